@@ -1,0 +1,72 @@
+// The document that a host opens, saves and closes: one template, and the protocol by which its views hear
+// what happened. All substance lies in the template core.
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+#include "core/template_core.h"
+#include "platform/docview.h"
+
+namespace tessal {
+
+/// The numbers of the hints by which the views of a document speak with each other.
+namespace hint {
+inline constexpr int kShowMisc = 1;
+inline constexpr int kShowParticles = 2;
+inline constexpr int kSelectElement = 4;
+inline constexpr int kCommit = 5;
+inline constexpr int kCreateElement = 7;
+inline constexpr int kDeleteItem = 8;
+inline constexpr int kMoveUp = 9;
+inline constexpr int kMoveDown = 10;
+inline constexpr int kAddGroup = 11;
+inline constexpr int kDeleteGroup = 12;
+inline constexpr int kSelectGroup = 13;
+inline constexpr int kRenameGroup = 14;
+}  // namespace hint
+
+/// A hint whose argument is a number: an element's identity, a group's place, or a switch.
+struct NumberHint final : UpdateHint {
+  explicit NumberHint(std::int32_t value) : number(value) {}
+  std::int32_t number;
+};
+
+/// How the document speaks with its user.
+class DocumentDialogs {
+ public:
+  virtual ~DocumentDialogs() = default;
+
+  virtual void ShowMessage(const std::string& text) = 0;
+  virtual bool AskYesNo(const std::string& question) = 0;
+
+ protected:
+  DocumentDialogs() = default;
+  DocumentDialogs(const DocumentDialogs&) = default;
+  DocumentDialogs& operator=(const DocumentDialogs&) = default;
+};
+
+class CTessalDoc final : public CDocument {
+ public:
+  explicit CTessalDoc(DocumentDialogs& userDialogs) : dialogs(userDialogs) {}
+
+  bool OnOpenDocument(const std::string& path) override;
+  /// Asks first when the registry holds anything; false, with nothing written, on No.
+  bool OnSaveDocument(const std::string& path) override;
+  /// Marks the title too. The mark is taken off by the title that a save gives.
+  void SetModifiedFlag(bool flag) override;
+
+  TemplateCore& Core() { return core; }
+  const TemplateCore& Core() const { return core; }
+
+  /// The filter of the overview page: group and level from 1, 0 for all, and whether lower levels count in.
+  std::int32_t visibilityGroup = 0;
+  std::int32_t visibilityLevel = 0;
+  bool visibilityRecursive = false;
+
+ private:
+  DocumentDialogs& dialogs;
+  TemplateCore core;
+};
+
+}  // namespace tessal

@@ -1,0 +1,100 @@
+#include "core/error_registry.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::array<std::string_view, 5> kLevelWords = {"", "Notice", "Warning", "Critical", "-FATAL-"};
+
+}  // namespace
+
+std::string_view LevelWord(std::uint32_t level) {
+  return level < kLevelWords.size() ? kLevelWords[level] : kLevelWords[0];
+}
+
+void ErrorRegistry::AddError(std::uint32_t level, std::string_view symbol, std::int32_t uid,
+                             std::string_view text) {
+  if (level >= 1 && level <= kLevels) ++counts[level - 1];
+  records.push_back({level, std::string(symbol), uid, std::string(text)});
+}
+
+void ErrorRegistry::AddError(ErrorLevel level, std::string_view symbol, std::int32_t uid,
+                             std::string_view text) {
+  AddError(static_cast<std::uint32_t>(level), symbol, uid, text);
+}
+
+void ErrorRegistry::ReportElementError(std::string_view symbol, std::int32_t uid, std::string_view text) {
+  AddError(ErrorLevel::Warning, symbol, uid, text);
+  ++expressionWarningCount;
+}
+
+void ErrorRegistry::ClearErrors() {
+  records.clear();
+  counts.fill(0);
+}
+
+std::size_t ErrorRegistry::GetErrorCount(std::uint32_t level) const {
+  return level >= 1 && level <= kLevels ? counts[level - 1] : records.size();
+}
+
+bool ErrorRegistry::GetError(std::size_t index, std::uint32_t& level, std::string& symbol, std::int32_t& uid,
+                             std::string& text) const {
+  if (index >= records.size()) return false;
+  const ErrorRecord& record = records[index];
+  level = record.level;
+  symbol = record.symbol;
+  uid = record.uid;
+  text = record.text;
+  return true;
+}
+
+bool ErrorRegistry::FormatError(std::size_t index, std::string& text) const {
+  if (index >= records.size()) {
+    text = "invalid error number!";
+    return false;
+  }
+  const ErrorRecord& record = records[index];
+  // The word stands glued to the text: people search their logs for this form.
+  text = std::string(LevelWord(record.level)) + record.text;
+  if (record.uid > 0) {
+    text += " symbol \"" + record.symbol + "\" ( UID=" + std::to_string(record.uid) + ")";
+  }
+  return true;
+}
+
+std::string ErrorRegistry::JoinErrors() const {
+  std::string joined;
+  std::string line;
+  for (std::size_t index = 0; index < records.size(); ++index) {
+    FormatError(index, line);
+    joined += line;
+    joined += '\n';
+  }
+  return joined;
+}
+
+void ErrorRegistry::GetErrorForList(std::size_t index, std::string& symbol, std::int32_t& uid,
+                                    std::string& text) const {
+  if (index >= records.size()) {
+    symbol.clear();
+    uid = -1;
+    text = "no errors";
+    return;
+  }
+  const ErrorRecord& record = records[index];
+  symbol = record.symbol;
+  uid = record.uid > 0 ? record.uid : -1;
+  text = std::string(LevelWord(record.level)) + ": " + record.text;
+}
+
+void ErrorRegistry::Reset() {
+  ClearErrors();
+  expressionWarningCount = 0;
+}
+
+ErrorRegistry& Errors() {
+  static ErrorRegistry registry;
+  return registry;
+}
+
+}  // namespace tessal

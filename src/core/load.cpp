@@ -1,0 +1,231 @@
+// Loading a template file. The key-file library gives the values that the elements are built from; the
+// reader of the item tree then reads the same file again for what the library cannot keep.
+#include <exception>
+
+#include "core/error_registry.h"
+#include "core/template_core.h"
+#include "elements/property_io.h"
+#include "keyfile/keywords.h"
+#include "keyfile/reader.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kLoadSymbol = "LOAD ";
+
+/// Closes the library's file on every way out.
+class OpenFile final {
+ public:
+  explicit OpenFile(const std::string& path) : handle(kvfLoadFile(path, 1)), error(kvfGetErrorGlb()) {}
+  OpenFile(const OpenFile&) = delete;
+  OpenFile& operator=(const OpenFile&) = delete;
+  ~OpenFile() { kvfClose(&handle); }
+
+  KvfHandle Handle() const { return handle; }
+  int Error() const { return error; }
+
+ private:
+  KvfHandle handle;
+  int error;
+};
+
+/// Switches rebuilds off, and on again on every way out.
+class RebuildsOff final {
+ public:
+  explicit RebuildsOff(bool& rebuildSwitch) : enabled(rebuildSwitch) { enabled = false; }
+  RebuildsOff(const RebuildsOff&) = delete;
+  RebuildsOff& operator=(const RebuildsOff&) = delete;
+  ~RebuildsOff() { enabled = true; }
+
+ private:
+  bool& enabled;
+};
+
+std::string SyntaxErrorText(KvfHandle handle) {
+  int line = 0;
+  int position = 0;
+  std::string near;
+  kvfGetSyntaxErr(handle, line, position, near);
+  return "Synthax error near line " + std::to_string(line) + " position " + std::to_string(position) + " : " +
+         near;
+}
+
+std::string LoadErrorText(const OpenFile& file, const std::string& path) {
+  switch (file.Error()) {
+    case kKvfCannotOpen:
+      return "Can not open file " + path;
+    case kKvfCannotInitialiseStream:
+      return "Can not initalise iput stream";
+    case kKvfSyntaxError:
+      return SyntaxErrorText(file.Handle());
+    case kKvfCannotInitialiseParser:
+      return "Can not initalise KVF parser!";
+    case kKvfBadHandle:
+      return "Bad handle passed to function!";
+    case kKvfBadNode:
+      return "Bad node passed to function!";
+    default:
+      return "unkown error occured!";
+  }
+}
+
+/// A target that holds nothing stands for an empty template, and misses no key.
+bool IsEmptyTarget(KvfNode target) {
+  return kvfGetNoSections(target) == 0 && !HasKeyword(target, key::kDescription) &&
+         !HasKeyword(target, key::kOnlineHelp) && !HasKeyword(target, key::kDocumentation);
+}
+
+}  // namespace
+
+bool TemplateCore::LoadWrapper(const std::string& path) { return Load(path); }
+
+bool TemplateCore::Load(const std::string& path) {
+  const NotificationsOff silent;
+  try {
+    Clear();
+    if (!ReadTemplate(path)) return false;
+    if (!CheckIdRange()) AssignIds();
+    RebuildSymbolTable();
+    if (flags.strictScopeRule != 0) {
+      CheckScopeRule();
+    } else {
+      CheckProcessRule();
+    }
+    ParseAllExpressions();
+    ValidateTemplate();
+    flags.modified = false;
+    return true;
+  } catch (const std::exception& failure) {
+    // What was built so far stays; the reason must reach the user.
+    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, std::string(failure.what()) + "\n");
+    return false;
+  }
+}
+
+bool TemplateCore::ReadTemplate(const std::string& path) {
+  const OpenFile file(path);
+  if (file.Error() != kKvfOk || file.Handle() == 0) {
+    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, LoadErrorText(file, path) + "\n");
+    return false;
+  }
+  saveFileName = path;
+  templateFileName = path;
+  if (!ReadSections(file.Handle(), 1)) return false;
+  keptTree.Clear();
+  if (LoadKeyFileTree(path, keptTree) == 0) {
+    const std::string& reason = LastKeyError().empty() ? KeyFileFailureText() : LastKeyError();
+    Errors().AddError(ErrorLevel::Warning, "could not read template: ", -1, reason);
+  }
+  return true;
+}
+
+bool TemplateCore::ReadSections(KvfHandle file, int targetNumber) {
+  int status = 0;
+  const KvfNode target = kvfTargetByNameNum(file, section::kTarget, targetNumber);
+  if (target != nullptr && !IsEmptyTarget(target)) {
+    const RebuildsOff noRebuilds(flags.rebuildEnabled);
+    root.Read(target, status);
+    ReadMisc(target, status);
+    ReadCollections(target, status);
+    ReadEquations(target, status);
+    ReadSpecies(target, status);
+  } else {
+    hasMisc = false;
+  }
+  RebuildSymbolTable();
+  if (hasMisc) ApplyVisibilityGroups();
+  if (Errors().GetErrorCount(static_cast<std::uint32_t>(ErrorLevel::Fatal)) > 0) return false;
+  flags.modified = false;
+  return true;
+}
+
+void TemplateCore::ReadMisc(KvfNode target, int& status) {
+  const KvfNode settings = kvfSectionByNameNum(target, section::kMisc, 1);
+  hasMisc = settings != nullptr;
+  if (hasMisc) misc.Read(settings, status);
+}
+
+template <class AddElement>
+void TemplateCore::ReadCollection(KvfNode target, std::string_view name, std::int32_t listKind, int& status,
+                                  AddElement add) {
+  const KvfNode list = kvfSectionByNameNum(target, name, 1);
+  if (list == nullptr) return;
+  ListHead(listKind).Read(list, status);
+  const int count = kvfGetNoSections(list);
+  for (int number = 1; number <= count; ++number) {
+    CEL_Element& element = add();
+    element.Read(kvfSectionByNum(list, number), status);
+    element.SetLoaded(true);
+  }
+}
+
+void TemplateCore::ReadCollections(KvfNode target, int& status) {
+  ReadCollection(target, section::kStateVariables, kind::kStateVariableList, status,
+                 [this]() -> CEL_Element& { return AddStateVariable(); });
+  ReadCollection(target, section::kConstants, kind::kConstantList, status,
+                 [this]() -> CEL_Element& { return AddConstant(); });
+  ReadCollection(target, section::kForcings, kind::kForcingList, status,
+                 [this]() -> CEL_Element& { return AddForcing(); });
+  ReadCollection(target, section::kAuxiliaryVariables, kind::kAuxiliaryList, status,
+                 [this]() -> CEL_Element& { return AddAuxiliary(); });
+  ReadCollection(target, section::kProcesses, kind::kProcessList, status,
+                 [this]() -> CEL_Element& { return AddProcess(); });
+  ReadCollection(target, section::kDerivedOutputs, kind::kDerivedOutputList, status,
+                 [this]() -> CEL_Element& { return AddDerivedOutput(); });
+  // The file holds no symbol for these: their place gives it.
+  for (std::size_t place = 0; place < derivedOutputs.size(); ++place) {
+    derivedOutputs[place]->symbol.SetText("Derived Output " + std::to_string(place + 1));
+  }
+}
+
+void TemplateCore::ReadEquations(KvfNode target, int& status) {
+  const KvfNode equations = kvfSectionByNameNum(target, section::kStateVariableEquations, 1);
+  if (equations == nullptr) return;
+  const int count = kvfGetNoSections(equations);
+  for (int number = 1; number <= count; ++number) {
+    GetStateVariable(static_cast<std::size_t>(number - 1))
+        .ReadEquation(kvfSectionByNum(equations, number), status);
+  }
+}
+
+void TemplateCore::ReadSpecies(KvfNode target, int& status) {
+  const KvfNode classes = kvfSectionByNameNum(target, section::kLagrange, 1);
+  if (classes == nullptr) return;
+  const int count = kvfGetNoSections(classes);
+  for (int number = 1; number <= count; ++number) {
+    CEL_Lagrange_Specie& specie = AddSpecie();
+    specie.Read(kvfSectionByNum(classes, number), status);
+    specie.SetLoaded(true);
+  }
+}
+
+bool TemplateCore::CheckIdRange() {
+  constexpr std::int32_t kSlotsOfVector = 2;
+  auto slots = static_cast<std::int32_t>(CountNamedElements());
+  for (const auto& specie : species) {
+    slots += 1 + kSlotsOfVector * static_cast<std::int32_t>(specie->horizontalVectors.size()) + 1;
+  }
+  bool good = true;
+  ForEachNamedElement([slots, &good](CEL_Element& element) {
+    if (element.id.IntValue() <= slots) return;
+    element.id.SetInt(slots);
+    good = false;
+  });
+  return good;
+}
+
+void TemplateCore::AssignIds() {
+  ResolveReferencesToNames();
+  for (const SymbolRecord& record : symbolTable) {
+    record.element->id.SetInt(static_cast<std::int32_t>(record.sequence));
+  }
+  for (std::size_t place = 0; place < species.size(); ++place) {
+    species[place]->SetIndex(static_cast<std::int32_t>(place + 1));
+    species[place]->StampMembers();
+  }
+  ResolveNamesToReferences();
+  flags.modified = true;
+}
+
+}  // namespace tessal

@@ -1,0 +1,209 @@
+// Saving a template: written through the key-file library into a temporary file beside the target, joined
+// with the top-level sections that only the kept tree knows, and put in the target's place in one step.
+#include <cstdio>
+#include <exception>
+#include <locale>
+#include <sstream>
+
+#include "core/error_registry.h"
+#include "core/template_core.h"
+#include "elements/version_stamp.h"
+#include "keyfile/keywords.h"
+#include "platform/file_replacement.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kSaveSymbol = "SAVE ";
+constexpr std::string_view kTypeLine = "// type = 2\r\n";
+/// The type line comes before this line, counted from 1.
+constexpr int kTypeLineNumber = 4;
+
+/// An image of the library, closed on every way out.
+class Image final {
+ public:
+  Image() : handle(kvfCreate()) {}
+  Image(const Image&) = delete;
+  Image& operator=(const Image&) = delete;
+  ~Image() { kvfClose(&handle); }
+
+  KvfHandle Handle() const { return handle; }
+
+ private:
+  KvfHandle handle;
+};
+
+void ReportFailure(std::string_view reason) {
+  Errors().AddError(ErrorLevel::Critical, kSaveSymbol, -1, reason);
+}
+
+/// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
+/// follows a text that ends in a line end.
+std::string WithTypeLine(const std::string& text) {
+  std::size_t lineStart = 0;
+  for (int line = 1; line < kTypeLineNumber; ++line) {
+    const std::size_t lineEnd = text.find('\n', lineStart);
+    if (lineEnd == std::string::npos) return text;
+    lineStart = lineEnd + 1;
+  }
+  std::string result = text.substr(0, lineStart);
+  result += kTypeLine;
+  result.append(text, lineStart);
+  result += "\r\n";
+  return result;
+}
+
+/// Each line feed as carriage return and line feed.
+std::string WithCarriageReturns(const std::string& text) {
+  std::string result;
+  result.reserve(text.size() + text.size() / 16);
+  for (const char character : text) {
+    if (character == '\n') result += '\r';
+    result += character;
+  }
+  return result;
+}
+
+template <class Elements>
+void WriteElements(const Elements& elements, std::string_view prefix, KvfHandle file, int& status) {
+  for (std::size_t place = 0; place < elements.size(); ++place) {
+    kvfAddSection(file, std::string(prefix) + std::to_string(place + 1));
+    elements[place]->Write(file, status);
+    kvfEndSection(file);
+  }
+}
+
+}  // namespace
+
+bool TemplateCore::SaveWrapper(const std::string& path) { return Save(path); }
+
+bool TemplateCore::Save(const std::string& path) {
+  try {
+    return path == saveFileName ? WriteTemplateFile(path) : SaveAs(path);
+  } catch (const std::exception& failure) {
+    ReportFailure(failure.what());
+    return false;
+  }
+}
+
+bool TemplateCore::SaveAs(const std::string& path) {
+  const bool hadMisc = hasMisc;
+  // A file that had no settings stays with the meaning that it was written with.
+  std::string angleUnit = "Radians";
+  if (hasMisc) {
+    angleUnit = misc.trigonometrics.Text();
+  } else {
+    hasMisc = true;
+    misc.Reset();
+  }
+  const std::int32_t formerRevision = misc.documentRevision.IntValue();
+  misc.tessalVersion.SetReal(SoftwareVersion());
+  misc.parserVersion.SetReal(ParserVersion());
+  misc.documentRevision.SetInt(0);
+  misc.optimise.SetBool(true);
+  misc.trigonometrics.SetText(angleUnit);
+  if (WriteTemplateFile(path)) return true;
+  hasMisc = hadMisc;
+  misc.documentRevision.SetInt(formerRevision);
+  return false;
+}
+
+bool TemplateCore::WriteTemplateFile(const std::string& path) {
+  const std::int32_t formerRevision = misc.documentRevision.IntValue();
+  const std::string reason = WriteThrough(path);
+  if (!reason.empty()) {
+    // What is in memory stays unsaved, and its revision uncounted.
+    misc.documentRevision.SetInt(formerRevision);
+    flags.modified = true;
+    ReportFailure(reason);
+    return false;
+  }
+  templateFileName = path;
+  saveFileName = path;
+  flags.modified = false;
+  return true;
+}
+
+std::string TemplateCore::WriteThrough(const std::string& path) {
+  const std::string temporary = path + "$";
+  {
+    const Image image;
+    if (!WriteSections(image.Handle())) return "the template holds what the file format can not";
+    if (kvfWrite(image.Handle(), temporary) != kKvfOk) {
+      std::string reason = kvfGetWriteFailure();
+      RemoveFile(temporary);
+      return reason;
+    }
+  }
+  std::string reason;
+  const std::optional<std::string> text = ReadWholeFile(temporary, reason);
+  if (!text) return reason;
+  reason = ReplaceFile(path, WithTypeLine(*text + KeptSectionsText()));
+  const std::string removal = RemoveFile(temporary);
+  if (!removal.empty()) std::fprintf(stderr, "could not delete temporary file %s\n", temporary.c_str());
+  return reason;
+}
+
+std::string TemplateCore::KeptSectionsText() const {
+  std::ostringstream text;
+  text.imbue(std::locale::classic());
+  const std::size_t count = keptTree.CountChildren(CKvfBaseItem::kSection);
+  for (std::size_t place = 1; place < count; ++place) {
+    keptTree.ChildByKind(place, CKvfBaseItem::kSection)->Write(text);
+  }
+  return WithCarriageReturns(text.str());
+}
+
+bool TemplateCore::WriteSections(KvfHandle file) {
+  int status = 0;
+  AssignIds();
+  kvfAddTarget(file, section::kTarget);
+  root.Write(file, status);
+  if (hasMisc) {
+    kvfAddSection(file, section::kMisc);
+    misc.Write(file, status);
+    kvfEndSection(file);
+  }
+  WriteCollections(file, status);
+  WriteEquations(file, status);
+  WriteSpecies(file, status);
+  kvfEndSection(file);
+  return status == 0;
+}
+
+void TemplateCore::WriteCollections(KvfHandle file, int& status) {
+  const auto write = [this, file, &status](const auto& elements, std::string_view name, std::string_view prefix,
+                                           std::int32_t headKind) {
+    kvfAddSection(file, name);
+    ListHead(headKind).Write(file, status);
+    WriteElements(elements, prefix, file, status);
+    kvfEndSection(file);
+  };
+  write(stateVariables, section::kStateVariables, section::kStateVariablePrefix, kind::kStateVariableList);
+  write(constants, section::kConstants, section::kConstantPrefix, kind::kConstantList);
+  write(forcings, section::kForcings, section::kForcingPrefix, kind::kForcingList);
+  // The texts of the auxiliaries' head are those of the constants: files have always been written so.
+  write(auxiliaries, section::kAuxiliaryVariables, section::kAuxiliaryVariablePrefix, kind::kConstantList);
+  write(processes, section::kProcesses, section::kProcessPrefix, kind::kProcessList);
+  write(derivedOutputs, section::kDerivedOutputs, section::kDerivedOutputPrefix, kind::kDerivedOutputList);
+}
+
+void TemplateCore::WriteEquations(KvfHandle file, int& status) {
+  kvfAddSection(file, section::kStateVariableEquations);
+  for (std::size_t place = 0; place < stateVariables.size(); ++place) {
+    kvfAddSection(file, std::string(section::kStateVariableEquationPrefix) + std::to_string(place + 1));
+    stateVariables[place]->WriteEquation(file, status);
+    kvfEndSection(file);
+  }
+  kvfEndSection(file);
+}
+
+void TemplateCore::WriteSpecies(KvfHandle file, int& status) {
+  if (species.empty()) return;
+  kvfAddSection(file, section::kLagrange);
+  WriteElements(species, section::kSpeciePrefix, file, status);
+  kvfEndSection(file);
+}
+
+}  // namespace tessal

@@ -1,0 +1,128 @@
+#include "core/scope_rule.h"
+
+#include <algorithm>
+#include <array>
+#include <string>
+
+#include "core/error_registry.h"
+#include "core/template_core.h"
+
+namespace tessal {
+
+namespace {
+
+struct CodeRow {
+  std::string_view text;
+  std::int32_t code;
+};
+
+constexpr std::array<CodeRow, 5> kScopes = {{
+    {"Global", scope_code::kGlobal},
+    {"WS", scope_code::kWaterSurface},
+    {"WB", scope_code::kWaterBottom},
+    {"SED", scope_code::kSediment},
+    {"WC", scope_code::kWaterColumn},
+}};
+
+// Spelt as the files spell them: "HORIZONTAL" is no known value.
+constexpr std::array<CodeRow, 3> kSpatialVariations = {{
+    {"NONE", spatial_code::kNone},
+    {"HORISONTAL", spatial_code::kHorizontal},
+    {"HORISONTAL_AND_VERTICAL", spatial_code::kHorizontalAndVertical},
+}};
+
+template <std::size_t Count>
+std::int32_t CodeOf(const std::array<CodeRow, Count>& rows, std::string_view text, std::int32_t otherwise) {
+  const auto hit = std::find_if(rows.begin(), rows.end(), [text](const CodeRow& row) { return row.text == text; });
+  return hit == rows.end() ? otherwise : hit->code;
+}
+
+/// What does not vary in space uses nothing that does; what varies horizontally in the water column uses
+/// nothing of the water column that varies in all three dimensions.
+bool ViolatesScopeRule(const SymbolRecord& user, const SymbolRecord& used) {
+  const bool bothInColumn =
+      user.scope == scope_code::kWaterColumn && used.scope == scope_code::kWaterColumn;
+  if (bothInColumn && user.spatial == spatial_code::kHorizontal) {
+    return used.spatial == spatial_code::kHorizontalAndVertical;
+  }
+  return user.spatial == spatial_code::kNone && used.spatial != spatial_code::kNone;
+}
+
+constexpr std::string_view kNoProcess = " is no process!";
+constexpr std::string_view kInvalidScope = " has invalid scope and/or spatial variation in expression of";
+
+/// The text of a violation of the process rule, empty when the use is allowed.
+std::string_view ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
+  const std::int32_t userKind = user.element->Kind();
+  const std::int32_t usedKind = used.element->Kind();
+  if (userKind == kind::kStateVariable) return usedKind == kind::kProcess ? std::string_view() : kNoProcess;
+  if (userKind != kind::kAuxiliary && userKind != kind::kProcess) return {};
+  switch (usedKind) {
+    case kind::kConstant:
+    case kind::kForcing:
+    case kind::kAuxiliary:
+      return used.spatial <= user.spatial ? std::string_view() : kInvalidScope;
+    case kind::kProcess:
+      if (userKind == kind::kAuxiliary) return {};
+      return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
+    case kind::kStateVariable:
+      return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
+    default:
+      return {};
+  }
+}
+
+}  // namespace
+
+std::int32_t ScopeFromText(std::string_view text) { return CodeOf(kScopes, text, scope_code::kNone); }
+
+std::int32_t SpatialFromText(std::string_view text) {
+  return CodeOf(kSpatialVariations, text, spatial_code::kUnknown);
+}
+
+std::int32_t SpatialFromScope(std::int32_t scope) {
+  switch (scope) {
+    case scope_code::kGlobal:
+      return spatial_code::kNone;
+    case scope_code::kWaterSurface:
+    case scope_code::kWaterBottom:
+    case scope_code::kSediment:
+      return spatial_code::kHorizontal;
+    case scope_code::kWaterColumn:
+      return spatial_code::kHorizontalAndVertical;
+    default:
+      return spatial_code::kUnknown;
+  }
+}
+
+bool TemplateCore::CheckScopeRule() const {
+  bool good = true;
+  for (const SymbolRecord& user : symbolTable) {
+    if (user.element->Kind() >= kind::kSpecie) continue;
+    for (const std::uint32_t sequence : user.references) {
+      const SymbolRecord& used = Record(sequence);
+      if (!ViolatesScopeRule(user, used)) continue;
+      Errors().ReportElementError(user.element->symbol.Text(), user.element->MessageUid(),
+                                  "'" + RecordSymbol(used) + "' has invalid scope and/or spatial variation");
+      good = false;
+    }
+  }
+  return good;
+}
+
+bool TemplateCore::CheckProcessRule() const {
+  bool good = true;
+  for (const SymbolRecord& user : symbolTable) {
+    for (const std::uint32_t sequence : user.references) {
+      const SymbolRecord& used = Record(sequence);
+      const std::string_view violation = ProcessRuleViolation(user, used);
+      if (violation.empty()) continue;
+      Errors().ReportElementError(user.element->symbol.Text(), user.element->MessageUid(),
+                                  RecordSymbol(used) + std::string(violation));
+      good = false;
+    }
+  }
+  return good;
+}
+
+}  // namespace tessal

@@ -1,0 +1,132 @@
+// The structural pass over a template: it numbers the elements and makes the flat symbol table anew. It holds
+// nothing between runs and reports nothing.
+#include <array>
+#include <charconv>
+
+#include "core/scope_rule.h"
+#include "core/template_core.h"
+
+namespace tessal {
+
+namespace {
+
+/// A number as a stream with its default settings prints it: six significant digits.
+std::string StreamText(double value) {
+  constexpr int kStreamPrecision = 6;
+  std::array<char, 32> buffer{};
+  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
+                                    std::chars_format::general, kStreamPrecision);
+  return {buffer.data(), result.ptr};
+}
+
+}  // namespace
+
+void TemplateCore::RebuildSymbolTable() {
+  if (!flags.rebuildEnabled) return;
+  const NotificationsOff silent;
+  const std::size_t formerSize = symbolTable.size();
+  symbolTable.clear();
+  symbolTable.reserve(formerSize + 1);
+  MarkUndefinedStale();
+  ResolveReferencesToNames();
+  NumberTemplateElements();
+  NumberParticleElements();
+  ExtractReferences();
+  BuildReverseReferences();
+  ClassifyArithmeticExpressions();
+  ResolveNamesToReferences();
+  DropStaleUndefined();
+}
+
+void TemplateCore::MarkUndefinedStale() {
+  for (const auto& undefined : undefinedSymbols) {
+    undefined->stale = true;
+    undefined->usedBy.clear();
+  }
+}
+
+void TemplateCore::DropStaleUndefined() {
+  std::erase_if(undefinedSymbols, [](const auto& undefined) { return undefined->stale; });
+}
+
+void TemplateCore::AppendRecord(CEL_Element& element, std::int32_t index, std::int32_t specieIndex,
+                                std::string text) {
+  SymbolRecord record;
+  record.sequence = static_cast<std::uint32_t>(symbolTable.size() + 1);
+  if (!symbolTable.empty()) {
+    record.scope = symbolTable.back().scope;
+    record.spatial = symbolTable.back().spatial;
+  }
+  record.index = index;
+  record.specieIndex = specieIndex;
+  record.text = std::move(text);
+  record.element = &element;
+  element.id.SetInt(static_cast<std::int32_t>(record.sequence));
+  symbolTable.push_back(std::move(record));
+}
+
+void TemplateCore::NumberTemplateElements() {
+  const auto append = [this](auto& element, std::int32_t index, std::string text) {
+    AppendRecord(element, index, -1, std::move(text));
+    SymbolRecord& record = symbolTable.back();
+    record.scope = ScopeFromText(element.scope.Text());
+    return &record;
+  };
+  const auto appendVarying = [&append](auto& element, std::int32_t index, std::string text) {
+    append(element, index, std::move(text))->spatial = SpatialFromText(element.spatialVariation.Text());
+  };
+  std::int32_t index = 0;
+  for (const auto& element : stateVariables) {
+    SymbolRecord* record = append(*element, index++, element->equation.Text());
+    record->spatial = SpatialFromScope(record->scope);
+  }
+  const auto appendInputs = [&appendVarying](const auto& inputs) {
+    std::int32_t place = 0;
+    for (const auto& element : inputs) {
+      appendVarying(*element, place++, StreamText(element->defaultValue.RealValue()));
+    }
+  };
+  const auto appendExpressions = [&appendVarying](const auto& elements) {
+    std::int32_t place = 0;
+    for (const auto& element : elements) appendVarying(*element, place++, element->expression.Text());
+  };
+  appendInputs(constants);
+  appendInputs(forcings);
+  appendExpressions(auxiliaries);
+  appendExpressions(processes);
+  appendExpressions(derivedOutputs);
+}
+
+void TemplateCore::NumberParticleElements() {
+  const auto append = [this](const auto& members, std::size_t specie, auto textOf) {
+    std::int32_t place = 0;
+    for (const auto& member : members) {
+      AppendRecord(*member, place++, static_cast<std::int32_t>(specie), textOf(*member));
+    }
+  };
+  const auto valueText = [](const CEL_SpecieValue& member) {
+    return StreamText(member.defaultValue.RealValue());
+  };
+  for (std::size_t place = 0; place < species.size(); ++place) {
+    const CEL_Lagrange_Specie& specie = *species[place];
+    append(specie.stateVariables, place, [](const auto& member) { return member.equation.Text(); });
+    append(specie.constants, place, valueText);
+    append(specie.forcings, place, valueText);
+    append(specie.spatialFunctions, place, [](const auto& member) { return member.VariableName(); });
+    append(specie.arithmeticExpressions, place, [](const auto& member) { return member.expression.Text(); });
+  }
+  for (std::size_t place = 0; place < species.size(); ++place) {
+    CEL_Lagrange_Specie& specie = *species[place];
+    const auto specieIndex = static_cast<std::int32_t>(place);
+    AppendRecord(specie, specieIndex, specieIndex, "");
+    std::int32_t index = 0;
+    for (const auto& vector : specie.horizontalVectors) {
+      AppendRecord(*vector, index, specieIndex, vector->direction.Text());
+      AppendRecord(*vector, index, specieIndex, vector->speed.Text());
+      ++index;
+    }
+    AppendRecord(*specie.verticalEquation, 0, specieIndex, specie.verticalEquation->speed.Text());
+  }
+}
+
+}  // namespace tessal

@@ -1,0 +1,199 @@
+#include "elements/area_search.h"
+
+#include <array>
+
+#include "core/error_registry.h"
+#include "elements/element_checks.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kEuler = "EULER";
+constexpr std::string_view kLagrange = "LAGRANGE";
+constexpr std::string_view kOilspill = "OILSPILL";
+constexpr std::string_view kNone = "NONE";
+
+constexpr std::int32_t kOwnSpecie = -1;
+constexpr std::int32_t kAnyParticle = -2;
+constexpr std::int32_t kLargestVariableId = 999999;
+
+constexpr std::array<std::string_view, 2> kFrameworks = {kEuler, kLagrange};
+constexpr std::array<std::string_view, 9> kProperties = {kNone,  "XPOS",   "YPOS",   "ZPOS",    "AGE",
+                                                         "HDIR", "HSPEED", "VSPEED", "DISTANCE"};
+constexpr std::array<std::string_view, 2> kEulerPurposes = {"DIRECTION", "MAGNITUDE"};
+constexpr std::array<std::string_view, 4> kLagrangePurposes = {"DIRECTION", "MAGNITUDE", "DISTANCE",
+                                                               "PARTICLE"};
+constexpr std::array<std::string_view, 5> kEulerMath = {kNone, "MIN", "MAX", "MIN_ABSOLUTE", "MAX_ABSOLUTE"};
+constexpr std::array<std::string_view, 7> kMagnitudeMath = {kNone, "COUNT", "AVERAGE", "MIN",
+                                                            "MAX", "SUM",   "SUM_NORM"};
+constexpr std::array<std::string_view, 3> kParticleMath = {kNone, "MIN", "MAX"};
+constexpr std::array<std::string_view, 4> kDistanceMath = {kNone, "AVERAGE", "MIN", "MAX"};
+constexpr std::array<std::string_view, 1> kNoMath = {kNone};
+
+const ChoiceList& FrameworkChoices() {
+  static const ChoiceList kList = MakeTextChoices(kFrameworks);
+  return kList;
+}
+
+const ChoiceList& PropertyChoices() {
+  static const ChoiceList kList = MakeTextChoices(kProperties);
+  return kList;
+}
+
+const ChoiceList& DimensionChoices() {
+  static const ChoiceList kList = std::make_shared<const std::vector<CEL_Choice>>(
+      std::vector<CEL_Choice>{CEL_Choice::Number("2", 2), CEL_Choice::Number("3", 3)});
+  return kList;
+}
+
+std::span<const std::string_view> LagrangeMath(std::string_view purpose) {
+  if (purpose == "MAGNITUDE") return kMagnitudeMath;
+  if (purpose == "PARTICLE") return kParticleMath;
+  if (purpose == "DISTANCE" || purpose == "DIRECTION") return kDistanceMath;
+  return kNoMath;
+}
+
+constexpr std::array<PropertyRow, 11> kRows = {{
+    {key::kFunctionId, "Function_ID", ValueType::Integer, nullptr, "", 100.0},
+    {key::kVariableId, "Variable ID", ValueType::Integer, nullptr, "", -1.0},
+    {key::kSpecieId, "Specie ID", ValueType::Integer, nullptr, "", -1.0},
+    {key::kRadius, "Radius", ValueType::Real, nullptr, "", 0.0},
+    {key::kDimension, "Dimension", ValueType::Integer, DimensionChoices, "", 2.0},
+    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_INDIVIDUAL"},
+    {key::kPurpose, "Purpose", ValueType::Text, nullptr, "DIRECTION"},
+    {key::kFramework, "Framework", ValueType::Text, FrameworkChoices, kEuler},
+    {key::kProperty, "Property", ValueType::Text, PropertyChoices, kNone},
+    {key::kMath, "Math", ValueType::Text, nullptr, kNone},
+    {key::kLookFor, "Lookfor", ValueType::Integer, nullptr, "", kOwnSpecie},
+}};
+
+/// Selects the choice that stores the property's text; without one the first choice takes its place.
+void SelectOrTakeFirst(CEL_Property& property) {
+  const auto& choices = property.Choices();
+  for (std::size_t index = 0; index < choices.size(); ++index) {
+    if (choices[index].fileText != property.Text()) continue;
+    property.SelectIndex(static_cast<std::int32_t>(index));
+    return;
+  }
+  if (choices.empty()) return;
+  property.SelectIndex(0);
+  property.ApplySelection();
+}
+
+}  // namespace
+
+std::vector<CEL_Choice> FirstLookForChoices() {
+  return {CEL_Choice::Number("OWN SPECIE", kOwnSpecie), CEL_Choice::Number("ANY PARTICLE", kAnyParticle)};
+}
+
+CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view caption) : CEL_Element(caption) {
+  SetKind(kind::kSpatialFunction);
+  Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
+               &framework, &property, &math, &lookFor});
+  ListenTo({&variableId, &lookFor, &purpose, &framework});
+  lookFor.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(FirstLookForChoices()));
+  CEL_Lagrange_Spatial_Function::Reset();
+}
+
+void CEL_Lagrange_Spatial_Function::Reset() {
+  ResetOwn();
+  RebuildChoices();
+  RestoreSelections();
+}
+
+void CEL_Lagrange_Spatial_Function::Read(KvfNode section, int& status) {
+  if (!kvfIsSection(section)) return;
+  CEL_Element::Read(section, status);
+  RebuildChoices();
+  RestoreSelections();
+}
+
+bool CEL_Lagrange_Spatial_Function::SearchesGrid() const {
+  return framework.Text() == kEuler && purpose.Text() != kOilspill;
+}
+
+bool CEL_Lagrange_Spatial_Function::SearchesParticles() const {
+  return framework.Text() == kLagrange || purpose.Text() == kOilspill;
+}
+
+void CEL_Lagrange_Spatial_Function::RebuildChoices() {
+  if (framework.Text() == kEuler && purpose.Text() == kOilspill) {
+    // No longer offered, but kept where a file has it.
+    purpose.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(
+        1, CEL_Choice::Text("Oilspill(deprecated)", kOilspill)));
+    purpose.SelectIndex(0);
+  } else if (framework.Text() == kEuler) {
+    purpose.SetChoices(MakeTextChoices(kEulerPurposes));
+    purpose.SelectChoice("DIRECTION");
+    math.SetChoices(MakeTextChoices(kEulerMath));
+    math.SelectChoice("MIN");
+  } else if (framework.Text() == kLagrange) {
+    purpose.SetChoices(MakeTextChoices(kLagrangePurposes));
+    math.SetChoices(MakeTextChoices(LagrangeMath(purpose.Text())));
+  }
+}
+
+void CEL_Lagrange_Spatial_Function::RestoreSelections() {
+  SelectOrTakeFirst(framework);
+  SelectOrTakeFirst(purpose);
+  SelectOrTakeFirst(math);
+  property.SelectChoice(property.Text());
+  property.ApplySelection();
+}
+
+void CEL_Lagrange_Spatial_Function::OfferSpecies(const std::vector<NamedNumber>& species) {
+  std::vector<CEL_Choice> owners;
+  std::vector<CEL_Choice> lookedFor = FirstLookForChoices();
+  for (const NamedNumber& specie : species) {
+    owners.push_back(CEL_Choice::Number(specie.name, specie.number));
+    lookedFor.push_back(CEL_Choice::Number(specie.name, specie.number));
+  }
+  specieId.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(std::move(owners)));
+  lookFor.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(std::move(lookedFor)));
+  SelectPresentValues();
+}
+
+bool CEL_Lagrange_Spatial_Function::Check() {
+  bool good = CheckTextContent(*this);
+  const auto report = [this, &good](std::string_view text) {
+    Errors().ReportElementError(symbol.Text(), MessageUid(), text);
+    good = false;
+  };
+  const bool lagrange = framework.Text() == kLagrange;
+  const std::int32_t sought = lookFor.IntValue();
+  const std::int32_t variable = variableId.IntValue();
+  const auto species =
+      static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieNames().size());
+  if (lagrange && (sought < kAnyParticle || sought == 0 || sought > species)) report(message::kNoSpecie);
+  if (purpose.Text() != kOilspill) {
+    const bool needsVariable = !lagrange || property.Text() == kNone;
+    if (variable > kLargestVariableId || (variable < 1 && needsVariable)) report(message::kNoVariable);
+  }
+  if (math.Text() == kNone) report(message::kNoMath);
+  if (!(radius.RealValue() > 0.0)) report(message::kNoRadius);
+  return good;
+}
+
+void CEL_Lagrange_Spatial_Function::OnPropertyChanged(CEL_Property& changed) {
+  if (&changed == &framework || &changed == &purpose) {
+    OnFrameworkChanged();
+  } else {
+    RebuildOwner();
+  }
+}
+
+void CEL_Lagrange_Spatial_Function::OnFrameworkChanged() {
+  if (framework.Text() == kEuler || framework.Text() == kLagrange) {
+    variableId.SetInt(-1);
+    property.ApplySelection();
+    property.SetEditable(true);
+  }
+  if (Owner() != nullptr) OfferSpecies(Owner()->SpecieNames());
+  RebuildChoices();
+  RestoreSelections();
+  if (Owner() != nullptr) Owner()->RefreshSearchFunctionChoices();
+}
+
+}  // namespace tessal

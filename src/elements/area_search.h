@@ -1,0 +1,59 @@
+// A restricted area search: around a particle, within a radius, the model looks at a grid variable or at
+// other particles and reduces what it finds to one number. Its choices are linked: the framework decides
+// which purposes exist, the purpose which mathematics apply.
+#pragma once
+
+#include <string>
+
+#include "elements/element.h"
+#include "elements/element_owner.h"
+
+namespace tessal {
+
+class CEL_Lagrange_Spatial_Function final : public CEL_Element {
+ public:
+  explicit CEL_Lagrange_Spatial_Function(std::string_view caption);
+
+  void Read(KvfNode section, int& status) override;
+  void Reset() override;
+  bool Check() override;
+  void OnPropertyChanged(CEL_Property& changed) override;
+
+  /// Fills the choices of purpose and mathematics from the framework and the purpose.
+  void RebuildChoices();
+  /// Selects the present texts among the choices; a text that is no choice gives way to the first one.
+  void RestoreSelections();
+  /// Offers the particle classes as owner and as what to look for.
+  void OfferSpecies(const std::vector<NamedNumber>& species);
+
+  /// Whether it looks at particles and so needs the spatial tree: framework "LAGRANGE", or an oil spill.
+  bool SearchesParticles() const;
+  /// Whether it looks at the values of the grid.
+  bool SearchesGrid() const;
+
+  /// The name behind `variableId`. It carries the link through a renumbering, see the symbol references.
+  const std::string& VariableName() const { return variableName; }
+  void SetVariableName(std::string_view name) { variableName = name; }
+
+  CEL_Property functionId{ValueType::Integer};
+  CEL_Property variableId{ValueType::Integer};
+  CEL_Property specieId{ValueType::Integer};
+  CEL_Property radius{ValueType::Real};
+  CEL_Property dimension{ValueType::Integer};
+  CEL_Property spatialVariation{ValueType::Text};
+  CEL_Property purpose{ValueType::Text};
+  CEL_Property framework{ValueType::Text};
+  CEL_Property property{ValueType::Text};
+  CEL_Property math{ValueType::Text};
+  CEL_Property lookFor{ValueType::Integer};
+
+ private:
+  void OnFrameworkChanged();
+
+  std::string variableName;
+};
+
+/// The choices that stand first for what a search looks for.
+std::vector<CEL_Choice> FirstLookForChoices();
+
+}  // namespace tessal

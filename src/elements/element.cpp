@@ -1,0 +1,372 @@
+#include "elements/element.h"
+
+#include <algorithm>
+#include <array>
+#include <cassert>
+
+#include "elements/element_owner.h"
+#include "elements/property_io.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+std::uint32_t& NextElementUid() {
+  static std::uint32_t uid = 0;
+  return uid;
+}
+
+constexpr std::string_view kUserDefined = "User defined";
+
+constexpr std::array<UnitTypeRow, 1> kUserDefinedType = {{{kUserDefined, kUserDefinedUnit, 0, "undefined"}}};
+
+const ChoiceList& UserDefinedUnitChoices() {
+  static const ChoiceList kList =
+      std::make_shared<const std::vector<CEL_Choice>>(1, CEL_Choice::Number(kUserDefined, 0));
+  return kList;
+}
+
+const ChoiceList& UserDefinedTypeChoices() {
+  static const ChoiceList kList = MakeUnitTypeChoices(kUserDefinedType);
+  return kList;
+}
+
+/// The base fields in the order of field lists, which is not that of the file.
+struct BaseRow {
+  std::string_view label;
+  CEL_Property CEL_Element::*property;
+};
+
+constexpr std::array<BaseRow, 7> kBaseRows = {{
+    {"Symbol", &CEL_Element::symbol},
+    {"ID", &CEL_Element::id},
+    {"Description", &CEL_Element::description},
+    {"Documentation", &CEL_Element::documentation},
+    {"Online help", &CEL_Element::onlineHelp},
+    {"UNQ Type", &CEL_Element::unqType},
+    {"UNQ Unit", &CEL_Element::unqUnit},
+}};
+
+void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
+  switch (row.type) {
+    case ValueType::Real:
+      property.SetReal(row.defaultNumber);
+      break;
+    case ValueType::Integer:
+      property.SetInt(static_cast<std::int32_t>(row.defaultNumber));
+      break;
+    case ValueType::Boolean:
+      property.SetBool(row.defaultText == "YES");
+      break;
+    default:
+      property.SetText(row.defaultText);
+      break;
+  }
+}
+
+/// Selects the choice that stands for the property's value, so that a form opens on it.
+void SelectPresentValue(CEL_Property& property) {
+  const auto& choices = property.Choices();
+  const auto hit = std::find_if(choices.begin(), choices.end(), [&property](const CEL_Choice& choice) {
+    switch (property.Type()) {
+      case ValueType::Real:
+        return choice.realValue == property.RealValue();
+      case ValueType::Integer:
+        return choice.intValue == property.IntValue();
+      case ValueType::Boolean:
+        return choice.boolValue == property.BoolValue();
+      default:
+        return choice.fileText == property.Text();
+    }
+  });
+  property.SelectIndex(hit == choices.end() ? -1 : static_cast<std::int32_t>(hit - choices.begin()));
+}
+
+}  // namespace
+
+CEL_Element::CEL_Element(bool withSymbol, bool withId, bool withDescription)
+    : hasDescription(withDescription), hasSymbol(withSymbol), hasId(withId), uid(++NextElementUid()) {
+  OfferUnitTypes(kUserDefinedType);
+  unqUnit.SetChoices(UserDefinedUnitChoices());
+  unqUnit.SelectIndex(0);
+}
+
+CEL_Element::CEL_Element(std::string_view caption) : CEL_Element(true, true, true) {
+  symbol.SetText(caption);
+}
+
+CEL_ListHead::CEL_ListHead(std::int32_t kindNumber, std::string_view caption)
+    : CEL_Element(false, false, true) {
+  SetKind(kindNumber);
+  symbol.SetText(caption);
+  SetLoaded(true);
+}
+
+void CEL_Element::OfferUnitTypes(std::span<const UnitTypeRow> rows) {
+  unqType.SetChoices(rows.data() == kUserDefinedType.data() ? UserDefinedTypeChoices()
+                                                            : MakeUnitTypeChoices(rows));
+  unqType.SetInt(kUserDefinedUnit);
+  unqType.SelectChoice(kUserDefined);
+}
+
+void CEL_Element::SetFileFlags(bool withSymbol, bool withId, bool withDescription) {
+  hasSymbol = withSymbol;
+  hasId = withId;
+  hasDescription = withDescription;
+}
+
+void CEL_Element::Bind(std::span<const PropertyRow> rows, std::initializer_list<CEL_Property*> properties) {
+  assert(rows.size() == properties.size());
+  ownProperties.reserve(ownProperties.size() + rows.size());
+  auto row = rows.begin();
+  for (CEL_Property* property : properties) {
+    assert(property->Type() == row->type);
+    if (row->choices != nullptr) property->SetChoices(row->choices());
+    ownProperties.push_back({&*row, property});
+    ++row;
+  }
+  ResetOwn();
+}
+
+void CEL_Element::ListenTo(std::initializer_list<CEL_Property*> properties) {
+  for (CEL_Property* property : properties) property->AddListener(*this);
+}
+
+void CEL_Element::ResetOwn() {
+  for (const OwnProperty& own : ownProperties) ApplyDefault(*own.property, *own.row);
+  SelectPresentValues();
+}
+
+void CEL_Element::SelectPresentValues() {
+  SelectPresentValue(unqType);
+  SelectPresentValue(unqUnit);
+  for (const OwnProperty& own : ownProperties) SelectPresentValue(*own.property);
+}
+
+std::vector<CEL_Property*> CEL_Element::BaseProperties() {
+  std::vector<CEL_Property*> properties;
+  properties.reserve(kBaseRows.size());
+  for (const BaseRow& row : kBaseRows) properties.push_back(&(this->*row.property));
+  return properties;
+}
+
+void CEL_Element::SetModifiedFlag(bool* flag) {
+  modifiedFlag = flag;
+  for (CEL_Property* property : BaseProperties()) property->SetModifiedFlag(flag);
+  for (const OwnProperty& own : ownProperties) own.property->SetModifiedFlag(flag);
+}
+
+void CEL_Element::MarkModified() {
+  if (modifiedFlag != nullptr) *modifiedFlag = true;
+}
+
+std::uint32_t CEL_Element::GetUid() const {
+  if (uid == 0) uid = ++NextElementUid();
+  return uid;
+}
+
+void ResetElementUids() { NextElementUid() = 0; }
+
+void CEL_Element::Read(KvfNode section, int& status) {
+  if (!kvfIsSection(section)) return;
+  ReadBase(section, status);
+  ReadOwn(section, status);
+}
+
+void CEL_Element::Write(KvfHandle file, int& status) {
+  WriteBase(file, status);
+  WriteOwn(file, status);
+}
+
+void CEL_Element::ReadBase(KvfNode section, int& status) {
+  if (!kvfIsSection(section)) return;
+  if (hasSymbol) ReadProperty(symbol, section, key::kSymbol, status);
+  if (hasId) ReadProperty(id, section, key::kId, status);
+  if (hasDescription) {
+    ReadProperty(description, section, key::kDescription, status);
+    ReadProperty(onlineHelp, section, key::kOnlineHelp, status);
+    ReadProperty(documentation, section, key::kDocumentation, status);
+  }
+  if (unitMode == UnitMode::Type || unitMode == UnitMode::Both) {
+    if (HasKeyword(section, key::kUnqType)) {
+      ReadProperty(unqType, section, key::kUnqType, status);
+    } else {
+      unqType.SetInt(kUserDefinedUnit);
+    }
+  }
+  if (unitMode == UnitMode::Unit || unitMode == UnitMode::Both) {
+    if (HasKeyword(section, key::kUnqUnit)) {
+      ReadProperty(unqUnit, section, key::kUnqUnit, status);
+    } else {
+      unqUnit.SetInt(0);
+    }
+  }
+  loaded = true;
+  sourceLine = kvfGetLine(section);
+}
+
+void CEL_Element::WriteBase(KvfHandle file, int& status) {
+  if (hasSymbol) WriteProperty(symbol, file, key::kSymbol, *this, status);
+  if (hasId) WriteProperty(id, file, key::kId, *this, status);
+  if (hasDescription) {
+    WriteProperty(description, file, key::kDescription, *this, status);
+    WriteProperty(onlineHelp, file, key::kOnlineHelp, *this, status);
+    WriteProperty(documentation, file, key::kDocumentation, *this, status);
+  }
+  if (unitMode == UnitMode::Type || unitMode == UnitMode::Both) {
+    WriteProperty(unqType, file, key::kUnqType, *this, status);
+  }
+  if (unitMode == UnitMode::Unit || unitMode == UnitMode::Both) {
+    WriteProperty(unqUnit, file, key::kUnqUnit, *this, status);
+  }
+}
+
+void CEL_Element::ReadOwn(KvfNode section, int& status) {
+  for (const bool last : {false, true}) {
+    for (const OwnProperty& own : ownProperties) {
+      const PropertyRow& row = *own.row;
+      if (row.readLast != last || row.keyword.empty()) continue;
+      if (!row.onlyWith.empty() && !HasKeyword(section, row.onlyWith)) continue;
+      ReadProperty(*own.property, section, row.keyword, status);
+    }
+  }
+  SelectPresentValues();
+}
+
+void CEL_Element::WriteOwn(KvfHandle file, int& status) {
+  for (const OwnProperty& own : ownProperties) {
+    if (!own.row->keyword.empty()) WriteProperty(*own.property, file, own.row->keyword, *this, status);
+  }
+}
+
+ElementField MakeField(std::string_view label, const CEL_Property& property) {
+  ElementField field;
+  field.name = label;
+  switch (property.Type()) {
+    case ValueType::Real:
+      field.kind = FieldKind::Real;
+      field.realValue = property.RealValue();
+      break;
+    case ValueType::Integer:
+      field.kind = FieldKind::Integer;
+      field.intValue = property.IntValue();
+      break;
+    case ValueType::Boolean:
+      field.kind = FieldKind::Boolean;
+      field.boolValue = property.BoolValue();
+      break;
+    case ValueType::Expression:
+      field.kind = FieldKind::Expression;
+      field.text = property.Text();
+      break;
+    default:
+      field.kind = FieldKind::Text;
+      field.text = property.Text();
+      break;
+  }
+  for (const CEL_Choice& choice : property.Choices()) field.choiceTexts.push_back(choice.display);
+  return field;
+}
+
+bool SetFromField(CEL_Property& property, const ElementField& field) {
+  switch (field.kind) {
+    case FieldKind::Text:
+    case FieldKind::Expression:
+      return property.SetText(field.text);
+    case FieldKind::Integer:
+      return property.SetInt(field.intValue);
+    case FieldKind::Real:
+      return property.SetReal(field.realValue);
+    case FieldKind::Boolean:
+      return property.SetBool(field.boolValue);
+    case FieldKind::Invalid:
+      break;
+  }
+  return false;
+}
+
+void CEL_Element::AppendCaption(std::vector<ElementField>& fields) const {
+  ElementField caption;
+  caption.kind = FieldKind::Text;
+  caption.name = "Caption";
+  caption.text = KindText();
+  fields.push_back(std::move(caption));
+}
+
+void CEL_Element::AppendBaseFields(std::vector<ElementField>& fields) const {
+  for (const BaseRow& row : kBaseRows) fields.push_back(MakeField(row.label, this->*row.property));
+}
+
+void CEL_Element::AppendOwnFields(std::vector<ElementField>& fields) const {
+  for (const bool last : {false, true}) {
+    for (const OwnProperty& own : ownProperties) {
+      if (own.row->listedLast == last) fields.push_back(MakeField(own.row->label, *own.property));
+    }
+  }
+}
+
+void CEL_Element::GetFields(std::vector<ElementField>& fields) const {
+  if (!ownProperties.empty()) AppendCaption(fields);
+  AppendBaseFields(fields);
+  AppendOwnFields(fields);
+}
+
+int CEL_Element::SetBaseFields(const std::vector<ElementField>& fields) {
+  int found = 0;
+  for (const BaseRow& row : kBaseRows) {
+    const ElementField* field = FindField(fields, row.label);
+    if (field != nullptr && SetFromField(this->*row.property, *field)) ++found;
+  }
+  return found;
+}
+
+int CEL_Element::SetOwnFields(const std::vector<ElementField>& fields) {
+  int found = 0;
+  for (const OwnProperty& own : ownProperties) {
+    const ElementField* field = FindField(fields, own.row->label);
+    if (field != nullptr && SetFromField(*own.property, *field)) ++found;
+  }
+  return found;
+}
+
+int CEL_Element::SetFields(const std::vector<ElementField>& fields) {
+  return SetBaseFields(fields) + SetOwnFields(fields);
+}
+
+void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) { RebuildOwner(); }
+
+void CEL_Element::RebuildOwner() {
+  if (owner != nullptr) owner->RebuildSymbolTable();
+}
+
+void CEL_Element::SetVisibility(std::int32_t group, std::int32_t level) {
+  const auto hit = std::find(visibility.begin(), visibility.end(), std::pair(group, level));
+  if (hit == visibility.end()) {
+    visibility.emplace_back(group, level);
+  } else {
+    visibility.erase(hit);
+  }
+}
+
+void CEL_Element::RemoveVisibility(std::int32_t group, std::int32_t level) {
+  std::erase(visibility, std::pair(group, level));
+}
+
+void CEL_Element::RemoveVisibilityGroup(std::int32_t group) {
+  std::erase_if(visibility, [group](const auto& pair) { return pair.first == group; });
+}
+
+void CEL_Element::CloseVisibilityGroupGap(std::int32_t removedGroup) {
+  for (auto& [group, level] : visibility) {
+    if (group > removedGroup) --group;
+  }
+}
+
+void CEL_Element::CloseVisibilityLevelGap(std::int32_t group, std::int32_t removedLevel) {
+  for (auto& [itsGroup, level] : visibility) {
+    if (itsGroup == group && level > removedLevel) --level;
+  }
+}
+
+}  // namespace tessal

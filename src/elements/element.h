@@ -1,0 +1,182 @@
+// The base of every item of a template: a bundle of typed properties that reads itself from a key-file
+// section, writes itself to one, checks itself and hands its values over as named fields.
+#pragma once
+
+#include <cstdint>
+#include <initializer_list>
+#include <span>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "elements/choices.h"
+#include "elements/element_field.h"
+#include "elements/element_kind.h"
+#include "elements/property.h"
+#include "platform/kvf2004.h"
+
+namespace tessal {
+
+class ElementOwner;
+
+/// One row of the table that an element class is described by: how a property is called in the file and by
+/// people, what it may hold, and what it starts with.
+struct PropertyRow {
+  std::string_view keyword;  ///< empty for a property that the element's own section does not hold
+  std::string_view label;
+  ValueType type;
+  ChoiceSource choices = nullptr;
+  std::string_view defaultText{};  ///< as it stands in the file
+  double defaultNumber = 0.0;
+  bool readLast = false;    ///< a value that is read behind the bounds that limit it
+  bool listedLast = false;  ///< stands behind the others in the field list
+  std::string_view onlyWith{};  ///< read only when the section has this keyword; without it the value stays
+};
+
+/// Which unit data an element has in the file.
+enum class UnitMode : std::int32_t { None = 0, Type = 1, Unit = 2, Both = 3 };
+
+class CEL_Element : public PropertyListener {
+ public:
+  /// A list head or the root: what it reads and writes is told by the flags.
+  CEL_Element(bool withSymbol, bool withId, bool withDescription);
+  /// An element with all three, and a caption in its symbol.
+  explicit CEL_Element(std::string_view caption);
+  CEL_Element(const CEL_Element&) = delete;
+  CEL_Element& operator=(const CEL_Element&) = delete;
+  virtual ~CEL_Element() = default;
+
+  /// Fills the properties from a key-file section; a node that is no section leaves the element alone.
+  virtual void Read(KvfNode section, int& status);
+  /// Writes the properties as keywords into the section that the caller has opened.
+  virtual void Write(KvfHandle file, int& status);
+  /// Returns the properties to the defaults of the class.
+  virtual void Reset() {}
+  /// Reports each problem to the registry; true when there is none.
+  virtual bool Check() { return true; }
+  /// Compiles the expressions, reports failures; true when all compiled.
+  virtual bool ParseExpression() { return true; }
+  /// Appends a named field for each property.
+  virtual void GetFields(std::vector<ElementField>& fields) const;
+  /// Sets each property that the list has a field for; the count of fields found.
+  virtual int SetFields(const std::vector<ElementField>& fields);
+
+  void OnPropertyChanged(CEL_Property& changed) override;
+
+  /// Points each property's selection at the choice that stands for its value.
+  void SelectPresentValues();
+
+  /// The identity: never 0, never reused, not stored, the same through renames and moves.
+  std::uint32_t GetUid() const;
+  /// The identity as messages and views carry it.
+  std::int32_t MessageUid() const { return static_cast<std::int32_t>(GetUid()); }
+
+  std::int32_t Kind() const { return elementKind; }
+  std::string_view KindText() const { return tessal::KindText(elementKind); }
+
+  /// The element's place in the tree: a list head, or the root.
+  CEL_Element* Parent() const { return parent; }
+  /// For a member of a particle class the list head of its list; none else.
+  CEL_Element* ListHeader() const { return listHeader; }
+  void SetParent(CEL_Element* element) { parent = element; }
+  void SetListHeader(CEL_Element* head) { parent = listHeader = head; }
+  ElementOwner* Owner() const { return owner; }
+  virtual void SetOwner(ElementOwner* template_) { owner = template_; }
+
+  /// Stores the reference in the element and in all its properties.
+  virtual void SetModifiedFlag(bool* flag);
+  void MarkModified();
+
+  /// Whether the element was read from a file or shown in a form.
+  bool Loaded() const { return loaded; }
+  void SetLoaded(bool value) { loaded = value; }
+  /// The line of the file, from 1, at which the element's section begins; 0 for one that was not read.
+  int SourceLine() const { return sourceLine; }
+
+  /// Memberships in visibility groups: pairs of a group's and a level's number, both from 1.
+  const std::vector<std::pair<std::int32_t, std::int32_t>>& Visibility() const { return visibility; }
+  /// Adds the pair, or removes it if it is there already.
+  void SetVisibility(std::int32_t group, std::int32_t level);
+  void RemoveVisibility(std::int32_t group, std::int32_t level);
+  void RemoveVisibilityGroup(std::int32_t group);
+  /// Takes memberships of the groups (or, within a group, levels) behind a removed one along to their new numbers.
+  void CloseVisibilityGroupGap(std::int32_t removedGroup);
+  void CloseVisibilityLevelGap(std::int32_t group, std::int32_t removedLevel);
+
+  CEL_Property symbol{ValueType::Symbol};
+  CEL_Property id{ValueType::Integer};
+  CEL_Property description{ValueType::LongText};
+  CEL_Property onlineHelp{ValueType::Text};
+  CEL_Property documentation{ValueType::LongText};
+  CEL_Property unqType{ValueType::Integer};
+  CEL_Property unqUnit{ValueType::Integer};
+
+ protected:
+  struct OwnProperty {
+    const PropertyRow* row;
+    CEL_Property* property;
+  };
+
+  void SetKind(std::int32_t kindNumber) { elementKind = kindNumber; }
+  /// A list head's kind, unit data and flags are set by who builds it.
+  void SetUnitMode(UnitMode mode) { unitMode = mode; }
+  void SetFileFlags(bool withSymbol, bool withId, bool withDescription);
+
+  /// Joins the rows of the class's table with the properties, in order, and gives them their defaults.
+  void Bind(std::span<const PropertyRow> rows, std::initializer_list<CEL_Property*> properties);
+  void ListenTo(std::initializer_list<CEL_Property*> properties);
+
+  void ReadBase(KvfNode section, int& status);
+  void WriteBase(KvfHandle file, int& status);
+  /// The properties of the class's table, in its order, those that are read last behind the others.
+  void ReadOwn(KvfNode section, int& status);
+  void WriteOwn(KvfHandle file, int& status);
+  void ResetOwn();
+
+  void AppendCaption(std::vector<ElementField>& fields) const;
+  void AppendBaseFields(std::vector<ElementField>& fields) const;
+  void AppendOwnFields(std::vector<ElementField>& fields) const;
+  int SetBaseFields(const std::vector<ElementField>& fields);
+  int SetOwnFields(const std::vector<ElementField>& fields);
+
+  /// The unit type "User defined" and the unit type's own choices and defaults.
+  void OfferUnitTypes(std::span<const UnitTypeRow> rows);
+
+  void RebuildOwner();
+
+ private:
+  std::vector<CEL_Property*> BaseProperties();
+
+  bool hasDescription;
+  bool hasSymbol;
+  bool hasId;
+  bool loaded = false;
+  bool* modifiedFlag = nullptr;
+  mutable std::uint32_t uid = 0;
+  std::int32_t elementKind = kind::kNone;
+  UnitMode unitMode = UnitMode::None;
+  int sourceLine = 0;
+  CEL_Element* listHeader = nullptr;
+  CEL_Element* parent = nullptr;
+  ElementOwner* owner = nullptr;
+  std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
+  std::vector<OwnProperty> ownProperties;
+};
+
+/// A list head or the root: an element that carries the descriptive texts of a collection.
+class CEL_ListHead final : public CEL_Element {
+ public:
+  CEL_ListHead(std::int32_t kindNumber, std::string_view caption);
+};
+
+/// A field that holds a property's value, with the allowed texts of a property that has choices.
+ElementField MakeField(std::string_view label, const CEL_Property& property);
+
+/// Sets a property from a field of its kind; false when the kinds do not fit.
+bool SetFromField(CEL_Property& property, const ElementField& field);
+
+/// The counter behind the identities: the next element of the process gets this number plus 1. For tests.
+void ResetElementUids();
+
+}  // namespace tessal

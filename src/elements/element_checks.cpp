@@ -1,0 +1,76 @@
+#include "elements/element_checks.h"
+
+#include <algorithm>
+#include <array>
+#include <string>
+
+#include "core/error_registry.h"
+#include "elements/element.h"
+#include "expr/parser.h"
+#include "expr/scanner.h"
+#include "expr/semantic_checks.h"
+
+namespace tessal {
+
+namespace {
+
+void Report(const CEL_Element& element, std::string_view text) {
+  Errors().ReportElementError(element.symbol.Text(), element.MessageUid(), text);
+}
+
+}  // namespace
+
+bool CheckDefaultInRange(const CEL_Element& element, const CEL_Property& minimum, const CEL_Property& value,
+                         const CEL_Property& maximum) {
+  const bool below = minimum.RealValue() > value.RealValue();
+  const bool above = value.RealValue() > maximum.RealValue();
+  if (below) Report(element, message::kBelowMinimum);
+  if (above) Report(element, message::kAboveMaximum);
+  return !below && !above;
+}
+
+bool CheckRangeOrder(const CEL_Element& element, const CEL_Property& minimum, const CEL_Property& maximum) {
+  if (minimum.RealValue() <= maximum.RealValue()) return true;
+  Report(element, message::kRangeReversed);
+  return false;
+}
+
+bool CheckSymbolForm(const CEL_Element& element) {
+  if (IsValidSymbol(element.symbol.Text())) return true;
+  Report(element, element.symbol.Text() + std::string(message::kIllegalSymbol));
+  return false;
+}
+
+bool HoldsIllegalText(const CEL_Element& element) {
+  const std::array<const CEL_Property*, 3> texts = {&element.description, &element.onlineHelp,
+                                                    &element.documentation};
+  return std::any_of(texts.begin(), texts.end(), [](const CEL_Property* property) {
+    return property->Text().find('!') != std::string::npos;
+  });
+}
+
+bool CheckTextContent(const CEL_Element& element) {
+  if (!HoldsIllegalText(element)) return true;
+  Report(element, message::kIllegalText);
+  return false;
+}
+
+bool CheckExpression(const CEL_Element& element, const CEL_Property& expression) {
+  return CheckFunctionsSpecified(element.symbol.Text(), element.GetUid(),
+                                 StripExpressionQuotes(expression.Text())) != 0;
+}
+
+bool CompileExpression(const CEL_Element& element, std::string_view caption, const CEL_Property& expression,
+                       ExpressionNode& tree) {
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string text;
+  if (ParseExpressionText(std::string(StripExpressionQuotes(expression.Text())), tree, line, position, text) !=
+      0) {
+    return true;
+  }
+  Errors().ReportElementError(caption, element.MessageUid(), text);
+  return false;
+}
+
+}  // namespace tessal

@@ -1,0 +1,33 @@
+// Steps that the checks of several elements share. Each reports what it finds under the element's symbol and
+// identity, and returns whether it found nothing.
+#pragma once
+
+#include <string_view>
+
+#include "expr/expression_node.h"
+
+namespace tessal {
+
+class CEL_Element;
+class CEL_Property;
+
+/// The default lies within minimum and maximum. Both ends are tested and each has a message of its own.
+bool CheckDefaultInRange(const CEL_Element& element, const CEL_Property& minimum, const CEL_Property& value,
+                         const CEL_Property& maximum);
+/// The minimum is not above the maximum.
+bool CheckRangeOrder(const CEL_Element& element, const CEL_Property& minimum, const CEL_Property& maximum);
+bool CheckSymbolForm(const CEL_Element& element);
+/// No "!" in the descriptive texts; reported once.
+bool CheckTextContent(const CEL_Element& element);
+/// Calls, arguments and particle properties of an expression. The result tells only whether it parses.
+bool CheckExpression(const CEL_Element& element, const CEL_Property& expression);
+
+/// Compiles an expression into its tree. On failure the tree keeps what it held, and the parser's message is
+/// reported under the caption.
+bool CompileExpression(const CEL_Element& element, std::string_view caption, const CEL_Property& expression,
+                       ExpressionNode& tree);
+
+/// Whether the text holds a "!", which the simulation engine's files cannot carry.
+bool HoldsIllegalText(const CEL_Element& element);
+
+}  // namespace tessal

@@ -1,0 +1,53 @@
+// What elements need of the template that owns them. The template implements it; elements know no more of it.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <set>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace tessal {
+
+class CEL_Element;
+
+/// A name that a choice list offers, with the number that the choice stores.
+struct NamedNumber {
+  std::string name;
+  std::int32_t number;
+};
+
+class ElementOwner {
+ public:
+  /// Numbers all elements anew and finds out who uses whom.
+  virtual void RebuildSymbolTable() = 0;
+
+  /// Whether any element has this symbol.
+  virtual bool SymbolExists(std::string_view symbol) const = 0;
+
+  /// Whether an element other than the one with this identity has this symbol.
+  virtual bool IsSymbolTakenByOther(std::uint32_t uid, std::string_view symbol) const = 0;
+
+  /// The elements that the element's expression uses, in the order of their first use. For an element with
+  /// two expressions, those of the first record.
+  virtual std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const = 0;
+
+  /// The particle classes, each with its number from 1.
+  virtual std::vector<NamedNumber> SpecieNames() const = 0;
+
+  /// The numbers of the symbol records of elements, given by their identities; an identity without a record
+  /// is left out.
+  virtual std::set<std::int32_t> ItemsToRecordNumbers(const std::set<std::int32_t>& uids) const = 0;
+
+  /// Fills the choice lists of all search functions from the present classes and their values.
+  virtual void RefreshSearchFunctionChoices() = 0;
+
+ protected:
+  ElementOwner() = default;
+  ElementOwner(const ElementOwner&) = default;
+  ElementOwner& operator=(const ElementOwner&) = default;
+  ~ElementOwner() = default;
+};
+
+}  // namespace tessal

@@ -1,0 +1,75 @@
+#include "elements/external_function.h"
+
+#include <array>
+
+#include "expr/user_function_names.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kMathFunction = "AS_MATH_FUNC";
+
+constexpr std::array<std::string_view, 7> kUses = {kMathFunction,     "ON_INITSTEP",    "ON_FINALISESTEP",
+                                                   "ON_INITLOCATION", "ON_SETLOCATION", "ON_SETVOLUME",
+                                                   "ON_SETSPECIES"};
+
+const ChoiceList& UseChoices() {
+  static const ChoiceList kList = MakeTextChoices(kUses);
+  return kList;
+}
+
+const ChoiceList& ParameterChoices() {
+  constexpr std::int32_t kMostParameters = 6;
+  static const ChoiceList kList = [] {
+    std::vector<CEL_Choice> choices{CEL_Choice::Number("none", 0)};
+    for (std::int32_t count = 1; count <= kMostParameters; ++count) {
+      choices.push_back(CEL_Choice::Number(std::to_string(count), count));
+    }
+    return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+  }();
+  return kList;
+}
+
+constexpr std::array<PropertyRow, 5> kRows = {{
+    {key::kPublicName, "Public Name", ValueType::Text, nullptr, "External"},
+    {key::kParameters, "Parameter Count", ValueType::Integer, ParameterChoices, "", 0.0},
+    {key::kUsedAs, "Used as", ValueType::Text, UseChoices, kMathFunction},
+    {key::kDll, "DLL", ValueType::Text},
+    {key::kEntryPoint, "Entry Point", ValueType::Text},
+}};
+
+}  // namespace
+
+CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Element(caption) {
+  SetKind(kind::kExternalFunction);
+  Bind(kRows, {&publicName, &parameters, &usedAs, &dll, &entryPoint});
+  ListenTo({&publicName, &parameters, &usedAs});
+}
+
+void CEL_ExternalFunction::Reset() { ResetOwn(); }
+
+void CEL_ExternalFunction::Read(KvfNode section, int& status) {
+  CEL_Element::Read(section, status);
+  EnableParameters();
+  RegisterUserFunctionName(publicName.Text());
+}
+
+void CEL_ExternalFunction::OnPropertyChanged(CEL_Property& changed) {
+  if (&changed == &publicName) {
+    UnregisterUserFunctionName(publicName.PrevText());
+    RegisterUserFunctionName(publicName.Text());
+  } else if (&changed == &usedAs) {
+    EnableParameters();
+  } else {
+    RebuildOwner();
+  }
+}
+
+void CEL_ExternalFunction::EnableParameters() {
+  // The engine fixes the argument count of its hooks.
+  parameters.SetEditable(usedAs.Text() == kMathFunction);
+}
+
+}  // namespace tessal

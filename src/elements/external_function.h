@@ -1,0 +1,27 @@
+// A function that a plug-in module of the simulation engine supplies. Used as a math function, its public
+// name joins the names that expressions may call; the module and its entry point are data for the engine.
+#pragma once
+
+#include "elements/element.h"
+
+namespace tessal {
+
+class CEL_ExternalFunction final : public CEL_Element {
+ public:
+  explicit CEL_ExternalFunction(std::string_view caption);
+
+  void Read(KvfNode section, int& status) override;
+  void Reset() override;
+  void OnPropertyChanged(CEL_Property& changed) override;
+
+  CEL_Property publicName{ValueType::Text};
+  CEL_Property dll{ValueType::Text};
+  CEL_Property entryPoint{ValueType::Text};
+  CEL_Property parameters{ValueType::Integer};
+  CEL_Property usedAs{ValueType::Text};
+
+ private:
+  void EnableParameters();
+};
+
+}  // namespace tessal

@@ -1,0 +1,165 @@
+#include "elements/input_elements.h"
+
+#include <array>
+#include <limits>
+#include <utility>
+
+#include "core/error_registry.h"
+#include "elements/element_checks.h"
+#include "expr/builtin_catalogue.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr InputKind kConstantKind{kind::kConstant, 1, ConstantBuiltinIds};
+constexpr InputKind kForcingKind{kind::kForcing, 2, ForcingBuiltinIds};
+
+constexpr std::string_view kUserDefined = "User defined";
+constexpr std::int32_t kNoBuiltin = -1;
+
+constexpr std::array<UnitTypeRow, 2> kUnitTypes = {{
+    {"Process rate", 100150, 0, "/d"},
+    {kUserDefined, kUserDefinedUnit, 0, ""},
+}};
+
+const ChoiceList& UnitTypeChoices() {
+  static const ChoiceList kList = MakeUnitTypeChoices(kUnitTypes);
+  return kList;
+}
+
+constexpr std::array<PropertyRow, 8> kRows = {{
+    {key::kIsUserSpecified, "Is user specified", ValueType::Boolean, YesNoChoices, "YES"},
+    {key::kBuiltInId, "Build in ID", ValueType::Integer, nullptr, "", kNoBuiltin},
+    {key::kScope, "Scope", ValueType::Text, InputScopeChoices, "NOT_SPECIFIED"},
+    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, "NONE"},
+    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0, true},
+    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
+    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
+}};
+
+ChoiceList BuiltinChoices(const InputKind& input, bool withDeprecated, std::int32_t inUse) {
+  std::vector<CEL_Choice> choices{CEL_Choice::Number(kUserDefined, kNoBuiltin)};
+  CatalogueBuiltin row;
+  for (const std::int32_t builtinId : input.builtinIds()) {
+    if (IsDeprecatedBuiltin(builtinId) && !withDeprecated && builtinId != inUse) continue;
+    if (GetBuiltinById(builtinId, row) == 0) choices.push_back(CEL_Choice::Number(row.name, builtinId));
+  }
+  return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+}
+
+/// The list of an element that shows no deprecated row is the same for all of its kind.
+const ChoiceList& UsualBuiltinChoices(const InputKind& input) {
+  static const ChoiceList kConstants = BuiltinChoices(kConstantKind, false, kNoBuiltin);
+  static const ChoiceList kForcings = BuiltinChoices(kForcingKind, false, kNoBuiltin);
+  return input.kind == kind::kConstant ? kConstants : kForcings;
+}
+
+}  // namespace
+
+CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
+    : CEL_Element(caption), input(inputKind) {
+  SetKind(input.kind);
+  SetUnitMode(UnitMode::Both);
+  unqType.SetChoices(UnitTypeChoices());
+  Bind(kRows, {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue,
+               &maxValue});
+  ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
+  CEL_Input::Reset();
+}
+
+CEL_Constant::CEL_Constant(std::string_view caption) : CEL_Input(kConstantKind, caption) {}
+
+CEL_Forcing::CEL_Forcing(std::string_view caption) : CEL_Input(kForcingKind, caption) {}
+
+void CEL_Input::Reset() {
+  ResetOwn();
+  unqType.SetInt(kUserDefinedUnit);
+  unqType.SelectChoice(kUserDefined);
+  unqUnit.SetInt(0);
+  RebuildBuiltInChoices(false);
+}
+
+void CEL_Input::Read(KvfNode section, int& status) {
+  CEL_Element::Read(section, status);
+  // Again, so that a deprecated id that the file holds stays in the list.
+  if (kvfIsSection(section)) RebuildBuiltInChoices(showDeprecated);
+}
+
+void CEL_Input::RebuildBuiltInChoices(bool withDeprecated) {
+  showDeprecated = withDeprecated;
+  const std::int32_t inUse = builtInId.IntValue();
+  const bool usual = !withDeprecated && !IsDeprecatedBuiltin(inUse);
+  builtInId.SetChoices(usual ? UsualBuiltinChoices(input) : BuiltinChoices(input, withDeprecated, inUse));
+  SelectPresentValues();
+}
+
+bool CEL_Input::Check() {
+  const bool inRange = CheckDefaultInRange(*this, minValue, defaultValue, maxValue);
+  const bool ordered = CheckRangeOrder(*this, minValue, maxValue);
+  const bool named = CheckSymbolForm(*this);
+  const bool worded = CheckTextContent(*this);
+  const bool current = !IsDeprecatedBuiltin(builtInId.IntValue());
+  if (!current) Errors().ReportElementError(symbol.Text(), MessageUid(), message::kDeprecatedBuiltin);
+  return inRange && ordered && named && worded && current;
+}
+
+void CEL_Input::OnPropertyChanged(CEL_Property& changed) {
+  if (&changed == &builtInId) {
+    ApplyBuiltin();
+  } else if (&changed == &unqType) {
+    ApplyUnitType();
+  } else if (&changed == &scope) {
+    const std::string_view variation = SpatialVariationOfScope(scope.Text());
+    if (!variation.empty()) spatialVariation.SetText(variation);
+  } else {
+    RebuildOwner();
+  }
+}
+
+void CEL_Input::SetDataEditable(bool editable) {
+  for (CEL_Property* property :
+       {&scope, &spatialVariation, &unqType, &unqUnit, &unit, &defaultValue, &minValue, &maxValue}) {
+    property->SetEditable(editable);
+  }
+}
+
+void CEL_Input::ApplyBuiltin() {
+  if (builtInId.IntValue() < 1) {
+    isUserSpecified.SetBool(true);
+    SetDataEditable(true);
+    SelectPresentValues();
+    return;
+  }
+  CatalogueBuiltin row;
+  if (GetBuiltinById(builtInId.IntValue(), row) != 0 || row.kind != input.builtinKind) return;
+  isUserSpecified.SetBool(false);
+  SetDataEditable(false);
+  scope.SetText(LayerText(row.layer));
+  spatialVariation.SetText(VariationText(row.variation));
+  unqType.SetInt(row.unitType);
+  unit.SetText(row.unit);
+  // Wide open first, so that no limit stands in the way of the default.
+  minValue.SetReal(std::numeric_limits<double>::lowest());
+  maxValue.SetReal(std::numeric_limits<double>::max());
+  defaultValue.SetReal(row.defaultValue);
+  minValue.SetReal(row.minimum);
+  maxValue.SetReal(row.maximum);
+  SelectPresentValues();
+}
+
+void CEL_Input::ApplyUnitType() {
+  const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
+  if (row == nullptr) {
+    unqType.SetInt(kUserDefinedUnit);
+    unit.SetEditable(true);
+    return;
+  }
+  const bool fixesUnit = row->unqType != kUserDefinedUnit;
+  if (fixesUnit) unit.SetText(row->unit);
+  unit.SetEditable(!fixesUnit);
+}
+
+}  // namespace tessal

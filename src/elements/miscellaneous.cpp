@@ -1,0 +1,164 @@
+#include "elements/miscellaneous.h"
+
+#include <algorithm>
+#include <array>
+
+#include "elements/element_checks.h"
+#include "elements/property_io.h"
+#include "elements/version_stamp.h"
+#include "expr/user_function_names.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kRadians = "Radians";
+constexpr std::array<std::string_view, 2> kAngleUnits = {kRadians, "Degree"};
+
+constexpr std::array<std::string_view, 7> kDebugLevels = {"No debug information",
+                                                          "Debug level 1",
+                                                          "Debug level 2",
+                                                          "Debug level 3",
+                                                          "Debug level 4",
+                                                          "Debug level 5",
+                                                          "Debug level 6"};
+
+const ChoiceList& AngleUnitChoices() {
+  static const ChoiceList kList = MakeTextChoices(kAngleUnits);
+  return kList;
+}
+
+const ChoiceList& DebugLevelChoices() {
+  static const ChoiceList kList = [] {
+    std::vector<CEL_Choice> choices;
+    for (std::size_t level = 0; level < kDebugLevels.size(); ++level) {
+      choices.push_back(CEL_Choice::Number(kDebugLevels[level], static_cast<std::int32_t>(level)));
+    }
+    return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+  }();
+  return kList;
+}
+
+// The last column names the keywords that old files lack and that are not reported when they do.
+constexpr std::array<PropertyRow, 11> kRows = {{
+    {key::kTessalVersion, "Tessal version", ValueType::Real},
+    {key::kParserVersion, "Parser version", ValueType::Real},
+    {key::kDocumentRevision, "Revision", ValueType::Integer, nullptr, "", 0.0, false, true,
+     key::kDocumentRevision},
+    {key::kRandSeed, "Randseed", ValueType::Integer},
+    {key::kDebugLevel, "Debug level", ValueType::Integer, DebugLevelChoices},
+    {key::kDebugLog, "Debug log", ValueType::Text},
+    {key::kRandomParticleDir, "Inital random particle dir", ValueType::Boolean, YesNoChoices, "NO"},
+    {key::kBuildSpatialTree, "Build spatial tree", ValueType::Boolean, YesNoChoices, "NO"},
+    {key::kChecksum, "Checksum", ValueType::Text, nullptr, "0"},
+    {key::kOptimise, "Optimise expressions", ValueType::Boolean, YesNoChoices, "YES", 0.0, false, false,
+     key::kOptimise},
+    {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree", 0.0, false,
+     false, key::kTrigonometrics},
+}};
+
+}  // namespace
+
+CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
+  SetKind(kind::kMiscellaneous);
+  Bind(kRows, {&tessalVersion, &parserVersion, &documentRevision, &randSeed, &debugLevel, &debugLog,
+               &randomParticleDir, &buildSpatialTree, &checksum, &optimise, &trigonometrics});
+  CEL_Miscanellous::Reset();
+}
+
+void CEL_Miscanellous::Reset() {
+  ResetOwn();
+  tessalVersion.SetReal(SoftwareVersion());
+  parserVersion.SetReal(ParserVersion());
+  description.SetText("");
+  onlineHelp.SetText("");
+  documentation.SetText("");
+  DropFunctions();
+  visibilities.Reset();
+}
+
+void CEL_Miscanellous::SetAbsentValues() {
+  documentRevision.SetInt(-1);
+  optimise.SetBool(false);
+  trigonometrics.SetText(kRadians);
+}
+
+void CEL_Miscanellous::Read(KvfNode section, int& status) {
+  if (!kvfIsSection(section)) return;
+  SetAbsentValues();
+  CEL_Element::Read(section, status);
+  tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
+  parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));
+  const KvfNode list = kvfSectionByNameNum(section, section::kExternalFunctions, 1);
+  if (list != nullptr) {
+    functionHead.Read(list, status);
+    const int count = kvfGetNoSections(list);
+    for (int number = 1; number <= count; ++number) {
+      AddExternalFunction().Read(kvfSectionByNum(list, number), status);
+    }
+  }
+  visibilities.Read(section, status);
+}
+
+void CEL_Miscanellous::Write(KvfHandle file, int& status) {
+  if (documentRevision.IntValue() >= 0) documentRevision.SetInt(documentRevision.IntValue() + 1);
+  CEL_Element::Write(file, status);
+  if (!functions.empty()) {
+    kvfAddSection(file, section::kExternalFunctions);
+    functionHead.Write(file, status);
+    for (std::size_t index = 0; index < functions.size(); ++index) {
+      kvfAddSection(file, std::string(section::kExternalFunctionPrefix) + std::to_string(index + 1));
+      functions[index]->Write(file, status);
+      kvfEndSection(file);
+    }
+    kvfEndSection(file);
+  }
+  if (!visibilities.groups.empty()) visibilities.Write(file, status);
+}
+
+bool CEL_Miscanellous::Check() { return CheckTextContent(*this); }
+
+void CEL_Miscanellous::SetModifiedFlag(bool* flag) {
+  templateModified = flag;
+  CEL_Element::SetModifiedFlag(flag);
+  functionHead.SetModifiedFlag(flag);
+  for (const auto& function : functions) function->SetModifiedFlag(flag);
+  visibilities.SetModifiedFlag(flag);
+}
+
+void CEL_Miscanellous::SetOwner(ElementOwner* template_) {
+  CEL_Element::SetOwner(template_);
+  functionHead.SetOwner(template_);
+  for (const auto& function : functions) function->SetOwner(template_);
+  visibilities.SetOwner(template_);
+}
+
+CEL_ExternalFunction& CEL_Miscanellous::AddExternalFunction() {
+  auto function =
+      std::make_unique<CEL_ExternalFunction>("External User Function " + std::to_string(functions.size() + 1));
+  function->SetOwner(Owner());
+  function->SetParent(this);
+  function->SetModifiedFlag(templateModified);
+  functions.push_back(std::move(function));
+  return *functions.back();
+}
+
+bool CEL_Miscanellous::RemoveExternalFunction(std::size_t index) {
+  if (index >= functions.size()) return false;
+  const std::string name = functions[index]->publicName.Text();
+  functions.erase(functions.begin() + static_cast<std::ptrdiff_t>(index));
+  const bool stillUsed = std::any_of(functions.begin(), functions.end(), [&name](const auto& function) {
+    return function->publicName.Text() == name;
+  });
+  if (!stillUsed) UnregisterUserFunctionName(name);
+  MarkModified();
+  return true;
+}
+
+void CEL_Miscanellous::DropFunctions() {
+  for (const auto& function : functions) UnregisterUserFunctionName(function->publicName.Text());
+  functions.clear();
+}
+
+}  // namespace tessal

@@ -1,0 +1,74 @@
+// The members of a particle class that hold expressions: its auxiliaries and processes, its horizontal
+// movements, and its downward movement.
+#pragma once
+
+#include "elements/element.h"
+#include "expr/expression_node.h"
+
+namespace tessal {
+
+class CEL_Lagrange_Arithmetical_Expression final : public CEL_Element {
+ public:
+  explicit CEL_Lagrange_Arithmetical_Expression(std::string_view caption);
+
+  void Reset() override { ResetOwn(); }
+  bool Check() override;
+  bool ParseExpression() override;
+
+  /// Whether it is a process follows from its use: one that a state variable of its class uses is one.
+  void Classify(bool isProcess);
+
+  const ExpressionNode& Tree() const { return tree; }
+
+  CEL_Property expressionType{ValueType::Text};
+  CEL_Property specie{ValueType::Integer};  ///< the number of the owning class, from 1
+  CEL_Property output{ValueType::Boolean};
+  CEL_Property spatialVariation{ValueType::Text};
+  CEL_Property unit{ValueType::Text};
+  CEL_Property expression{ValueType::Expression};
+
+ private:
+  ExpressionNode tree;
+};
+
+/// One horizontal movement. It takes two places in the symbol table: its direction, then its speed.
+class CEL_Lagrange_Horizontal_Vector final : public CEL_Element {
+ public:
+  explicit CEL_Lagrange_Horizontal_Vector(std::string_view caption);
+
+  void Reset() override { ResetOwn(); }
+  bool Check() override;
+  bool ParseExpression() override;
+  void GetFields(std::vector<ElementField>& fields) const override;
+  int SetFields(const std::vector<ElementField>& fields) override;
+
+  const ExpressionNode& SpeedTree() const { return speedTree; }
+  const ExpressionNode& DirectionTree() const { return directionTree; }
+
+  CEL_Property speed{ValueType::Expression};
+  CEL_Property direction{ValueType::Expression};
+
+ private:
+  ExpressionNode speedTree;
+  ExpressionNode directionTree;
+};
+
+class CEL_Lagrange_Vertical_Equation final : public CEL_Element {
+ public:
+  explicit CEL_Lagrange_Vertical_Equation(std::string_view caption);
+
+  void Reset() override { ResetOwn(); }
+  bool Check() override;
+  bool ParseExpression() override;
+  void GetFields(std::vector<ElementField>& fields) const override;
+  int SetFields(const std::vector<ElementField>& fields) override;
+
+  const ExpressionNode& SpeedTree() const { return speedTree; }
+
+  CEL_Property speed{ValueType::Expression};
+
+ private:
+  ExpressionNode speedTree;
+};
+
+}  // namespace tessal

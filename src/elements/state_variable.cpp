@@ -1,0 +1,115 @@
+#include "elements/state_variable.h"
+
+#include <array>
+#include <limits>
+
+#include "elements/element_checks.h"
+#include "elements/property_io.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::array<UnitTypeRow, 6> kUnitTypes = {{
+    {"Concentration", 100404, 2205, "mg/l"},
+    {"Mass per Area", 100437, 4400, "g/m2"},
+    {"Bacteria Concentration", 100008, 3001, "per 100 ml"},
+    {"User defined", kUserDefinedUnit, 0, "undefined"},
+    {"Volume", 110230, 1600, "m3"},
+    {"Length", 110220, 1000, "m"},
+}};
+
+constexpr std::array<std::string_view, 2> kTransports = {"ADVECTION_DISPERSION", "FIXED"};
+
+const ChoiceList& TransportChoices() {
+  static const ChoiceList kList = MakeTextChoices(kTransports);
+  return kList;
+}
+
+const ChoiceList& UnitTypeChoices() {
+  static const ChoiceList kList = MakeUnitTypeChoices(kUnitTypes);
+  return kList;
+}
+
+constexpr std::array<PropertyRow, 7> kRows = {{
+    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, "WC"},
+    {key::kTransport, "Transport", ValueType::Text, TransportChoices, "ADVECTION_DISPERSION"},
+    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0},
+    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
+    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
+    {"", "Equation", ValueType::Expression, nullptr, "0"},
+}};
+
+}  // namespace
+
+CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(caption) {
+  SetKind(kind::kStateVariable);
+  SetUnitMode(UnitMode::Both);
+  unqType.SetChoices(UnitTypeChoices());
+  Bind(kRows, {&scope, &transport, &unit, &defaultValue, &minValue, &maxValue, &equation});
+  ListenTo({&symbol, &scope, &unqType, &unqUnit, &equation});
+  CEL_StateVariable::Reset();
+}
+
+void CEL_StateVariable::Reset() {
+  unqType.SetInt(kUserDefinedUnit);
+  unqType.SelectChoice("User defined");
+  unqUnit.SetInt(0);
+  ResetOwn();
+}
+
+void CEL_StateVariable::Read(KvfNode section, int& status) {
+  if (!kvfIsSection(section)) return;
+  ReadBase(section, status);
+  ReadProperty(scope, section, key::kScope, status);
+  ReadProperty(transport, section, key::kTransport, status);
+  ReadProperty(unit, section, key::kUnit, status);
+  minValue.SetReal(std::numeric_limits<double>::lowest());
+  maxValue.SetReal(std::numeric_limits<double>::max());
+  ReadProperty(minValue, section, key::kMinValue, status);
+  // A file without a maximum gives one equal to the minimum.
+  maxValue.SetReal(minValue.RealValue());
+  ReadProperty(maxValue, section, key::kMaxValue, status);
+  ReadProperty(defaultValue, section, key::kDefaultValue, status);
+  SelectPresentValues();
+}
+
+void CEL_StateVariable::ReadEquation(KvfNode section, int& status) {
+  ReadProperty(equation, section, symbol.Text(), status);
+}
+
+void CEL_StateVariable::WriteEquation(KvfHandle file, int& status) {
+  WriteProperty(equation, file, symbol.Text(), *this, status);
+}
+
+bool CEL_StateVariable::Check() {
+  const bool inRange = CheckDefaultInRange(*this, minValue, defaultValue, maxValue);
+  const bool ordered = CheckRangeOrder(*this, minValue, maxValue);
+  const bool named = CheckSymbolForm(*this);
+  const bool expressed = CheckExpression(*this, equation);
+  const bool worded = CheckTextContent(*this);
+  return inRange && ordered && named && expressed && worded;
+}
+
+bool CEL_StateVariable::ParseExpression() {
+  return CompileExpression(*this, symbol.Text(), equation, equationTree);
+}
+
+void CEL_StateVariable::OnPropertyChanged(CEL_Property& changed) {
+  if (&changed != &unqType) {
+    RebuildOwner();
+    return;
+  }
+  const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
+  if (row == nullptr) {
+    unqType.SetInt(kUserDefinedUnit);
+    unit.SetEditable(true);
+    return;
+  }
+  unit.SetText(row->unit);
+  unit.SetEditable(row->unqType == kUserDefinedUnit);
+}
+
+}  // namespace tessal

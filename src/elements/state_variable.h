@@ -1,0 +1,38 @@
+// A quantity of the model with a transport behaviour, a value range and a time-derivative equation.
+#pragma once
+
+#include "elements/element.h"
+#include "expr/expression_node.h"
+
+namespace tessal {
+
+class CEL_StateVariable final : public CEL_Element {
+ public:
+  explicit CEL_StateVariable(std::string_view caption);
+
+  void Read(KvfNode section, int& status) override;
+  void Reset() override;
+  bool Check() override;
+  bool ParseExpression() override;
+  void OnPropertyChanged(CEL_Property& changed) override;
+
+  /// The equation stands in a section of its own, under the symbol as keyword.
+  void ReadEquation(KvfNode section, int& status);
+  void WriteEquation(KvfHandle file, int& status);
+
+  const ExpressionNode& EquationTree() const { return equationTree; }
+  bool UnitEditable() const { return unit.Editable(); }
+
+  CEL_Property scope{ValueType::Text};
+  CEL_Property transport{ValueType::Text};
+  CEL_Property unit{ValueType::Text};
+  CEL_Property defaultValue{ValueType::Real};
+  CEL_Property minValue{ValueType::Real};
+  CEL_Property maxValue{ValueType::Real};
+  CEL_Property equation{ValueType::Expression};
+
+ private:
+  ExpressionNode equationTree;
+};
+
+}  // namespace tessal

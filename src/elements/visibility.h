@@ -1,0 +1,45 @@
+// Visibility groups: named groups with levels, by which an application shows a modeller only part of a large
+// template. The definitions list, for each level, the elements that belong to it.
+#pragma once
+
+#include <set>
+#include <string>
+#include <vector>
+
+#include "elements/element.h"
+
+namespace tessal {
+
+struct VisibilityLevel {
+  std::string name;
+  std::string description;
+  /// Identities of elements. Only while a file is read, and until the template has its symbol table, these
+  /// are the numbers of symbol records that the file holds.
+  std::set<std::int32_t> items;
+};
+
+struct VisibilityGroup {
+  std::string name;
+  std::string description;
+  std::vector<VisibilityLevel> levels;
+};
+
+class CEL_Visibility final : public CEL_Element {
+ public:
+  CEL_Visibility();
+
+  /// Reads the sub-section of the settings; without one nothing changes.
+  void Read(KvfNode settings, int& status) override;
+  /// Writes the sub-section, with the numbers of symbol records in the place of identities.
+  void Write(KvfHandle file, int& status) override;
+  void Reset() override { groups.clear(); }
+  void GetFields(std::vector<ElementField>& /*fields*/) const override {}
+  int SetFields(const std::vector<ElementField>& /*fields*/) override { return 0; }
+
+  std::vector<VisibilityGroup> groups;
+
+ private:
+  void WriteLevel(const VisibilityLevel& level, KvfHandle file, int& status);
+};
+
+}  // namespace tessal

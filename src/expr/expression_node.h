@@ -1,0 +1,91 @@
+// The parse tree of an expression: one type of node, with the kind telling what its text and children mean.
+// Trees of long chains are as deep as they are long, so nothing here recurses.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace tessal {
+
+enum NodeKind : std::int32_t {
+  NODE_UNKNOWN = 0,
+  NODE_IDENTIFIER = 2,
+  NODE_NUMBER = 3,
+  NODE_CALL = 4,
+  NODE_ARITHMETIC = 5,
+  NODE_COMPARISON = 6,
+  NODE_CONDITIONAL = 7,
+  NODE_DIRECT_ASSIGN = 8,
+  NODE_DIRECT_PLUS = 9,
+  NODE_DIRECT_MINUS = 10,
+  NODE_DIRECT_MULTIPLY = 11,
+  NODE_DIRECT_DIVIDE = 12,
+  NODE_PROPERTY = 13,
+  NODE_ARGUMENT = 14,
+  NODE_INTERACTION = 15,
+  NODE_TARGET = 16,
+  NODE_MODLISTS = 17,
+  NODE_MODLIST = 18,
+  NODE_MODFIELD = 19,
+  NODE_NEGATE = 21,
+  NODE_EXCEEDANCE = 22
+};
+
+class ExpressionNode final {
+ public:
+  /// What a walk calls: the node's kind, its text and its depth.
+  using Callback = std::function<void(std::int32_t kind, const std::string& text, std::int32_t depth)>;
+
+  ExpressionNode() : text("unknown") {}
+  ExpressionNode(std::int32_t nodeKind, std::string nodeText) : kind(nodeKind), text(std::move(nodeText)) {}
+  /// A node with empty slots for children.
+  ExpressionNode(std::int32_t nodeKind, std::string nodeText, std::int32_t childCount)
+      : kind(nodeKind), text(std::move(nodeText)), children(static_cast<std::size_t>(childCount)) {}
+  ExpressionNode(const ExpressionNode& other) { DeepCopy(&other); }
+  ExpressionNode(ExpressionNode&& other) noexcept { TakeFrom(other); }
+  ExpressionNode& operator=(const ExpressionNode& other);
+  ExpressionNode& operator=(ExpressionNode&& other) noexcept;
+  ~ExpressionNode() {
+    if (!children.empty()) Release();
+  }
+
+  std::int32_t Kind() const { return kind; }
+  const std::string& Text() const { return text; }
+  std::int32_t ChildCount() const { return static_cast<std::int32_t>(children.size()); }
+  /// The child in a slot from 1; none for an empty slot or one beyond the count.
+  const ExpressionNode* Child(std::int32_t slot) const;
+  /// The node above; none at the root.
+  const ExpressionNode* Parent() const { return parent; }
+
+  /// Fills a slot from 1; a slot beyond the count is ignored, and the node released.
+  void SetChild(std::int32_t slot, std::unique_ptr<ExpressionNode> node);
+  /// Releases all children; the node keeps its kind and text.
+  void Release();
+  /// Becomes a copy of another tree, or, of nothing, an unknown node with an empty text.
+  void DeepCopy(const ExpressionNode* source);
+
+  /// Calls `before`, walks the children from the last to the first, calls `visit` and `after`. `before` and
+  /// `after` may be empty.
+  void WalkPostOrder(const Callback& before, const Callback& visit, const Callback& after,
+                     std::int32_t depth = 0) const;
+  /// Calls `before`, walks the first child, calls `visit`, walks the other children in order, calls `after`.
+  void WalkInOrder(const Callback& before, const Callback& visit, const Callback& after,
+                   std::int32_t depth = 0) const;
+
+ private:
+  static constexpr std::int32_t kHighestKind = NODE_EXCEEDANCE;
+
+  void TakeFrom(ExpressionNode& other) noexcept;
+  void CopyHead(const ExpressionNode& source);
+
+  std::int32_t kind = NODE_UNKNOWN;
+  std::string text;
+  std::vector<std::unique_ptr<ExpressionNode>> children;
+  ExpressionNode* parent = nullptr;
+};
+
+}  // namespace tessal

@@ -1,0 +1,28 @@
+#include "expr/identifiers.h"
+
+#include "expr/scanner.h"
+
+namespace tessal {
+
+void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& identifiers) {
+  identifiers.clear();
+  bool clean = true;
+  ExpressionScan scan(text);
+  while (const std::int32_t code = scan.Next()) {
+    if (code == token::kIdentifier) {
+      const std::size_t length = scan.Lexeme().size();
+      identifiers.push_back(text.substr(scan.Consumed() - length, length));
+    }
+    // To the end all the same: the start state of the next scan depends on it.
+    clean = clean && code >= token::kIdentifier && code <= token::kRvalId;
+  }
+  if (!clean) identifiers.clear();
+}
+
+void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers) {
+  std::vector<std::string_view> names;
+  ScanIdentifiers(StripExpressionQuotes(text), names);
+  identifiers.assign(names.begin(), names.end());
+}
+
+}  // namespace tessal

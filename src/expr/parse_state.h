@@ -1,0 +1,60 @@
+// What one parse works on: the scan, the nodes that wait for their parents, and the failure text.
+// The generated parser's values are trivial so that its stack can grow; the nodes lie here, so that a failed
+// parse releases them all.
+#pragma once
+
+#include <cstdint>
+#include <initializer_list>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "expr/expression_grammar.h"
+#include "expr/expression_node.h"
+#include "expr/scanner.h"
+
+namespace tessal {
+
+class ParseState final {
+ public:
+  /// The text must outlive the parse.
+  explicit ParseState(std::string_view expression) : text(expression), scan(expression) {}
+
+  // The token side.
+  int Pull(LexemeSpan& lexeme);
+  bool TokenIsTooLong() const { return tooLong; }
+  void Fail(std::string_view message);
+
+  // The tree side. Each takes its children out of the store and puts itself in.
+  NodeHandle Leaf(NodeKind kind, LexemeSpan lexeme);
+  NodeHandle Node(NodeKind kind, const char* nodeText, std::initializer_list<NodeHandle> children);
+  NodeHandle Named(NodeKind kind, LexemeSpan name, std::initializer_list<NodeHandle> children);
+  NodeHandle RidValue(LexemeSpan name);
+  NodeHandle Conditional(NodeHandle condition, NodeHandle thenValue, NodeHandle elseValue);
+  // There is no boolean node: the operators become conditionals that yield 1 or 0, compared against 0.
+  NodeHandle Not(NodeHandle condition);
+  NodeHandle Or(NodeHandle left, NodeHandle right);
+  NodeHandle And(NodeHandle left, NodeHandle right);
+  NodeHandle Modlist(std::initializer_list<NodeHandle> fields);
+  void SetRoot(NodeHandle handle) { root = std::move(store[handle]); }
+
+  std::unique_ptr<ExpressionNode>& Root() { return root; }
+  const std::string& Message() const { return message; }
+  std::int32_t Line() const { return static_cast<std::int32_t>(scan.Lines()); }
+  std::int32_t Position() const { return static_cast<std::int32_t>(scan.Consumed() - scan.LineStart()); }
+
+ private:
+  NodeHandle Put(std::unique_ptr<ExpressionNode> node);
+  NodeHandle Number(const char* digits);
+  NodeHandle IsTrue(NodeHandle conditional);
+
+  std::string_view text;
+  ExpressionScan scan;
+  std::vector<std::unique_ptr<ExpressionNode>> store;
+  std::unique_ptr<ExpressionNode> root;
+  std::string message;
+  bool tooLong = false;
+};
+
+}  // namespace tessal

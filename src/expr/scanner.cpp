@@ -1,0 +1,94 @@
+#include "expr/scanner.h"
+
+#include <algorithm>
+#include <array>
+#include <limits>
+
+#include "expr/scanner_state.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::array<std::string_view, 36> kTokenNames = {
+    "IDENTIFIER",     "INT_NUM",           "FLOAT_NUM",       "SCIENTIFIC_NUM",
+    "ADD_OP_PLUS",    "ADD_OP_MINUS",      "MUL_OP_MULTIPLY", "MUL_OP_DIVIDE",
+    "COMMA",          "LEFT_BRACKET",      "RIGHT_BRACKET",   "LEFT_SQUARE",
+    "RIGHT_SQUARE",   "LEFT_CURLY",        "RIGHT_CURLY",     "EQUAL",
+    "NOT_EQUAL",      "BIGGER",            "SMALLER",         "BIGGER_OR_EQUAL",
+    "SMALLER_OR_EQUAL", "IF",              "THEN",            "ELSE",
+    "NOT_OP",         "AND_OP",            "OR_OP",           "DIRECT_ASSIGN",
+    "DIRECT_PLUS",    "DIRECT_MINUS",      "DIRECT_MULTIPLY", "DIRECT_DIVIDE",
+    "RVAL_ID",        "EXCEEDANCE_FREQUENCY", "U_PLUS",       "U_MINUS"};
+
+/// What a listed token outside the plain ones is shown as.
+constexpr std::int32_t kListedAsOther = token::kExceedanceFrequency;
+
+bool IsListed(std::int32_t code) { return code >= token::kIdentifier && code <= token::kRvalId; }
+
+ExpressionToken MakeToken(const ExpressionScan& scan, std::int32_t code) {
+  const std::string_view lexeme = scan.Lexeme();
+  const auto length = static_cast<std::int32_t>(lexeme.size());
+  ExpressionToken listed;
+  listed.text = lexeme;
+  listed.code = code;
+  listed.line = static_cast<std::int32_t>(scan.Lines());
+  listed.lastOffset = static_cast<std::int32_t>(scan.Consumed()) - 1;
+  listed.firstOffset = listed.lastOffset - length + 1;
+  listed.lastColumn = static_cast<std::int32_t>(scan.Consumed() - scan.LineStart()) - 1;
+  listed.firstColumn = listed.lastColumn - length + 1;
+  return listed;
+}
+
+}  // namespace
+
+ScanPosition& ScannerCounters() {
+  static ScanPosition counters;
+  return counters;
+}
+
+std::string_view TokenName(std::int32_t code) {
+  const auto place = static_cast<std::size_t>(code - token::kIdentifier);
+  return code >= token::kIdentifier && place < kTokenNames.size() ? kTokenNames[place] : "-";
+}
+
+ExpressionScan::ExpressionScan(std::string_view text) {
+  constexpr auto kLongest = static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() - 2);
+  text = text.substr(0, std::min(text.find('\0'), kLongest));
+  ScannerCounters() = {};
+  BeginFlexScan(text.data(), text.size());
+}
+
+ExpressionScan::~ExpressionScan() { EndFlexScan(); }
+
+std::int32_t ExpressionScan::Next() { return NextFlexToken(); }
+
+std::string_view ExpressionScan::Lexeme() const { return FlexLexeme(); }
+
+std::uint32_t ExpressionScan::Consumed() const { return ScannerCounters().consumed; }
+
+std::uint32_t ExpressionScan::Lines() const { return ScannerCounters().lines; }
+
+std::uint32_t ExpressionScan::LineStart() const { return ScannerCounters().lineStart; }
+
+bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& tokens) {
+  tokens.clear();
+  bool clean = true;
+  ExpressionScan scan(text);
+  while (const std::int32_t code = scan.Next()) {
+    clean = clean && IsListed(code);
+    tokens.push_back(MakeToken(scan, IsListed(code) ? code : kListedAsOther));
+  }
+  return clean;
+}
+
+std::string_view StripExpressionQuotes(std::string_view stored) {
+  const std::size_t first = stored.find('"');
+  if (first == std::string_view::npos) return stored;
+  const std::size_t last = stored.rfind('"');
+  return last == first ? stored.substr(first + 1) : stored.substr(first + 1, last - first - 1);
+}
+
+void ResetExpressionScanner() { ResetFlexState(); }
+
+}  // namespace tessal

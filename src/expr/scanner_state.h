@@ -1,0 +1,25 @@
+// What the generated scanner and its owner share. Nobody else includes this.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace tessal {
+
+/// Counted since the beginning of the scan.
+struct ScanPosition {
+  std::uint32_t consumed = 0;   ///< characters taken, the present token's included
+  std::uint32_t lines = 0;      ///< line feeds outside comments
+  std::uint32_t lineStart = 0;  ///< characters taken when the present line began
+};
+
+ScanPosition& ScannerCounters();
+
+void BeginFlexScan(const char* text, std::size_t length);
+void EndFlexScan();
+std::int32_t NextFlexToken();
+std::string_view FlexLexeme();
+void ResetFlexState();
+
+}  // namespace tessal

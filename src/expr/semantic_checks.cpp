@@ -1,0 +1,162 @@
+#include "expr/semantic_checks.h"
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <string>
+
+#include "core/error_registry.h"
+#include "expr/expression_node.h"
+#include "expr/function_catalogue.h"
+#include "expr/parser.h"
+#include "expr/user_function_names.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::array<std::string_view, 24> kProperties = {
+    "XPOS",      "YPOS",      "ZPOS",      "HITSTATE",      "AGE",          "HDIR",
+    "HSPEED",    "VSPEED",    "PROJ_XPOS", "PROJ_YPOS",     "PROJ_ZPOS",    "PROJ_HITSTATE",
+    "ABOVE_GROUND", "BELOW_SURFACE", "PREV_XPOS", "PREV_YPOS", "PREV_ZPOS", "PREV_HITSTATE",
+    "PARTICLEID", "SOURCEID", "PROJ_TIME", "VIEWANGLE",     "ALIVE",        "ALL"};
+constexpr std::array<std::string_view, 6> kVerbs = {"CREATE", "REMOVE", "KILL", "TRANSFER", "SPLIT", "GETVALUE"};
+constexpr std::array<std::string_view, 3> kConditionalWords = {"IF", "THEN", "ELSE"};
+
+template <class Words>
+bool Holds(const Words& words, std::string_view text) {
+  return std::find(words.begin(), words.end(), text) != words.end();
+}
+
+bool IsLetter(char character) {
+  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
+}
+
+bool IsDigit(char character) { return character >= '0' && character <= '9'; }
+
+std::string UpperCase(std::string_view text) {
+  std::string upper(text);
+  for (char& character : upper) {
+    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
+  }
+  return upper;
+}
+
+/// Whether a text as a whole converts to a number by the rules of the "C" locale. The conversion of the empty
+/// text, and of nothing behind blanks, stops where it starts.
+bool ReadsAsNumber(std::string_view text) {
+  if (text.empty()) return true;
+  constexpr std::string_view kBlanks = " \t\n\v\f\r";
+  const std::size_t start = text.find_first_not_of(kBlanks);
+  if (start == std::string_view::npos) return false;
+  std::string_view digits = text.substr(start);
+  if (digits.front() == '+' || digits.front() == '-') digits.remove_prefix(1);
+  if (digits.empty() || digits.front() == '-' || digits.front() == '+') return false;
+  const bool isHex = digits.size() > 2 && digits[0] == '0' && (digits[1] == 'x' || digits[1] == 'X');
+  if (isHex) digits.remove_prefix(2);
+  double value = 0.0;
+  const auto result = std::from_chars(digits.data(), digits.data() + digits.size(), value,
+                                      isHex ? std::chars_format::hex : std::chars_format::general);
+  return result.ec != std::errc::invalid_argument && result.ptr == digits.data() + digits.size();
+}
+
+/// One check of one expression.
+class FunctionCheck final {
+ public:
+  FunctionCheck(std::string_view checkedSymbol, std::uint32_t checkedUid)
+      : symbol(checkedSymbol), uid(checkedUid) {}
+
+  void Walk(const ExpressionNode& root) {
+    root.WalkPostOrder(
+        nullptr, [this](std::int32_t kind, const std::string& text, std::int32_t) { Visit(kind, text); },
+        [this](std::int32_t kind, const std::string&, std::int32_t) {
+          if (kind == NODE_CALL) --callDepth;
+        });
+  }
+
+  bool IsBalanced() const { return callDepth < 1; }
+  const std::string& LastCall() const { return lastCall; }
+
+  void Report(std::string_view text) {
+    Errors().ReportElementError(symbol, static_cast<std::int32_t>(uid), text);
+  }
+
+ private:
+  void Visit(std::int32_t kind, const std::string& text) {
+    if (kind == NODE_ARGUMENT) {
+      // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
+      ++arguments;
+    } else if (kind == NODE_PROPERTY) {
+      if (!IsPropertyName(text)) Report("Unknown property ['" + text + "'] !");
+    } else if (kind == NODE_CALL) {
+      CheckCall(text);
+      ++callDepth;
+      lastCall = text;
+      arguments = 0;
+    }
+  }
+
+  void CheckCall(const std::string& name) {
+    const CatalogueFunction* function = FindFunction(name);
+    if (function == nullptr) {
+      if (!IsUserFunctionName(name)) Report("Unknown function '" + name + "' !");
+      return;
+    }
+    if (function->argumentCount != arguments) {
+      Report("Wrong number of arguments for function " + name + "(" + JoinedArguments(*function) + ")!");
+    }
+    if (IsDeprecatedFunction(function->id)) {
+      Report("The function " + name + " is deprecated and should not be used!");
+    }
+  }
+
+  std::string_view symbol;
+  std::uint32_t uid;
+  std::int32_t arguments = 0;
+  std::int32_t callDepth = 0;
+  std::string lastCall;
+};
+
+}  // namespace
+
+int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression) {
+  FunctionCheck check(symbol, uid);
+  ExpressionNode root;
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string message;
+  const int parsed = ParseExpressionText(std::string(expression), root, line, position, message);
+  if (parsed == 0) check.Report(message);
+  check.Walk(root);
+  if (!check.IsBalanced()) {
+    check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
+    return 0;
+  }
+  return parsed;
+}
+
+bool IsPropertyName(std::string_view text) { return Holds(kProperties, text); }
+
+bool IsInteractionVerb(std::string_view text) { return Holds(kVerbs, text); }
+
+bool IsConditionalWord(std::string_view text) { return Holds(kConditionalWords, text); }
+
+bool IsValidSymbolSpelling(std::string_view text) {
+  if (text.empty() || !IsLetter(text.front())) return false;
+  return std::all_of(text.begin(), text.end(), [](char character) {
+    return IsLetter(character) || IsDigit(character) || character == '_';
+  });
+}
+
+bool IsValidSymbol(std::string_view text) {
+  return IsValidSymbolSpelling(text) && !IsUserFunctionName(text) && !IsConditionalWord(text) &&
+         !IsInteractionVerb(text) && FunctionIdByName(text) < 0;
+}
+
+bool IsReservedName(std::string_view text) {
+  const std::string upper = UpperCase(text);
+  return FunctionIdByName(upper) >= 0 || IsConditionalWord(upper) || IsInteractionVerb(upper) ||
+         ReadsAsNumber(text);
+}
+
+}  // namespace tessal

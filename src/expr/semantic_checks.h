@@ -1,0 +1,29 @@
+// What the grammar cannot see: that each called function exists and gets the right number of arguments, that a
+// particle property is a known one, and which texts may serve as symbols.
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+
+namespace tessal {
+
+/// Parses and checks an expression; each finding goes to the error registry under the symbol and identity.
+/// 0 when it does not parse, else 1, also with findings.
+int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression);
+
+/// The words of the tables, exactly.
+bool IsPropertyName(std::string_view text);
+bool IsInteractionVerb(std::string_view text);
+bool IsConditionalWord(std::string_view text);
+
+/// A letter, then letters, digits and underscores.
+bool IsValidSymbolSpelling(std::string_view text);
+
+/// Spelt like a symbol and no user function's name, conditional word, verb or catalogue function, as they
+/// stand: `sin` passes where `SIN` fails.
+bool IsValidSymbol(std::string_view text);
+
+/// A catalogue function, conditional word or verb in any case, or a number; the empty text reads as one.
+bool IsReservedName(std::string_view text);
+
+}  // namespace tessal

@@ -1,0 +1,24 @@
+// The reader that turns key-file text into an item tree, with its comments and positions. One read at a time.
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+namespace tessal {
+
+class CKvfSectionItem;
+
+/// Reads a file into a tree. 1 on success; on failure 0, with the target as it was, and `KeyFileFailureText`
+/// tells why.
+int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target);
+
+/// The same from a text in memory.
+int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target);
+
+/// The size of a file in bytes; 0 when it cannot be opened.
+std::uintmax_t KeyFileSize(const std::string& path);
+
+/// Why the last read failed; empty behind a good one.
+const std::string& KeyFileFailureText();
+
+}  // namespace tessal

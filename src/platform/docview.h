@@ -1,0 +1,117 @@
+// Documents and their views: a document owns data and tells its views what happened through numbered hints;
+// a view shows it. A document template makes documents and views of one kind for a host application.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+class QWidget;
+
+namespace tessal {
+
+class CView;
+
+/// What comes with a hint. Each kind of hint has a type of its own.
+class UpdateHint {
+ public:
+  virtual ~UpdateHint() = default;
+
+ protected:
+  UpdateHint() = default;
+  UpdateHint(const UpdateHint&) = default;
+  UpdateHint& operator=(const UpdateHint&) = default;
+};
+
+class CDocument {
+ public:
+  CDocument() = default;
+  CDocument(const CDocument&) = delete;
+  CDocument& operator=(const CDocument&) = delete;
+  virtual ~CDocument() = default;
+
+  /// Each returns false when it failed; the host then keeps things as they were.
+  virtual bool OnNewDocument() { return true; }
+  virtual bool OnOpenDocument(const std::string& path);
+  virtual bool OnSaveDocument(const std::string& path) = 0;
+  virtual void OnCloseDocument() {}
+
+  virtual bool IsModified() const { return modified; }
+  virtual void SetModifiedFlag(bool flag) { modified = flag; }
+
+  const std::string& Title() const { return title; }
+  void SetTitle(const std::string& text) { title = text; }
+  const std::string& PathName() const { return pathName; }
+  /// Also gives the document the file's plain name as its title.
+  void SetPathName(const std::string& path);
+
+  /// Views look on: whoever makes one keeps it, and takes it off before it goes.
+  void AddView(CView& view);
+  void RemoveView(CView& view);
+  const std::vector<CView*>& Views() const { return views; }
+
+  /// Tells every view but the sender.
+  void UpdateAllViews(const CView* sender, int hint = 0, const UpdateHint* argument = nullptr);
+
+ private:
+  bool modified = false;
+  std::string title;
+  std::string pathName;
+  std::vector<CView*> views;
+};
+
+class CView {
+ public:
+  CView() = default;
+  CView(const CView&) = delete;
+  CView& operator=(const CView&) = delete;
+  virtual ~CView() = default;
+
+  virtual void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) = 0;
+  /// Builds what the view shows. Called once, when it stands in its frame.
+  virtual void OnInitialUpdate() {}
+  /// Puts what the user has entered and not yet committed into the document, before a save or a close.
+  virtual void OnCommit() {}
+  /// The widget that a host puts into its frame; none for a view without a screen.
+  virtual QWidget* Widget() { return nullptr; }
+
+  /// How a view has the frame around it show the document's title anew.
+  void SetFrameTitleUpdate(std::function<void()> update) { frameTitleUpdate = std::move(update); }
+  void UpdateFrameTitle() {
+    if (frameTitleUpdate) frameTitleUpdate();
+  }
+
+ private:
+  std::function<void()> frameTitleUpdate;
+};
+
+/// What a host needs to know of one kind of documents.
+class CMultiDocTemplate final {
+ public:
+  using DocumentFactory = std::function<std::unique_ptr<CDocument>()>;
+  using ViewFactory = std::function<std::unique_ptr<CView>(CDocument&)>;
+
+  /// The resource text holds seven names, parted by line feeds: window title, document name, new-file name,
+  /// filter name, extension, and two identifiers of the file type.
+  CMultiDocTemplate(int resourceNumber, const std::string& resourceText, DocumentFactory documentFactory,
+                    ViewFactory viewFactory);
+
+  enum Name { kWindowTitle, kDocumentName, kNewFileName, kFilterName, kFilterExtension, kFileTypeId, kFileTypeName };
+
+  int ResourceNumber() const { return resource; }
+  /// One of the names; empty when the resource text has none.
+  std::string GetDocString(Name name) const;
+  std::unique_ptr<CDocument> CreateNewDocument() const { return makeDocument(); }
+  /// A view on a document of this template, known to the document from here on.
+  std::unique_ptr<CView> CreateView(CDocument& document) const;
+
+ private:
+  int resource;
+  std::vector<std::string> names;
+  DocumentFactory makeDocument;
+  ViewFactory makeView;
+};
+
+}  // namespace tessal

@@ -1,0 +1,29 @@
+// Whole files: reading them, writing them, and putting a new one in the place of an old one so that nobody ever
+// sees half of it. Every failure is told in words.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace tessal {
+
+/// Reads a whole file. Nothing, with the reason in `failure`, when that fails.
+std::optional<std::string> ReadWholeFile(const std::string& path, std::string& failure);
+
+/// The size in bytes; 0 for a file that cannot be opened.
+std::uintmax_t FileSize(const std::string& path);
+
+/// Writes a file from its start and flushes it to the disk. Returns the empty text, or the reason in words.
+std::string WriteWholeFile(const std::string& path, std::string_view content);
+
+/// Writes the content into a new file beside the target and, when every byte is on disk, lets it take the
+/// target's place in one step. The target's permissions stay, and a symbolic link stays a link to the file
+/// that is replaced. Returns the empty text, or the reason in words; the old file is then whole.
+std::string ReplaceFile(const std::string& target, std::string_view content);
+
+/// Removes a file. Returns the empty text, or the reason in words.
+std::string RemoveFile(const std::string& path);
+
+}  // namespace tessal

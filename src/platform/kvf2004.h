@@ -1,0 +1,87 @@
+// The key-file library: reads a key file into targets, sections, keywords and parameters, and writes such
+// files. Elements are filled from it and written through it; it drops comments.
+// Handles and nodes are opaque, zero is "none", numbers count from 1, and names are compared without regard
+// to case. A node lives as long as its handle is open.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace tessal {
+
+using KvfHandle = std::uint32_t;
+struct KvfItem;
+using KvfNode = const KvfItem*;
+
+/// What went wrong, as `kvfGetErrorGlb` and the calls that return an int tell it.
+enum KvfError : int {
+  kKvfOk = 0,
+  kKvfCannotOpen = 1001,
+  kKvfCannotInitialiseStream = 1002,
+  kKvfSyntaxError = 1003,
+  kKvfCannotInitialiseParser = 1004,
+  kKvfBadHandle = 1005,
+  kKvfBadNode = 1006,
+  kKvfWrongType = 1007,    ///< a parameter of another type than asked for
+  kKvfNotWritable = 1008,  ///< a text or name that the format cannot hold
+  kKvfWriteFailed = 1009,  ///< the file system refused a byte
+};
+
+/// Reads and parses a file. Gives 0 on failure; `kvfGetErrorGlb` then tells why. The mode is always 1.
+KvfHandle kvfLoadFile(const std::string& path, int mode);
+
+/// The same from bytes in memory.
+KvfHandle kvfLoadText(std::string_view bytes);
+
+/// The last error of the library, 0 for none.
+int kvfGetErrorGlb();
+
+/// Where the syntax error of the last load lies (line and position from 1) and at most 40 bytes of the text
+/// near it, on one line. The handle may be the 0 of the failed load. Returns 0, or an error number.
+int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& text);
+
+/// A handle on a new, empty file image.
+KvfHandle kvfCreate();
+
+/// Releases a file and sets the handle to 0; a 0 handle is ignored.
+void kvfClose(KvfHandle* handle);
+
+KvfNode kvfTargetByNameNum(KvfHandle handle, std::string_view name, int number);
+KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number);
+int kvfGetNoSections(KvfNode node);
+KvfNode kvfSectionByNum(KvfNode node, int number);
+bool kvfIsSection(KvfNode node);
+std::string kvfGetNameGlb(KvfNode node);
+/// The line of the file, from 1, on which a target, section or keyword begins; 0 for none.
+int kvfGetLine(KvfNode node);
+KvfNode kvfKeywordByNameNum(KvfNode section, std::string_view name, int number);
+int kvfGetNoParams(KvfNode keyword);
+KvfNode kvfParamByNum(KvfNode keyword, int number);
+
+/// Readers of one parameter: 0 when read, else an error number with the output untouched.
+/// An integer outside 32 bits and a real outside 64 bits read as the nearest limit.
+int kvfGetInt(KvfNode parameter, std::int32_t& value);
+/// Takes integers too.
+int kvfGetDouble(KvfNode parameter, double& value);
+/// Quoted and path strings, and numbers and booleans as the text that stands in the file.
+int kvfGetString(KvfNode parameter, std::string& value);
+
+/// Writing: the image holds a stack of open sections; a keyword takes the parameters added after it.
+/// Each returns 0 when done, else an error number, and adds nothing then.
+int kvfAddTarget(KvfHandle handle, std::string_view name);
+int kvfAddSection(KvfHandle handle, std::string_view name);
+int kvfEndSection(KvfHandle handle);
+int kvfAddKeyword(KvfHandle handle, std::string_view name);
+int kvfAddInt(KvfHandle handle, std::int32_t value);
+/// Refuses a value that is not finite.
+int kvfAddDouble(KvfHandle handle, double value);
+/// Refuses a text that holds both ' and |, or a zero byte.
+int kvfAddString(KvfHandle handle, std::string_view value);
+
+/// Writes the image as text with CRLF line ends; 0 when every byte reached the file and was flushed to it,
+/// else an error number; `kvfGetWriteFailure` then tells the reason in words.
+int kvfWrite(KvfHandle handle, const std::string& path);
+std::string kvfGetWriteFailure();
+
+}  // namespace tessal

@@ -1,0 +1,48 @@
+#include "platform/kvf_text.h"
+
+#include <algorithm>
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+
+bool IsNameStart(char character) {
+  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') || character == '_';
+}
+
+}  // namespace
+
+std::string KvfReadableText(std::string_view bytes) {
+  bytes = bytes.substr(0, bytes.find('\0'));
+  if (bytes.starts_with(kByteOrderMark)) bytes.remove_prefix(kByteOrderMark.size());
+  std::string text;
+  text.reserve(bytes.size() + static_cast<std::size_t>(std::count(bytes.begin(), bytes.end(), '\n')));
+  char previous = '\0';
+  for (const char byte : bytes) {
+    if (byte == '\n' && previous != '\r') text += '\r';
+    text += byte;
+    previous = byte;
+  }
+  return text;
+}
+
+std::string KvfWritableText(std::string_view text) {
+  std::string written;
+  written.reserve(text.size() + static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n')));
+  for (const char character : text) {
+    if (character == '\r') continue;
+    if (character == '\n') written += '\r';
+    written += character;
+  }
+  return written;
+}
+
+bool IsKvfName(std::string_view text) {
+  return !text.empty() && IsNameStart(text.front()) && std::all_of(text.begin(), text.end(), [](char character) {
+    return IsNameStart(character) || (character >= '0' && character <= '9');
+  });
+}
+
+}  // namespace tessal
