@@ -152,8 +152,8 @@ bool TemplateCore::OfferUndefinedSymbols(CreationQuestions& questions) {
 }
 
 bool TemplateCore::OfferSymbol(const UndefinedSymbol& undefined, CreationQuestions& questions) const {
-  if (!questions.AskYesNo("There are undefined symbols!\n\nDo you want to create symbol '" + undefined.symbol +
-                          "' ?")) {
+  if (!questions.AskYesNo("There are undefined symbols!\n\nDo you want to create symbol '" +
+                          undefined.symbol + "' ?")) {
     return false;
   }
   const int choice = questions.ChooseKind(undefined.symbol, OfferMask(undefined));

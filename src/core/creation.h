@@ -8,9 +8,9 @@ namespace tessal {
 
 /// What is to be made.
 struct CreateRequest {
-  std::string symbol;            ///< empty: the element keeps its default name and has no texts
-  std::uint32_t kind = 0;        ///< one of the kinds 1 to 13
-  std::int32_t ownerId = 0;      ///< for kinds 8 to 13 the identity of the list head in the particle class
+  std::string symbol;        ///< empty: the element keeps its default name and has no texts
+  std::uint32_t kind = 0;    ///< one of the kinds 1 to 13
+  std::int32_t ownerId = 0;  ///< for kinds 8 to 13 the identity of the list head in the particle class
 };
 
 /// A new element and its place among its siblings.

@@ -31,7 +31,9 @@ bool EraseFrom(Sequence<Element>& sequence, std::size_t index) {
   return true;
 }
 
-bool IsParticleKind(std::int32_t elementKind) { return elementKind >= kind::kSpecieStateVariable; }
+bool IsParticleKind(std::int32_t elementKind) {
+  return elementKind >= kind::kSpecieStateVariable;
+}
 
 /// Kinds whose order of declaration an expression depends on.
 bool IsOrdered(std::int32_t elementKind) {
@@ -66,7 +68,8 @@ template <class Operation>
 bool TemplateCore::WithSequenceOf(const SymbolRecord& record, Operation operation) {
   const std::int32_t elementKind = record.element->Kind();
   if (IsParticleKind(elementKind)) {
-    return WithMemberSequence(At(species, static_cast<std::size_t>(record.specieIndex)), elementKind, operation);
+    return WithMemberSequence(At(species, static_cast<std::size_t>(record.specieIndex)), elementKind,
+                              operation);
   }
   switch (elementKind) {
     case kind::kStateVariable:
@@ -116,15 +119,21 @@ CEL_StateVariable& TemplateCore::AddStateVariable() {
   return AddTo(stateVariables, kind::kStateVariableList, "StateVariable_");
 }
 
-CEL_Constant& TemplateCore::AddConstant() { return AddTo(constants, kind::kConstantList, "Constant_"); }
+CEL_Constant& TemplateCore::AddConstant() {
+  return AddTo(constants, kind::kConstantList, "Constant_");
+}
 
-CEL_Forcing& TemplateCore::AddForcing() { return AddTo(forcings, kind::kForcingList, "Forcing_"); }
+CEL_Forcing& TemplateCore::AddForcing() {
+  return AddTo(forcings, kind::kForcingList, "Forcing_");
+}
 
 CEL_Auxilliary_Variable& TemplateCore::AddAuxiliary() {
   return AddTo(auxiliaries, kind::kAuxiliaryList, "Auxiliary_");
 }
 
-CEL_Process& TemplateCore::AddProcess() { return AddTo(processes, kind::kProcessList, "Process_"); }
+CEL_Process& TemplateCore::AddProcess() {
+  return AddTo(processes, kind::kProcessList, "Process_");
+}
 
 CEL_Derived_Output& TemplateCore::AddDerivedOutput() {
   return AddTo(derivedOutputs, kind::kDerivedOutputList, "Derived Output ");
@@ -186,14 +195,16 @@ bool TemplateCore::CanMove(std::uint32_t uid, std::uint32_t targetUid) const {
   if (!IsOrdered(elementKind)) return true;
   const auto staysAhead = [target](std::uint32_t used) { return used < target->sequence; };
   if (!std::all_of(moved->references.begin(), moved->references.end(), staysAhead)) return false;
-  return std::all_of(moved->referencedBy.begin(), moved->referencedBy.end(), [this, target](std::uint32_t user) {
-    const SymbolRecord* record = FindRecordBySequence(user);
-    if (record == nullptr) return false;
-    const std::int32_t userKind = record->element->Kind();
-    // Equations use what they use regardless of order.
-    if (userKind == kind::kStateVariable || userKind == kind::kSpecieStateVariable) return true;
-    return user > target->sequence;
-  });
+  return std::all_of(moved->referencedBy.begin(), moved->referencedBy.end(),
+                     [this, target](std::uint32_t user) {
+                       const SymbolRecord* record = FindRecordBySequence(user);
+                       if (record == nullptr) return false;
+                       const std::int32_t userKind = record->element->Kind();
+                       // Equations use what they use regardless of order.
+                       if (userKind == kind::kStateVariable || userKind == kind::kSpecieStateVariable)
+                         return true;
+                       return user > target->sequence;
+                     });
 }
 
 bool TemplateCore::MoveElement(std::uint32_t uid, std::uint32_t targetUid, bool before) {
@@ -213,7 +224,8 @@ bool TemplateCore::MoveElement(std::uint32_t uid, std::uint32_t targetUid, bool 
 
 bool TemplateCore::MoveRecordElement(const SymbolRecord& record, std::size_t target) {
   const auto from = static_cast<std::size_t>(record.index);
-  return WithSequenceOf(record, [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
+  return WithSequenceOf(record,
+                        [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
 }
 
 bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predecessor) {
@@ -221,12 +233,11 @@ bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predece
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr || record->referencedByUids.empty()) return false;
   const std::int32_t elementKind = record->element->Kind();
-  const bool hasUserOfKind =
-      std::any_of(record->referencedBy.begin(), record->referencedBy.end(),
-                  [this, elementKind](std::uint32_t user) {
-                    const SymbolRecord* candidate = FindRecordBySequence(user);
-                    return candidate != nullptr && candidate->element->Kind() == elementKind;
-                  });
+  const bool hasUserOfKind = std::any_of(
+      record->referencedBy.begin(), record->referencedBy.end(), [this, elementKind](std::uint32_t user) {
+        const SymbolRecord* candidate = FindRecordBySequence(user);
+        return candidate != nullptr && candidate->element->Kind() == elementKind;
+      });
   if (!hasUserOfKind) return false;
   // The last user decides the place, whatever its kind; the user of the same kind is only the condition.
   const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());

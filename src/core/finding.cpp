@@ -179,7 +179,8 @@ std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<std::in
     // The second record of a movement counts as its first.
     if (record.element == nullptr || record.element == previous) continue;
     previous = record.element;
-    if (uids.contains(record.element->MessageUid())) numbers.insert(static_cast<std::int32_t>(record.sequence));
+    if (uids.contains(record.element->MessageUid()))
+      numbers.insert(static_cast<std::int32_t>(record.sequence));
   }
   return numbers;
 }

@@ -78,7 +78,9 @@ bool IsEmptyTarget(KvfNode target) {
 
 }  // namespace
 
-bool TemplateCore::LoadWrapper(const std::string& path) { return Load(path); }
+bool TemplateCore::LoadWrapper(const std::string& path) {
+  return Load(path);
+}
 
 bool TemplateCore::Load(const std::string& path) {
   const NotificationsOff silent;

@@ -50,10 +50,12 @@ bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
 
 /// What the extraction looks names up in. It lives as long as the step.
 struct TemplateCore::ReferenceLookup {
-  std::unordered_map<std::string, std::uint32_t> composed;  ///< symbols of movements, which have no text of their own
+  std::unordered_map<std::string, std::uint32_t>
+      composed;  ///< symbols of movements, which have no text of their own
   std::unordered_map<std::string_view, std::uint32_t> sequences;
   std::unordered_map<std::string_view, UndefinedSymbol*> undefined;
-  /// For each record the last one that was noted to use it: an expression's second use of a symbol adds nothing.
+  /// For each record the last one that was noted to use it: an expression's second use of a symbol adds
+  /// nothing.
   std::vector<std::uint32_t> lastUser;
   std::vector<std::string_view> identifiers;
 };
@@ -144,7 +146,8 @@ void TemplateCore::ClassifyArithmeticExpressions() {
   for (const auto& specie : species) {
     std::unordered_set<const CEL_Element*> usedByEquations;
     for (const auto& variable : specie->stateVariables) {
-      for (const std::uint32_t sequence : Record(static_cast<std::uint32_t>(variable->id.IntValue())).references) {
+      for (const std::uint32_t sequence :
+           Record(static_cast<std::uint32_t>(variable->id.IntValue())).references) {
         usedByEquations.insert(Record(sequence).element);
       }
     }
@@ -168,7 +171,8 @@ void TemplateCore::ResolveReferencesToNames() {
 void TemplateCore::ResolveNamesToReferences() {
   if (!HasSearchFunction(species)) return;
   std::unordered_map<std::string_view, const CEL_Element*> byName;
-  ForEachNamedElement([&byName](const CEL_Element& element) { byName.emplace(element.symbol.Text(), &element); });
+  ForEachNamedElement(
+      [&byName](const CEL_Element& element) { byName.emplace(element.symbol.Text(), &element); });
   ForEachSearchFunction(species, [&byName](CEL_Lagrange_Spatial_Function& function) {
     if (function.VariableName() == kUnresolvedName) return;
     const auto hit = byName.find(function.VariableName());

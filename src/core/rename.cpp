@@ -15,7 +15,8 @@ bool IsLetter(char character) {
 }
 
 /// Rewrites an expression in its stored form, between quotes: the word rule knows the opening one.
-std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord, std::string_view newWord) {
+std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
+                                std::string_view newWord) {
   const std::string rewritten = ReplaceWord('"' + std::string(expression) + '"', oldWord, newWord);
   return std::string(StripExpressionQuotes(rewritten));
 }

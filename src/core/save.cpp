@@ -76,7 +76,9 @@ void WriteElements(const Elements& elements, std::string_view prefix, KvfHandle 
 
 }  // namespace
 
-bool TemplateCore::SaveWrapper(const std::string& path) { return Save(path); }
+bool TemplateCore::SaveWrapper(const std::string& path) {
+  return Save(path);
+}
 
 bool TemplateCore::Save(const std::string& path) {
   try {
@@ -173,8 +175,8 @@ bool TemplateCore::WriteSections(KvfHandle file) {
 }
 
 void TemplateCore::WriteCollections(KvfHandle file, int& status) {
-  const auto write = [this, file, &status](const auto& elements, std::string_view name, std::string_view prefix,
-                                           std::int32_t headKind) {
+  const auto write = [this, file, &status](const auto& elements, std::string_view name,
+                                           std::string_view prefix, std::int32_t headKind) {
     kvfAddSection(file, name);
     ListHead(headKind).Write(file, status);
     WriteElements(elements, prefix, file, status);

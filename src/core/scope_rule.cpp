@@ -33,15 +33,15 @@ constexpr std::array<CodeRow, 3> kSpatialVariations = {{
 
 template <std::size_t Count>
 std::int32_t CodeOf(const std::array<CodeRow, Count>& rows, std::string_view text, std::int32_t otherwise) {
-  const auto hit = std::find_if(rows.begin(), rows.end(), [text](const CodeRow& row) { return row.text == text; });
+  const auto hit =
+      std::find_if(rows.begin(), rows.end(), [text](const CodeRow& row) { return row.text == text; });
   return hit == rows.end() ? otherwise : hit->code;
 }
 
 /// What does not vary in space uses nothing that does; what varies horizontally in the water column uses
 /// nothing of the water column that varies in all three dimensions.
 bool ViolatesScopeRule(const SymbolRecord& user, const SymbolRecord& used) {
-  const bool bothInColumn =
-      user.scope == scope_code::kWaterColumn && used.scope == scope_code::kWaterColumn;
+  const bool bothInColumn = user.scope == scope_code::kWaterColumn && used.scope == scope_code::kWaterColumn;
   if (bothInColumn && user.spatial == spatial_code::kHorizontal) {
     return used.spatial == spatial_code::kHorizontalAndVertical;
   }
@@ -74,7 +74,9 @@ std::string_view ProcessRuleViolation(const SymbolRecord& user, const SymbolReco
 
 }  // namespace
 
-std::int32_t ScopeFromText(std::string_view text) { return CodeOf(kScopes, text, scope_code::kNone); }
+std::int32_t ScopeFromText(std::string_view text) {
+  return CodeOf(kScopes, text, scope_code::kNone);
+}
 
 std::int32_t SpatialFromText(std::string_view text) {
   return CodeOf(kSpatialVariations, text, spatial_code::kUnknown);

@@ -9,7 +9,9 @@ ChoiceList ShareChoices(std::vector<CEL_Choice> choices) {
   return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
 }
 
-std::vector<CEL_Choice> NoVariable() { return {CEL_Choice::Number("NONE", -1)}; }
+std::vector<CEL_Choice> NoVariable() {
+  return {CEL_Choice::Number("NONE", -1)};
+}
 
 template <class Elements>
 void Offer(std::vector<CEL_Choice>& choices, const Elements& elements) {

@@ -67,7 +67,8 @@ std::int32_t TemplateCore::AddVisibilityGroup() {
   if (!hasMisc) return 0;
   auto& groups = misc.Visibilities().groups;
   const auto taken = [&groups](const std::string& name) {
-    return std::any_of(groups.begin(), groups.end(), [&name](const auto& group) { return group.name == name; });
+    return std::any_of(groups.begin(), groups.end(),
+                       [&name](const auto& group) { return group.name == name; });
   };
   const auto nameOf = [](std::uint32_t number) { return "Group_" + std::to_string(number); };
   if (groupCounter > 0 || groups.empty()) {
@@ -133,13 +134,16 @@ void TemplateCore::CollectItems(std::int32_t group, std::int32_t level, std::vec
   items.clear();
   if (!hasMisc) return;
   if (group < 1) {
-    for (const SymbolRecord& record : symbolTable) items.push_back(static_cast<std::int32_t>(record.sequence));
+    for (const SymbolRecord& record : symbolTable)
+      items.push_back(static_cast<std::int32_t>(record.sequence));
     return;
   }
   if (!HasGroup(group)) return;
   const auto& levels = Group(group).levels;
   std::set<std::int32_t> uids;
-  const auto collect = [&uids](const VisibilityLevel& from) { uids.insert(from.items.begin(), from.items.end()); };
+  const auto collect = [&uids](const VisibilityLevel& from) {
+    uids.insert(from.items.begin(), from.items.end());
+  };
   if (level < 1) {
     for (const VisibilityLevel& each : levels) collect(each);
   } else {
@@ -167,9 +171,13 @@ std::string TemplateCore::NamedLevel(std::int32_t group, std::int32_t level, std
   return Group(group).levels[static_cast<std::size_t>(level - 1)].name;
 }
 
-std::string TemplateCore::GroupText(std::int32_t group) const { return NamedGroup(group, "any"); }
+std::string TemplateCore::GroupText(std::int32_t group) const {
+  return NamedGroup(group, "any");
+}
 
-std::string TemplateCore::GroupListText(std::int32_t group) const { return NamedGroup(group, "all variables"); }
+std::string TemplateCore::GroupListText(std::int32_t group) const {
+  return NamedGroup(group, "all variables");
+}
 
 std::string TemplateCore::LevelText(std::int32_t group, std::int32_t level) const {
   return NamedLevel(group, level, "all");

@@ -88,7 +88,8 @@ std::vector<CEL_Choice> FirstLookForChoices() {
   return {CEL_Choice::Number("OWN SPECIE", kOwnSpecie), CEL_Choice::Number("ANY PARTICLE", kAnyParticle)};
 }
 
-CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view caption) : CEL_Element(caption) {
+CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view caption)
+    : CEL_Element(caption) {
   SetKind(kind::kSpatialFunction);
   Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
                &framework, &property, &math, &lookFor});
@@ -164,8 +165,7 @@ bool CEL_Lagrange_Spatial_Function::Check() {
   const bool lagrange = framework.Text() == kLagrange;
   const std::int32_t sought = lookFor.IntValue();
   const std::int32_t variable = variableId.IntValue();
-  const auto species =
-      static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieNames().size());
+  const auto species = static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieNames().size());
   if (lagrange && (sought < kAnyParticle || sought == 0 || sought > species)) report(message::kNoSpecie);
   if (purpose.Text() != kOilspill) {
     const bool needsVariable = !lagrange || property.Text() == kNone;

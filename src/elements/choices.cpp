@@ -12,8 +12,8 @@ constexpr std::array<std::string_view, 4> kLayerScopes = {"WS", "WC", "WB", "SED
 
 // The first two rows are one text, and the first of them wins a selection: the built-in catalogue counts
 // its layers by this table.
-constexpr std::array<std::string_view, 6> kInputScopes = {"NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC",
-                                                          "WB",            "SED"};
+constexpr std::array<std::string_view, 6> kInputScopes = {
+    "NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC", "WB", "SED"};
 
 constexpr std::array<std::string_view, 1> kNoScope = {"NOT_SPECIFIED"};
 

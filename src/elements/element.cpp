@@ -166,7 +166,9 @@ std::uint32_t CEL_Element::GetUid() const {
   return uid;
 }
 
-void ResetElementUids() { NextElementUid() = 0; }
+void ResetElementUids() {
+  NextElementUid() = 0;
+}
 
 void CEL_Element::Read(KvfNode section, int& status) {
   if (!kvfIsSection(section)) return;
@@ -334,7 +336,9 @@ int CEL_Element::SetFields(const std::vector<ElementField>& fields) {
   return SetBaseFields(fields) + SetOwnFields(fields);
 }
 
-void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) { RebuildOwner(); }
+void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) {
+  RebuildOwner();
+}
 
 void CEL_Element::RebuildOwner() {
   if (owner != nullptr) owner->RebuildSymbolTable();

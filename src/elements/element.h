@@ -29,8 +29,8 @@ struct PropertyRow {
   ChoiceSource choices = nullptr;
   std::string_view defaultText{};  ///< as it stands in the file
   double defaultNumber = 0.0;
-  bool readLast = false;    ///< a value that is read behind the bounds that limit it
-  bool listedLast = false;  ///< stands behind the others in the field list
+  bool readLast = false;        ///< a value that is read behind the bounds that limit it
+  bool listedLast = false;      ///< stands behind the others in the field list
   std::string_view onlyWith{};  ///< read only when the section has this keyword; without it the value stays
 };
 
@@ -100,7 +100,8 @@ class CEL_Element : public PropertyListener {
   void SetVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibilityGroup(std::int32_t group);
-  /// Takes memberships of the groups (or, within a group, levels) behind a removed one along to their new numbers.
+  /// Takes memberships of the groups (or, within a group, levels) behind a removed one along to their new
+  /// numbers.
   void CloseVisibilityGroupGap(std::int32_t removedGroup);
   void CloseVisibilityLevelGap(std::int32_t group, std::int32_t removedLevel);
 

@@ -65,8 +65,8 @@ bool CompileExpression(const CEL_Element& element, std::string_view caption, con
   std::int32_t line = 0;
   std::int32_t position = 0;
   std::string text;
-  if (ParseExpressionText(std::string(StripExpressionQuotes(expression.Text())), tree, line, position, text) !=
-      0) {
+  if (ParseExpressionText(std::string(StripExpressionQuotes(expression.Text())), tree, line, position,
+                          text) != 0) {
     return true;
   }
   Errors().ReportElementError(caption, element.MessageUid(), text);

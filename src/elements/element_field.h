@@ -8,7 +8,14 @@
 
 namespace tessal {
 
-enum class FieldKind : std::int32_t { Invalid = 0, Text = 1, Integer = 2, Real = 3, Boolean = 4, Expression = 5 };
+enum class FieldKind : std::int32_t {
+  Invalid = 0,
+  Text = 1,
+  Integer = 2,
+  Real = 3,
+  Boolean = 4,
+  Expression = 5
+};
 
 struct ElementField {
   FieldKind kind = FieldKind::Invalid;
@@ -18,8 +25,9 @@ struct ElementField {
   double realValue = 0.0;
   bool boolValue = false;
   bool flags[2] = {true, true};
-  std::vector<std::string> choiceTexts;                ///< the allowed texts of a field that has choices
-  std::vector<std::vector<ElementField>> choiceFields;  ///< for each allowed text, the fields that depend on it
+  std::vector<std::string> choiceTexts;  ///< the allowed texts of a field that has choices
+  std::vector<std::vector<ElementField>>
+      choiceFields;  ///< for each allowed text, the fields that depend on it
 };
 
 /// The value as text; "invalid" for a field without a kind.

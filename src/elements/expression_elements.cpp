@@ -61,7 +61,9 @@ CEL_ExpressionElement::CEL_ExpressionElement(std::int32_t kindNumber, std::strin
   SetUnitMode(UnitMode::Both);
 }
 
-void CEL_ExpressionElement::Reset() { ResetOwn(); }
+void CEL_ExpressionElement::Reset() {
+  ResetOwn();
+}
 
 bool CEL_ExpressionElement::Check() {
   const bool expressed = CheckExpression(*this, expression);

@@ -48,7 +48,9 @@ CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Eleme
   ListenTo({&publicName, &parameters, &usedAs});
 }
 
-void CEL_ExternalFunction::Reset() { ResetOwn(); }
+void CEL_ExternalFunction::Reset() {
+  ResetOwn();
+}
 
 void CEL_ExternalFunction::Read(KvfNode section, int& status) {
   CEL_Element::Read(section, status);

@@ -64,8 +64,8 @@ CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
   SetKind(input.kind);
   SetUnitMode(UnitMode::Both);
   unqType.SetChoices(UnitTypeChoices());
-  Bind(kRows, {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue,
-               &maxValue});
+  Bind(kRows,
+       {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
   ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
   CEL_Input::Reset();
 }

@@ -16,13 +16,9 @@ namespace {
 constexpr std::string_view kRadians = "Radians";
 constexpr std::array<std::string_view, 2> kAngleUnits = {kRadians, "Degree"};
 
-constexpr std::array<std::string_view, 7> kDebugLevels = {"No debug information",
-                                                          "Debug level 1",
-                                                          "Debug level 2",
-                                                          "Debug level 3",
-                                                          "Debug level 4",
-                                                          "Debug level 5",
-                                                          "Debug level 6"};
+constexpr std::array<std::string_view, 7> kDebugLevels = {
+    "No debug information", "Debug level 1", "Debug level 2", "Debug level 3",
+    "Debug level 4",        "Debug level 5", "Debug level 6"};
 
 const ChoiceList& AngleUnitChoices() {
   static const ChoiceList kList = MakeTextChoices(kAngleUnits);
@@ -117,7 +113,9 @@ void CEL_Miscanellous::Write(KvfHandle file, int& status) {
   if (!visibilities.groups.empty()) visibilities.Write(file, status);
 }
 
-bool CEL_Miscanellous::Check() { return CheckTextContent(*this); }
+bool CEL_Miscanellous::Check() {
+  return CheckTextContent(*this);
+}
 
 void CEL_Miscanellous::SetModifiedFlag(bool* flag) {
   templateModified = flag;
@@ -135,8 +133,8 @@ void CEL_Miscanellous::SetOwner(ElementOwner* template_) {
 }
 
 CEL_ExternalFunction& CEL_Miscanellous::AddExternalFunction() {
-  auto function =
-      std::make_unique<CEL_ExternalFunction>("External User Function " + std::to_string(functions.size() + 1));
+  auto function = std::make_unique<CEL_ExternalFunction>("External User Function " +
+                                                         std::to_string(functions.size() + 1));
   function->SetOwner(Owner());
   function->SetParent(this);
   function->SetModifiedFlag(templateModified);

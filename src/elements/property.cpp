@@ -45,9 +45,13 @@ CEL_Choice CEL_Choice::Boolean(std::string_view display, bool value) {
   return choice;
 }
 
-bool NotifyChanges() { return NotificationSwitch(); }
+bool NotifyChanges() {
+  return NotificationSwitch();
+}
 
-void SetNotifyChanges(bool on) { NotificationSwitch() = on; }
+void SetNotifyChanges(bool on) {
+  NotificationSwitch() = on;
+}
 
 std::string RealText(double value) {
   std::array<char, 32> buffer{};

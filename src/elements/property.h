@@ -22,7 +22,9 @@ enum class ValueType : std::int32_t {
 };
 
 /// Whether values of this type are text (types 4 to 7).
-constexpr bool IsTextType(ValueType type) { return type >= ValueType::Text; }
+constexpr bool IsTextType(ValueType type) {
+  return type >= ValueType::Text;
+}
 
 /// One allowed value of a property.
 struct CEL_Choice {

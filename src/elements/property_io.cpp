@@ -155,7 +155,8 @@ void WriteProperty(const CEL_Property& property, KvfHandle file, std::string_vie
       const double value = property.RealValue();
       const bool whole = std::trunc(value) == value;
       int result = kvfAddKeyword(file, key);
-      if (result == kKvfOk) result = kvfAddDouble(file, property.ForceReal() && whole ? value + kNudge : value);
+      if (result == kKvfOk)
+        result = kvfAddDouble(file, property.ForceReal() && whole ? value + kNudge : value);
       NoteWriteResult(result, key, element, status);
       break;
     }
@@ -174,8 +175,12 @@ void WriteProperty(const CEL_Property& property, KvfHandle file, std::string_vie
   }
 }
 
-const std::string& LastKeyError() { return LastKeyErrorText(); }
+const std::string& LastKeyError() {
+  return LastKeyErrorText();
+}
 
-void ClearLastKeyError() { LastKeyErrorText().clear(); }
+void ClearLastKeyError() {
+  LastKeyErrorText().clear();
+}
 
 }  // namespace tessal

@@ -31,8 +31,10 @@ bool HasKeyword(KvfNode section, std::string_view key);
 /// 3 under the element's symbol, and sets the status.
 void WriteProperty(const CEL_Property& property, KvfHandle file, std::string_view key, CEL_Element& element,
                    int& status);
-void WriteText(std::string_view text, KvfHandle file, std::string_view key, CEL_Element& element, int& status);
-void WriteInteger(std::int32_t value, KvfHandle file, std::string_view key, CEL_Element& element, int& status);
+void WriteText(std::string_view text, KvfHandle file, std::string_view key, CEL_Element& element,
+               int& status);
+void WriteInteger(std::int32_t value, KvfHandle file, std::string_view key, CEL_Element& element,
+                  int& status);
 
 /// Notes the result of a library call that added something: reports and sets the status unless it is 0.
 void NoteWriteResult(int result, std::string_view key, CEL_Element& element, int& status);

@@ -13,7 +13,9 @@ template <class Element>
 using Sequence = std::vector<std::unique_ptr<Element>>;
 
 /// The failure of every access beyond a sequence. The guards of load and save catch it.
-inline std::out_of_range SubscriptFailure() { return std::out_of_range("invalid vector<T> subscript"); }
+inline std::out_of_range SubscriptFailure() {
+  return std::out_of_range("invalid vector<T> subscript");
+}
 
 /// The element at a place from 0; raises the subscript failure when there is none.
 template <class Element>

@@ -83,7 +83,8 @@ std::string NotOfThisClass(std::string_view what, const CEL_Element& used, const
 }
 
 /// What a state variable's equation may use: the arithmetic expressions of its class.
-std::optional<ReferenceFinding> FindEquationFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
+std::optional<ReferenceFinding> FindEquationFault(const CEL_Element& used,
+                                                  const CEL_Lagrange_Specie& specie) {
   if (used.Kind() != kind::kArithmeticExpression) {
     return ReferenceFinding{"The symbol'" + used.symbol.Text() +
                             "' is not a process of the current current specie " + specie.symbol.Text()};

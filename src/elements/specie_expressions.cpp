@@ -14,9 +14,8 @@ constexpr std::string_view kProcessType = "PROCESS";
 constexpr std::array<std::string_view, 1> kVariations = {"PER_INDIVIDUAL"};
 
 const ChoiceList& ExpressionTypeChoices() {
-  static const ChoiceList kList = std::make_shared<const std::vector<CEL_Choice>>(
-      std::vector<CEL_Choice>{CEL_Choice::Text("Auxiliary variable", kAuxiliaryType),
-                              CEL_Choice::Text("Process", kProcessType)});
+  static const ChoiceList kList = std::make_shared<const std::vector<CEL_Choice>>(std::vector<CEL_Choice>{
+      CEL_Choice::Text("Auxiliary variable", kAuxiliaryType), CEL_Choice::Text("Process", kProcessType)});
   return kList;
 }
 
@@ -105,7 +104,9 @@ CEL_Lagrange_Vertical_Equation::CEL_Lagrange_Vertical_Equation(std::string_view 
   ListenTo({&speed});
 }
 
-bool CEL_Lagrange_Vertical_Equation::Check() { return CheckExpression(*this, speed); }
+bool CEL_Lagrange_Vertical_Equation::Check() {
+  return CheckExpression(*this, speed);
+}
 
 bool CEL_Lagrange_Vertical_Equation::ParseExpression() {
   return CompileExpression(*this, "vertical speed equation", speed, speedTree);

@@ -59,10 +59,16 @@ double VersionFromStamps(std::string_view branchStamp, std::string_view revision
   return release + NumberBehind(kRevisionPrefix, revisionStamp).value_or(1) * 0.001;
 }
 
-double SoftwareVersion() { return VersionFromStamps(kBranchStamp, kRevisionStamp, {}); }
+double SoftwareVersion() {
+  return VersionFromStamps(kBranchStamp, kRevisionStamp, {});
+}
 
-double ParserVersion() { return SoftwareVersion(); }
+double ParserVersion() {
+  return SoftwareVersion();
+}
 
-double RoundVersion(double version) { return std::floor(version * 1000.0 + 0.5) * 0.001; }
+double RoundVersion(double version) {
+  return std::floor(version * 1000.0 + 0.5) * 0.001;
+}
 
 }  // namespace tessal

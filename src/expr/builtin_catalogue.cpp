@@ -25,8 +25,10 @@ constexpr std::int32_t kFull = 3;
 /// The unit type "User defined" of the elements.
 constexpr std::int32_t kUserUnit = 999;
 
-constexpr std::array<std::string_view, 6> kLayers = {"NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC", "WB", "SED"};
-constexpr std::array<std::string_view, 4> kVariations = {"NONE", "NONE", "HORISONTAL", "HORISONTAL_AND_VERTICAL"};
+constexpr std::array<std::string_view, 6> kLayers = {
+    "NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC", "WB", "SED"};
+constexpr std::array<std::string_view, 4> kVariations = {"NONE", "NONE", "HORISONTAL",
+                                                         "HORISONTAL_AND_VERTICAL"};
 
 // Names, units without a denominator and limits are part of the vocabulary and stay as they are.
 constexpr CatalogueBuiltin kRows[] = {
@@ -43,7 +45,8 @@ constexpr CatalogueBuiltin kRows[] = {
     {"HORISONTAL_CURRENT_SPEED", 11, kForcing, kColumn, kFull, kUserUnit, "m/s", 0.2, 0, 10},
     {"HORISONTAL_CURRENT_DIRECTION", 12, kForcing, kColumn, kFull, kUserUnit, "degrees", 0, 0, 360},
     {"VERTICAL_CURRENT_SPEED", 13, kForcing, kColumn, kFull, kUserUnit, "m/s", 0, 0, 10},
-    {"WATER_SURFACE_SLOPE_IN_FLOW_DIRECTION", 14, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m/m", 0, -10, 10},
+    {"WATER_SURFACE_SLOPE_IN_FLOW_DIRECTION", 14, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m/m", 0, -10,
+     10},
     {"BED_AREA_OF_GRIDCELL", 15, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m2", 100000, 1e-07, 1e+10},
     {"FLOODED_AREA_OF_GRIDCELL", 16, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m2", 100000, 1e-07, 1e+10},
     {"SURFACE_AREA_OF_GRIDCELL", 17, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m2", 100000, 1e-07, 1e+10},
@@ -76,9 +79,12 @@ constexpr CatalogueBuiltin kRows[] = {
     {"CHEZY_NO", 44, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m^1/2 /s", 0, 0, 1e+10},
     {"WATER_SURFACE_WIDTH", 45, kForcing, kSurface, kHorizontal, kUserUnit, "m", 0, 0, 1e+10},
     {"HEAT_FLUX_WATER_ATMOSPHERE", 46, kForcing, kAnyLayer, kHorizontal, kUserUnit, "W/m2", 0, 0, 1e+10},
-    {"FLUVIOICE_LOCAL_VELO_AT_BORDER_ICE_WIDTH", 47, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m/s", 0, 0, 1e+10},
-    {"FLUVIOICE_BORDER_ICE_WIDTH_VLIM_PROGR", 48, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m", 0, 0, 1e+10},
-    {"FLUVIOICE_BORDER_ICE_WIDTH_VLIM_RETREAT", 49, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m", 0, 0, 1e+10},
+    {"FLUVIOICE_LOCAL_VELO_AT_BORDER_ICE_WIDTH", 47, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m/s", 0, 0,
+     1e+10},
+    {"FLUVIOICE_BORDER_ICE_WIDTH_VLIM_PROGR", 48, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m", 0, 0,
+     1e+10},
+    {"FLUVIOICE_BORDER_ICE_WIDTH_VLIM_RETREAT", 49, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m", 0, 0,
+     1e+10},
     {"FLUVIOICE_WATER_LEVEL_AT_FREEZEUP", 50, kForcing, kAnyLayer, kHorizontal, kUserUnit, "m", 0, 0, 1e+10},
     {"FLUVIOICE_KAPPA_DYNAMIC_PROGRESSION", 51, kForcing, kAnyLayer, kHorizontal, kUserUnit, "", 0, 0, 1e+10},
     {"FLUVIOICE_LEADING_EDGE_AT_NEXT_SECTION", 52, kForcing, kSurface, kHorizontal, kUserUnit, "", 0, 0, 1},
@@ -102,7 +108,8 @@ constexpr CatalogueBuiltin kRows[] = {
     {"LONGITUDE", 70, kConstant, kAnyLayer, kHorizontal, kUserUnit, "Degrees", 12, -180, 180},
     {"LAYER_CENTER_DEPTH", 71, kForcing, kColumn, kFull, kUserUnit, "m", 5, 0, 12000},
     {"FLOW_AREA", 72, kForcing, kSurface, kHorizontal, kUserUnit, "m^2", 0, 0, 1e+10},
-    {"RELATIVE_DEPTH", 73, kForcing, kSurface, kHorizontal, kUserUnit, "()", -1, -1, 1e+10},};
+    {"RELATIVE_DEPTH", 73, kForcing, kSurface, kHorizontal, kUserUnit, "()", -1, -1, 1e+10},
+};
 
 struct DeprecatedRange {
   std::int32_t first;
@@ -117,8 +124,9 @@ std::vector<std::int32_t> IdsByName(std::int32_t kind) {
   for (const CatalogueBuiltin& row : kRows) {
     if (row.kind == kind) rows.push_back(&row);
   }
-  std::sort(rows.begin(), rows.end(),
-            [](const CatalogueBuiltin* left, const CatalogueBuiltin* right) { return left->name < right->name; });
+  std::sort(rows.begin(), rows.end(), [](const CatalogueBuiltin* left, const CatalogueBuiltin* right) {
+    return left->name < right->name;
+  });
   std::vector<std::int32_t> ids;
   ids.reserve(rows.size());
   for (const CatalogueBuiltin* row : rows) ids.push_back(row->id);
@@ -160,8 +168,12 @@ bool IsDeprecatedBuiltin(std::int32_t id) {
                      [id](const DeprecatedRange& range) { return id >= range.first && id <= range.last; });
 }
 
-std::string_view LayerText(std::int32_t layer) { return TextAt(kLayers, layer); }
+std::string_view LayerText(std::int32_t layer) {
+  return TextAt(kLayers, layer);
+}
 
-std::string_view VariationText(std::int32_t variation) { return TextAt(kVariations, variation); }
+std::string_view VariationText(std::int32_t variation) {
+  return TextAt(kVariations, variation);
+}
 
 }  // namespace tessal

@@ -51,11 +51,24 @@ constexpr FunctionRow kRows[] = {
     {23, "ARRHENIUS20", "Arhenius20", 2, 1, 0, {"Temperature_Coefficient", "Temperature"}},
     {24, "OXYGENSATURATION", "OxygenSaturation", 2, 1, 0, {"Salinity", "Temperature"}},
     {25, "ARRHENIUS5", "Arhenius5", 2, 1, 0, {"Temperature_Coefficient", "Temperature"}},
-    {26, "LASSITER", "Lassiter", 2, 1, 0, {"Lassiter_Constant", "Growth_Rate_Mabce", "Growth_Optimum_Temperature", "Growth_Inhibition_Temperature", "Temperature"}},
+    {26,
+     "LASSITER",
+     "Lassiter",
+     2,
+     1,
+     0,
+     {"Lassiter_Constant", "Growth_Rate_Mabce", "Growth_Optimum_Temperature", "Growth_Inhibition_Temperature",
+      "Temperature"}},
     {27, "MICHAELIS_MENTEN1", "MichaelisMenten1", 2, 1, 0, {"Concentration", "Halfsaturation_Constant"}},
     {28, "MICHAELIS_MENTEN2", "MichaelisMenten2", 2, 1, 0, {"Concentration", "Constant"}},
     {29, "REVERSE_MICHAELIS_MENTEN", "ReverseMichaelisMenten", 2, 1, 0, {"Concentration"}},
-    {30, "SUNRISE", "Sunrise", 2, 1, 0, {"YEAR", "MONTH", "DAY", "Latitude", "Summertime_Correction_In_Hours"}},
+    {30,
+     "SUNRISE",
+     "Sunrise",
+     2,
+     1,
+     0,
+     {"YEAR", "MONTH", "DAY", "Latitude", "Summertime_Correction_In_Hours"}},
     {31, "SUNSET", "Sunset", 2, 1, 0, {"YEAR", "MONTH", "DAY", "Latitude", "Summertime_Correction_In_Hours"}},
     {32, "SECOND", "Second", 3, 1, 0, {"Time"}},
     {33, "MINUTE", "Minute", 3, 1, 0, {"Time"}},
@@ -63,18 +76,63 @@ constexpr FunctionRow kRows[] = {
     {35, "DAY", "Day", 3, 1, 0, {"Time"}},
     {36, "MONTH", "Month", 3, 1, 0, {"Time"}},
     {37, "YEAR", "Year", 3, 1, 0, {"Time"}},
-    {38, "LAMBERT_BEER_1", "LambertBeer1", 2, 3, 1, {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
-    {39, "LAMBERT_BEER_2", "LambertBeer2", 2, 3, 2, {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
+    {38,
+     "LAMBERT_BEER_1",
+     "LambertBeer1",
+     2,
+     3,
+     1,
+     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
+    {39,
+     "LAMBERT_BEER_2",
+     "LambertBeer2",
+     2,
+     3,
+     2,
+     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
     {40, "OXYGENSATURATION_WEISS", "OxygenSaturation_Weiss", 2, 1, 0, {"Salinity", "Temperature"}},
     {41, "RELATIVE_DAYLENGTH", "RelativeDaylength", 2, 1, 0, {"YEAR", "MONTH", "DAY", "Latitude"}},
     {42, "PI", "PI", 2, 1, 0, {}},
     {43, "EXCEEDANCE_FREQUENCY", "ExceedFreq", 2, 1, 0, {"ntrue", "ntota"}},
     {44, "ANUTRC11", "Anutrc11", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "cn11", "cn12", "cn13"}},
-    {45, "ANUTRC12", "Anutrc12", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "pc2", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23"}},
-    {46, "ANUTRC22", "Anutrc22", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "pc2", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23"}},
-    {47, "ANUTRC13", "Anutrc13", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31", "cn32", "cn33"}},
-    {48, "ANUTRC23", "Anutrc23", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31", "cn32", "cn33"}},
-    {49, "ANUTRC33", "Anutrc33", 2, 1, 0, {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31", "cn32", "cn33"}},
+    {45,
+     "ANUTRC12",
+     "Anutrc12",
+     2,
+     1,
+     0,
+     {"nutr", "kadnutr", "ptam", "pc1", "pc2", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23"}},
+    {46,
+     "ANUTRC22",
+     "Anutrc22",
+     2,
+     1,
+     0,
+     {"nutr", "kadnutr", "ptam", "pc1", "pc2", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23"}},
+    {47,
+     "ANUTRC13",
+     "Anutrc13",
+     2,
+     1,
+     0,
+     {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31",
+      "cn32", "cn33"}},
+    {48,
+     "ANUTRC23",
+     "Anutrc23",
+     2,
+     1,
+     0,
+     {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31",
+      "cn32", "cn33"}},
+    {49,
+     "ANUTRC33",
+     "Anutrc33",
+     2,
+     1,
+     0,
+     {"nutr", "kadnutr", "ptam", "pc1", "pc2", "pc3", "cn11", "cn12", "cn13", "cn21", "cn22", "cn23", "cn31",
+      "cn32", "cn33"}},
     {50, "RAND", "RandomNumber", 2, 1, 0, {}},
     {51, "U_RAND", "U_Rand", 2, 1, 0, {}},
     {52, "U_RAND2", "U_Rand2", 2, 1, 0, {"Min", "Max"}},
@@ -89,11 +147,23 @@ constexpr FunctionRow kRows[] = {
     {61, "GETDISTANCE", "GetDistance", 2, 1, 0, {"X1", "Y1", "Z1", "X2", "Y2", "Z2"}},
     {62, "GETANGLE", "GetAngle", 2, 1, 0, {"X1", "Y1", "X2", "Y2"}},
     {63, "RESULTINGSPEED", "ResultingSpeed", 2, 1, 0, {"Speed1", "Direction1", "Speed2", "Direction2"}},
-    {64, "RESULTINGDIRECTION", "ResultingDirection", 2, 1, 0, {"Speed1", "Direction1", "Speed2", "Direction2"}},
+    {64,
+     "RESULTINGDIRECTION",
+     "ResultingDirection",
+     2,
+     1,
+     0,
+     {"Speed1", "Direction1", "Speed2", "Direction2"}},
     {65, "ANGLEBETWEEN", "AngleBetween", 2, 1, 0, {"Speed1", "Direction1", "Speed2", "Direction2"}},
     {66, "TESTHITSTATE", "TestHitstate", 2, 1, 0, {"Testvalue", "Conditions"}},
     {67, "MOD", "Mod", 2, 1, 0, {"value", "divisor"}},
-    {68, "SECCHI_DEPTH", "SECCHI_DETPH_func", 4, 1, 0, {"Light extinction coefficient", "Damping_percentage"}},
+    {68,
+     "SECCHI_DEPTH",
+     "SECCHI_DETPH_func",
+     4,
+     1,
+     0,
+     {"Light extinction coefficient", "Damping_percentage"}},
     {69, "AVERAGE_WATER_COLUMN", "AVERAGE_WATER_COLUMN_func", 5, 1, 0, {"State variable"}},
     {70, "SMOOTHING_AVERAGE", "SMOOTHING_AVERAGE_func", 6, 1, 0, {"State variable", "weight alpha"}},
     {71, "MOVING_AVERAGE", "MOVING_AVERAGE_func", 7, 1, 0, {"State variable", "timesteps"}},
@@ -155,8 +225,20 @@ constexpr FunctionRow kRows[] = {
     {126, "GET_CO3", "Get_CO3", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {127, "GET_CO2", "Get_CO2", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {128, "GET_FCO2", "Get_fCO2", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
-    {129, "GET_DIC_EST", "Get_DIC_estimate", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
-    {130, "GET_ALK_EST", "Get_ALK_estimate", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
+    {129,
+     "GET_DIC_EST",
+     "Get_DIC_estimate",
+     2,
+     1,
+     0,
+     {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
+    {130,
+     "GET_ALK_EST",
+     "Get_ALK_estimate",
+     2,
+     1,
+     0,
+     {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {131, "GET_CALK", "Get_CALK", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {132, "GET_BALK", "Get_BALK", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {133, "GET_SIALK", "Get_SiALK", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
@@ -164,9 +246,16 @@ constexpr FunctionRow kRows[] = {
     {135, "GET_HF", "Get_HF", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {136, "GET_HFREE", "Get_HFree", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
     {137, "GET_HSO4", "Get_HSO4", 2, 1, 0, {"pH", "DIC", "Alkalinity", "Salinity", "Temperature", "Depth"}},
-    {139, "LAMBERT_BEER_AVR", "LambertBeerAvr", 2, 1, 0, {"Surface_Light", "Depth", "Light_Extinction_Coefficient"}},
+    {139,
+     "LAMBERT_BEER_AVR",
+     "LambertBeerAvr",
+     2,
+     1,
+     0,
+     {"Surface_Light", "Depth", "Light_Extinction_Coefficient"}},
     {140, "SIGN", "Sign", 1, 1, 0, {"x"}},
-    {141, "MOONPHASE", "MoonPhase", 2, 1, 0, {"Year", "Month", "Day", "Hour", "Minute", "Second"}},};
+    {141, "MOONPHASE", "MoonPhase", 2, 1, 0, {"Year", "Month", "Day", "Hour", "Minute", "Second"}},
+};
 
 constexpr std::array<CatalogueGroup, 2> kGroups = {{{"Mathematica", 1}, {"Some other group", 2}}};
 
@@ -196,8 +285,8 @@ CatalogueFunction MakeFunction(const FunctionRow& row) {
   function.id = row.id;
   function.functionClass = row.functionClass;
   function.firstFlag = row.firstFlag;
-  function.argumentCount = static_cast<std::int32_t>(
-      std::count_if(row.arguments.begin(), row.arguments.end(), [](std::string_view name) { return !name.empty(); }));
+  function.argumentCount = static_cast<std::int32_t>(std::count_if(
+      row.arguments.begin(), row.arguments.end(), [](std::string_view name) { return !name.empty(); }));
   function.variant = row.variant;
   // Set-up overwrites the engine's name with the catalogue's own.
   function.internalName = function.name;
@@ -214,7 +303,8 @@ struct Catalogue {
       }
     }
     // Behind the last insertion, so that the keys stay where they are.
-    for (std::size_t place = 0; place < functions.size(); ++place) byName.emplace(functions[place].name, place);
+    for (std::size_t place = 0; place < functions.size(); ++place)
+      byName.emplace(functions[place].name, place);
   }
 
   std::vector<CatalogueFunction> functions;
@@ -236,8 +326,9 @@ const CatalogueFunction* FindExact(std::string_view upperName) {
 
 void SetEvaluators(std::vector<CatalogueFunction>& functions) {
   for (const EvaluatorRow& row : Evaluators()) {
-    const auto hit = std::find_if(functions.begin(), functions.end(),
-                                  [&row](const CatalogueFunction& function) { return function.name == row.name; });
+    const auto hit =
+        std::find_if(functions.begin(), functions.end(),
+                     [&row](const CatalogueFunction& function) { return function.name == row.name; });
     if (hit != functions.end()) hit->evaluator = row.evaluator;
   }
 }
@@ -258,13 +349,21 @@ void ReleaseCatalogues() {
   if (catalogue.users > 0 && --catalogue.users == 0) ReleaseCarbonate();
 }
 
-const std::vector<CatalogueFunction>& Functions() { return TheCatalogue().functions; }
+const std::vector<CatalogueFunction>& Functions() {
+  return TheCatalogue().functions;
+}
 
-const std::vector<CatalogueArgument>& Arguments() { return TheCatalogue().arguments; }
+const std::vector<CatalogueArgument>& Arguments() {
+  return TheCatalogue().arguments;
+}
 
-const std::array<CatalogueGroup, 2>& Groups() { return kGroups; }
+const std::array<CatalogueGroup, 2>& Groups() {
+  return kGroups;
+}
 
-const CatalogueFunction* FindFunction(std::string_view name) { return FindExact(UpperCase(name)); }
+const CatalogueFunction* FindFunction(std::string_view name) {
+  return FindExact(UpperCase(name));
+}
 
 int FindFunctionUpper(std::string_view name, std::string& internalName, std::int32_t& argumentCount,
                       std::int32_t& functionClass, std::int32_t& id) {
@@ -288,10 +387,10 @@ std::uint32_t GetFunctionById(std::int32_t id, CatalogueFunction& record) {
 
 std::uint32_t GetArgumentName(std::int32_t functionId, std::int32_t position, std::string& name) {
   const auto& arguments = Arguments();
-  const auto hit =
-      std::find_if(arguments.begin(), arguments.end(), [functionId, position](const CatalogueArgument& argument) {
-        return argument.functionId == functionId && argument.position == position;
-      });
+  const auto hit = std::find_if(arguments.begin(), arguments.end(),
+                                [functionId, position](const CatalogueArgument& argument) {
+                                  return argument.functionId == functionId && argument.position == position;
+                                });
   if (hit == arguments.end()) return kCatalogueNotFound;
   name = hit->name;
   return 0;

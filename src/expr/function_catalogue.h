@@ -19,7 +19,8 @@ inline constexpr std::uint32_t kCatalogueNotFound = 0x80040306U;
 struct CatalogueFunction {
   std::string name;  ///< in upper case
   std::int32_t id = 0;
-  std::int32_t functionClass = 0;  ///< 1 plain mathematics, 3 calendar of a time, 4 to 7 one each, 2 all others
+  std::int32_t functionClass =
+      0;  ///< 1 plain mathematics, 3 calendar of a time, 4 to 7 one each, 2 all others
   std::int32_t firstFlag = 1;
   std::int32_t secondFlag = 1;
   std::int32_t argumentCount = 0;
@@ -40,7 +41,8 @@ struct CatalogueGroup {
   std::int32_t id;
 };
 
-/// Counts one more user; the first one sets the catalogues up and reads the option file of the current folder.
+/// Counts one more user; the first one sets the catalogues up and reads the option file of the current
+/// folder.
 void InitCatalogues();
 /// Counts one user fewer; behind the last one the state that belongs to the catalogues is released.
 void ReleaseCatalogues();

@@ -8,8 +8,8 @@
 
 namespace tessal {
 
-/// The identifiers of a stored expression, its quotes stripped, in text order with repeats. None when the text
-/// holds something that is no token.
+/// The identifiers of a stored expression, its quotes stripped, in text order with repeats. None when the
+/// text holds something that is no token.
 void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers);
 
 /// The same over a text without quotes, as views into it.

@@ -10,9 +10,13 @@ namespace {
 /// Identifiers and numbers fit a buffer of this size with their terminator, or fail the parse.
 constexpr std::size_t kLexemeBuffer = 1000;
 
-std::string TextOf(LexemeSpan lexeme) { return {lexeme.start, lexeme.length}; }
+std::string TextOf(LexemeSpan lexeme) {
+  return {lexeme.start, lexeme.length};
+}
 
-bool HasLexeme(std::int32_t code) { return code >= token::kIdentifier && code <= token::kScientificNum; }
+bool HasLexeme(std::int32_t code) {
+  return code >= token::kIdentifier && code <= token::kScientificNum;
+}
 
 constexpr std::array<const char*, 6> kModlistFields = {"SV1", "SV2", "cpy12", "cpy21", "red1", "red2"};
 

@@ -10,21 +10,49 @@ namespace tessal {
 
 namespace {
 
-constexpr std::array<std::string_view, 36> kTokenNames = {
-    "IDENTIFIER",     "INT_NUM",           "FLOAT_NUM",       "SCIENTIFIC_NUM",
-    "ADD_OP_PLUS",    "ADD_OP_MINUS",      "MUL_OP_MULTIPLY", "MUL_OP_DIVIDE",
-    "COMMA",          "LEFT_BRACKET",      "RIGHT_BRACKET",   "LEFT_SQUARE",
-    "RIGHT_SQUARE",   "LEFT_CURLY",        "RIGHT_CURLY",     "EQUAL",
-    "NOT_EQUAL",      "BIGGER",            "SMALLER",         "BIGGER_OR_EQUAL",
-    "SMALLER_OR_EQUAL", "IF",              "THEN",            "ELSE",
-    "NOT_OP",         "AND_OP",            "OR_OP",           "DIRECT_ASSIGN",
-    "DIRECT_PLUS",    "DIRECT_MINUS",      "DIRECT_MULTIPLY", "DIRECT_DIVIDE",
-    "RVAL_ID",        "EXCEEDANCE_FREQUENCY", "U_PLUS",       "U_MINUS"};
+constexpr std::array<std::string_view, 36> kTokenNames = {"IDENTIFIER",
+                                                          "INT_NUM",
+                                                          "FLOAT_NUM",
+                                                          "SCIENTIFIC_NUM",
+                                                          "ADD_OP_PLUS",
+                                                          "ADD_OP_MINUS",
+                                                          "MUL_OP_MULTIPLY",
+                                                          "MUL_OP_DIVIDE",
+                                                          "COMMA",
+                                                          "LEFT_BRACKET",
+                                                          "RIGHT_BRACKET",
+                                                          "LEFT_SQUARE",
+                                                          "RIGHT_SQUARE",
+                                                          "LEFT_CURLY",
+                                                          "RIGHT_CURLY",
+                                                          "EQUAL",
+                                                          "NOT_EQUAL",
+                                                          "BIGGER",
+                                                          "SMALLER",
+                                                          "BIGGER_OR_EQUAL",
+                                                          "SMALLER_OR_EQUAL",
+                                                          "IF",
+                                                          "THEN",
+                                                          "ELSE",
+                                                          "NOT_OP",
+                                                          "AND_OP",
+                                                          "OR_OP",
+                                                          "DIRECT_ASSIGN",
+                                                          "DIRECT_PLUS",
+                                                          "DIRECT_MINUS",
+                                                          "DIRECT_MULTIPLY",
+                                                          "DIRECT_DIVIDE",
+                                                          "RVAL_ID",
+                                                          "EXCEEDANCE_FREQUENCY",
+                                                          "U_PLUS",
+                                                          "U_MINUS"};
 
 /// What a listed token outside the plain ones is shown as.
 constexpr std::int32_t kListedAsOther = token::kExceedanceFrequency;
 
-bool IsListed(std::int32_t code) { return code >= token::kIdentifier && code <= token::kRvalId; }
+bool IsListed(std::int32_t code) {
+  return code >= token::kIdentifier && code <= token::kRvalId;
+}
 
 ExpressionToken MakeToken(const ExpressionScan& scan, std::int32_t code) {
   const std::string_view lexeme = scan.Lexeme();
@@ -59,17 +87,29 @@ ExpressionScan::ExpressionScan(std::string_view text) {
   BeginFlexScan(text.data(), text.size());
 }
 
-ExpressionScan::~ExpressionScan() { EndFlexScan(); }
+ExpressionScan::~ExpressionScan() {
+  EndFlexScan();
+}
 
-std::int32_t ExpressionScan::Next() { return NextFlexToken(); }
+std::int32_t ExpressionScan::Next() {
+  return NextFlexToken();
+}
 
-std::string_view ExpressionScan::Lexeme() const { return FlexLexeme(); }
+std::string_view ExpressionScan::Lexeme() const {
+  return FlexLexeme();
+}
 
-std::uint32_t ExpressionScan::Consumed() const { return ScannerCounters().consumed; }
+std::uint32_t ExpressionScan::Consumed() const {
+  return ScannerCounters().consumed;
+}
 
-std::uint32_t ExpressionScan::Lines() const { return ScannerCounters().lines; }
+std::uint32_t ExpressionScan::Lines() const {
+  return ScannerCounters().lines;
+}
 
-std::uint32_t ExpressionScan::LineStart() const { return ScannerCounters().lineStart; }
+std::uint32_t ExpressionScan::LineStart() const {
+  return ScannerCounters().lineStart;
+}
 
 bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& tokens) {
   tokens.clear();
@@ -89,6 +129,8 @@ std::string_view StripExpressionQuotes(std::string_view stored) {
   return last == first ? stored.substr(first + 1) : stored.substr(first + 1, last - first - 1);
 }
 
-void ResetExpressionScanner() { ResetFlexState(); }
+void ResetExpressionScanner() {
+  ResetFlexState();
+}
 
 }  // namespace tessal

@@ -1,7 +1,7 @@
 // Turns the text of an expression into tokens. The parser pulls one token at a time; the colouring of the
 // editor and the search for identifiers list all tokens of a text.
-// There is one scanner in the process. Its start state outlives a scan: a text that ends inside an open comment
-// leaves the next one in it.
+// There is one scanner in the process. Its start state outlives a scan: a text that ends inside an open
+// comment leaves the next one in it.
 #pragma once
 
 #include <cstdint>

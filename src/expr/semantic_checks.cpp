@@ -16,11 +16,12 @@ namespace tessal {
 namespace {
 
 constexpr std::array<std::string_view, 24> kProperties = {
-    "XPOS",      "YPOS",      "ZPOS",      "HITSTATE",      "AGE",          "HDIR",
-    "HSPEED",    "VSPEED",    "PROJ_XPOS", "PROJ_YPOS",     "PROJ_ZPOS",    "PROJ_HITSTATE",
+    "XPOS",         "YPOS",          "ZPOS",      "HITSTATE",  "AGE",       "HDIR",
+    "HSPEED",       "VSPEED",        "PROJ_XPOS", "PROJ_YPOS", "PROJ_ZPOS", "PROJ_HITSTATE",
     "ABOVE_GROUND", "BELOW_SURFACE", "PREV_XPOS", "PREV_YPOS", "PREV_ZPOS", "PREV_HITSTATE",
-    "PARTICLEID", "SOURCEID", "PROJ_TIME", "VIEWANGLE",     "ALIVE",        "ALL"};
-constexpr std::array<std::string_view, 6> kVerbs = {"CREATE", "REMOVE", "KILL", "TRANSFER", "SPLIT", "GETVALUE"};
+    "PARTICLEID",   "SOURCEID",      "PROJ_TIME", "VIEWANGLE", "ALIVE",     "ALL"};
+constexpr std::array<std::string_view, 6> kVerbs = {"CREATE",   "REMOVE", "KILL",
+                                                    "TRANSFER", "SPLIT",  "GETVALUE"};
 constexpr std::array<std::string_view, 3> kConditionalWords = {"IF", "THEN", "ELSE"};
 
 template <class Words>
@@ -32,7 +33,9 @@ bool IsLetter(char character) {
   return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
 }
 
-bool IsDigit(char character) { return character >= '0' && character <= '9'; }
+bool IsDigit(char character) {
+  return character >= '0' && character <= '9';
+}
 
 std::string UpperCase(std::string_view text) {
   std::string upper(text);
@@ -135,11 +138,17 @@ int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::str
   return parsed;
 }
 
-bool IsPropertyName(std::string_view text) { return Holds(kProperties, text); }
+bool IsPropertyName(std::string_view text) {
+  return Holds(kProperties, text);
+}
 
-bool IsInteractionVerb(std::string_view text) { return Holds(kVerbs, text); }
+bool IsInteractionVerb(std::string_view text) {
+  return Holds(kVerbs, text);
+}
 
-bool IsConditionalWord(std::string_view text) { return Holds(kConditionalWords, text); }
+bool IsConditionalWord(std::string_view text) {
+  return Holds(kConditionalWords, text);
+}
 
 bool IsValidSymbolSpelling(std::string_view text) {
   if (text.empty() || !IsLetter(text.front())) return false;

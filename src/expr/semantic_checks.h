@@ -1,5 +1,5 @@
-// What the grammar cannot see: that each called function exists and gets the right number of arguments, that a
-// particle property is a known one, and which texts may serve as symbols.
+// What the grammar cannot see: that each called function exists and gets the right number of arguments, that
+// a particle property is a known one, and which texts may serve as symbols.
 #pragma once
 
 #include <cstdint>

@@ -15,7 +15,9 @@ bool RegisterUserFunctionName(std::string_view name) {
   return true;
 }
 
-void UnregisterUserFunctionName(std::string_view name) { std::erase(UserFunctionNames(), name); }
+void UnregisterUserFunctionName(std::string_view name) {
+  std::erase(UserFunctionNames(), name);
+}
 
 bool IsUserFunctionName(std::string_view name) {
   const auto& names = UserFunctionNames();

@@ -1,5 +1,5 @@
-// The public names of the plug-in user functions, which expressions may call beside the catalogue. One list of
-// the process.
+// The public names of the plug-in user functions, which expressions may call beside the catalogue. One list
+// of the process.
 #pragma once
 
 #include <string>

@@ -1,5 +1,5 @@
-// Comparing two item trees, with a report of what differs. Comments never count, and an item without a partner
-// makes no difference by itself: it is told only beside a real one.
+// Comparing two item trees, with a report of what differs. Comments never count, and an item without a
+// partner makes no difference by itself: it is told only beside a real one.
 #include <array>
 #include <ostream>
 #include <regex>
@@ -81,7 +81,8 @@ class CKvfSectionItem::Comparison final {
     for (const auto& child : left.children) {
       switch (child->ItemKind()) {
         case kSection:
-          differences += CompareSections(static_cast<CKvfSectionItem&>(*child), partners.sections[child->name]);
+          differences +=
+              CompareSections(static_cast<CKvfSectionItem&>(*child), partners.sections[child->name]);
           break;
         case kKeyword:
           if (IsIgnored(child->name, ignored)) {

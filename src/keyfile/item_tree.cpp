@@ -154,8 +154,9 @@ void CKvfSectionItem::Clear() {
 }
 
 std::size_t CKvfSectionItem::CountChildren(Kind childKind) const {
-  return static_cast<std::size_t>(std::count_if(
-      children.begin(), children.end(), [childKind](const auto& child) { return child->ItemKind() == childKind; }));
+  return static_cast<std::size_t>(
+      std::count_if(children.begin(), children.end(),
+                    [childKind](const auto& child) { return child->ItemKind() == childKind; }));
 }
 
 CKvfBaseItem* CKvfSectionItem::ChildByKind(std::size_t index, Kind childKind) const {

@@ -1,5 +1,5 @@
-// A key file as a tree of items: sections hold keywords, comments and further sections, in file order. The tree
-// writes itself back as text and compares itself with another tree.
+// A key file as a tree of items: sections hold keywords, comments and further sections, in file order. The
+// tree writes itself back as text and compares itself with another tree.
 #pragma once
 
 #include <cstddef>
@@ -30,8 +30,8 @@ class CKvfBaseItem {
   virtual ~CKvfBaseItem() = default;
 
   virtual void SetDepth(std::size_t newDepth) { depth = newDepth; }
-  /// Whether the items are equal; differences go to the report, where there is one. A faulty regular expression
-  /// among the ignored names raises `std::regex_error`.
+  /// Whether the items are equal; differences go to the report, where there is one. A faulty regular
+  /// expression among the ignored names raises `std::regex_error`.
   virtual bool Compare(CKvfBaseItem& other, std::ostream* report, const IgnoredNames* ignoreNames,
                        bool onlyKeywords);
   virtual void Write(std::ostream& stream) const;

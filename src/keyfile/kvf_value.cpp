@@ -19,13 +19,21 @@ const Type& Get(const Content& content) {
 
 }  // namespace
 
-bool KvfValue::AsBoolean() const { return Get<bool>(content); }
+bool KvfValue::AsBoolean() const {
+  return Get<bool>(content);
+}
 
-std::int32_t KvfValue::AsInteger() const { return Get<std::int32_t>(content); }
+std::int32_t KvfValue::AsInteger() const {
+  return Get<std::int32_t>(content);
+}
 
-double KvfValue::AsReal() const { return Get<double>(content); }
+double KvfValue::AsReal() const {
+  return Get<double>(content);
+}
 
-const std::string& KvfValue::AsString() const { return Get<std::string>(content); }
+const std::string& KvfValue::AsString() const {
+  return Get<std::string>(content);
+}
 
 void KvfValue::Write(std::ostream& stream) const {
   switch (tag) {

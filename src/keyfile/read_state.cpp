@@ -58,7 +58,9 @@ std::uint32_t ReadState::PrependTarget(std::uint32_t section, std::uint32_t targ
   return targets;
 }
 
-std::uint32_t ReadState::NewSection() { return PutItem(std::make_unique<CKvfSectionItem>()); }
+std::uint32_t ReadState::NewSection() {
+  return PutItem(std::make_unique<CKvfSectionItem>());
+}
 
 namespace {
 
@@ -103,9 +105,13 @@ std::uint32_t ReadState::BooleanValue(std::uint32_t text) {
   return PutValue(KvfValue::Boolean(word.front() == 't' || word.front() == 'T'));
 }
 
-std::uint32_t ReadState::QuotedValue(std::uint32_t text) { return PutValue(KvfValue::Quoted(TextAt(text))); }
+std::uint32_t ReadState::QuotedValue(std::uint32_t text) {
+  return PutValue(KvfValue::Quoted(TextAt(text)));
+}
 
-std::uint32_t ReadState::PathValue(std::uint32_t text) { return PutValue(KvfValue::Path(TextAt(text))); }
+std::uint32_t ReadState::PathValue(std::uint32_t text) {
+  return PutValue(KvfValue::Path(TextAt(text)));
+}
 
 std::uint32_t ReadState::NewKey(std::uint32_t value) {
   const std::uint32_t key = PutItem(std::make_unique<CKvfKeyItem>());

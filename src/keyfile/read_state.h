@@ -1,6 +1,6 @@
-// What one read of a key file works on: the scanner's counters, the texts and items under construction, and the
-// failure text. The generated parser's values are places in the stores here, so that a failed read releases
-// everything.
+// What one read of a key file works on: the scanner's counters, the texts and items under construction, and
+// the failure text. The generated parser's values are places in the stores here, so that a failed read
+// releases everything.
 #pragma once
 
 #include <cstdint>

@@ -20,9 +20,13 @@ std::string& FailureText() {
 
 }  // namespace
 
-const std::string& KeyFileFailureText() { return FailureText(); }
+const std::string& KeyFileFailureText() {
+  return FailureText();
+}
 
-std::uintmax_t KeyFileSize(const std::string& path) { return FileSize(path); }
+std::uintmax_t KeyFileSize(const std::string& path) {
+  return FileSize(path);
+}
 
 int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target) {
   FailureText().clear();

@@ -6,7 +6,9 @@
 
 namespace tessal {
 
-bool CDocument::OnOpenDocument(const std::string& path) { return !path.empty(); }
+bool CDocument::OnOpenDocument(const std::string& path) {
+  return !path.empty();
+}
 
 void CDocument::SetPathName(const std::string& path) {
   pathName = path;
@@ -17,7 +19,9 @@ void CDocument::AddView(CView& view) {
   if (std::find(views.begin(), views.end(), &view) == views.end()) views.push_back(&view);
 }
 
-void CDocument::RemoveView(CView& view) { std::erase(views, &view); }
+void CDocument::RemoveView(CView& view) {
+  std::erase(views, &view);
+}
 
 void CDocument::UpdateAllViews(const CView* sender, int hint, const UpdateHint* argument) {
   // Over a copy: a view may go, or a new one come, while the others are told.

@@ -98,7 +98,15 @@ class CMultiDocTemplate final {
   CMultiDocTemplate(int resourceNumber, const std::string& resourceText, DocumentFactory documentFactory,
                     ViewFactory viewFactory);
 
-  enum Name { kWindowTitle, kDocumentName, kNewFileName, kFilterName, kFilterExtension, kFileTypeId, kFileTypeName };
+  enum Name {
+    kWindowTitle,
+    kDocumentName,
+    kNewFileName,
+    kFilterName,
+    kFilterExtension,
+    kFileTypeId,
+    kFileTypeName
+  };
 
   int ResourceNumber() const { return resource; }
   /// One of the names; empty when the resource text has none.

@@ -1,5 +1,5 @@
-// Whole files: reading them, writing them, and putting a new one in the place of an old one so that nobody ever
-// sees half of it. Every failure is told in words.
+// Whole files: reading them, writing them, and putting a new one in the place of an old one so that nobody
+// ever sees half of it. Every failure is told in words.
 #pragma once
 
 #include <cstdint>

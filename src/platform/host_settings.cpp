@@ -15,8 +15,12 @@ std::string FromEnvironment(const char* name) {
 
 }  // namespace
 
-std::string InstallRoot() { return FromEnvironment("TESSAL_INSTALL_ROOT"); }
+std::string InstallRoot() {
+  return FromEnvironment("TESSAL_INSTALL_ROOT");
+}
 
-std::string ManualsAddress() { return FromEnvironment("TESSAL_MANUALS_URI").substr(0, kLongestAddress); }
+std::string ManualsAddress() {
+  return FromEnvironment("TESSAL_MANUALS_URI").substr(0, kLongestAddress);
+}
 
 }  // namespace tessal

@@ -51,9 +51,8 @@ KvfHandle Keep(std::unique_ptr<KvfImage> image) {
 
 bool SameName(std::string_view left, std::string_view right) {
   return left.size() == right.size() &&
-         std::equal(left.begin(), left.end(), right.begin(), [](unsigned char a, unsigned char b) {
-           return std::tolower(a) == std::tolower(b);
-         });
+         std::equal(left.begin(), left.end(), right.begin(),
+                    [](unsigned char a, unsigned char b) { return std::tolower(a) == std::tolower(b); });
 }
 
 KvfNode NthOfName(const std::vector<KvfItem*>& items, std::string_view name, int number) {
@@ -131,7 +130,9 @@ KvfHandle kvfLoadText(std::string_view bytes) {
   return Keep(std::move(image));
 }
 
-int kvfGetErrorGlb() { return TheLibrary().lastError; }
+int kvfGetErrorGlb() {
+  return TheLibrary().lastError;
+}
 
 int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& text) {
   const Library& library = TheLibrary();
@@ -142,7 +143,9 @@ int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& tex
   return kKvfOk;
 }
 
-KvfHandle kvfCreate() { return Keep(std::make_unique<KvfImage>()); }
+KvfHandle kvfCreate() {
+  return Keep(std::make_unique<KvfImage>());
+}
 
 void kvfClose(KvfHandle* handle) {
   if (handle == nullptr || *handle == 0) return;
@@ -167,14 +170,18 @@ KvfNode kvfSectionByNum(KvfNode node, int number) {
   return Is(node, KvfItem::Type::Section) ? Nth(node->sections, number) : nullptr;
 }
 
-bool kvfIsSection(KvfNode node) { return node != nullptr && node->type == KvfItem::Type::Section; }
+bool kvfIsSection(KvfNode node) {
+  return node != nullptr && node->type == KvfItem::Type::Section;
+}
 
 std::string kvfGetNameGlb(KvfNode node) {
   const bool named = node != nullptr && node->type != KvfItem::Type::Parameter;
   return named ? node->text : std::string();
 }
 
-int kvfGetLine(KvfNode node) { return node == nullptr ? 0 : node->line; }
+int kvfGetLine(KvfNode node) {
+  return node == nullptr ? 0 : node->line;
+}
 
 KvfNode kvfKeywordByNameNum(KvfNode section, std::string_view name, int number) {
   return Is(section, KvfItem::Type::Section) ? NthOfName(section->keywords, name, number) : nullptr;
@@ -208,9 +215,13 @@ int kvfGetString(KvfNode parameter, std::string& value) {
   return kKvfOk;
 }
 
-int kvfAddTarget(KvfHandle handle, std::string_view name) { return OpenSection(handle, name, true); }
+int kvfAddTarget(KvfHandle handle, std::string_view name) {
+  return OpenSection(handle, name, true);
+}
 
-int kvfAddSection(KvfHandle handle, std::string_view name) { return OpenSection(handle, name, false); }
+int kvfAddSection(KvfHandle handle, std::string_view name) {
+  return OpenSection(handle, name, false);
+}
 
 int kvfEndSection(KvfHandle handle) {
   KvfImage* image = ImageOf(handle);
@@ -254,6 +265,8 @@ int kvfWrite(KvfHandle handle, const std::string& path) {
   return TheLibrary().writeFailure.empty() ? kKvfOk : Note(kKvfWriteFailed);
 }
 
-std::string kvfGetWriteFailure() { return TheLibrary().writeFailure; }
+std::string kvfGetWriteFailure() {
+  return TheLibrary().writeFailure;
+}
 
 }  // namespace tessal

@@ -1,5 +1,5 @@
-// Reading and writing the images of the key-file library. Reading is milder than the grammar of the item tree:
-// no line feed is needed at either end, and comments may stand anywhere a line may.
+// Reading and writing the images of the key-file library. Reading is milder than the grammar of the item
+// tree: no line feed is needed at either end, and comments may stand anywhere a line may.
 #include <algorithm>
 #include <cctype>
 #include <utility>
@@ -19,16 +19,20 @@ constexpr std::string_view kHeader =
 constexpr std::size_t kBlanksPerLevel = 3;
 constexpr std::size_t kLongestNear = 40;
 
-bool IsDigit(char character) { return character >= '0' && character <= '9'; }
+bool IsDigit(char character) {
+  return character >= '0' && character <= '9';
+}
 
 bool IsWordCharacter(char character) {
-  return IsDigit(character) || (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') ||
-         character == '_';
+  return IsDigit(character) || (character >= 'a' && character <= 'z') ||
+         (character >= 'A' && character <= 'Z') || character == '_';
 }
 
 bool EqualsWord(std::string_view text, std::string_view word) {
-  return text.size() == word.size() && std::equal(text.begin(), text.end(), word.begin(), [](char left, char right) {
-           return std::tolower(static_cast<unsigned char>(left)) == std::tolower(static_cast<unsigned char>(right));
+  return text.size() == word.size() &&
+         std::equal(text.begin(), text.end(), word.begin(), [](char left, char right) {
+           return std::tolower(static_cast<unsigned char>(left)) ==
+                  std::tolower(static_cast<unsigned char>(right));
          });
 }
 
@@ -168,7 +172,8 @@ class ImageReader final {
     const std::size_t startOfLine = lineStart;
     std::string content;
     while (!AtEnd() && text[place] != quote) {
-      const std::size_t end = std::min(text.find_first_of(quote == '|' ? "|\r\n" : "'\r\n", place), text.size());
+      const std::size_t end =
+          std::min(text.find_first_of(quote == '|' ? "|\r\n" : "'\r\n", place), text.size());
       content += text.substr(place, end - place);
       place = end;
       if (AtEnd() || text[place] == quote) break;
@@ -185,7 +190,8 @@ class ImageReader final {
       return false;
     }
     ++place;
-    image.AddParameter(keyword, quote == '|' ? KvfItem::Value::Path : KvfItem::Value::Quoted, std::move(content));
+    image.AddParameter(keyword, quote == '|' ? KvfItem::Value::Path : KvfItem::Value::Quoted,
+                       std::move(content));
     return true;
   }
 

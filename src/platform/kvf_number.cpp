@@ -10,8 +10,8 @@ namespace tessal {
 
 namespace {
 
-/// Whether a number too large or too small for 64 bits is too large: its first digit stands ahead of the point,
-/// the exponent counted in.
+/// Whether a number too large or too small for 64 bits is too large: its first digit stands ahead of the
+/// point, the exponent counted in.
 bool IsHuge(std::string_view digits) {
   const std::size_t exponentSign = digits.find_first_of("eE");
   const std::string_view mantissa = digits.substr(0, exponentSign);

@@ -40,9 +40,10 @@ std::string KvfWritableText(std::string_view text) {
 }
 
 bool IsKvfName(std::string_view text) {
-  return !text.empty() && IsNameStart(text.front()) && std::all_of(text.begin(), text.end(), [](char character) {
-    return IsNameStart(character) || (character >= '0' && character <= '9');
-  });
+  return !text.empty() && IsNameStart(text.front()) &&
+         std::all_of(text.begin(), text.end(), [](char character) {
+           return IsNameStart(character) || (character >= '0' && character <= '9');
+         });
 }
 
 }  // namespace tessal

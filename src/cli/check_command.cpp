@@ -1,0 +1,74 @@
+// Lists what the editor would show: the registry's records in order, then the undefined symbols.
+#include <nlohmann/json.hpp>
+
+#include "cli/commands.h"
+#include "cli/sarif.h"
+#include "cli/template_messages.h"
+
+namespace tessal::cli {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+void PrintText(const TemplateMessages& messages) {
+  for (const TemplateMessage& message : messages.errors) {
+    PrintLine(messages.path + ": " + Coloured(message.word, message.level) + ": " +
+              (message.symbol.empty() ? "generic" : message.symbol) + ": " + message.text);
+  }
+  for (const UndefinedName& undefined : messages.undefined) {
+    for (const std::string& user : undefined.usedBy) {
+      PrintLine(messages.path + ": " + Coloured("Undefined", 0) + ": " + user + ": Undefined symbol " +
+                undefined.symbol);
+    }
+  }
+}
+
+Json ToJson(const TemplateMessages& messages) {
+  Json errors = Json::array();
+  for (const TemplateMessage& message : messages.errors) {
+    errors.push_back({{"level", message.level},
+                      {"word", message.word},
+                      {"symbol", JsonText(message.symbol)},
+                      {"uid", message.uid},
+                      {"kind", message.kind},
+                      {"text", JsonText(message.text)}});
+  }
+  Json undefined = Json::array();
+  for (const UndefinedName& name : messages.undefined) {
+    Json users = Json::array();
+    for (const std::string& user : name.usedBy) users.push_back(JsonText(user));
+    undefined.push_back({{"symbol", JsonText(name.symbol)}, {"usedBy", users}});
+  }
+  return {{"path", JsonText(messages.path)},
+          {"loaded", messages.loaded},
+          {"errors", errors},
+          {"undefined", undefined}};
+}
+
+}  // namespace
+
+ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel) {
+  ExitCode exitCode = kFine;
+  std::vector<TemplateMessages> all;
+  for (const std::string& file : files) {
+    TemplateMessages messages = CollectMessages(file, lowestLevel);
+    if (!messages.loaded) exitCode = Worse(exitCode, kCallFault);
+    if (!messages.IsClean()) exitCode = Worse(exitCode, kContentFault);
+    if (format == Format::Text) {
+      PrintText(messages);
+    } else {
+      all.push_back(std::move(messages));
+    }
+  }
+  if (format == Format::Json) {
+    Json list = Json::array();
+    for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
+    PrintLine(Json{{"files", list}}.dump());
+  } else if (format == Format::Sarif) {
+    PrintLine(SarifText(all));
+  }
+  return exitCode;
+}
+
+}  // namespace tessal::cli

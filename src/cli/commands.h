@@ -1,0 +1,56 @@
+// The commands of the tool. Each prints its result and tells how it ended.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "cli/output.h"
+
+namespace tessal::cli {
+
+enum class Format { Text, Json, Sarif };
+
+// Templates.
+ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
+ExitCode RunSymbols(const std::string& file, Format format);
+/// With an empty output a plain save in place, else a save under that name.
+ExitCode RunSave(const std::string& file, const std::string& output);
+ExitCode RunNew(const std::string& output, bool overwrite);
+struct RenameCall {
+  std::string file;
+  std::string oldSymbol;
+  std::string newSymbol;
+  bool onlySymbol = false;
+  std::string output;
+};
+ExitCode RunRename(const RenameCall& call);
+ExitCode RunOverview(const std::string& file);
+ExitCode RunHtml(const std::string& file, bool withMathJax, const std::string& output);
+
+// Key files.
+ExitCode RunTree(const std::string& file);
+ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,
+                 bool onlyKeywords);
+
+// Expressions. The text "-" stands for standard input.
+struct ExpressionCall {
+  std::string text;
+  bool eachLine = false;  ///< standard input, one expression a line
+  std::string symbol;
+  bool isDerivative = false;
+};
+ExitCode RunTokens(const ExpressionCall& call);
+ExitCode RunParse(const ExpressionCall& call);
+ExitCode RunMathml(const ExpressionCall& call);
+ExitCode RunRewrite(const ExpressionCall& call);
+ExitCode RunExpressionCheck(const ExpressionCall& call);
+ExitCode RunIdentifiers(const ExpressionCall& call);
+
+// Catalogues.
+ExitCode RunFunctions(const std::string& name);
+ExitCode RunBuiltins();
+ExitCode RunEval(const std::string& name, const std::vector<std::string>& values);
+ExitCode RunCall(const std::string& name, const std::vector<std::string>& values,
+                 const std::vector<std::string>& settings);
+
+}  // namespace tessal::cli

@@ -1,0 +1,160 @@
+// Commands on single expressions.
+#include <algorithm>
+#include <functional>
+#include <string_view>
+
+#include "cli/commands.h"
+#include "cli/tree_json.h"
+#include "core/error_registry.h"
+#include "docgen/mathml.h"
+#include "expr/expression_node.h"
+#include "expr/identifiers.h"
+#include "expr/interaction_rewriter.h"
+#include "expr/parser.h"
+#include "expr/scanner.h"
+#include "expr/semantic_checks.h"
+
+namespace tessal::cli {
+
+namespace {
+
+/// What one expression gives: the result's text, and how it ended.
+struct Answer {
+  std::string text;
+  ExitCode exitCode = kFine;
+};
+
+using Question = std::function<Answer(const std::string& expression)>;
+
+/// Several lines of one result stand on one line for batch use.
+std::string OnOneLine(std::string_view text, char separator) {
+  std::string line(WithoutLineFeed(text));
+  std::replace(line.begin(), line.end(), '\n', separator);
+  return line;
+}
+
+/// Asks about each line of standard input; lines end at line feeds alone.
+ExitCode AskEachLine(const Question& question) {
+  const std::string input = ReadStandardInput();
+  ExitCode worst = kFine;
+  std::size_t start = 0;
+  while (start < input.size()) {
+    const std::size_t end = std::min(input.find('\n', start), input.size());
+    const Answer answer = question(input.substr(start, end - start));
+    PrintLine(OnOneLine(answer.text, '\t'));
+    worst = Worse(worst, answer.exitCode);
+    start = end + 1;
+  }
+  return worst;
+}
+
+ExitCode AskOnce(const ExpressionCall& call, const Question& question) {
+  const Answer answer = question(call.text == "-" ? ReadStandardInput() : call.text);
+  if (!answer.text.empty()) PrintLine(WithoutLineFeed(answer.text));
+  return answer.exitCode;
+}
+
+ExitCode Ask(const ExpressionCall& call, const Question& question) {
+  return call.eachLine ? AskEachLine(question) : AskOnce(call, question);
+}
+
+/// Parses, and lets the operation make the text of a tree. The failure is the parser's message, or nothing.
+Answer WithTree(const std::string& expression, bool tellFailure,
+                const std::function<std::string(const ExpressionNode&)>& textOf) {
+  ExpressionNode tree;
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string message;
+  if (ParseExpressionText(expression, tree, line, position, message) == 0) {
+    return {tellFailure ? message : std::string(), kContentFault};
+  }
+  return {textOf(tree), kFine};
+}
+
+/// A token outside the table carries the code of the last one in it; its text tells the two apart.
+std::string_view NameOf(const ExpressionToken& listed) {
+  const bool isOther = listed.code == token::kExceedanceFrequency && listed.text != "EXCEEDANCE_FREQUENCY";
+  return isOther ? "-" : TokenName(listed.code);
+}
+
+std::string TokenRow(const ExpressionToken& listed) {
+  std::string row = std::to_string(listed.code) + '\t';
+  row += NameOf(listed);
+  for (const std::int32_t number :
+       {listed.firstColumn, listed.lastColumn, listed.firstOffset, listed.lastOffset}) {
+    row += '\t' + std::to_string(number);
+  }
+  return row + '\t' + listed.text;
+}
+
+Answer TokenTable(const std::string& expression) {
+  std::vector<ExpressionToken> tokens;
+  const bool clean = ScanExpressionTokens(expression, tokens);
+  Answer answer;
+  for (const ExpressionToken& listed : tokens) answer.text += TokenRow(listed) + '\n';
+  answer.exitCode = clean ? kFine : kContentFault;
+  return answer;
+}
+
+Answer TokenLine(const std::string& expression) {
+  std::vector<ExpressionToken> tokens;
+  const bool clean = ScanExpressionTokens(expression, tokens);
+  Answer answer;
+  for (const ExpressionToken& listed : tokens) {
+    if (!answer.text.empty()) answer.text += ' ';
+    answer.text += std::to_string(listed.code) + ":" + listed.text;
+  }
+  if (!clean) answer.text += " !";
+  answer.exitCode = clean ? kFine : kContentFault;
+  return answer;
+}
+
+Answer Findings(const std::string& expression) {
+  Errors().ClearErrors();
+  CheckFunctionsSpecified("", 0, expression);
+  Answer answer;
+  for (const ErrorRecord& record : Errors().Records()) {
+    answer.text += std::string(WithoutLineFeed(record.text)) + '\n';
+    answer.exitCode = kContentFault;
+  }
+  return answer;
+}
+
+}  // namespace
+
+ExitCode RunTokens(const ExpressionCall& call) {
+  return Ask(call, call.eachLine ? TokenLine : TokenTable);
+}
+
+ExitCode RunParse(const ExpressionCall& call) {
+  return Ask(call, [](const std::string& expression) { return WithTree(expression, true, TreeJson); });
+}
+
+ExitCode RunMathml(const ExpressionCall& call) {
+  return Ask(call, [&call](const std::string& expression) {
+    Answer answer{ExpressionToMathML(expression, call.symbol, call.isDerivative), kFine};
+    if (answer.text.empty()) answer.exitCode = kContentFault;
+    return answer;
+  });
+}
+
+ExitCode RunRewrite(const ExpressionCall& call) {
+  return Ask(
+      call, [](const std::string& expression) { return WithTree(expression, false, RewriteExpressionText); });
+}
+
+ExitCode RunExpressionCheck(const ExpressionCall& call) {
+  return Ask(call, Findings);
+}
+
+ExitCode RunIdentifiers(const ExpressionCall& call) {
+  return Ask(call, [](const std::string& expression) {
+    std::vector<std::string> identifiers;
+    ExtractIdentifiers(expression, identifiers);
+    Answer answer;
+    for (const std::string& identifier : identifiers) answer.text += identifier + '\n';
+    return answer;
+  });
+}
+
+}  // namespace tessal::cli

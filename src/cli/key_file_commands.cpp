@@ -1,0 +1,56 @@
+// Commands on key files as such: their trees and what differs between two.
+#include <regex>
+#include <sstream>
+
+#include "cli/commands.h"
+#include "keyfile/item_tree.h"
+#include "keyfile/reader.h"
+#include "platform/file_replacement.h"
+
+namespace tessal::cli {
+
+namespace {
+
+/// Reads a tree. A file that cannot be read at all is the machine's fault, one that is no key file its own.
+ExitCode ReadTree(const std::string& file, CKvfSectionItem& tree) {
+  std::string failure;
+  if (!ReadWholeFile(file, failure)) {
+    Complain(failure);
+    return kCallFault;
+  }
+  if (LoadKeyFileTree(file, tree) != 0) return kFine;
+  Complain(file + ": " + KeyFileFailureText());
+  return kContentFault;
+}
+
+}  // namespace
+
+ExitCode RunTree(const std::string& file) {
+  CKvfSectionItem tree;
+  const ExitCode read = ReadTree(file, tree);
+  if (read != kFine) return read;
+  std::ostringstream text;
+  tree.Write(text);
+  Print(text.str());
+  return kFine;
+}
+
+ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,
+                 bool onlyKeywords) {
+  CKvfSectionItem first;
+  CKvfSectionItem second;
+  // A file that is no key file cannot be compared: that is no difference.
+  if (ReadTree(left, first) != kFine || ReadTree(right, second) != kFine) return kCallFault;
+  const IgnoredNames names(ignored.begin(), ignored.end());
+  std::ostringstream report;
+  try {
+    const bool same = first.Compare(second, &report, names.empty() ? nullptr : &names, onlyKeywords);
+    Print(report.str());
+    return same ? kFine : kContentFault;
+  } catch (const std::regex_error& failure) {
+    Complain(std::string("a name to ignore is no regular expression: ") + failure.what());
+    return kCallFault;
+  }
+}
+
+}  // namespace tessal::cli

@@ -1,0 +1,218 @@
+// The command line: which commands there are, with which arguments and options.
+#include <CLI/CLI.hpp>
+#include <csignal>
+#include <exception>
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "cli/commands.h"
+#include "cli/numbers.h"
+
+namespace tessal::cli {
+
+namespace {
+
+/// What the options of all commands are read into, and the command that was called.
+struct CommandLine {
+  std::vector<std::string> files;
+  std::string file;
+  std::string otherFile;
+  std::string output;
+  std::string name;
+  std::vector<std::string> values;
+  std::vector<std::string> settings;
+  std::vector<std::string> ignored;
+  bool onlyKeywords = false;
+  bool force = false;
+  bool mathJax = false;
+  Format format = Format::Text;
+  int lowestLevel = 0;
+  RenameCall rename;
+  ExpressionCall expression;
+  std::function<ExitCode()> run;
+};
+
+const std::map<std::string, Format> kCheckFormats = {
+    {"text", Format::Text}, {"json", Format::Json}, {"sarif", Format::Sarif}};
+const std::map<std::string, Format> kTableFormats = {{"text", Format::Text}, {"json", Format::Json}};
+
+CLI::App* AddCommand(CLI::App& parent, CommandLine& line, const char* name, const char* description,
+                     std::function<ExitCode()> run) {
+  CLI::App* command = parent.add_subcommand(name, description);
+  command->callback([&line, run = std::move(run)] { line.run = run; });
+  return command;
+}
+
+CLI::Option* AddFile(CLI::App& command, std::string& file) {
+  return command.add_option("FILE", file, "a template file")->required();
+}
+
+void AddTemplateCommands(CLI::App& app, CommandLine& line) {
+  CLI::App* check = AddCommand(app, line, "check", "lists the messages of templates",
+                               [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
+  check->add_option("FILE", line.files, "template files")->required();
+  check->add_option("--format", line.format, "text, json or sarif")
+      ->transform(CLI::CheckedTransformer(kCheckFormats));
+  check->add_option("--level", line.lowestLevel, "hides messages below this level");
+
+  CLI::App* symbols = AddCommand(app, line, "symbols", "lists the symbol table of a template",
+                                 [&line] { return RunSymbols(line.file, line.format); });
+  AddFile(*symbols, line.file);
+  symbols->add_option("--format", line.format, "text or json")
+      ->transform(CLI::CheckedTransformer(kTableFormats));
+
+  CLI::App* save = AddCommand(app, line, "save", "loads a template and saves it",
+                              [&line] { return RunSave(line.file, line.output); });
+  AddFile(*save, line.file);
+  save->add_option("--output", line.output, "saves under this name");
+
+  CLI::App* create = AddCommand(app, line, "new", "saves an empty template",
+                                [&line] { return RunNew(line.file, line.force); });
+  create->add_option("OUT", line.file, "the new file")->required();
+  create->add_flag("--force", line.force, "replaces an existing file");
+
+  CLI::App* rename = AddCommand(app, line, "rename", "renames a symbol with all its uses",
+                                [&line] { return RunRename(line.rename); });
+  AddFile(*rename, line.rename.file);
+  rename->add_option("OLD", line.rename.oldSymbol, "the symbol to rename")->required();
+  rename->add_option("NEW", line.rename.newSymbol, "its new name")->required();
+  rename->add_flag("--only-symbol", line.rename.onlySymbol, "leaves the uses as they are");
+  rename->add_option("--output", line.rename.output, "saves under this name");
+
+  CLI::App* overview = AddCommand(app, line, "overview", "prints the overview table",
+                                  [&line] { return RunOverview(line.file); });
+  AddFile(*overview, line.file);
+
+  CLI::App* html = AddCommand(app, line, "html", "writes the HTML documentation",
+                              [&line] { return RunHtml(line.file, line.mathJax, line.output); });
+  AddFile(*html, line.file);
+  html->add_flag("--mathjax", line.mathJax, "has MathJax render the equations");
+  html->add_option("--output", line.output, "the page to write");
+}
+
+void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
+  CLI::App* tree = AddCommand(app, line, "tree", "prints a key file as its item tree",
+                              [&line] { return RunTree(line.file); });
+  tree->add_option("FILE", line.file, "a key file")->required();
+
+  CLI::App* diff = AddCommand(app, line, "diff", "compares two key files", [&line] {
+    return RunDiff(line.file, line.otherFile, line.ignored, line.onlyKeywords);
+  });
+  diff->add_option("A", line.file, "a key file")->required();
+  diff->add_option("B", line.otherFile, "another")->required();
+  diff->add_option("--ignore", line.ignored, "leaves out names that match")->allow_extra_args(false);
+  diff->add_flag("--keywords-only", line.onlyKeywords, "lists keywords only");
+}
+
+void AddExpressionCommands(CLI::App& app, CommandLine& line) {
+  CLI::App* expressions = app.add_subcommand("expr", "looks at one expression");
+  expressions->require_subcommand(1);
+  struct Row {
+    const char* name;
+    const char* description;
+    ExitCode (*run)(const ExpressionCall&);
+  };
+  const Row rows[] = {
+      {"tokens", "lists the tokens", RunTokens},
+      {"parse", "prints the tree", RunParse},
+      {"mathml", "prints the MathML block", RunMathml},
+      {"rewrite", "prints the engine's form", RunRewrite},
+      {"check", "lists the findings", RunExpressionCheck},
+      {"identifiers", "lists the identifiers", RunIdentifiers},
+  };
+  for (const Row& row : rows) {
+    CLI::App* command = AddCommand(*expressions, line, row.name, row.description,
+                                   [&line, run = row.run] { return run(line.expression); });
+    CLI::Option* text =
+        command->add_option("EXPR", line.expression.text, "an expression, or - for standard input");
+    CLI::Option* lines = command->add_flag("--lines", line.expression.eachLine,
+                                           "each line of standard input is an expression");
+    text->excludes(lines);
+    command->parse_complete_callback([&line, command, text] {
+      // An unknown option is told as such, not as a missing expression.
+      if (line.expression.eachLine || text->count() > 0 || command->remaining_size() > 0) return;
+      throw CLI::RequiredError("EXPR");
+    });
+    if (row.run == RunMathml) {
+      command->add_option("--symbol", line.expression.symbol, "the left side");
+      command->add_flag("--derivative", line.expression.isDerivative, "the left side is a time derivative");
+    }
+  }
+}
+
+void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
+  CLI::App* functions = AddCommand(app, line, "functions", "lists the function catalogue",
+                                   [&line] { return RunFunctions(line.name); });
+  functions->add_option("NAME", line.name, "one function");
+  AddCommand(app, line, "builtins", "lists the built-in variables", [] { return RunBuiltins(); });
+
+  CLI::App* eval = AddCommand(app, line, "eval", "computes a plain function",
+                              [&line] { return RunEval(line.name, line.values); });
+  eval->add_option("NAME", line.name, "the function")->required();
+  eval->add_option("VALUE", line.values, "its values");
+
+  CLI::App* call = AddCommand(app, line, "call", "computes any function of the catalogue",
+                              [&line] { return RunCall(line.name, line.values, line.settings); });
+  call->add_option("NAME", line.name, "the function")->required();
+  call->add_option("VALUE", line.values, "its values");
+  call->add_option("--set", line.settings, "a function to call first: NAME=VALUE,VALUE...")
+      ->allow_extra_args(false);
+}
+
+/// CLI11 parses a reversed list, without the program's name. Numbers are hidden from it, and shown again to
+/// whatever takes them.
+std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
+  std::vector<std::string> reversed;
+  for (int place = count - 1; place > 0; --place) reversed.push_back(HiddenNumber(arguments[place]));
+  return reversed;
+}
+
+void ShowNumbers(CommandLine& line) {
+  for (std::string* text :
+       {&line.file, &line.otherFile, &line.output, &line.name, &line.rename.file, &line.rename.oldSymbol,
+        &line.rename.newSymbol, &line.rename.output, &line.expression.text, &line.expression.symbol}) {
+    *text = ShownNumber(*text);
+  }
+  for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {
+    for (std::string& text : *texts) text = ShownNumber(text);
+  }
+}
+
+int RunTool(int count, char** arguments) {
+  CLI::App app{"Reads, checks, documents and saves templates of aquatic process models.", "tessal"};
+  app.set_version_flag("--version", std::string("tessal ") + TESSAL_VERSION);
+  app.require_subcommand(1);
+  CommandLine line;
+  AddTemplateCommands(app, line);
+  AddKeyFileCommands(app, line);
+  AddExpressionCommands(app, line);
+  AddCatalogueCommands(app, line);
+  try {
+    app.parse(ArgumentsForParser(count, arguments));
+  } catch (const CLI::ParseError& stop) {
+    if (stop.get_exit_code() == 0) return app.exit(stop);
+    const bool unknown = count > 1 && app.get_subcommands().empty() && *arguments[1] != '-';
+    Complain(unknown ? "unknown command '" + std::string(arguments[1]) + "'" : ShownNumber(stop.what()));
+    return kCallFault;
+  }
+  ShowNumbers(line);
+  const ExitCode exitCode = line.run();
+  return FlushOutput() ? exitCode : kCallFault;
+}
+
+}  // namespace
+
+}  // namespace tessal::cli
+
+int main(int count, char** arguments) {
+  // A closed pipe shows as a failed write, which ends the tool quietly.
+  std::signal(SIGPIPE, SIG_IGN);
+  try {
+    return tessal::cli::RunTool(count, arguments);
+  } catch (const std::exception& failure) {
+    tessal::cli::Complain(failure.what());
+    return tessal::cli::kCallFault;
+  }
+}

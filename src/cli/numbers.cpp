@@ -1,0 +1,60 @@
+#include "cli/numbers.h"
+
+#include <algorithm>
+#include <charconv>
+#include <limits>
+#include <system_error>
+
+namespace tessal::cli {
+
+namespace {
+
+/// Stands before a hidden number. No argument of a shell begins with it.
+constexpr char kHidden = '\x01';
+
+}  // namespace
+
+std::optional<double> NumberOf(std::string_view text) {
+  if (text.starts_with('+')) text.remove_prefix(1);
+  double value = 0.0;
+  const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
+  if (read.ptr != text.data() + text.size() || read.ec == std::errc::invalid_argument) return std::nullopt;
+  if (read.ec == std::errc::result_out_of_range) {
+    const bool tiny = text.find("e-") != std::string_view::npos || text.find("E-") != std::string_view::npos;
+    value = tiny ? 0.0 : std::numeric_limits<double>::infinity();
+    if (text.starts_with('-')) value = -value;
+  }
+  return value;
+}
+
+std::optional<std::vector<double>> NumbersOf(const std::vector<std::string>& texts) {
+  std::vector<double> values;
+  for (const std::string& text : texts) {
+    const std::optional<double> value = NumberOf(text);
+    if (!value) return std::nullopt;
+    values.push_back(*value);
+  }
+  return values;
+}
+
+std::vector<std::string> SplitAtCommas(std::string_view text) {
+  std::vector<std::string> pieces;
+  if (text.empty()) return pieces;
+  std::size_t start = 0;
+  while (start <= text.size()) {
+    const std::size_t end = std::min(text.find(',', start), text.size());
+    pieces.emplace_back(text.substr(start, end - start));
+    start = end + 1;
+  }
+  return pieces;
+}
+
+std::string HiddenNumber(const std::string& argument) {
+  return argument.starts_with('-') && NumberOf(argument) ? kHidden + argument : argument;
+}
+
+std::string ShownNumber(const std::string& argument) {
+  return argument.starts_with(kHidden) ? argument.substr(1) : argument;
+}
+
+}  // namespace tessal::cli

@@ -1,0 +1,42 @@
+// Where the tool's words go: results to standard output, diagnostics to standard error.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace tessal::cli {
+
+/// What every command ends with.
+enum ExitCode : int {
+  kFine = 0,
+  kContentFault = 1,  ///< findings, differences, an expression that does not parse
+  kCallFault = 2      ///< a wrong call, or a file that cannot be read or written
+};
+
+/// Keeps the graver of two.
+ExitCode Worse(ExitCode left, ExitCode right);
+
+/// Adds to the result. It is written when the command has ended, or when much has come together.
+void Print(std::string_view text);
+void PrintLine(std::string_view text);
+
+/// Writes what is left of the result. False, with a diagnostic, when standard output takes no more; a closed
+/// pipe is no failure.
+bool FlushOutput();
+
+/// One line on standard error, with the tool's name.
+void Complain(std::string_view text);
+
+/// The whole of standard input.
+std::string ReadStandardInput();
+
+/// Whether the result goes to a terminal that wants colour.
+bool WantsColour();
+
+/// The word in the colour of its gravity (1 to 4), where colour is wanted.
+std::string Coloured(std::string_view word, unsigned level);
+
+/// A text without its trailing line feed.
+std::string_view WithoutLineFeed(std::string_view text);
+
+}  // namespace tessal::cli

@@ -1,0 +1,38 @@
+#include "cli/template_files.h"
+
+#include "cli/output.h"
+#include "core/error_registry.h"
+#include "core/template_core.h"
+
+namespace tessal::cli {
+
+namespace {
+
+void ComplainWithMessages(std::string_view what, const std::string& file) {
+  std::string text;
+  Complain(std::string(what) + " '" + file + "'");
+  for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
+    Errors().FormatError(index, text);
+    Complain(WithoutLineFeed(text));
+  }
+}
+
+}  // namespace
+
+bool LoadOrComplain(TemplateCore& core, const std::string& file) {
+  const bool loaded = core.LoadWrapper(file);
+  if (!loaded) ComplainWithMessages("failed to load file", file);
+  // From here on changes reach what hangs on them, as in an editor.
+  SetNotifyChanges(true);
+  return loaded;
+}
+
+bool SaveOrComplain(TemplateCore& core, const std::string& file) {
+  // What the load found is no part of why a save fails.
+  Errors().ClearErrors();
+  if (core.SaveWrapper(file)) return true;
+  ComplainWithMessages("failed to save file", file);
+  return false;
+}
+
+}  // namespace tessal::cli

@@ -1,0 +1,18 @@
+// Loading templates for a command, as the editor does.
+#pragma once
+
+#include <string>
+
+namespace tessal {
+class TemplateCore;
+}
+
+namespace tessal::cli {
+
+/// Loads a file. False, with every message of the load on standard error, when it could not be loaded.
+bool LoadOrComplain(TemplateCore& core, const std::string& file);
+
+/// Saves a template. False, with the reasons on standard error, when it could not be saved.
+bool SaveOrComplain(TemplateCore& core, const std::string& file);
+
+}  // namespace tessal::cli

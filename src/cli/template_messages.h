@@ -1,0 +1,41 @@
+// What is wrong with a template file, collected for printing.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace tessal::cli {
+
+struct TemplateMessage {
+  std::uint32_t level;
+  std::string word;
+  std::string symbol;
+  std::int32_t uid;
+  std::int32_t kind;  ///< the element's, 0 for none
+  int line;           ///< of the element's sub-section, from 1; 0 for none
+  std::string text;
+};
+
+struct UndefinedName {
+  std::string symbol;
+  std::vector<std::string> usedBy;  ///< the symbols of the users
+  int line;                         ///< of the first user's sub-section; 0 for none
+};
+
+struct TemplateMessages {
+  std::string path;
+  bool loaded = false;
+  std::vector<TemplateMessage> errors;
+  std::vector<UndefinedName> undefined;
+
+  bool IsClean() const { return errors.empty() && undefined.empty(); }
+};
+
+/// Loads a file as the editor does, and lists its messages from a level up.
+TemplateMessages CollectMessages(const std::string& file, int lowestLevel);
+
+/// Bytes as JSON can hold them.
+std::string JsonText(const std::string& bytes);
+
+}  // namespace tessal::cli

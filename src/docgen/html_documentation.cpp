@@ -1,0 +1,332 @@
+#include "docgen/html_documentation.h"
+
+#include <array>
+#include <span>
+#include <string_view>
+#include <vector>
+
+#include "core/template_core.h"
+#include "docgen/mathml.h"
+#include "docgen/page_style.h"
+#include "platform/file_replacement.h"
+#include "platform/unit_names.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kScriptAddress = TESSAL_MATHJAX_SCRIPT;
+constexpr std::string_view kProjectAddress = TESSAL_MATHJAX_PROJECT;
+
+// The slash ahead of the public identifier has always stood there.
+constexpr std::string_view kDoctype =
+    "<!DOCTYPE HTML PUBLIC /\"-//W3C//DTD HTML 4.01 Transitional//EN\" "
+    "\"http://www.w3.org/TR/html4/loose.dtd\">";
+
+constexpr std::array<std::string_view, 13> kMiscKeys = {
+    "Description",          "Documentation",      "Online help",
+    "Tessal version",       "Parser version",     "Randseed",
+    "Optimise expressions", "Trigonometric unit", "Revision",
+    "Debug level",          "Debug log",          "Inital random particle dir",
+    "Build spatial tree"};
+
+// The last key stands twice: an element that has it shows the row twice.
+constexpr std::array<std::string_view, 23> kElementKeys = {"ID",
+                                                           "Description",
+                                                           "Documentation",
+                                                           "Online help",
+                                                           "Scope",
+                                                           "Transport",
+                                                           "Spatial Variation",
+                                                           "UNQ Type",
+                                                           "UNQ Unit",
+                                                           "Unit",
+                                                           "Is user specified",
+                                                           "Build in ID",
+                                                           "Default Value",
+                                                           "Min Value",
+                                                           "Max Value",
+                                                           "Expression",
+                                                           "Equation",
+                                                           "Speed",
+                                                           "Direction",
+                                                           "horizontal speed equation",
+                                                           "horizontal direction equation",
+                                                           "vertical speed equation",
+                                                           "vertical speed equation"};
+
+using Keys = std::span<const std::string_view>;
+
+bool HasUnitName(std::string_view key) {
+  return key == "UNQ Type" || key == "UNQ Unit";
+}
+
+class PageWriter final {
+ public:
+  PageWriter(const TemplateCore& templateCore, bool embedMathJax)
+      : core(templateCore), mathJax(embedMathJax) {}
+
+  std::string Write(const std::tm& created) {
+    WriteHead();
+    WriteSummary();
+    WriteMisc();
+    Line("</div>");
+    Line("<div id=left style=background-color:#FFD700;width:35%;float:left;>");
+    Line("<h1>Elements</h1>");
+    WriteElementSections(false, kElementKeys);
+    Line("</div>");
+    Line("<div id=right style=background-color:#EEEEEE;width:65%;float:left;>");
+    Line("<h1>Details</h1>");
+    WriteElementSections(true, kElementKeys);
+    Line("</div>");
+    WriteFooter(created);
+    return std::move(page);
+  }
+
+ private:
+  void Line(std::string_view text) {
+    page += text;
+    page += '\n';
+  }
+
+  void Count(std::string_view text, std::size_t count) {
+    Line(std::string(text) + std::to_string(count) + "</li>");
+  }
+
+  const SymbolRecord* RecordOf(const CEL_Element& element) const {
+    // The element's number is the place of its record, or of its second one.
+    const auto place = static_cast<std::uint32_t>(element.id.IntValue());
+    for (const std::uint32_t sequence : {place - 1, place}) {
+      const SymbolRecord* record = core.FindRecordBySequence(sequence);
+      if (record != nullptr && record->element == &element) return record;
+    }
+    return nullptr;
+  }
+
+  void WriteHead() {
+    Line(kDoctype);
+    Line("<html>");
+    Line("<head>");
+    const std::string& description = core.Root().description.Text();
+    if (!description.empty()) Line("<title>Model description for " + description + "</title>");
+    if (mathJax) {
+      for (const std::string_view query : {"?config=MML_HTMLorMML", ""}) {
+        Line("<script type=text/javascript");
+        Line("src=\"" + std::string(kScriptAddress) + std::string(query) + "\">");
+        Line("</script>");
+      }
+      Line("<meta http-equiv=X-UA-Compatible content=IE=EmulateIE7>");
+    }
+    Line(kPageStyle);
+    Line("</head>");
+    Line("<body>");
+    Line("<div id=container>");
+    Line("<div id=header>");
+    if (!description.empty()) Line("<h1>Model description for " + description + "</h1>");
+    Line("<h2>Template file : " + core.TemplateFileName() + "</h2>");
+    if (mathJax) Line("<br>This document uses MathML and may render quite slow in IE8!");
+  }
+
+  void WriteSummary() {
+    Line("<br><h3>Summary</h3>");
+    Line("<ul>");
+    Count("<li>State variables : ", core.GetStateVariableCount());
+    Count("<li>Constants       : ", core.GetConstantCount());
+    Count("<li>Forcings        : ", core.GetForcingCount());
+    Count("<li>Auxiliaries     : ", core.GetAuxiliaryCount());
+    Count("<li>Processes       : ", core.GetProcessCount());
+    Count("<li>Derived outputs : ", core.GetDerivedOutputCount());
+    if (core.GetSpecieCount() > 0) {
+      Count("<li>Species         : ", core.GetSpecieCount());
+      Line("<ul>");
+      std::size_t number = 0;
+      for (const auto& specie : core.Species()) {
+        Count("<li>Specie ", ++number);
+        Count("<li>State variables          : ", specie->stateVariables.size());
+        Count("<li>Constants                : ", specie->constants.size());
+        Count("<li>Spatial functions        : ", specie->spatialFunctions.size());
+        Count("<li>Arithmetical expressions : ", specie->arithmeticExpressions.size());
+        Count("<li>Horizontal vectors       : ", specie->horizontalVectors.size());
+        Count("<li>Vertical vectors         : ", 1);
+      }
+      Line("</ul>");
+    }
+    Line("</ul> <br>");
+  }
+
+  void WriteMisc() {
+    const CEL_Miscanellous* misc = core.GetMisc();
+    if (misc == nullptr) return;
+    Line("<hr>");
+    Line("<p><h3>Miscellaneous</h3>");
+    WriteElementEntry(*misc, true, kMiscKeys, false);
+    Line("</p>");
+  }
+
+  void WriteFooter(const std::tm& created) {
+    constexpr std::size_t kTimeLength = 26;
+    Line("<div id=footer>");
+    Line("<hr>");
+    std::array<char, kTimeLength * 2> time{};
+    // The fixed form of asctime ends in a line break of its own.
+    if (std::strftime(time.data(), time.size(), "%a %b %e %H:%M:%S %Y\n", &created) > 0) {
+      page += "<br>Document created : ";
+      Line(time.data());
+    }
+    if (mathJax) {
+      Line("<br>Math rendered by <a href=\"" + std::string(kProjectAddress) + "\">MathJax</a>");
+    }
+    for (const std::string_view end : {"</div>", "</div>", "</body>", "</html>"}) Line(end);
+  }
+
+  template <class Elements>
+  void WriteEntries(const Elements& elements, bool detail, Keys keys) {
+    for (const auto& element : elements) WriteElementEntry(*element, detail, keys, true);
+  }
+
+  template <class Elements>
+  void WriteCollection(std::string_view heading, std::string_view closing, const Elements& elements,
+                       bool detail, Keys keys) {
+    Line("<hr>");
+    Line(heading);
+    if (elements.empty()) Line("-none- <br>");
+    WriteEntries(elements, detail, keys);
+    Line(closing);
+  }
+
+  void WriteElementSections(bool detail, Keys keys) {
+    constexpr std::string_view kClosing = "</li> </p>";
+    Line("<ul>");
+    WriteCollection("<p> <li> <h2>State Variables </h2>", " </li> </p>", core.StateVariables(), detail, keys);
+    WriteCollection("<p> <li> <h2> Constants </h2>", kClosing, core.Constants(), detail, keys);
+    WriteCollection("<p> <li> <h2> Forcing </h2>", kClosing, core.Forcings(), detail, keys);
+    WriteCollection("<p> <li> <h2> Auxilliaries </h2>", kClosing, core.Auxiliaries(), detail, keys);
+    WriteCollection("<p> <li> <h2> Process </h2>", kClosing, core.Processes(), detail, keys);
+    WriteCollection("<p> <li> <h2> Derived Outputs </h2>", kClosing, core.DerivedOutputs(), detail, keys);
+    if (core.GetSpecieCount() > 0) {
+      Line("<hr>");
+      Line("<p> <h2>Lagrange particle classes</h2>");
+      Line("<ul>");
+      for (const auto& specie : core.Species()) WriteSpecie(*specie, detail, keys);
+      Line("</p>");
+    }
+    Line("</ul>");
+  }
+
+  void WriteSpecie(const CEL_Lagrange_Specie& specie, bool detail, Keys keys) {
+    constexpr std::string_view kClosing = "</li> </p>";
+    Line("<li> <h2> Particle Class &quot" + specie.symbol.Text() + "&quot</h2>");
+    WriteElementEntry(specie, detail, keys, true);
+    WriteCollection("<p> <li> <h2> State Variables </h2>", kClosing, specie.stateVariables, detail, keys);
+    WriteCollection("<p> <li> <h2> Constants</h2>", kClosing, specie.constants, detail, keys);
+    WriteCollection("<p> <li> <h2>  Remote Area Search Functions </h2>", kClosing, specie.spatialFunctions,
+                    detail, keys);
+    WriteCollection("<p> <li> <h2> Arithmetic Expressions </h2>", kClosing, specie.arithmeticExpressions,
+                    detail, keys);
+    Line("<hr>");
+    Line("<p> <ul> <h2> Movement </h2>");
+    Line("<p> <li> <h3> Horizontal Vectors</h3>");
+    WriteEntries(specie.horizontalVectors, detail, keys);
+    Line(kClosing);
+    Line("<li><h3> Vertical Vector </h3>");
+    WriteElementEntry(*specie.verticalEquation, detail, keys, true);
+    Line("</li>");
+    Line("</ul> </p>");
+    Line("</ul>");
+  }
+
+  /// The name of an element's anchor: its symbol field, or, for a movement, which has none, the composed
+  /// symbol.
+  std::string AnchorOf(const CEL_Element& element, const std::vector<ElementField>& fields) const {
+    if (const ElementField* symbol = FindField(fields, "Symbol")) return symbol->text;
+    const bool isMovement =
+        element.Kind() == kind::kHorizontalVector || element.Kind() == kind::kVerticalEquation;
+    const SymbolRecord* record = isMovement ? RecordOf(element) : nullptr;
+    return record == nullptr ? std::string() : core.RecordSymbol(*record);
+  }
+
+  void WriteElementEntry(const CEL_Element& element, bool detail, Keys keys, bool withReferences) {
+    std::vector<ElementField> fields;
+    element.GetFields(fields);
+    Line("<ul><li>");
+    const std::string anchor = AnchorOf(element, fields);
+    if (!anchor.empty()) {
+      Line((detail ? "<h4> <a id=ref_" : "<h4> <a href=#ref_") + anchor + ">" + anchor + "</a></h4>");
+    }
+    if (detail) {
+      Line("<table border=0 > ");
+      Line("<colgroup> <col width=30%> <col width=70%> </colgroup> ");
+      for (const std::string_view key : keys) WriteRow(element, fields, key, anchor);
+      if (withReferences) WriteReferences(element);
+      Line("</table> ");
+    }
+    Line("</li></ul>");
+  }
+
+  void WriteRow(const CEL_Element& element, const std::vector<ElementField>& fields, std::string_view key,
+                const std::string& symbol) {
+    const ElementField* field = FindField(fields, key);
+    if (field == nullptr) return;
+    Line("<tr>");
+    Line("<td>");
+    Line(field->name);
+    Line("</td>");
+    Line("<td>");
+    if (field->kind == FieldKind::Expression) {
+      const bool isDerivative =
+          element.Kind() == kind::kStateVariable || element.Kind() == kind::kSpecieStateVariable;
+      Line(ExpressionToMathML(field->text, symbol, isDerivative));
+    } else {
+      Line(FieldText(*field));
+    }
+    std::string unitName;
+    if (HasUnitName(key) && unqGetItemTypeKey(field->intValue, unitName) != 0) Line(" (" + unitName + ")");
+    Line("</td>");
+    Line("</tr> ");
+  }
+
+  void WriteReferences(const CEL_Element& element) {
+    Line("<tr>");
+    Line("<td>");
+    Line("Referenced by");
+    Line("</td>");
+    Line("<td>");
+    std::string links;
+    const SymbolRecord* record = RecordOf(element);
+    const CEL_Element* previous = nullptr;
+    for (const std::uint32_t sequence :
+         record == nullptr ? std::vector<std::uint32_t>() : record->referencedBy) {
+      const SymbolRecord* user = core.FindRecordBySequence(sequence);
+      // A movement that uses the element in both of its expressions stands once.
+      if (user == nullptr || user->element == previous) continue;
+      previous = user->element;
+      const std::string name = core.RecordSymbol(*user);
+      if (!links.empty()) links += ", ";
+      links += "<a href=#ref_" + name + ">" + name + "</a>";
+    }
+    Line(links.empty() ? "- not used -" : links);
+    Line("</td>");
+    Line("</tr> ");
+  }
+
+  const TemplateCore& core;
+  bool mathJax;
+  std::string page;
+};
+
+}  // namespace
+
+std::string HtmlDocumentation(const TemplateCore& core, bool embedMathJax, const std::tm& created) {
+  return PageWriter(core, embedMathJax).Write(created);
+}
+
+bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, bool embedMathJax,
+                             std::string& failure) {
+  const std::time_t now = std::time(nullptr);
+  std::tm local = {};
+  localtime_r(&now, &local);
+  failure = WriteWholeFile(path, HtmlDocumentation(core, embedMathJax, local));
+  return failure.empty();
+}
+
+}  // namespace tessal

@@ -1,0 +1,272 @@
+#include "docgen/mathml.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "expr/expression_node.h"
+#include "expr/parser.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::string_view kStart =
+    "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>"
+    "<math display=\"block\" align=\"left\" xmlns=\"http://www.w3.org/1998/Math/MathML\"><mrow>";
+constexpr std::string_view kEnd = "</mrow></math>\n";
+
+constexpr std::string_view kFence = "<mfenced separators=\"\">";
+constexpr std::string_view kFenceEnd = "</mfenced>";
+
+struct Relation {
+  std::string_view text;
+  std::string_view markUp;
+};
+
+// The greater sign stands unescaped, unlike the smaller one.
+constexpr std::array<Relation, 6> kRelations = {{
+    {"==", "<mo>=</mo>"},
+    {"!=", "<mo>&#x2260;</mo>"},
+    {"<", "<mo>&lt;</mo>"},
+    {">", "<mo>></mo>"},
+    {">=", "<mo>&#x2265;</mo>"},
+    {"<=", "<mo>&#x2264;</mo>"},
+}};
+
+struct FunctionMarkUp {
+  std::string_view name;
+  std::string_view enter;
+  std::string_view leave;
+};
+
+constexpr std::array<FunctionMarkUp, 5> kFunctions = {{
+    {"PI", "<mi mathvariant=\"bold-italic\">&#x3C0;</mi>", ""},
+    {"SQRT", "<mrow><msqrt>", "</msqrt></mrow>"},
+    {"SQR", "<mrow><msup>", "<mn>2</mn></msup></mrow>"},
+    {"POW", "<mrow><msup>", "</msup></mrow>"},
+    {"EXP", "<mrow><msup><mi>e</mi>", "</msup></mrow>"},
+}};
+
+constexpr std::string_view kRow = "<mtr><mtd columnalign=\"left\"><mtext mathcolor=\"blue\">";
+constexpr std::string_view kRowValue = "</mtext></mtd><mtd columnalign=\"left\">";
+
+/// The signs of the direct modifications, in the order of their kinds.
+constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
+
+std::string UpperCase(std::string text) {
+  for (char& character : text) {
+    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
+  }
+  return text;
+}
+
+const FunctionMarkUp* FindMarkUp(std::string_view upperName) {
+  const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(),
+                                [upperName](const FunctionMarkUp& row) { return row.name == upperName; });
+  return hit == kFunctions.end() ? nullptr : &*hit;
+}
+
+bool IsSum(const std::string& text) {
+  return text == "+" || text == "-";
+}
+
+/// One run of the writer. A sum is fenced once; products, quotients and calls start afresh.
+class MathMLWriter final {
+ public:
+  explicit MathMLWriter(std::string& output) : buffer(output) {}
+
+  void OnEnter(std::int32_t kind, const std::string& text) {
+    switch (kind) {
+      case NODE_CALL:
+        EnterCall(UpperCase(text));
+        break;
+      case NODE_ARITHMETIC:
+        EnterArithmetic(text);
+        break;
+      case NODE_COMPARISON:
+        buffer += kFence;
+        break;
+      case NODE_CONDITIONAL:
+        EnterConditional(text);
+        break;
+      case NODE_DIRECT_ASSIGN:
+      case NODE_DIRECT_PLUS:
+      case NODE_DIRECT_MINUS:
+      case NODE_DIRECT_MULTIPLY:
+      case NODE_DIRECT_DIVIDE:
+        Element("mi", text);
+        buffer += "<mtext mathvariant=\"bold-italic\" mathcolor=\"green\">";
+        buffer += kDirectSigns.at(static_cast<std::size_t>(kind - NODE_DIRECT_ASSIGN));
+        buffer += "</mtext>";
+        break;
+      case NODE_ARGUMENT:
+        if (listDepth++ == 0) buffer += "<mrow>";
+        break;
+      case NODE_NEGATE:
+        buffer += "<mo>-</mo>";
+        break;
+      default:
+        break;
+    }
+  }
+
+  void OnBetween(std::int32_t kind, const std::string& text) {
+    switch (kind) {
+      case NODE_IDENTIFIER:
+        Element("mi", text);
+        break;
+      case NODE_NUMBER:
+        Element("mn", text);
+        break;
+      case NODE_ARITHMETIC:
+        if (text == "/") {
+          buffer += "</mrow><mrow>";
+        } else {
+          Element("mo", text);
+        }
+        break;
+      case NODE_COMPARISON:
+        WriteRelation(text);
+        break;
+      case NODE_PROPERTY:
+        buffer += "<mtext>[" + text + "]</mtext>";
+        break;
+      default:
+        break;
+    }
+  }
+
+  void OnLeave(std::int32_t kind, const std::string& text) {
+    switch (kind) {
+      case NODE_CALL:
+        LeaveCall(UpperCase(text));
+        break;
+      case NODE_ARITHMETIC:
+        LeaveArithmetic(text);
+        break;
+      case NODE_COMPARISON:
+        buffer += kFenceEnd;
+        break;
+      case NODE_CONDITIONAL:
+        if (text == "IF") buffer += "</mtd></mtr></mtable> </mfenced> ";
+        break;
+      case NODE_ARGUMENT:
+        // The end of one argument is the beginning of the next.
+        buffer += "</mrow>";
+        if (--listDepth >= 1) buffer += "<mrow>";
+        break;
+      default:
+        break;
+    }
+  }
+
+ private:
+  void Element(std::string_view tag, std::string_view content) {
+    buffer += '<';
+    buffer += tag;
+    buffer += '>';
+    buffer += content;
+    buffer += "</";
+    buffer += tag;
+    buffer += '>';
+  }
+
+  void EnterCall(const std::string& name) {
+    if (const FunctionMarkUp* markUp = FindMarkUp(name)) {
+      buffer += markUp->enter;
+    } else {
+      buffer += "<mrow><mtext mathvariant=\"bold-italic\" mathcolor=\"green\">" + name + "</mtext><mfenced>";
+    }
+    listStack.push_back(listDepth);
+    fenceStack.push_back(fenceDepth);
+    listDepth = fenceDepth = 0;
+  }
+
+  void LeaveCall(const std::string& name) {
+    const FunctionMarkUp* markUp = FindMarkUp(name);
+    buffer += markUp != nullptr ? markUp->leave : "</mfenced></mrow>";
+    listDepth = Take(listStack);
+    fenceDepth = Take(fenceStack);
+  }
+
+  void EnterArithmetic(const std::string& text) {
+    if (IsSum(text)) {
+      if (++fenceDepth == 1) buffer += kFence;
+      return;
+    }
+    if (text == "/") buffer += "<mfrac><mrow>";
+    fenceStack.push_back(fenceDepth);
+    fenceDepth = 0;
+  }
+
+  void LeaveArithmetic(const std::string& text) {
+    if (IsSum(text)) {
+      if (fenceDepth-- == 1) buffer += kFenceEnd;
+      return;
+    }
+    if (text == "/") buffer += "</mrow></mfrac>";
+    fenceDepth = Take(fenceStack);
+  }
+
+  void EnterConditional(const std::string& text) {
+    if (text == "IF") {
+      buffer += "<mtext mathcolor=\"blue\">IF</mtext>";
+      return;
+    }
+    buffer += text == "THEN" ? "<mfenced open=\"{\" close=\"\"><mtable>" : "</mtd></mtr>";
+    buffer += kRow;
+    buffer += text;
+    buffer += kRowValue;
+  }
+
+  void WriteRelation(const std::string& text) {
+    const auto hit = std::find_if(kRelations.begin(), kRelations.end(),
+                                  [&text](const Relation& relation) { return relation.text == text; });
+    if (hit != kRelations.end()) {
+      buffer += hit->markUp;
+    } else {
+      Element("mo", text);
+    }
+  }
+
+  static std::int32_t Take(std::vector<std::int32_t>& stack) {
+    const std::int32_t value = stack.back();
+    stack.pop_back();
+    return value;
+  }
+
+  std::string& buffer;
+  std::int32_t fenceDepth = 0;
+  std::int32_t listDepth = 0;
+  std::vector<std::int32_t> fenceStack;
+  std::vector<std::int32_t> listStack;
+};
+
+}  // namespace
+
+std::string ExpressionToMathML(const std::string& expression, const std::string& symbol, bool isDerivative) {
+  ExpressionNode tree;
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string message;
+  if (ParseExpressionText(expression, tree, line, position, message) == 0) return {};
+  std::string buffer(kStart);
+  if (isDerivative) {
+    buffer +=
+        "<mfrac><mrow><mi>d</mi><mi>" + symbol + "</mi></mrow><mrow><mi>dt</mi></mrow></mfrac><mo>=</mo>";
+  } else {
+    buffer += "<mi>" + symbol + "</mi><mo>=</mo>";
+  }
+  MathMLWriter writer(buffer);
+  tree.WalkInOrder(
+      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnEnter(kind, text); },
+      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnBetween(kind, text); },
+      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnLeave(kind, text); });
+  buffer += kEnd;
+  return buffer;
+}
+
+}  // namespace tessal

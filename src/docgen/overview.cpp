@@ -1,0 +1,148 @@
+#include "docgen/overview.h"
+
+#include <algorithm>
+#include <array>
+
+#include "core/template_core.h"
+#include "elements/property_io.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr std::size_t kColumns = 5;
+
+constexpr std::array<std::string_view, kColumns> kHeader = {"No.", "Symbol", "Type",
+                                                            "Expression/ Default value", "Description"};
+
+/// The name behind a search function's reference by number.
+std::string NameOfReference(const TemplateCore& core, std::int32_t reference, const std::string& otherwise) {
+  if (reference < 1) return otherwise;
+  const CEL_Element* element = core.GetElementBySequence(static_cast<std::uint32_t>(reference));
+  return element == nullptr ? "unkown" : element->symbol.Text();
+}
+
+std::string OwnerName(const TemplateCore& core, std::int32_t considered) {
+  if (considered == -1) return "own";
+  if (considered < 1) return "any";
+  const auto place = static_cast<std::size_t>(considered - 1);
+  return place < core.Species().size() ? core.Species()[place]->symbol.Text() : "unkown";
+}
+
+std::string SearchSummary(const TemplateCore& core, const CEL_Lagrange_Spatial_Function& function) {
+  if (function.purpose.Text() == "OILSPILL") return "Oilspill(deprecated)";
+  const std::int32_t reference = function.variableId.IntValue();
+  std::string sought;
+  if (function.framework.Text() == "EULER") {
+    sought = NameOfReference(core, reference, "unkown");
+  } else {
+    sought = OwnerName(core, function.lookFor.IntValue()) + "." +
+             NameOfReference(core, reference, function.property.Text());
+  }
+  return function.purpose.Text() + "(" + function.math.Text() + "[" + sought + "])";
+}
+
+/// Collects the rows, counting those that show a number.
+class OverviewBuilder final {
+ public:
+  explicit OverviewBuilder(const TemplateCore& templateCore) : core(templateCore) {}
+
+  std::vector<OverviewRow> Build() {
+    const auto equation = [](const auto& element) { return element.equation.Text(); };
+    const auto value = [](const auto& element) { return element.defaultValue.TextOf(); };
+    const auto expression = [](const auto& element) { return element.expression.Text(); };
+    AddAll(core.StateVariables(), "", equation);
+    AddAll(core.Constants(), "", value);
+    AddAll(core.Forcings(), "", value);
+    AddAll(core.Auxiliaries(), "", expression);
+    AddAll(core.Processes(), "", expression);
+    AddAll(core.DerivedOutputs(), "", expression);
+    for (const auto& specie : core.Species()) {
+      const std::string ofClass = " (" + specie->symbol.Text() + ")";
+      AddAll(specie->stateVariables, ofClass, equation);
+      AddAll(specie->constants, ofClass, value);
+      AddAll(specie->spatialFunctions, ofClass,
+             [this](const auto& function) { return SearchSummary(core, function); });
+      AddAll(specie->arithmeticExpressions, ofClass, expression);
+      for (const auto& vector : specie->horizontalVectors) {
+        AddMovement(*vector, "Direction" + ofClass, vector->direction, "horizontal direction equation");
+        AddMovement(*vector, "Speed" + ofClass, vector->speed, "horizontal speed equation");
+      }
+      const auto& vertical = *specie->verticalEquation;
+      AddMovement(vertical, std::string(vertical.KindText()) + ofClass, vertical.speed,
+                  "vertical speed equation");
+    }
+    return std::move(rows);
+  }
+
+ private:
+  template <class Elements, class TextOf>
+  void AddAll(const Elements& elements, const std::string& ofClass, TextOf textOf) {
+    for (const auto& element : elements) {
+      rows.push_back({std::to_string(++counted), element->symbol.Text(),
+                      std::string(element->KindText()) + ofClass, textOf(*element),
+                      element->description.Text(), element->GetUid()});
+    }
+  }
+
+  void AddMovement(const CEL_Element& movement, std::string type, const CEL_Property& expression,
+                   const char* description) {
+    rows.push_back(
+        {"-", movement.symbol.Text(), std::move(type), expression.Text(), description, movement.GetUid()});
+  }
+
+  const TemplateCore& core;
+  std::vector<OverviewRow> rows;
+  std::size_t counted = 0;
+};
+
+/// A text for one line of the table: without line ends and tabs, and without blanks at its ends.
+std::string Cleaned(std::string text) {
+  std::erase_if(text,
+                [](char character) { return character == '\r' || character == '\n' || character == '\t'; });
+  return std::string(CleanText(text));
+}
+
+using Cells = std::array<std::string, kColumns>;
+
+/// The first three columns stand right, the others left; tabs part them.
+void AppendRow(const Cells& cells, const std::array<std::size_t, kColumns>& widths, std::string& text) {
+  constexpr std::size_t kRightAligned = 3;
+  for (std::size_t column = 0; column < kColumns; ++column) {
+    if (column > 0) text += '\t';
+    const std::size_t width = widths[column] + 1;
+    const std::string padding(width > cells[column].size() ? width - cells[column].size() : 0, ' ');
+    text += column < kRightAligned ? padding + cells[column] : cells[column] + padding;
+  }
+  text += "\r\n";
+}
+
+}  // namespace
+
+std::vector<OverviewRow> BuildOverview(const TemplateCore& core) {
+  return OverviewBuilder(core).Build();
+}
+
+std::string OverviewText(const TemplateCore& core) {
+  std::string text = "Template " + core.TemplateFileName() + "\r\n";
+  // No line end follows the revision: the header row begins behind it.
+  if (core.GetMisc() != nullptr && core.GetDocumentRevision() > 0) {
+    text += "\nRevision " + std::to_string(core.GetDocumentRevision());
+  }
+  std::vector<Cells> table;
+  std::array<std::size_t, kColumns> widths{};
+  for (OverviewRow& row : BuildOverview(core)) {
+    table.push_back({std::move(row.number), std::move(row.symbol), std::move(row.type),
+                     Cleaned(std::move(row.expression)), Cleaned(std::move(row.description))});
+    for (std::size_t column = 0; column < kColumns; ++column) {
+      widths[column] = std::max(widths[column], table.back()[column].size());
+    }
+  }
+  Cells header;
+  std::copy(kHeader.begin(), kHeader.end(), header.begin());
+  AppendRow(header, widths, text);
+  for (const Cells& cells : table) AppendRow(cells, widths, text);
+  return text;
+}
+
+}  // namespace tessal
