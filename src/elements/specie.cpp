@@ -377,7 +377,8 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
   bool good = true;
   for (const CEL_Element* used : Owner()->ReferencedElements(member)) {
     auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
-    if (IsDeclaredAfter(*used, member, *this)) {
+    // Equations use what they use regardless of order: state variables are integrated.
+    if (!isEquation && IsDeclaredAfter(*used, member, *this)) {
       finding = ReferenceFinding{"The symbol '" + used->symbol.Text() +
                                  "' can not be used as it is declared after '" + member.symbol.Text() + "'!"};
     }

@@ -16,7 +16,7 @@ constexpr std::int32_t kAnyLayer = 1;
 constexpr std::int32_t kSurface = 2;
 constexpr std::int32_t kColumn = 3;
 constexpr std::int32_t kBottom = 4;
-constexpr std::int32_t kSediment = 5;
+[[maybe_unused]] constexpr std::int32_t kSediment = 5;
 
 constexpr std::int32_t kNone = 1;
 constexpr std::int32_t kHorizontal = 2;

@@ -1,0 +1,75 @@
+// Any text scans, parses, is checked and walked without harm, and the answers agree with each other.
+#include <cstdint>
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+#include "core/error_registry.h"
+#include "expr/expression_node.h"
+#include "expr/identifiers.h"
+#include "expr/interaction_rewriter.h"
+#include "expr/parser.h"
+#include "expr/scanner.h"
+#include "expr/semantic_checks.h"
+
+namespace {
+
+using namespace tessal;
+
+void Require(bool holds) {
+  if (!holds) std::abort();
+}
+
+void CheckTokens(const std::string& text) {
+  std::vector<ExpressionToken> tokens;
+  ResetExpressionScanner();
+  const bool clean = ScanExpressionTokens(text, tokens);
+  std::int32_t end = -1;
+  std::size_t names = 0;
+  for (const ExpressionToken& listed : tokens) {
+    Require(listed.firstOffset > end && listed.lastOffset >= listed.firstOffset);
+    end = listed.lastOffset;
+    const auto length = static_cast<std::size_t>(listed.lastOffset - listed.firstOffset + 1);
+    Require(text.compare(static_cast<std::size_t>(listed.firstOffset), length, listed.text) == 0);
+    if (listed.code == token::kIdentifier) ++names;
+  }
+  std::vector<std::string_view> identifiers;
+  ResetExpressionScanner();
+  ScanIdentifiers(text, identifiers);
+  Require(identifiers.size() == (clean ? names : 0));
+}
+
+void CheckParse(const std::string& text) {
+  ExpressionNode tree;
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string message;
+  ResetExpressionScanner();
+  const int parsed = ParseExpressionText(text, tree, line, position, message);
+  ResetExpressionScanner();
+  ExpressionNode again;
+  std::string sameMessage;
+  Require(ParseExpressionText(text, again, line, position, sameMessage) == parsed && message == sameMessage);
+  Require(parsed == 1 || message.starts_with("Line "));
+  const ExpressionNode copy(tree);
+  int nodes = 0;
+  int copied = 0;
+  tree.WalkInOrder(nullptr, [&nodes](std::int32_t, const std::string&, std::int32_t) { ++nodes; }, nullptr);
+  copy.WalkPostOrder(nullptr, [&copied](std::int32_t, const std::string&, std::int32_t) { ++copied; }, nullptr);
+  Require(nodes == copied);
+  if (parsed == 1) RewriteExpressionText(copy);
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  const std::string text(reinterpret_cast<const char*>(data), size);
+  CheckTokens(text);
+  CheckParse(text);
+  tessal::ResetExpressionScanner();
+  tessal::CheckFunctionsSpecified("fuzz", 1, text);
+  tessal::IsReservedName(text);
+  tessal::IsValidSymbol(text);
+  tessal::Errors().Reset();
+  return 0;
+}

@@ -1,0 +1,30 @@
+// The questions and boxes of the editor. The real ones stand on the screen; tests answer in their place.
+#pragma once
+
+#include <QString>
+#include <cstdint>
+#include <string>
+
+#include "core/document.h"
+
+class QWidget;
+
+namespace tessal {
+
+class UserDialogs : public DocumentDialogs {
+ public:
+  /// Shows a text in a box with an exclamation icon.
+  virtual void Warn(QWidget* parent, const QString& text) = 0;
+  virtual bool Ask(QWidget* parent, const QString& question) = 0;
+  /// Lets the user choose what an undefined symbol shall become; -1 when it is skipped.
+  virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
+  /// Lets the user choose a documentation file; empty when declined.
+  virtual QString ChooseDocumentationFile(QWidget* parent, const QString& start) = 0;
+  /// Asks the system to open a file or an address; false when it can not.
+  virtual bool OpenWithSystem(const QString& target) = 0;
+};
+
+/// The dialogs on the screen.
+UserDialogs& ScreenDialogs();
+
+}  // namespace tessal

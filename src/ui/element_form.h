@@ -1,0 +1,106 @@
+// The forms of the elements: one implementation over tables of fields. A form class is its table and what is
+// truly its own.
+#pragma once
+
+#include <QString>
+#include <span>
+#include <string>
+#include <vector>
+
+#include "ui/right_pane.h"
+
+class QComboBox;
+class QGridLayout;
+class QLabel;
+class QLineEdit;
+class QPlainTextEdit;
+
+namespace tessal {
+
+class CAutoRichEditCtrl;
+class CEL_Property;
+
+enum class FieldEditor {
+  Symbol,         ///< one line; a change is a rename
+  Line,           ///< one line of text
+  Lines,          ///< several lines of text
+  Documentation,  ///< one line, with buttons to browse for a file and to open it
+  Number,         ///< a real
+  Integer,
+  Shown,          ///< a value that is shown and never stored
+  SortedChoice,   ///< a combo box, its entries by caption
+  OrderedChoice,  ///< a combo box, its entries in the order of the choices
+  Expression,     ///< a coloured field, with the parser's message under it
+  ReferencedIn    ///< the names of the users, as links
+};
+
+/// One field: the number of its control, its label, and the property that it shows.
+struct FormField {
+  int control;
+  const char* label;
+  FieldEditor editor;
+  CEL_Property& (*property)(CEL_Element& element);
+  /// What else the field's behaviour hangs on.
+  bool onlyWhileEnabled = false;
+};
+
+/// A form: its class, its dialog and help numbers and its fields, in the order in which they are loaded.
+struct FormTable {
+  std::int32_t kind;
+  int dialog;
+  int help;
+  std::span<const FormField> fields;
+};
+
+class CElementForm : public CRightPaneBase {
+  Q_OBJECT
+
+ public:
+  CElementForm(const FormTable& formTable, const FormContext& context, QWidget* parent);
+
+  int HelpNumber() const override { return table.help; }
+
+ protected:
+  void ItemToForm() override;
+  void FormToItem() override;
+
+  struct Control {
+    const FormField* field;
+    QWidget* editor;
+    QLabel* label;
+    QLabel* note;  ///< under an expression: what the parser says
+  };
+
+  const Control* FindControl(int number) const;
+  /// Whether a control may be used; the property's flag, unless the form knows better.
+  virtual bool IsEnabled(const FormField& field, const CEL_Property& property) const;
+  /// Writes the fields behind the symbol; true when any has changed.
+  virtual bool StoreFields(CEL_Element& element);
+  bool Store(const Control& control, CEL_Element& element);
+  const std::vector<Control>& Controls() const { return controls; }
+
+ private:
+  void AddField(const FormField& field, QGridLayout& layout, int row);
+  QWidget* MakeEditor(const FormField& field, QWidget*& cell, QLabel*& note);
+  QWidget* MakeLine(const FormField& field);
+  QWidget* MakeLines();
+  QWidget* MakeCombo(const FormField& field);
+  QWidget* MakeDocumentation(QLineEdit*& line);
+  QWidget* MakeExpression(const FormField& field, CAutoRichEditCtrl*& edit, QLabel*& note);
+
+  void Show(const Control& control, CEL_Element& element);
+  void FillCombo(QComboBox& combo, const CEL_Property& property, bool enabled) const;
+  QString ReferrerText(const CEL_Element& element) const;
+  bool StoreText(const QString& text, CEL_Property& property) const;
+  bool StoreNumber(const QString& text, CEL_Property& property) const;
+  bool StoreChoice(const QComboBox& combo, CEL_Property& property) const;
+  std::string EnteredSymbol(const Control& control, const CEL_Element& element) const;
+
+  void BrowseDocumentation(QLineEdit& line);
+  void OpenDocumentation(const QString& text);
+
+  const FormTable& table;
+  std::vector<Control> controls;
+};
+
+}  // namespace tessal

@@ -1,0 +1,180 @@
+#include "ui/element_tree.h"
+
+#include <algorithm>
+
+#include "core/template_core.h"
+#include "ui/text_bytes.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr int kIndent = 14;
+
+/// A node with what stands behind it.
+class ElementItem final : public QTreeWidgetItem {
+ public:
+  CItemData data;
+};
+
+}  // namespace
+
+std::string ElementCaption(const CEL_Element& element) {
+  if (element.Kind() == kind::kDerivedOutput) return element.description.Text();
+  if (element.Kind() == kind::kExternalFunction) {
+    return "User function '" + static_cast<const CEL_ExternalFunction&>(element).publicName.Text() + "'";
+  }
+  return element.symbol.Text();
+}
+
+std::string MarkedCaption(const CEL_Element& element) {
+  const std::string caption = ElementCaption(element);
+  return element.Loaded() ? caption : "*" + caption;
+}
+
+CElementTree::CElementTree(QWidget* parent) : QTreeWidget(parent) {
+  setHeaderHidden(true);
+  setIndentation(kIndent);
+  setUniformRowHeights(true);
+  setContextMenuPolicy(Qt::CustomContextMenu);
+  setAccessibleName(QStringLiteral("Elements of the template"));
+}
+
+CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
+  return static_cast<ElementItem&>(item).data;
+}
+
+QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, std::int32_t kind, std::int32_t id,
+                                      const std::string& caption) {
+  auto* item = new ElementItem;
+  item->data.kind = kind;
+  item->data.id = id;
+  item->setText(0, ToScreen(caption));
+  parent.insertChild(std::min(place, parent.childCount()), item);
+  return item;
+}
+
+template <class Elements>
+void CElementTree::InsertFolder(std::int32_t kind, std::int32_t id, const Elements& elements) {
+  QTreeWidgetItem* folder =
+      Insert(*RootItem(), RootItem()->childCount(), kind, id, std::string(KindText(kind)));
+  for (const auto& element : elements) InsertElement(*folder, *element, folder->childCount());
+}
+
+void CElementTree::Build(TemplateCore& core) {
+  clear();
+  groupItems.clear();
+  auto* root = new ElementItem;
+  root->data.kind = node_kind::kRoot;
+  root->data.id = folder_id::kRoot;
+  root->setText(0, QStringLiteral("Tessal Setup"));
+  addTopLevelItem(root);
+  InsertFolder(kind::kStateVariableList, folder_id::kStateVariables, core.StateVariables());
+  InsertFolder(kind::kConstantList, folder_id::kConstants, core.Constants());
+  InsertFolder(kind::kForcingList, folder_id::kForcings, core.Forcings());
+  InsertFolder(kind::kAuxiliaryList, folder_id::kAuxiliaries, core.Auxiliaries());
+  InsertFolder(kind::kProcessList, folder_id::kProcesses, core.Processes());
+  InsertFolder(kind::kDerivedOutputList, folder_id::kDerivedOutputs, core.DerivedOutputs());
+  if (core.GetMisc() != nullptr) ShowMisc(core);
+  if (core.GetSpecieCount() > 0) ShowParticles(core);
+  root->setExpanded(true);
+}
+
+QTreeWidgetItem* CElementTree::FindById(std::int32_t id) const {
+  for (QTreeWidgetItemIterator item(const_cast<CElementTree*>(this)); *item != nullptr; ++item) {
+    if (DataOf(**item).id == id) return *item;
+  }
+  return nullptr;
+}
+
+QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_Element& element, int place) {
+  return Insert(folder, place, element.Kind(), element.MessageUid(), ElementCaption(element));
+}
+
+QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie) {
+  QTreeWidgetItem* branch = InsertElement(folder, specie, folder.childCount());
+  const auto addFolder = [this, branch, &specie](std::int32_t listKind, const auto& members) {
+    const CEL_Element& head = specie.Head(listKind);
+    QTreeWidgetItem* list =
+        Insert(*branch, branch->childCount(), listKind, head.MessageUid(), head.symbol.Text());
+    for (const auto& member : members) InsertElement(*list, *member, list->childCount());
+  };
+  // The forcings of a class are kept out on purpose.
+  addFolder(kind::kSpecieStateVariableList, specie.stateVariables);
+  addFolder(kind::kSpecieConstantList, specie.constants);
+  addFolder(kind::kSpatialFunctionList, specie.spatialFunctions);
+  addFolder(kind::kArithmeticExpressionList, specie.arithmeticExpressions);
+  addFolder(kind::kHorizontalVectorList, specie.horizontalVectors);
+  addFolder(kind::kVerticalEquationList, std::vector<const CEL_Element*>{specie.verticalEquation.get()});
+  return branch;
+}
+
+void CElementTree::ShowMisc(TemplateCore& core) {
+  if (FindById(folder_id::kMiscellaneous) != nullptr || core.GetMisc() == nullptr) return;
+  // Behind the collections and ahead of the particle classes.
+  QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses);
+  const int place = particles == nullptr ? RootItem()->childCount() : RootItem()->indexOfChild(particles);
+  QTreeWidgetItem* settings =
+      Insert(*RootItem(), place, kind::kMiscellaneous, folder_id::kMiscellaneous, "Miscellaneous");
+  const auto& functions = core.GetMisc()->ExternalFunctions();
+  if (!functions.empty()) {
+    QTreeWidgetItem* list =
+        Insert(*settings, 0, node_kind::kPluginFunctions, folder_id::kPluginFunctions, "Plug-in Functions");
+    for (const auto& function : functions) InsertElement(*list, *function, list->childCount());
+  }
+  Insert(*settings, settings->childCount(), kind::kVisibilityGroups, folder_id::kVisibilityGroups,
+         "Visibility Groups");
+  for (const VisibilityGroup& group : core.GetMisc()->Visibilities().groups) AddGroup(group.name);
+}
+
+void CElementTree::ShowParticles(TemplateCore& core) {
+  if (FindById(folder_id::kParticleClasses) != nullptr) return;
+  QTreeWidgetItem* folder = Insert(*RootItem(), RootItem()->childCount(), kind::kSpecie,
+                                   folder_id::kParticleClasses, "Particle Classes");
+  for (const auto& specie : core.Species()) InsertSpecie(*folder, *specie);
+  folder->setExpanded(true);
+}
+
+void CElementTree::RemoveBranch(std::int32_t folderId) {
+  QTreeWidgetItem* branch = FindById(folderId);
+  if (branch == nullptr) return;
+  if (folderId == folder_id::kMiscellaneous) groupItems.clear();
+  delete branch;
+}
+
+void CElementTree::AddGroup(const std::string& name) {
+  QTreeWidgetItem* folder = FindById(folder_id::kVisibilityGroups);
+  if (folder == nullptr) return;
+  QTreeWidgetItem* item =
+      Insert(*folder, folder->childCount(), kind::kVisibilityGroup, folder_id::kVisibilityGroup, name);
+  groupItems.push_back(item);
+  DataOf(*item).groupIndex = static_cast<std::int32_t>(groupItems.size());
+}
+
+void CElementTree::RemoveGroup(std::size_t position) {
+  if (position >= groupItems.size()) return;
+  delete groupItems[position];
+  groupItems.erase(groupItems.begin() + static_cast<std::ptrdiff_t>(position));
+  for (std::size_t place = position; place < groupItems.size(); ++place)
+    --DataOf(*groupItems[place]).groupIndex;
+}
+
+void CElementTree::MoveNode(QTreeWidgetItem& item, int step) {
+  QTreeWidgetItem* parent = item.parent();
+  if (parent == nullptr) return;
+  const int place = parent->indexOfChild(&item);
+  const int target = place + step;
+  if (target < 0 || target >= parent->childCount()) return;
+  setUpdatesEnabled(false);
+  const bool wasCurrent = currentItem() == &item;
+  const bool wasExpanded = item.isExpanded();
+  const QSignalBlocker quiet(this);
+  // The neighbour moves past the node, so that the node itself stays where it is.
+  QTreeWidgetItem* neighbour = parent->takeChild(target);
+  parent->insertChild(place, neighbour);
+  item.setExpanded(wasExpanded);
+  if (wasCurrent) setCurrentItem(&item);
+  setUpdatesEnabled(true);
+}
+
+}  // namespace tessal

@@ -1,0 +1,61 @@
+// The tree of a template: a node for each collection and each element, with what stands behind it.
+#pragma once
+
+#include <QTreeWidget>
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "ui/item_data.h"
+
+namespace tessal {
+
+class CEL_Element;
+class CEL_Lagrange_Specie;
+class TemplateCore;
+
+class CElementTree final : public QTreeWidget {
+  Q_OBJECT
+
+ public:
+  explicit CElementTree(QWidget* parent);
+
+  /// Builds the whole tree from a template and opens its root.
+  void Build(TemplateCore& core);
+
+  static CItemData& DataOf(QTreeWidgetItem& item);
+
+  /// The first node with this id, depth first; none when there is none.
+  QTreeWidgetItem* FindById(std::int32_t id) const;
+  QTreeWidgetItem* RootItem() const { return topLevelItem(0); }
+  /// The nodes of the visibility groups, in group order.
+  const std::vector<QTreeWidgetItem*>& GroupItems() const { return groupItems; }
+
+  /// Inserts the node of an element into its folder; a place beyond the end is the last.
+  QTreeWidgetItem* InsertElement(QTreeWidgetItem& folder, const CEL_Element& element, int place);
+  /// Inserts the node of a particle class with its whole branch.
+  QTreeWidgetItem* InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie);
+  void ShowMisc(TemplateCore& core);
+  void ShowParticles(TemplateCore& core);
+  void RemoveBranch(std::int32_t folderId);
+  void AddGroup(const std::string& name);
+  /// Removes the node of the group at a position from 0; the groups behind it move up by one number.
+  void RemoveGroup(std::size_t position);
+  /// Exchanges a node with a neighbour; nothing happens without one.
+  void MoveNode(QTreeWidgetItem& item, int step);
+
+ private:
+  QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, std::int32_t kind, std::int32_t id,
+                          const std::string& caption);
+  template <class Elements>
+  void InsertFolder(std::int32_t kind, std::int32_t id, const Elements& elements);
+
+  std::vector<QTreeWidgetItem*> groupItems;
+};
+
+/// The caption of an element's node: its symbol, a derived output's description, or a user function's public
+/// name. With the mark, when nobody has looked at the element yet.
+std::string ElementCaption(const CEL_Element& element);
+std::string MarkedCaption(const CEL_Element& element);
+
+}  // namespace tessal

@@ -1,0 +1,91 @@
+#include "ui/expression_colours.h"
+
+#include <algorithm>
+#include <array>
+#include <string>
+
+#include "core/template_core.h"
+#include "expr/function_catalogue.h"
+#include "expr/scanner.h"
+#include "expr/semantic_checks.h"
+#include "expr/user_function_names.h"
+
+namespace tessal {
+
+namespace {
+
+struct KindColour {
+  std::int32_t kind;
+  QRgb colour;
+};
+
+// Constants, inputs, intermediate values and rates have a colour each; everything else is blue.
+constexpr std::array<KindColour, 7> kKindColours = {{
+    {kind::kConstant, qRgb(230, 0, 230)},
+    {kind::kSpecieConstant, qRgb(230, 0, 230)},
+    {kind::kForcing, qRgb(230, 115, 0)},
+    {kind::kSpatialFunction, qRgb(230, 115, 0)},
+    {kind::kAuxiliary, qRgb(0, 230, 0)},
+    {kind::kArithmeticExpression, qRgb(0, 230, 0)},
+    {kind::kProcess, qRgb(0, 115, 230)},
+}};
+constexpr QRgb kOtherElement = qRgb(0, 0, 255);
+constexpr QRgb kCallable = qRgb(0, 155, 0);
+constexpr QRgb kProperty = qRgb(0, 0, 255);
+constexpr QRgb kUnknownName = qRgb(255, 0, 0);
+constexpr QRgb kNumber = qRgb(255, 0, 255);
+constexpr QRgb kOperator = qRgb(0, 0, 0);
+constexpr QRgb kConditional = qRgb(64, 64, 64);
+
+TokenStyle Style(QRgb colour, bool bold, bool italic, bool link) {
+  return {true, QColor(colour), bold, italic, link};
+}
+
+std::string UpperCase(std::string text) {
+  std::transform(text.begin(), text.end(), text.begin(), [](char letter) {
+    return letter >= 'a' && letter <= 'z' ? static_cast<char>(letter - 'a' + 'A') : letter;
+  });
+  return text;
+}
+
+bool IsCallable(const std::string& name) {
+  std::string upper = name;
+  return IsFunctionName(upper) || IsUserFunctionName(name) || IsInteractionVerb(UpperCase(name));
+}
+
+TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
+  std::int32_t id = 0;
+  std::int32_t elementKind = 0;
+  if (core.FindElementBySymbol(name, id, elementKind)) {
+    const auto row =
+        std::find_if(kKindColours.begin(), kKindColours.end(),
+                     [elementKind](const KindColour& entry) { return entry.kind == elementKind; });
+    return Style(row == kKindColours.end() ? kOtherElement : row->colour, true, false, true);
+  }
+  if (IsCallable(name)) return Style(kCallable, true, true, false);
+  if (IsPropertyName(name)) return Style(kProperty, true, false, false);
+  return Style(kUnknownName, true, false, false);
+}
+
+}  // namespace
+
+TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
+  const std::int32_t code = expressionToken.code;
+  if (code == token::kIdentifier) return StyleOfName(expressionToken.text, core);
+  if (code >= token::kIntNum && code <= token::kScientificNum) return Style(kNumber, true, true, false);
+  const bool isOperator = code >= token::kAddOpPlus && code <= token::kMulOpDivide;
+  const bool isBracket = code >= token::kLeftBracket && code <= token::kRightCurly;
+  if (isOperator || isBracket) return Style(kOperator, true, false, false);
+  if (code >= token::kIf && code <= token::kElse) return Style(kConditional, true, true, false);
+  return {};
+}
+
+QColor ReadableColour(const QColor& colour, const QColor& ground) {
+  constexpr int kDarkGround = 128;
+  constexpr int kLightEnough = 170;
+  if (ground.lightness() >= kDarkGround) return colour;
+  return QColor::fromHsl(std::max(colour.hslHue(), 0), colour.hslSaturation(),
+                         std::max(255 - colour.lightness(), kLightEnough));
+}
+
+}  // namespace tessal

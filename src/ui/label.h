@@ -1,0 +1,19 @@
+// A label whose font is described field by field, as the title over the right pane needs it.
+#pragma once
+
+#include <QLabel>
+
+namespace tessal {
+
+class CLabel final : public QLabel {
+  Q_OBJECT
+
+ public:
+  explicit CLabel(QWidget* parent) : QLabel(parent) { setTextFormat(Qt::PlainText); }
+
+  /// The weight on the scale from 1 to 1000 (400 normal, 700 bold), and the height in pixels.
+  void SetFontWeight(int weight);
+  void SetFontHeight(int pixels);
+};
+
+}  // namespace tessal

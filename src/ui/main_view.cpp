@@ -1,0 +1,389 @@
+#include "ui/main_view.h"
+
+#include <QAction>
+#include <QKeyEvent>
+#include <QMenu>
+#include <QScrollArea>
+#include <QSplitter>
+#include <QStyle>
+#include <QToolBar>
+#include <QToolButton>
+#include <QVBoxLayout>
+#include <algorithm>
+#include <array>
+
+#include "core/document.h"
+#include "ui/create_hint.h"
+#include "ui/dialogs.h"
+#include "ui/element_tree.h"
+#include "ui/error_list.h"
+#include "ui/form_tables.h"
+#include "ui/label.h"
+#include "ui/node_commands.h"
+#include "ui/strings.h"
+#include "ui/text_bytes.h"
+
+namespace tessal {
+
+namespace {
+
+constexpr int kSmallestTree = 100;
+constexpr int kSmallestForm = 200;
+constexpr int kSmallestUpper = 150;
+constexpr int kSmallestErrors = 50;
+constexpr QSize kSmallestView(500, 300);
+constexpr int kTitleWeight = 700;
+constexpr int kTitleHeight = 14;
+
+std::int32_t NumberOf(const UpdateHint* argument) {
+  const auto* number = dynamic_cast<const NumberHint*>(argument);
+  return number == nullptr ? 0 : number->number;
+}
+
+}  // namespace
+
+CMainView::CMainView(CTessalDoc& shownDocument, UserDialogs& userDialogs)
+    : document(shownDocument), dialogs(userDialogs) {
+  setMinimumSize(kSmallestView);
+}
+
+CMainView::~CMainView() {
+  // The form holds on to its node's data: it goes first.
+  form.reset();
+}
+
+TemplateCore& CMainView::Core() const {
+  return document.Core();
+}
+
+void CMainView::OnInitialUpdate() {
+  BuildToolBar();
+  BuildLayout();
+  tree->Build(Core());
+  errorList->RefreshErrorList(Core());
+  connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
+  connect(tree, &QTreeWidget::customContextMenuRequested, this, &CMainView::OpenContextMenu);
+  connect(errorList, &CErrorList::ElementChosen, this, &CMainView::SelectById);
+  tree->setCurrentItem(tree->RootItem());
+  UpdateNavigation();
+}
+
+void CMainView::BuildToolBar() {
+  toolBar = new QToolBar(this);
+  back = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowBack), strings::kNavigateBack, this,
+                            [this] { SelectById(history.Back()); });
+  forward = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowForward), strings::kNavigateForward,
+                               this, [this] { SelectById(history.Forward()); });
+  back->setShortcut(QKeySequence::Back);
+  forward->setShortcut(QKeySequence::Forward);
+  historyMenu = new QMenu(this);
+  connect(historyMenu, &QMenu::aboutToShow, this, &CMainView::FillHistoryMenu);
+  auto* button = new QToolButton(toolBar);
+  button->setText(strings::kNavigationHistory);
+  button->setToolTip(strings::kNavigationHistory);
+  button->setMenu(historyMenu);
+  button->setPopupMode(QToolButton::InstantPopup);
+  historyAction = toolBar->addWidget(button);
+}
+
+void CMainView::BuildLayout() {
+  title = new CLabel(this);
+  title->SetFontWeight(kTitleWeight);
+  title->SetFontHeight(kTitleHeight);
+  tree = new CElementTree(this);
+  tree->setMinimumWidth(kSmallestTree);
+  tree->installEventFilter(this);
+  errorList = new CErrorList(this);
+  errorList->setMinimumHeight(kSmallestErrors);
+
+  auto* area = new QScrollArea(this);
+  area->setWidgetResizable(true);
+  area->setFrameShape(QFrame::NoFrame);
+  holder = new QWidget(area);
+  holderLayout = new QVBoxLayout(holder);
+  holderLayout->setContentsMargins(0, 0, 0, 0);
+  area->setWidget(holder);
+
+  auto* titleDetail = new QWidget(this);
+  titleDetail->setMinimumWidth(kSmallestForm);
+  auto* detailLayout = new QVBoxLayout(titleDetail);
+  detailLayout->setContentsMargins(0, 0, 0, 0);
+  detailLayout->addWidget(title);
+  detailLayout->addWidget(area, 1);
+
+  auto* treeDetail = new QSplitter(Qt::Horizontal, this);
+  treeDetail->setObjectName(QStringLiteral("TreeDetail"));
+  treeDetail->addWidget(tree);
+  treeDetail->addWidget(titleDetail);
+  treeDetail->setStretchFactor(1, 1);
+  treeDetail->setMinimumHeight(kSmallestUpper);
+  treeDetail->setChildrenCollapsible(false);
+  auto* topBottom = new QSplitter(Qt::Vertical, this);
+  topBottom->setObjectName(QStringLiteral("TopBottom"));
+  topBottom->addWidget(treeDetail);
+  topBottom->addWidget(errorList);
+  topBottom->setStretchFactor(0, 1);
+  topBottom->setChildrenCollapsible(false);
+  constexpr int kUsualTree = 260;
+  constexpr int kUsualErrors = 140;
+  treeDetail->setSizes({kUsualTree, 3 * kUsualTree});
+  topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
+
+  auto* layout = new QVBoxLayout(this);
+  layout->addWidget(toolBar);
+  layout->addWidget(topBottom, 1);
+}
+
+void CMainView::MarkDocument() {
+  if (Core().Modified()) document.SetModifiedFlag(true);
+}
+
+void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHint* argument) {
+  const std::int32_t number = NumberOf(argument);
+  switch (hintNumber) {
+    case hint::kShowMisc:
+      number != 0 ? tree->ShowMisc(Core()) : tree->RemoveBranch(folder_id::kMiscellaneous);
+      break;
+    case hint::kShowParticles:
+      number != 0 ? tree->ShowParticles(Core()) : tree->RemoveBranch(folder_id::kParticleClasses);
+      break;
+    case hint::kSelectElement:
+      SelectById(number);
+      break;
+    case hint::kCommit:
+      Commit();
+      break;
+    case hint::kCreateElement:
+      if (const auto* request = dynamic_cast<const CreateHint*>(argument)) CreateElement(request->request);
+      break;
+    case hint::kDeleteItem:
+      if (QTreeWidgetItem* item = tree->FindById(number)) DeleteNode(*item);
+      break;
+    case hint::kMoveUp:
+    case hint::kMoveDown:
+      if (QTreeWidgetItem* item = tree->FindById(number))
+        tree->MoveNode(*item, hintNumber == hint::kMoveUp ? -1 : 1);
+      break;
+    case hint::kAddGroup: {
+      const std::int32_t group = Core().AddVisibilityGroup();
+      if (group > 0) tree->AddGroup(Core().GroupText(group));
+      break;
+    }
+    case hint::kDeleteGroup:
+      DeleteGroup(number);
+      break;
+    case hint::kSelectGroup:
+      SelectGroup(number);
+      break;
+    case hint::kRenameGroup:
+      if (const auto* rename = dynamic_cast<const RenameGroupHint*>(argument)) {
+        const auto position = static_cast<std::size_t>(rename->position);
+        const auto& groups = tree->GroupItems();
+        if (position < groups.size()) groups[position]->setText(0, ToScreen(rename->name));
+      }
+      break;
+    default:
+      break;
+  }
+  MarkDocument();
+}
+
+void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*previous*/) {
+  // The form still shows the node that is being left: its entries are written before it goes.
+  Commit();
+  RefreshCaption();
+  ReplaceForm(current);
+  if (current != nullptr) {
+    const CItemData& data = CElementTree::DataOf(*current);
+    history.Add(data.id, current->text(0).toStdString());
+    helpNumber = HelpNumberOfKind(data.kind);
+  }
+  UpdateNavigation();
+}
+
+void CMainView::ReplaceForm(QTreeWidgetItem* item) {
+  form.reset();
+  formItem = nullptr;
+  if (item == nullptr) return;
+  formItem = &CElementTree::DataOf(*item);
+  form = MakeForm({document, dialogs, *formItem}, holder);
+  holderLayout->addWidget(form.get());
+  form->Load();
+}
+
+void CMainView::Commit() {
+  if (form) {
+    form->Commit();
+    MarkDocument();
+  }
+  RefreshCaption();
+  errorList->RefreshErrorList(Core());
+}
+
+void CMainView::RefreshCaption() {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr) return;
+  const std::int32_t id = CElementTree::DataOf(*item).id;
+  const CEL_Element* element = id > 0 ? Core().GetElement(static_cast<std::uint32_t>(id)) : nullptr;
+  const bool isFolder = CElementTree::DataOf(*item).kind >= kind::kRoot;
+  if (element != nullptr && !isFolder) {
+    const QString caption = ToScreen(MarkedCaption(*element));
+    if (!caption.isEmpty()) item->setText(0, caption);
+  }
+  title->setText(item->text(0));
+}
+
+void CMainView::SelectById(std::int32_t id) {
+  QTreeWidgetItem* item = tree->FindById(id);
+  if (item == nullptr) return;
+  tree->setCurrentItem(item);
+  tree->scrollToItem(item);
+}
+
+void CMainView::SelectGroup(std::int32_t position) {
+  const auto& groups = tree->GroupItems();
+  const auto place = static_cast<std::size_t>(position);
+  if (position < 0 || place >= groups.size()) return;
+  tree->setCurrentItem(groups[place]);
+  tree->scrollToItem(groups[place]);
+}
+
+void CMainView::UpdateNavigation() {
+  back->setEnabled(history.CanGoBack());
+  forward->setEnabled(history.CanGoForward());
+  historyAction->setEnabled(history.CanGoBack() || history.CanGoForward());
+}
+
+void CMainView::FillHistoryMenu() {
+  historyMenu->clear();
+  std::ptrdiff_t place = 0;
+  for (const CHistoryData& entry : history.Entries()) {
+    QAction* action =
+        historyMenu->addAction(ToScreen(entry.caption), this, [this, id = entry.id] { SelectById(id); });
+    action->setCheckable(true);
+    action->setChecked(place++ == history.Position());
+  }
+}
+
+QTreeWidgetItem* CMainView::FolderFor(const CreateRequest& request) const {
+  const auto elementKind = static_cast<std::int32_t>(request.kind);
+  if (const std::int32_t folder = FolderOfKind(elementKind); folder != 0) return tree->FindById(folder);
+  return tree->FindById(request.ownerId);
+}
+
+std::uint32_t CMainView::CreateElement(const CreateRequest& request) {
+  const auto elementKind = static_cast<std::int32_t>(request.kind);
+  if (elementKind == kind::kVisibilityGroup || elementKind == kind::kVisibilityGroups) {
+    SetNotifyChanges(false);
+    document.UpdateAllViews(nullptr, hint::kAddGroup);
+    const NumberHint last(static_cast<std::int32_t>(tree->GroupItems().size()) - 1);
+    document.UpdateAllViews(nullptr, hint::kSelectGroup, &last);
+    return 0;
+  }
+  const CreatedElement created = Core().CreateElement(request);
+  if (created.uid != 0) InsertCreated(request, created);
+  return created.uid;
+}
+
+void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement& created) {
+  const CEL_Element* element = Core().GetElement(created.uid);
+  if (request.kind == static_cast<std::uint32_t>(kind::kSpecie)) tree->ShowParticles(Core());
+  QTreeWidgetItem* folder = FolderFor(request);
+  if (element == nullptr || folder == nullptr || tree->FindById(element->MessageUid()) != nullptr) return;
+  QTreeWidgetItem* item = nullptr;
+  if (element->Kind() == kind::kSpecie) {
+    item = tree->InsertSpecie(*folder, static_cast<const CEL_Lagrange_Specie&>(*element));
+  } else {
+    int place = folder->childCount();
+    if (created.placed) {
+      QTreeWidgetItem* before =
+          created.predecessor == 0 ? nullptr : tree->FindById(static_cast<std::int32_t>(created.predecessor));
+      place = before == nullptr ? 0 : folder->indexOfChild(before) + 1;
+    }
+    item = tree->InsertElement(*folder, *element, place);
+  }
+  item->setText(0, ToScreen(MarkedCaption(*element)));
+}
+
+void CMainView::OpenContextMenu(const QPoint& point) {
+  QTreeWidgetItem* item = tree->itemAt(point);
+  if (item == nullptr) return;
+  const CItemData data = CElementTree::DataOf(*item);
+  const NodeCommands commands = CommandsOfNode(data, Core());
+  if (commands.kindToCreate == 0) return;
+  QMenu menu(this);
+  QAction* create = menu.addAction(strings::kCreateNew, this, [this, data] { CreateFromMenu(data); });
+  create->setEnabled(commands.canCreate);
+  if (commands.offersDelete) {
+    QAction* remove = menu.addAction(strings::kDelete, this, [this, item] { DeleteFromMenu(*item); });
+    remove->setEnabled(commands.canDelete);
+  }
+  menu.exec(tree->viewport()->mapToGlobal(point));
+}
+
+void CMainView::CreateFromMenu(const CItemData& clicked) {
+  const NodeCommands commands = CommandsOfNode(clicked, Core());
+  CreateRequest request;
+  request.kind = static_cast<std::uint32_t>(commands.kindToCreate);
+  request.ownerId = commands.ownerId;
+  const std::uint32_t uid = CreateElement(request);
+  if (uid != 0) SelectById(static_cast<std::int32_t>(uid));
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
+}
+
+void CMainView::DeleteNode(QTreeWidgetItem& item) {
+  if (tree->currentItem() == &item) {
+    QTreeWidgetItem* parent = item.parent();
+    QTreeWidgetItem* next = parent == nullptr ? nullptr : parent->child(parent->indexOfChild(&item) + 1);
+    if (next == nullptr && parent != nullptr) next = parent->child(parent->indexOfChild(&item) - 1);
+    if (next == nullptr) next = parent;
+    if (next != nullptr) tree->setCurrentItem(next);
+  }
+  delete &item;
+}
+
+void CMainView::DeleteFromMenu(QTreeWidgetItem& item) {
+  const CItemData data = CElementTree::DataOf(item);
+  if (data.kind == kind::kVisibilityGroup) {
+    const auto& groups = tree->GroupItems();
+    const auto hit = std::find(groups.begin(), groups.end(), &item);
+    if (hit != groups.end()) DeleteGroup(static_cast<std::int32_t>(hit - groups.begin()));
+  } else {
+    // The commit that goes with leaving the node may have made it undeletable.
+    const auto uid = static_cast<std::uint32_t>(data.id);
+    if (!Core().CanDelete(uid)) return;
+    DeleteNode(item);
+    Core().DeleteElement(uid);
+  }
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
+}
+
+void CMainView::DeleteGroup(std::int32_t position) {
+  const auto& groups = tree->GroupItems();
+  const auto place = static_cast<std::size_t>(position);
+  if (position < 0 || place >= groups.size()) return;
+  if (tree->currentItem() == groups[place]) tree->setCurrentItem(groups[place]->parent());
+  Core().RemoveVisibilityGroup(position + 1);
+  tree->RemoveGroup(place);
+}
+
+bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
+  if (watched == tree && happened->type() == QEvent::KeyPress && form) {
+    const auto* key = static_cast<QKeyEvent*>(happened);
+    if (key->key() == Qt::Key_Tab && key->modifiers() == Qt::NoModifier) {
+      const auto fields = form->findChildren<QWidget*>();
+      const auto first = std::find_if(fields.begin(), fields.end(), [](const QWidget* field) {
+        return field->isEnabled() && field->isVisible() && (field->focusPolicy() & Qt::TabFocus) != 0;
+      });
+      if (first != fields.end()) {
+        (*first)->setFocus(Qt::TabFocusReason);
+        return true;
+      }
+    }
+  }
+  return QWidget::eventFilter(watched, happened);
+}
+
+}  // namespace tessal

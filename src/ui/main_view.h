@@ -1,0 +1,97 @@
+// The one view on a template: the tree of its elements, the form of the selected one, and the list of what is
+// wrong. It is the hub of the editor: forms and dialogs speak to it through the document's hints.
+#pragma once
+
+#include <QWidget>
+#include <memory>
+
+#include "core/creation.h"
+#include "platform/docview.h"
+#include "ui/item_data.h"
+
+class QAction;
+class QMenu;
+class QSplitter;
+class QToolBar;
+class QTreeWidgetItem;
+class QVBoxLayout;
+
+namespace tessal {
+
+class CElementTree;
+class CErrorList;
+class CLabel;
+class CRightPaneBase;
+class CTessalDoc;
+class TemplateCore;
+class UserDialogs;
+
+class CMainView final : public QWidget, public CView {
+  Q_OBJECT
+
+ public:
+  CMainView(CTessalDoc& shownDocument, UserDialogs& userDialogs);
+  ~CMainView() override;
+
+  void OnInitialUpdate() override;
+  void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) override;
+  /// Commits the open form.
+  void OnCommit() override { Commit(); }
+  QWidget* Widget() override { return this; }
+
+  CElementTree& Tree() const { return *tree; }
+  CErrorList& ErrorList() const { return *errorList; }
+  /// The form of the selected node; none before the first selection.
+  CRightPaneBase* Form() const { return form.get(); }
+  const CNavigationHistory& History() const { return history; }
+  int HelpNumber() const { return helpNumber; }
+
+  /// Selects the node with this id and makes it visible; nothing happens when there is none.
+  void SelectById(std::int32_t id);
+  /// Makes an element and its node; its identity, 0 when nothing was made.
+  std::uint32_t CreateElement(const CreateRequest& request);
+
+ protected:
+  bool eventFilter(QObject* watched, QEvent* happened) override;
+
+ private:
+  void BuildToolBar();
+  void BuildLayout();
+  TemplateCore& Core() const;
+
+  void OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* previous);
+  void ReplaceForm(QTreeWidgetItem* item);
+  void Commit();
+  void RefreshCaption();
+  void UpdateNavigation();
+  void FillHistoryMenu();
+  void MarkDocument();
+  void SelectGroup(std::int32_t position);
+
+  void OpenContextMenu(const QPoint& point);
+  void CreateFromMenu(const CItemData& clicked);
+  void DeleteFromMenu(QTreeWidgetItem& item);
+  void DeleteNode(QTreeWidgetItem& item);
+  void DeleteGroup(std::int32_t position);
+  QTreeWidgetItem* FolderFor(const CreateRequest& request) const;
+  void InsertCreated(const CreateRequest& request, const CreatedElement& created);
+
+  CTessalDoc& document;
+  UserDialogs& dialogs;
+  QToolBar* toolBar = nullptr;
+  QAction* back = nullptr;
+  QAction* forward = nullptr;
+  QAction* historyAction = nullptr;
+  QMenu* historyMenu = nullptr;
+  CLabel* title = nullptr;
+  CElementTree* tree = nullptr;
+  CErrorList* errorList = nullptr;
+  QWidget* holder = nullptr;
+  QVBoxLayout* holderLayout = nullptr;
+  std::unique_ptr<CRightPaneBase> form;
+  CItemData* formItem = nullptr;
+  CNavigationHistory history;
+  int helpNumber = 109;
+};
+
+}  // namespace tessal

@@ -1,0 +1,72 @@
+// What all forms of the right pane share: how a form is loaded from one element and written back to it, when
+// a change counts, and the prompts about names. The model is written by the commit only.
+#pragma once
+
+#include <QWidget>
+#include <cstdint>
+#include <string>
+
+#include "core/creation.h"
+#include "ui/item_data.h"
+
+namespace tessal {
+
+class CEL_Element;
+class CTessalDoc;
+class TemplateCore;
+class UserDialogs;
+
+/// What a form works on: the document, the node that it shows, and who speaks with the user.
+struct FormContext {
+  CTessalDoc& document;
+  UserDialogs& dialogs;
+  CItemData& item;
+};
+
+class CRightPaneBase : public QWidget {
+  Q_OBJECT
+
+ public:
+  CRightPaneBase(const FormContext& context, QWidget* parent);
+
+  /// Fills the form from its element. No control counts as edited meanwhile.
+  void Load();
+  /// Writes the form to its element, offers to create undefined symbols, and loads anew what has changed.
+  /// A commit that comes while one is running does nothing.
+  void Commit();
+
+  /// The number of the help topic.
+  virtual int HelpNumber() const { return kNoHelp; }
+  bool IsDirty() const { return dirty; }
+
+ protected:
+  static constexpr int kNoHelp = 107;
+
+  virtual void ItemToForm() {}
+  virtual void FormToItem() {}
+
+  CTessalDoc& Document() const { return context.document; }
+  TemplateCore& Core() const;
+  UserDialogs& Dialogs() const { return context.dialogs; }
+  CItemData& Item() const { return context.item; }
+  CEL_Element* Element() const;
+
+  // What controls report. Nothing counts while the form is being filled or written.
+  void NoteEdited();
+  void NoteFocusLost();
+  void NoteChosen();
+
+  /// Asks what a new symbol needs asking, and renames. False, with a message shown, when the name is refused.
+  bool Rename(const std::string& newSymbol);
+
+ private:
+  bool IsDeaf() const { return loading || committing; }
+  void RequestCommit();
+
+  FormContext context;
+  bool dirty = false;
+  bool loading = false;
+  bool committing = false;
+};
+
+}  // namespace tessal

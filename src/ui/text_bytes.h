@@ -1,0 +1,17 @@
+// Between the bytes of a template and the text on the screen. Bytes show as UTF-8 when they are valid UTF-8,
+// otherwise as Windows-1252; what nobody edited goes back as the same bytes.
+#pragma once
+
+#include <QString>
+#include <string>
+#include <string_view>
+
+namespace tessal {
+
+QString ToScreen(std::string_view bytes);
+
+/// The bytes of an edited text. A text that shows as the former bytes do gives them back; another is written
+/// in the encoding of the former bytes where that can hold it, else in UTF-8. Zero bytes are dropped.
+std::string FromScreen(const QString& text, std::string_view former);
+
+}  // namespace tessal
