@@ -1,0 +1,66 @@
+/* Preloaded into the save probe. Counts the calls by which a save reaches the disk, from the opening of its
+   temporary file on, and at the n-th (SAVE_FAULT_AT) ends the process (SAVE_FAULT_KIND=kill) or fails as a full disk does. */
+#define _GNU_SOURCE
+#include <dlfcn.h>
+#include <errno.h>
+#include <fcntl.h>
+#include <signal.h>
+#include <stdarg.h>
+#include <stdlib.h>
+#include <string.h>
+#include <sys/types.h>
+#include <unistd.h>
+
+static int counting = 0;
+static int calls = 0;
+
+/* 1 when this call shall fail. Does not return when it shall end the process. */
+static int strikes(void) {
+  const char* at = getenv("SAVE_FAULT_AT");
+  const char* kind = getenv("SAVE_FAULT_KIND");
+  if (!counting || at == NULL || ++calls != atoi(at)) return 0;
+  if (kind != NULL && strcmp(kind, "kill") == 0) raise(SIGKILL);
+  errno = ENOSPC;
+  return 1;
+}
+
+#define NEXT(name) ((__typeof__(&name))dlsym(RTLD_NEXT, #name))
+
+int open(const char* path, int flags, ...) {
+  va_list arguments;
+  va_start(arguments, flags);
+  const mode_t mode = (flags & O_CREAT) != 0 ? va_arg(arguments, mode_t) : 0;
+  va_end(arguments);
+  if ((flags & O_CREAT) != 0 && path[strlen(path) - 1] == '$') counting = 1;
+  if (strikes()) return -1;
+  return NEXT(open)(path, flags, mode);
+}
+
+int mkostemp(char* pattern, int flags) { return strikes() ? -1 : NEXT(mkostemp)(pattern, flags); }
+
+ssize_t write(int descriptor, const void* bytes, size_t count) {
+  if (descriptor > 2 && strikes()) {
+    /* A full disk takes a part first. */
+    if (count > 1) NEXT(write)(descriptor, bytes, count / 2);
+    errno = ENOSPC;
+    return -1;
+  }
+  return NEXT(write)(descriptor, bytes, count);
+}
+
+int fsync(int descriptor) { return strikes() ? -1 : NEXT(fsync)(descriptor); }
+
+int close(int descriptor) {
+  if (strikes()) {
+    NEXT(close)(descriptor);
+    errno = EIO;
+    return -1;
+  }
+  return NEXT(close)(descriptor);
+}
+
+int fchmod(int descriptor, mode_t mode) { return strikes() ? -1 : NEXT(fchmod)(descriptor, mode); }
+
+int rename(const char* from, const char* to) { return strikes() ? -1 : NEXT(rename)(from, to); }
+
+int unlink(const char* path) { return strikes() ? -1 : NEXT(unlink)(path); }

@@ -1,0 +1,208 @@
+#include "elements/element.h"
+
+#include <gtest/gtest.h>
+
+#include "core/error_registry.h"
+#include "elements/area_search.h"
+#include "elements/expression_elements.h"
+#include "elements/input_elements.h"
+#include "elements/miscellaneous.h"
+#include "elements/specie.h"
+#include "elements/state_variable.h"
+
+namespace tessal {
+namespace {
+
+std::string Labels(const CEL_Element& element) {
+  std::vector<ElementField> fields;
+  element.GetFields(fields);
+  std::string labels;
+  for (const ElementField& field : fields) labels += field.name + "|";
+  return labels;
+}
+
+constexpr const char* kBase = "Caption|Symbol|ID|Description|Documentation|Online help|UNQ Type|UNQ Unit|";
+
+TEST(Elements, ListTheirFieldsInOrder) {
+  const std::string base = kBase;
+  EXPECT_EQ(Labels(CEL_StateVariable("S")),
+            base + "Scope|Transport|Unit|Default Value|Min Value|Max Value|Equation|");
+  EXPECT_EQ(
+      Labels(CEL_Constant("c")),
+      base + "Is user specified|Build in ID|Scope|Spatial Variation|Unit|Default Value|Min Value|Max Value|");
+  EXPECT_EQ(Labels(CEL_Auxilliary_Variable("a")), base + "Output|Scope|Spatial Variation|Unit|Expression|");
+  EXPECT_EQ(Labels(CEL_Process("p")),
+            base +
+                "Output|Process type|Scope|Spatial Variation|Unit|Expression|Control "
+                "ID|Control Value|");
+  EXPECT_EQ(Labels(CEL_Derived_Output("d")), base + "Scope|Spatial Variation|Unit|Format|Expression|");
+  EXPECT_EQ(
+      Labels(CEL_Miscanellous()),
+      base +
+          "Tessal version|Parser version|Randseed|Debug level|Debug log|Inital random particle dir|Build "
+          "spatial tree|Checksum|Optimise expressions|Trigonometric unit|Revision|");
+  EXPECT_EQ(
+      Labels(CEL_Lagrange_Specie("A")),
+      "Caption|Name|Description|Documentation|Online help|Scope|Transport|Projection time|Field of view|");
+  EXPECT_EQ(Labels(CEL_Lagrange_Horizontal_Vector("h")), "Caption|Speed|Direction|");
+  EXPECT_EQ(Labels(CEL_Lagrange_Vertical_Equation("v")), "Caption|Speed|");
+  EXPECT_EQ(Labels(CEL_Lagrange_StateVariable("s")),
+            base + "Specie|Unit|Default Value|Min Value|Max Value|Equation|");
+  EXPECT_EQ(Labels(CEL_Lagrange_Spatial_Function("f")),
+            base +
+                "Function_ID|Variable ID|Specie ID|Radius|Dimension|Spatial "
+                "Variation|Purpose|Framework|Property|Math|Lookfor|");
+}
+
+TEST(Elements, SetTheFieldsTheyKnowAndCountThem) {
+  CEL_Auxilliary_Variable auxiliary("a");
+  ElementField expression;
+  expression.kind = FieldKind::Text;
+  expression.name = "Expression";
+  expression.text = "1+1";
+  ElementField equation = expression;
+  equation.name = "Equation";
+  ElementField wrong = expression;
+  wrong.name = "ID";
+  EXPECT_EQ(auxiliary.SetFields({expression, equation, wrong}), 1);
+  EXPECT_EQ(auxiliary.expression.Text(), "1+1");
+  CEL_StateVariable variable("S");
+  EXPECT_EQ(variable.SetFields({expression, equation}), 1);
+  EXPECT_EQ(variable.equation.Text(), "1+1");
+}
+
+TEST(Elements, StartWithTheirDefaults) {
+  const CEL_StateVariable variable("S");
+  EXPECT_EQ(
+      variable.scope.Text() + variable.transport.Text() + variable.unit.Text() + variable.equation.Text(),
+      "WCADVECTION_DISPERSIONundefined0");
+  EXPECT_EQ(variable.maxValue.RealValue(), 100.0);
+  EXPECT_EQ(variable.unqType.IntValue(), 999);
+  const CEL_Constant constant("c");
+  EXPECT_EQ(constant.builtInId.IntValue(), -1);
+  EXPECT_TRUE(constant.isUserSpecified.BoolValue());
+  EXPECT_EQ(constant.scope.Text() + constant.spatialVariation.Text(), "NOT_SPECIFIEDNONE");
+  EXPECT_EQ(CEL_Process("p").controlValue.RealValue(), 0.8);
+  EXPECT_EQ(CEL_Derived_Output("d").format.Text(), "INSTANTANEOUS");
+  EXPECT_EQ(CEL_Lagrange_Constant("c").maxValue.RealValue(), 10.0);
+  EXPECT_EQ(CEL_Lagrange_Forcing("f").minValue.RealValue(), 1e-35);
+  const CEL_Miscanellous misc;
+  EXPECT_EQ(misc.trigonometrics.Text(), "Degree");
+  EXPECT_TRUE(misc.optimise.BoolValue());
+}
+
+TEST(Elements, UnitTypesFixTheirUnits) {
+  SetNotifyChanges(true);
+  CEL_StateVariable variable("S");
+  variable.unqType.SelectChoice("Volume");
+  variable.unqType.ApplySelection();
+  EXPECT_EQ(variable.unit.Text(), "m3");
+  EXPECT_FALSE(variable.UnitEditable());
+  variable.unqType.SetInt(4711);
+  EXPECT_EQ(variable.unqType.IntValue(), 999);
+  EXPECT_TRUE(variable.UnitEditable());
+  CEL_Constant constant("c");
+  constant.unqType.SelectChoice("Process rate");
+  constant.unqType.ApplySelection();
+  EXPECT_EQ(constant.unit.Text(), "/d");
+  EXPECT_FALSE(constant.unit.Editable());
+  CEL_Lagrange_Constant particle("p");
+  particle.unqType.SetInt(100220);
+  EXPECT_EQ(particle.unit.Text(), "per meter");
+  particle.unqType.SetInt(1);
+  EXPECT_EQ(particle.unit.Text(), "per meter");
+  EXPECT_TRUE(particle.unit.Editable());
+  SetNotifyChanges(false);
+}
+
+TEST(Elements, AScopeBringsItsVariation) {
+  SetNotifyChanges(true);
+  CEL_Process process("p");
+  process.scope.SetText("SED");
+  EXPECT_EQ(process.spatialVariation.Text(), "HORISONTAL");
+  process.scope.SetText("WC");
+  EXPECT_EQ(process.spatialVariation.Text(), "HORISONTAL_AND_VERTICAL");
+  process.scope.SetText("elsewhere");
+  EXPECT_EQ(process.spatialVariation.Text(), "HORISONTAL_AND_VERTICAL");
+  SetNotifyChanges(false);
+}
+
+TEST(Elements, CheckTheirRanges) {
+  struct Row {
+    double minimum;
+    double value;
+    double maximum;
+    std::size_t ofTemplate;
+    std::size_t ofParticle;
+  };
+  const Row rows[] = {{1, 1, 1, 0, 0}, {0, -1, 5, 1, 1}, {0, 6, 5, 1, 1}, {9, 5, 1, 3, 2}};
+  for (const Row& row : rows) {
+    const auto check = [&row](auto&& element) {
+      Errors().Reset();
+      element.minValue.SetReal(row.minimum);
+      element.defaultValue.SetReal(row.value);
+      element.maxValue.SetReal(row.maximum);
+      const bool good = element.Check();
+      EXPECT_EQ(good, Errors().Records().empty());
+      return Errors().Records().size();
+    };
+    EXPECT_EQ(check(CEL_StateVariable("S")), row.ofTemplate) << row.value;
+    EXPECT_EQ(check(CEL_Forcing("f")), row.ofTemplate) << row.value;
+    EXPECT_EQ(check(CEL_Lagrange_StateVariable("s")), row.ofParticle) << row.value;
+    EXPECT_EQ(check(CEL_Lagrange_Forcing("f")), 0U) << "unchecked";
+  }
+}
+
+TEST(AreaSearch, ChoicesFollowFrameworkAndPurpose) {
+  SetNotifyChanges(true);
+  CEL_Lagrange_Spatial_Function search("s");
+  EXPECT_TRUE(search.math.HasChoice("MIN_ABSOLUTE"));
+  EXPECT_FALSE(search.purpose.HasChoice("PARTICLE"));
+  search.variableId.SetInt(5);
+  search.framework.SetText("LAGRANGE");
+  EXPECT_EQ(search.variableId.IntValue(), -1);
+  search.purpose.SetText("MAGNITUDE");
+  EXPECT_TRUE(search.math.HasChoice("SUM_NORM"));
+  search.math.SetText("SUM_NORM");
+  search.purpose.SetText("PARTICLE");
+  EXPECT_EQ(search.math.Text(), "NONE") << "gives way to the first choice";
+  search.framework.SetText("EULER");
+  EXPECT_EQ(search.purpose.Text(), "DIRECTION");
+  search.purpose.SetText("OILSPILL");
+  EXPECT_TRUE(search.purpose.HasChoice("Oilspill(deprecated)"));
+  EXPECT_EQ(search.purpose.Text(), "OILSPILL");
+  SetNotifyChanges(false);
+}
+
+TEST(AreaSearch, ChecksWhatItNeeds) {
+  CEL_Lagrange_Spatial_Function search("s");
+  const auto findings = [&search] {
+    Errors().Reset();
+    search.Check();
+    std::string texts;
+    for (const ErrorRecord& record : Errors().Records()) texts += record.text + "|";
+    return texts;
+  };
+  const std::string variable = "No valid variable/property selected|";
+  const std::string math = "Invalid math function|";
+  const std::string radius = "Search radius must be larger than zero|";
+  EXPECT_EQ(findings(), variable + math + radius);
+  search.purpose.SetText("OILSPILL");
+  EXPECT_EQ(findings(), math + radius);
+  search.purpose.SetText("DIRECTION");
+  search.math.SetText("MIN");
+  search.radius.SetReal(1e-9);
+  search.variableId.SetInt(1'000'000);
+  EXPECT_EQ(findings(), variable);
+  search.framework.SetText("LAGRANGE");
+  search.variableId.SetInt(-1);
+  search.property.SetText("AGE");
+  EXPECT_EQ(findings(), "");
+  search.lookFor.SetInt(0);
+  EXPECT_EQ(findings(), "No valid specie selected|");
+  search.lookFor.SetInt(-2);
+  EXPECT_EQ(findings(), "");
+}
+
+}  // namespace
+}  // namespace tessal
