@@ -26,9 +26,7 @@ const SymbolRecord* TemplateCore::FindRecordBySequence(std::uint32_t sequence) c
 }
 
 const SymbolRecord* TemplateCore::FindRecordByUid(std::uint32_t uid) const {
-  return FindRecord(symbolTable, [uid](const SymbolRecord& record) {
-    return record.element != nullptr && record.element->GetUid() == uid;
-  });
+  return FindRecord(symbolTable, [uid](const SymbolRecord& record) { return record.uid == uid; });
 }
 
 const SymbolRecord* TemplateCore::RecordOfElement(const CEL_Element& element) const {
@@ -41,11 +39,21 @@ const SymbolRecord* TemplateCore::RecordOfElement(const CEL_Element& element) co
   return FindRecordByUid(element.GetUid());
 }
 
+void TemplateCore::AppendRecordSymbol(const SymbolRecord& record, std::string& text) const {
+  if (record.element == nullptr) {
+    text += "unknown";
+    return;
+  }
+  if (IsMovement(*record.element)) {
+    text += "(" + At(species, static_cast<std::size_t>(record.specieIndex)).symbol.Text() + ")";
+  }
+  text += record.element->symbol.Text();
+}
+
 std::string TemplateCore::RecordSymbol(const SymbolRecord& record) const {
-  if (record.element == nullptr) return "unknown";
-  const std::string& own = record.element->symbol.Text();
-  if (!IsMovement(*record.element)) return own;
-  return "(" + At(species, static_cast<std::size_t>(record.specieIndex)).symbol.Text() + ")" + own;
+  std::string symbol;
+  AppendRecordSymbol(record, symbol);
+  return symbol;
 }
 
 CEL_Element* TemplateCore::GetElement(std::uint32_t uid, std::int32_t kindFilter) const {
@@ -102,8 +110,7 @@ bool TemplateCore::GetSequenceOfUid(std::uint32_t uid, std::uint32_t& sequence) 
 
 bool TemplateCore::IsSymbolTakenByOther(std::uint32_t uid, std::string_view symbol) const {
   return FindRecord(symbolTable, [this, uid, symbol](const SymbolRecord& record) {
-           return record.element != nullptr && record.element->GetUid() != uid &&
-                  RecordSymbol(record) == symbol;
+           return record.uid != uid && RecordSymbol(record) == symbol;
          }) != nullptr;
 }
 

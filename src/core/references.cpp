@@ -1,5 +1,9 @@
 // Who uses whom. The expressions are only scanned, so the answer exists also for one that does not parse.
 #include <algorithm>
+#include <bit>
+#include <functional>
+#include <numeric>
+#include <string>
 #include <string_view>
 #include <unordered_map>
 #include <unordered_set>
@@ -46,13 +50,68 @@ bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
                      [](const auto& specie) { return !specie->spatialFunctions.empty(); });
 }
 
+/// The symbols of the table by name. In a large template every step through memory counts: the names stand
+/// side by side, and so do the slots of the hash table, probed one after the other.
+class SymbolIndex final {
+ public:
+  explicit SymbolIndex(std::size_t records) : slots(std::bit_ceil(2 * records + 1)) {
+    ends.reserve(records + 1);
+    uids.reserve(records + 1);
+  }
+
+  /// Where the name of the next symbol is to be appended.
+  std::string& NextName() { return names; }
+  /// Adds the symbol whose name was appended last. Of equal names the first one counts.
+  void AddNext(std::uint32_t uid) {
+    ends.push_back(names.size());
+    uids.push_back(uid);
+    const auto sequence = static_cast<std::uint32_t>(ends.size() - 1);
+    const std::string_view name = NameOf(sequence);
+    Slot& slot = slots[SlotOf(name)];
+    if (slot.sequence == 0) slot = {ShortHash(name), sequence};
+  }
+
+  /// The sequence number of the symbol of that name; 0 when there is none.
+  std::uint32_t Find(std::string_view name) const { return slots[SlotOf(name)].sequence; }
+  std::uint32_t UidOf(std::uint32_t sequence) const { return uids[sequence]; }
+
+ private:
+  struct Slot {
+    std::uint32_t hash = 0;
+    std::uint32_t sequence = 0;  ///< 0 for an empty slot
+  };
+
+  static std::uint32_t ShortHash(std::string_view name) {
+    return static_cast<std::uint32_t>(std::hash<std::string_view>()(name));
+  }
+  std::string_view NameOf(std::uint32_t sequence) const {
+    const std::size_t start = ends[sequence - 1];
+    return std::string_view(names).substr(start, ends[sequence] - start);
+  }
+  /// The slot that holds the name, or the empty one that would take it.
+  std::size_t SlotOf(std::string_view name) const {
+    const std::uint32_t hash = ShortHash(name);
+    std::size_t place = hash & (slots.size() - 1);
+    while (slots[place].sequence != 0 &&
+           (slots[place].hash != hash || NameOf(slots[place].sequence) != name)) {
+      place = (place + 1) & (slots.size() - 1);
+    }
+    return place;
+  }
+
+  std::string names;
+  std::vector<std::size_t> ends{0};    // of the names, by sequence number
+  std::vector<std::uint32_t> uids{0};  // by sequence number
+  std::vector<Slot> slots;
+};
+
 }  // namespace
 
 /// What the extraction looks names up in. It lives as long as the step.
 struct TemplateCore::ReferenceLookup {
-  std::unordered_map<std::string, std::uint32_t>
-      composed;  ///< symbols of movements, which have no text of their own
-  std::unordered_map<std::string_view, std::uint32_t> sequences;
+  explicit ReferenceLookup(std::size_t records) : symbols(records), lastUser(records + 1, 0) {}
+
+  SymbolIndex symbols;
   std::unordered_map<std::string_view, UndefinedSymbol*> undefined;
   /// For each record the last one that was noted to use it: an expression's second use of a symbol adds
   /// nothing.
@@ -61,17 +120,10 @@ struct TemplateCore::ReferenceLookup {
 };
 
 void TemplateCore::ExtractReferences() {
-  ReferenceLookup lookup;
-  lookup.sequences.reserve(symbolTable.size());
-  lookup.lastUser.assign(symbolTable.size() + 1, 0);
+  ReferenceLookup lookup(symbolTable.size());
   for (const SymbolRecord& record : symbolTable) {
-    const std::int32_t elementKind = record.element->Kind();
-    if (elementKind == kind::kHorizontalVector || elementKind == kind::kVerticalEquation) {
-      const auto entry = lookup.composed.emplace(RecordSymbol(record), record.sequence).first;
-      lookup.sequences.emplace(entry->first, record.sequence);
-    } else {
-      lookup.sequences.emplace(record.element->symbol.Text(), record.sequence);
-    }
+    AppendRecordSymbol(record, lookup.symbols.NextName());
+    lookup.symbols.AddNext(record.uid);
   }
   for (const auto& undefined : undefinedSymbols) lookup.undefined.emplace(undefined->symbol, undefined.get());
   for (SymbolRecord& record : symbolTable) ExtractRecordReferences(record, lookup);
@@ -90,16 +142,16 @@ void TemplateCore::ExtractRecordReferences(SymbolRecord& record, ReferenceLookup
 }
 
 void TemplateCore::Refer(SymbolRecord& record, std::string_view name, ReferenceLookup& lookup) {
-  const auto hit = lookup.sequences.find(name);
-  if (hit == lookup.sequences.end()) {
-    NoteUndefined(name, record.element->GetUid(), lookup);
+  const std::uint32_t used = lookup.symbols.Find(name);
+  if (used == 0) {
+    NoteUndefined(name, record.uid, lookup);
     return;
   }
-  std::uint32_t& lastUser = lookup.lastUser[hit->second];
+  std::uint32_t& lastUser = lookup.lastUser[used];
   if (lastUser == record.sequence) return;
   lastUser = record.sequence;
-  record.references.push_back(hit->second);
-  record.referenceUids.push_back(Record(hit->second).element->GetUid());
+  record.references.push_back(used);
+  record.referenceUids.push_back(lookup.symbols.UidOf(used));
 }
 
 bool TemplateCore::CountsAsDefined(std::string_view name) const {
@@ -129,12 +181,26 @@ void TemplateCore::NoteUndefined(std::string_view name, std::uint32_t uid, Refer
 }
 
 void TemplateCore::BuildReverseReferences() {
+  // The uses are sorted by the symbol used in lists of plain numbers before they go to the records: in a
+  // large template a step from record to record is dear.
+  std::vector<std::uint32_t> uids(1, 0);
+  std::vector<std::size_t> ends(symbolTable.size() + 2, 0);  // of a symbol's uses in the list, by sequence
   for (const SymbolRecord& user : symbolTable) {
-    const std::uint32_t uid = user.element == nullptr ? kNoUid : user.element->GetUid();
-    for (const std::uint32_t sequence : user.references) {
-      SymbolRecord& used = Record(sequence);
-      used.referencedBy.push_back(user.sequence);
+    uids.push_back(user.uid);
+    for (const std::uint32_t sequence : user.references) ++ends[sequence + 1];
+  }
+  std::partial_sum(ends.begin(), ends.end(), ends.begin());
+  std::vector<std::uint32_t> users(ends.back());
+  for (const SymbolRecord& user : symbolTable) {
+    for (const std::uint32_t sequence : user.references) users[ends[sequence]++] = user.sequence;
+  }
+  auto use = users.cbegin();
+  for (SymbolRecord& used : symbolTable) {
+    const auto end = users.cbegin() + static_cast<std::ptrdiff_t>(ends[used.sequence]);
+    used.referencedBy.assign(use, end);
+    for (; use != end; ++use) {
       // The two records of a movement share an identity and stand side by side.
+      const std::uint32_t uid = uids[*use];
       if (used.referencedByUids.empty() || used.referencedByUids.back() != uid) {
         used.referencedByUids.push_back(uid);
       }

@@ -26,6 +26,7 @@ struct SymbolRecord {
   std::vector<std::uint32_t> referenceUids;
   std::vector<std::uint32_t> referencedByUids;
   CEL_Element* element = nullptr;
+  std::uint32_t uid = 0;  ///< the element's identity
 };
 
 /// A name that expressions use and nobody has defined.

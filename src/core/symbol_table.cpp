@@ -24,13 +24,12 @@ std::string StreamText(double value) {
 void TemplateCore::RebuildSymbolTable() {
   if (!flags.rebuildEnabled) return;
   const NotificationsOff silent;
-  const std::size_t formerSize = symbolTable.size();
-  symbolTable.clear();
-  symbolTable.reserve(formerSize + 1);
   MarkUndefinedStale();
   ResolveReferencesToNames();
+  recordCount = 0;
   NumberTemplateElements();
   NumberParticleElements();
+  symbolTable.resize(recordCount);
   ExtractReferences();
   BuildReverseReferences();
   ClassifyArithmeticExpressions();
@@ -49,36 +48,42 @@ void TemplateCore::DropStaleUndefined() {
   std::erase_if(undefinedSymbols, [](const auto& undefined) { return undefined->stale; });
 }
 
-void TemplateCore::AppendRecord(CEL_Element& element, std::int32_t index, std::int32_t specieIndex,
-                                std::string text) {
-  SymbolRecord record;
-  record.sequence = static_cast<std::uint32_t>(symbolTable.size() + 1);
-  if (!symbolTable.empty()) {
-    record.scope = symbolTable.back().scope;
-    record.spatial = symbolTable.back().spatial;
-  }
+SymbolRecord& TemplateCore::AppendRecord(CEL_Element& element, std::int32_t index, std::int32_t specieIndex,
+                                         std::string_view text) {
+  // A record is made anew in the place of the one before the rebuild, whose buffers it takes over.
+  if (recordCount == symbolTable.size()) symbolTable.emplace_back();
+  SymbolRecord& record = symbolTable[recordCount];
+  ++recordCount;
+  record.sequence = static_cast<std::uint32_t>(recordCount);
+  const SymbolRecord* before = recordCount < 2 ? nullptr : &symbolTable[recordCount - 2];
+  record.scope = before == nullptr ? scope_code::kGlobal : before->scope;
+  record.spatial = before == nullptr ? spatial_code::kNone : before->spatial;
   record.index = index;
   record.specieIndex = specieIndex;
-  record.text = std::move(text);
+  record.text = text;
+  for (auto* list :
+       {&record.references, &record.referencedBy, &record.referenceUids, &record.referencedByUids}) {
+    list->clear();
+  }
   record.element = &element;
+  record.uid = element.GetUid();
   element.id.SetInt(static_cast<std::int32_t>(record.sequence));
-  symbolTable.push_back(std::move(record));
+  return record;
 }
 
 void TemplateCore::NumberTemplateElements() {
-  const auto append = [this](auto& element, std::int32_t index, std::string text) {
-    AppendRecord(element, index, -1, std::move(text));
-    SymbolRecord& record = symbolTable.back();
+  const auto append = [this](auto& element, std::int32_t index, std::string_view text) -> SymbolRecord& {
+    SymbolRecord& record = AppendRecord(element, index, -1, text);
     record.scope = ScopeFromText(element.scope.Text());
-    return &record;
+    return record;
   };
-  const auto appendVarying = [&append](auto& element, std::int32_t index, std::string text) {
-    append(element, index, std::move(text))->spatial = SpatialFromText(element.spatialVariation.Text());
+  const auto appendVarying = [&append](auto& element, std::int32_t index, std::string_view text) {
+    append(element, index, text).spatial = SpatialFromText(element.spatialVariation.Text());
   };
   std::int32_t index = 0;
   for (const auto& element : stateVariables) {
-    SymbolRecord* record = append(*element, index++, element->equation.Text());
-    record->spatial = SpatialFromScope(record->scope);
+    SymbolRecord& record = append(*element, index++, element->equation.Text());
+    record.spatial = SpatialFromScope(record.scope);
   }
   const auto appendInputs = [&appendVarying](const auto& inputs) {
     std::int32_t place = 0;
@@ -109,11 +114,14 @@ void TemplateCore::NumberParticleElements() {
   };
   for (std::size_t place = 0; place < species.size(); ++place) {
     const CEL_Lagrange_Specie& specie = *species[place];
-    append(specie.stateVariables, place, [](const auto& member) { return member.equation.Text(); });
+    append(specie.stateVariables, place,
+           [](const auto& member) -> const std::string& { return member.equation.Text(); });
     append(specie.constants, place, valueText);
     append(specie.forcings, place, valueText);
-    append(specie.spatialFunctions, place, [](const auto& member) { return member.VariableName(); });
-    append(specie.arithmeticExpressions, place, [](const auto& member) { return member.expression.Text(); });
+    append(specie.spatialFunctions, place,
+           [](const auto& member) -> const std::string& { return member.VariableName(); });
+    append(specie.arithmeticExpressions, place,
+           [](const auto& member) -> const std::string& { return member.expression.Text(); });
   }
   for (std::size_t place = 0; place < species.size(); ++place) {
     CEL_Lagrange_Specie& specie = *species[place];

@@ -35,7 +35,6 @@ struct TemplateFlags {
 
 class TemplateCore final : public ElementOwner {
  public:
-  static constexpr std::uint32_t kNoUid = 0xFFFFFFFFU;
   static constexpr std::size_t kListHeadCount = 6;
 
   TemplateCore();
@@ -214,6 +213,7 @@ class TemplateCore final : public ElementOwner {
   std::uint32_t UidAt(const SymbolRecord& sibling, std::size_t place);
   void LeaveVisibilityGroups(CEL_Element& element);
 
+  void AppendRecordSymbol(const SymbolRecord& record, std::string& text) const;
   const SymbolRecord* RecordOfElement(const CEL_Element& element) const;
   SymbolRecord& Record(std::uint32_t sequence) { return symbolTable[sequence - 1]; }
   const SymbolRecord& Record(std::uint32_t sequence) const { return symbolTable[sequence - 1]; }
@@ -231,7 +231,8 @@ class TemplateCore final : public ElementOwner {
   // Steps of the rebuild.
   void MarkUndefinedStale();
   void DropStaleUndefined();
-  void AppendRecord(CEL_Element& element, std::int32_t index, std::int32_t specieIndex, std::string text);
+  SymbolRecord& AppendRecord(CEL_Element& element, std::int32_t index, std::int32_t specieIndex,
+                             std::string_view text);
   void NumberTemplateElements();
   void NumberParticleElements();
   void ResolveReferencesToNames();
@@ -295,6 +296,7 @@ class TemplateCore final : public ElementOwner {
   std::string saveFileName;
   CEL_ListHead root{kind::kRoot, "Tessal Setup"};
   std::vector<SymbolRecord> symbolTable;
+  std::size_t recordCount = 0;  ///< records that the rebuild under way has made
   std::vector<std::unique_ptr<UndefinedSymbol>> undefinedSymbols;
 };
 

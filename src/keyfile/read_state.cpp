@@ -136,7 +136,7 @@ std::uint32_t ReadState::EndKey(std::uint32_t key, std::uint32_t name, std::uint
 
 void ReadState::Finish(std::uint32_t header, std::uint32_t /*targets*/) {
   root = std::make_unique<CKvfSectionItem>();
-  root->name = ".";
+  root->name.assign(1, '.');  // GCC 12 warns, wrongly, of an overlap when a literal is assigned here
   if (header != kNothing) {
     TurnRound(*items[header]);
     root->AdoptChild(std::move(items[header]));
