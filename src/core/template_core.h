@@ -92,6 +92,8 @@ class TemplateCore final : public ElementOwner {
   void SetModified(bool value) { flags.modified = value; }
   bool ShowAllBuiltIns() const { return flags.showAllBuiltIns; }
   void SetShowAllBuiltIns(bool value);
+  /// Off while many elements are made at once; the caller rebuilds behind it.
+  void SetRebuildEnabled(bool value) { flags.rebuildEnabled = value; }
   /// 1 for the scope rule in force, 0 for the process rule that stands behind it.
   void SetStrictScopeRule(std::int32_t value) { flags.strictScopeRule = value; }
 

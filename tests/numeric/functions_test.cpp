@@ -33,6 +33,8 @@ void ExpectValues(const Value (&rows)[Count]) {
     if (std::isnan(row.expected)) {
       EXPECT_TRUE(std::isnan(row.computed)) << row.what << " gives " << row.computed;
     } else {
+      // An infinity has no neighbourhood.
+      if (row.computed == row.expected) continue;
       EXPECT_NEAR(row.computed, row.expected, 1e-12 * std::fabs(row.expected)) << row.what;
     }
   }

@@ -1,0 +1,40 @@
+// The documentation page of a large template.
+#include <benchmark/benchmark.h>
+
+#include <ctime>
+#include <string>
+
+#include "core/template_core.h"
+#include "docgen/html_documentation.h"
+#include "docgen/overview.h"
+
+namespace {
+
+using namespace tessal;
+
+/// A template of constants, auxiliaries and processes that use them.
+void Fill(TemplateCore& core, std::int64_t elements) {
+  const auto third = elements / 3;
+  for (std::int64_t number = 0; number < third; ++number) core.AddConstant();
+  for (std::int64_t number = 1; number <= third; ++number) {
+    const std::string symbol = "Constant_" + std::to_string(number);
+    core.AddAuxiliary().expression.SetText(symbol + "*(1 + EXP(-" + symbol + "/2))");
+    core.AddProcess().expression.SetText("IF " + symbol + " > 1 THEN Auxiliary_" + std::to_string(number) +
+                                         " ELSE 0");
+  }
+}
+
+void Page(benchmark::State& state) {
+  TemplateCore core;
+  core.SetRebuildEnabled(false);
+  Fill(core, state.range(0));
+  core.SetRebuildEnabled(true);
+  core.RebuildSymbolTable();
+  const std::tm time = {};
+  for ([[maybe_unused]] auto turn : state)
+    benchmark::DoNotOptimize(HtmlDocumentation(core, false, time).size());
+}
+
+}  // namespace
+
+BENCHMARK(Page)->Arg(1'000)->Arg(10'000)->Unit(benchmark::kMillisecond);

@@ -1,0 +1,60 @@
+// Expressions: to trees, to identifiers, and checked, as a validation does for every element.
+#include <benchmark/benchmark.h>
+
+#include <string>
+#include <vector>
+
+#include "expr/expression_node.h"
+#include "expr/identifiers.h"
+#include "expr/parser.h"
+#include "expr/semantic_checks.h"
+
+namespace {
+
+using namespace tessal;
+
+const std::string kShort = "a*b";
+const std::string kTypical = "kd*ARRHENIUS20(theta, temp)*(Cs - C)/dz + load";
+const std::string kLong = [] {
+  std::string text = kTypical;
+  for (int repeat = 0; repeat < 40; ++repeat) text += " + IF a > 1 AND b < 2 THEN MAX(a, b) ELSE " + kTypical;
+  return text;
+}();
+
+const std::string& Text(const benchmark::State& state) {
+  return state.range(0) == 0 ? kShort : state.range(0) == 1 ? kTypical : kLong;
+}
+
+void Parse(benchmark::State& state) {
+  std::int32_t line = 0;
+  std::int32_t position = 0;
+  std::string message;
+  for ([[maybe_unused]] auto turn : state) {
+    ExpressionNode tree;
+    benchmark::DoNotOptimize(ParseExpressionText(Text(state), tree, line, position, message));
+  }
+  state.SetItemsProcessed(state.iterations());
+}
+
+void Identifiers(benchmark::State& state) {
+  std::vector<std::string_view> names;
+  for ([[maybe_unused]] auto turn : state) {
+    ScanIdentifiers(Text(state), names);
+    benchmark::DoNotOptimize(names.data());
+  }
+  state.SetItemsProcessed(state.iterations());
+}
+
+void Check(benchmark::State& state) {
+  for ([[maybe_unused]] auto turn : state) {
+    benchmark::DoNotOptimize(CheckFunctionsSpecified("S", 1, Text(state)));
+  }
+  state.SetItemsProcessed(state.iterations());
+}
+
+}  // namespace
+
+// 0 short, 1 typical, 2 long.
+BENCHMARK(Parse)->DenseRange(0, 2);
+BENCHMARK(Identifiers)->DenseRange(0, 2);
+BENCHMARK(Check)->DenseRange(0, 2);
