@@ -34,9 +34,10 @@ class Choices final {
   std::size_t left;
 };
 
-constexpr std::array<const char*, 12> kTexts = {"a",     "b + a",  "Process_1", "a*(b-2)", "IF a > 1 THEN b ELSE Constant_1",
-                                                "K",     "",       "it's",      "x!",      "MAX(a, StateVariable_1)",
-                                                "a + ^", "[XPOS]"};
+constexpr std::array<const char*, 12> kTexts = {
+    "a",     "b + a", "Process_1", "a*(b-2)", "IF a > 1 THEN b ELSE Constant_1",
+    "K",     "",      "it's",      "x!",      "MAX(a, StateVariable_1)",
+    "a + ^", "[XPOS]"};
 constexpr std::array<const char*, 8> kNames = {"a", "b", "K", "Mass", "new_name", "Fish", "SIN", "two words"};
 
 std::uint32_t AnyUid(const TemplateCore& core, Choices& choices) {
@@ -48,7 +49,9 @@ void Add(TemplateCore& core, Choices& choices) {
   CreateRequest request;
   request.kind = static_cast<std::uint32_t>(1 + choices.Pick(13));
   request.symbol = choices.Pick(2) == 0 ? "" : kNames[choices.Pick(kNames.size() - 1)];
-  if (core.SymbolExists(request.symbol)) request.symbol.clear();
+  // A derived output has no symbol in the file: its place names it.
+  const bool isUnnamed = request.kind == static_cast<std::uint32_t>(kind::kDerivedOutput);
+  if (isUnnamed || core.SymbolExists(request.symbol)) request.symbol.clear();
   if (request.kind > 7 && core.GetSpecieCount() > 0) {
     const auto& specie = core.GetSpecie(choices.Pick(core.GetSpecieCount()));
     request.ownerId = specie.Head(kind::kSpecieConstantList).MessageUid();
@@ -65,7 +68,9 @@ void ChangeField(TemplateCore& core, Choices& choices) {
   ElementField& field = fields[choices.Pick(fields.size())];
   // Names go through the rename, numbers of records through the table.
   if (field.name == "Symbol" || field.name == "Name" || field.name == "ID" || field.name == "Specie") return;
-  field.text = kTexts[choices.Pick(kTexts.size())];
+  // A search function's loading gives up texts that are no choices.
+  const auto& allowed = field.choiceTexts;
+  field.text = allowed.empty() ? kTexts[choices.Pick(kTexts.size())] : allowed[choices.Pick(allowed.size())];
   field.intValue = static_cast<std::int32_t>(choices.Pick(7)) - 2;
   field.realValue = static_cast<double>(choices.Pick(9)) - 4.5;
   field.boolValue = choices.Pick(2) == 0;
@@ -113,9 +118,9 @@ void Edit(TemplateCore& core, Choices& choices) {
       break;
     }
     case 4: {
-      std::string symbol;
-      core.GetSymbolOfUid(AnyUid(core, choices), symbol);
-      core.RenameSymbol(symbol, kNames[choices.Pick(kNames.size())], choices.Pick(2) == 0);
+      const CEL_Element* renamed = core.GetElement(AnyUid(core, choices));
+      if (renamed == nullptr || renamed->Kind() == kind::kDerivedOutput) break;
+      core.RenameSymbol(renamed->symbol.Text(), kNames[choices.Pick(kNames.size())], choices.Pick(2) == 0);
       break;
     }
     case 5:
@@ -146,6 +151,15 @@ void CheckTable(const TemplateCore& core) {
   }
 }
 
+/// What a file does not hold: the names of derived outputs, the units of elements without unit data, and the
+/// key that the forcings of particle classes have always lost.
+bool IsLostOnTheWay(const CEL_Element& element, const std::string& field) {
+  const bool isForcing = element.Kind() == kind::kSpecieForcing;
+  const bool hasNoUnit = isForcing || element.Kind() == kind::kSpatialFunction;
+  if (element.Kind() == kind::kDerivedOutput) return field == "Symbol";
+  return (hasNoUnit && field.starts_with("UNQ ")) || (isForcing && field == "Spatial Variation");
+}
+
 /// Every value of every element as text.
 std::string Content(const TemplateCore& core) {
   std::string text;
@@ -153,10 +167,8 @@ std::string Content(const TemplateCore& core) {
   for (const SymbolRecord& record : core.SymbolTable()) {
     fields.clear();
     record.element->GetFields(fields);
-    // The forcings of particle classes lose a key on the way, as they always have.
-    const bool losesKey = record.element->Kind() == kind::kSpecieForcing;
     for (const ElementField& field : fields) {
-      if (losesKey && field.name == "Spatial Variation") continue;
+      if (IsLostOnTheWay(*record.element, field.name)) continue;
       text += field.name + "=" + FieldText(field) + "\n";
     }
     for (const auto& [group, level] : record.element->Visibility()) {

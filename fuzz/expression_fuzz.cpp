@@ -54,8 +54,10 @@ void CheckParse(const std::string& text) {
   const ExpressionNode copy(tree);
   int nodes = 0;
   int copied = 0;
-  tree.WalkInOrder(nullptr, [&nodes](std::int32_t, const std::string&, std::int32_t) { ++nodes; }, nullptr);
-  copy.WalkPostOrder(nullptr, [&copied](std::int32_t, const std::string&, std::int32_t) { ++copied; }, nullptr);
+  tree.WalkInOrder(
+      nullptr, [&nodes](std::int32_t, const std::string&, std::int32_t) { ++nodes; }, nullptr);
+  copy.WalkPostOrder(
+      nullptr, [&copied](std::int32_t, const std::string&, std::int32_t) { ++copied; }, nullptr);
   Require(nodes == copied);
   if (parsed == 1) RewriteExpressionText(copy);
 }

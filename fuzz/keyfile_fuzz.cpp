@@ -1,5 +1,5 @@
-// Any text is read to a tree or refused with a message; what a tree writes reads back. Adjacent blocks of comments
-// become one on the way; behind that a tree writes the same for ever.
+// Any text is read to a tree or refused with a message; what a tree writes reads back. Adjacent blocks of
+// comments become one on the way; behind that a tree writes the same for ever.
 #include <cstdint>
 #include <cstdlib>
 #include <sstream>

@@ -1,5 +1,5 @@
-// Any bytes load as a template or are refused with a message. What loads can be saved, and the saved file loads
-// with the same elements.
+// Any bytes load as a template or are refused with a message. What loads can be saved, and the saved file
+// loads with the same elements.
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -33,7 +33,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const std::string path = fuzz::ScratchFile("in.tessal");
   const std::string copy = fuzz::ScratchFile("out.tessal");
   ResetExpressionScanner();
-  Require(WriteWholeFile(path, {reinterpret_cast<const char*>(data), size}).empty(), "the scratch file is written");
+  Require(WriteWholeFile(path, {reinterpret_cast<const char*>(data), size}).empty(),
+          "the scratch file is written");
   TemplateCore core;
   if (!core.LoadWrapper(path)) {
     Require(!Errors().Records().empty(), "a failed load says why");

@@ -182,7 +182,11 @@ bool TemplateCore::EraseRecordElement(const SymbolRecord& record) {
     return false;
   }
   const auto index = static_cast<std::size_t>(record.index);
-  return WithSequenceOf(record, [index](auto& sequence) { return EraseFrom(sequence, index); });
+  const bool isSpecie = record.element->Kind() == kind::kSpecie;
+  if (isSpecie) ForgetSpecie(At(species, index).Index());
+  const bool erased = WithSequenceOf(record, [index](auto& sequence) { return EraseFrom(sequence, index); });
+  if (isSpecie) NumberSpecies();
+  return erased;
 }
 
 bool TemplateCore::CanMove(std::uint32_t uid, std::uint32_t targetUid) const {
@@ -224,8 +228,10 @@ bool TemplateCore::MoveElement(std::uint32_t uid, std::uint32_t targetUid, bool 
 
 bool TemplateCore::MoveRecordElement(const SymbolRecord& record, std::size_t target) {
   const auto from = static_cast<std::size_t>(record.index);
-  return WithSequenceOf(record,
-                        [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
+  const bool moved =
+      WithSequenceOf(record, [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
+  if (record.element->Kind() == kind::kSpecie) NumberSpecies();
+  return moved;
 }
 
 bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predecessor) {

@@ -222,10 +222,7 @@ void TemplateCore::AssignIds() {
   for (const SymbolRecord& record : symbolTable) {
     record.element->id.SetInt(static_cast<std::int32_t>(record.sequence));
   }
-  for (std::size_t place = 0; place < species.size(); ++place) {
-    species[place]->SetIndex(static_cast<std::int32_t>(place + 1));
-    species[place]->StampMembers();
-  }
+  NumberSpecies();
   ResolveNamesToReferences();
   flags.modified = true;
 }

@@ -38,13 +38,6 @@ bool HoldsExpression(std::int32_t elementKind) {
   }
 }
 
-template <class Visitor>
-void ForEachSearchFunction(const Sequence<CEL_Lagrange_Specie>& species, Visitor visit) {
-  for (const auto& specie : species) {
-    for (const auto& function : specie->spatialFunctions) visit(*function);
-  }
-}
-
 bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
   return std::any_of(species.begin(), species.end(),
                      [](const auto& specie) { return !specie->spatialFunctions.empty(); });
@@ -227,7 +220,7 @@ void TemplateCore::ResolveReferencesToNames() {
   if (!HasSearchFunction(species)) return;
   std::unordered_map<std::int32_t, const CEL_Element*> byId;
   ForEachNamedElement([&byId](const CEL_Element& element) { byId.emplace(element.id.IntValue(), &element); });
-  ForEachSearchFunction(species, [&byId](CEL_Lagrange_Spatial_Function& function) {
+  ForEachSearchFunction([&byId](CEL_Lagrange_Spatial_Function& function) {
     const std::int32_t number = function.variableId.IntValue();
     const auto hit = number > 0 ? byId.find(number) : byId.end();
     function.SetVariableName(hit == byId.end() ? kLostName : std::string_view(hit->second->symbol.Text()));
@@ -239,7 +232,7 @@ void TemplateCore::ResolveNamesToReferences() {
   std::unordered_map<std::string_view, const CEL_Element*> byName;
   ForEachNamedElement(
       [&byName](const CEL_Element& element) { byName.emplace(element.symbol.Text(), &element); });
-  ForEachSearchFunction(species, [&byName](CEL_Lagrange_Spatial_Function& function) {
+  ForEachSearchFunction([&byName](CEL_Lagrange_Spatial_Function& function) {
     if (function.VariableName() == kUnresolvedName) return;
     const auto hit = byName.find(function.VariableName());
     if (hit != byName.end()) function.variableId.SetInt(hit->second->id.IntValue());

@@ -1,5 +1,6 @@
 // Saving a template: written through the key-file library into a temporary file beside the target, joined
 // with the top-level sections that only the kept tree knows, and put in the target's place in one step.
+#include <algorithm>
 #include <cstdio>
 #include <exception>
 #include <locale>
@@ -54,6 +55,40 @@ std::string WithTypeLine(const std::string& text) {
   return result;
 }
 
+bool EqualIgnoringCase(std::string_view left, std::string_view right) {
+  const auto upper = [](char character) {
+    return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
+  };
+  return std::equal(left.begin(), left.end(), right.begin(), right.end(),
+                    [&upper](char one, char other) { return upper(one) == upper(other); });
+}
+
+/// The settings that a save under a new name stamps, so that one that fails can put them back.
+class Stamps final {
+ public:
+  explicit Stamps(const CEL_Miscanellous& misc)
+      : tessalVersion(misc.tessalVersion.RealValue()),
+        parserVersion(misc.parserVersion.RealValue()),
+        documentRevision(misc.documentRevision.IntValue()),
+        optimise(misc.optimise.BoolValue()),
+        trigonometrics(misc.trigonometrics.Text()) {}
+
+  void PutBack(CEL_Miscanellous& misc) const {
+    misc.tessalVersion.SetReal(tessalVersion);
+    misc.parserVersion.SetReal(parserVersion);
+    misc.documentRevision.SetInt(documentRevision);
+    misc.optimise.SetBool(optimise);
+    misc.trigonometrics.SetText(trigonometrics);
+  }
+
+ private:
+  double tessalVersion;
+  double parserVersion;
+  std::int32_t documentRevision;
+  bool optimise;
+  std::string trigonometrics;
+};
+
 /// Each line feed as carriage return and line feed.
 std::string WithCarriageReturns(const std::string& text) {
   std::string result;
@@ -91,6 +126,7 @@ bool TemplateCore::Save(const std::string& path) {
 
 bool TemplateCore::SaveAs(const std::string& path) {
   const bool hadMisc = hasMisc;
+  const Stamps former(misc);
   // A file that had no settings stays with the meaning that it was written with.
   std::string angleUnit = "Radians";
   if (hasMisc) {
@@ -99,7 +135,6 @@ bool TemplateCore::SaveAs(const std::string& path) {
     hasMisc = true;
     misc.Reset();
   }
-  const std::int32_t formerRevision = misc.documentRevision.IntValue();
   misc.tessalVersion.SetReal(SoftwareVersion());
   misc.parserVersion.SetReal(ParserVersion());
   misc.documentRevision.SetInt(0);
@@ -107,7 +142,7 @@ bool TemplateCore::SaveAs(const std::string& path) {
   misc.trigonometrics.SetText(angleUnit);
   if (WriteTemplateFile(path)) return true;
   hasMisc = hadMisc;
-  misc.documentRevision.SetInt(formerRevision);
+  former.PutBack(misc);
   return false;
 }
 
@@ -140,8 +175,7 @@ std::string TemplateCore::WriteThrough(const std::string& path) {
   }
   std::string reason;
   const std::optional<std::string> text = ReadWholeFile(temporary, reason);
-  if (!text) return reason;
-  reason = ReplaceFile(path, WithTypeLine(*text + KeptSectionsText()));
+  if (text) reason = ReplaceFile(path, WithTypeLine(*text + KeptSectionsText()));
   const std::string removal = RemoveFile(temporary);
   if (!removal.empty()) std::fprintf(stderr, "could not delete temporary file %s\n", temporary.c_str());
   return reason;
@@ -150,9 +184,13 @@ std::string TemplateCore::WriteThrough(const std::string& path) {
 std::string TemplateCore::KeptSectionsText() const {
   std::ostringstream text;
   text.imbue(std::locale::classic());
-  const std::size_t count = keptTree.CountChildren(CKvfBaseItem::kSection);
-  for (std::size_t place = 1; place < count; ++place) {
-    keptTree.ChildByKind(place, CKvfBaseItem::kSection)->Write(text);
+  // The first target of the template's name is the one that was read; it is not always the first of all.
+  bool targetSeen = false;
+  for (const auto& child : keptTree.Children()) {
+    if (child->ItemKind() != CKvfBaseItem::kSection) continue;
+    const bool isTarget = !targetSeen && EqualIgnoringCase(child->name, section::kTarget);
+    targetSeen = targetSeen || isTarget;
+    if (!isTarget) child->Write(text);
   }
   return WithCarriageReturns(text.str());
 }

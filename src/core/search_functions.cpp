@@ -1,4 +1,6 @@
 // The choices that area searches offer come from the template around them: its classes and its values.
+#include <map>
+
 #include "core/template_core.h"
 
 namespace tessal {
@@ -22,6 +24,29 @@ void Offer(std::vector<CEL_Choice>& choices, const Elements& elements) {
 
 }  // namespace
 
+void TemplateCore::NumberSpecies() {
+  const NotificationsOff silent;
+  std::map<std::int32_t, std::int32_t> numbers;  // new by old
+  for (std::size_t place = 0; place < species.size(); ++place) {
+    const auto number = static_cast<std::int32_t>(place + 1);
+    numbers.emplace(species[place]->Index(), number);
+    species[place]->SetIndex(number);
+    species[place]->StampMembers();
+  }
+  ForEachSearchFunction([&numbers](CEL_Lagrange_Spatial_Function& function) {
+    const auto sought = numbers.find(function.lookFor.IntValue());
+    if (sought != numbers.end()) function.lookFor.SetInt(sought->second);
+  });
+}
+
+void TemplateCore::ForgetSpecie(std::int32_t number) {
+  constexpr std::int32_t kNoSpecie = 0;
+  const NotificationsOff silent;
+  ForEachSearchFunction([number](CEL_Lagrange_Spatial_Function& function) {
+    if (function.lookFor.IntValue() == number) function.lookFor.SetInt(kNoSpecie);
+  });
+}
+
 void TemplateCore::RefreshSearchFunctionChoices() {
   if (species.empty()) return;
   const std::vector<NamedNumber> names = SpecieNames();
@@ -31,11 +56,11 @@ void TemplateCore::RefreshSearchFunctionChoices() {
   Offer(grid, forcings);
   const ChoiceList gridValues = ShareChoices(std::move(grid));
   const ChoiceList noValues = ShareChoices(NoVariable());
-  std::vector<ChoiceList> particleValues;  // of each class
+  std::map<std::int32_t, ChoiceList> particleValues;  // by the number of the class
   for (const auto& specie : species) {
     std::vector<CEL_Choice> values = NoVariable();
     Offer(values, specie->stateVariables);
-    particleValues.push_back(ShareChoices(std::move(values)));
+    particleValues.emplace(specie->Index(), ShareChoices(std::move(values)));
   }
 
   bool needTree = false;
@@ -49,8 +74,8 @@ void TemplateCore::RefreshSearchFunctionChoices() {
       } else if (function->SearchesParticles()) {
         needTree = true;
         const std::int32_t sought = function->lookFor.IntValue();
-        const auto place = static_cast<std::size_t>((sought == -1 ? specie->Index() : sought) - 1);
-        if (place < particleValues.size()) function->variableId.SetChoices(particleValues[place]);
+        const auto values = particleValues.find(sought == -1 ? specie->Index() : sought);
+        if (values != particleValues.end()) function->variableId.SetChoices(values->second);
       }
       function->SelectPresentValues();
     }

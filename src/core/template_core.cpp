@@ -43,7 +43,8 @@ TemplateCore::~TemplateCore() {
 void TemplateCore::Clear() {
   templateFileName.clear();
   saveFileName.clear();
-  for (CEL_Property* text : {&root.description, &root.onlineHelp, &root.documentation}) text->SetText("");
+  root.ClearTexts();
+  for (const auto& head : listHeads) head->ClearTexts();
   misc.Reset();
   hasMisc = true;
   stateVariables.clear();

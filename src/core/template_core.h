@@ -40,7 +40,7 @@ class TemplateCore final : public ElementOwner {
   TemplateCore();
   TemplateCore(const TemplateCore&) = delete;
   TemplateCore& operator=(const TemplateCore&) = delete;
-  ~TemplateCore();
+  ~TemplateCore() override;
 
   /// Empties the template and the error registry.
   void Clear();
@@ -211,6 +211,12 @@ class TemplateCore final : public ElementOwner {
   template <class Operation>
   bool WithSequenceOf(const SymbolRecord& record, Operation operation);
   bool EraseRecordElement(const SymbolRecord& record);
+  /// Numbers the particle classes by their places, and takes the searches for a class along to its number.
+  void NumberSpecies();
+  /// Searches for the class of that number look for none from now on: the number goes to another class.
+  void ForgetSpecie(std::int32_t number);
+  template <class Visitor>
+  void ForEachSearchFunction(Visitor visit) const;
   bool MoveRecordElement(const SymbolRecord& record, std::size_t target);
   std::uint32_t UidAt(const SymbolRecord& sibling, std::size_t place);
   void LeaveVisibilityGroups(CEL_Element& element);
@@ -301,6 +307,13 @@ class TemplateCore final : public ElementOwner {
   std::size_t recordCount = 0;  ///< records that the rebuild under way has made
   std::vector<std::unique_ptr<UndefinedSymbol>> undefinedSymbols;
 };
+
+template <class Visitor>
+void TemplateCore::ForEachSearchFunction(Visitor visit) const {
+  for (const auto& specie : species) {
+    for (const auto& function : specie->spatialFunctions) visit(*function);
+  }
+}
 
 /// Calls the visitor with each element that a reference by number or name may mean, in the order in which
 /// the first hit wins: the template's collections, then those of each particle class.

@@ -157,6 +157,10 @@ void CEL_Element::SetModifiedFlag(bool* flag) {
   for (const OwnProperty& own : ownProperties) own.property->SetModifiedFlag(flag);
 }
 
+void CEL_Element::ClearTexts() {
+  for (CEL_Property* text : {&description, &onlineHelp, &documentation}) text->SetText("");
+}
+
 void CEL_Element::MarkModified() {
   if (modifiedFlag != nullptr) *modifiedFlag = true;
 }

@@ -67,6 +67,9 @@ class CEL_Element : public PropertyListener {
   /// Points each property's selection at the choice that stands for its value.
   void SelectPresentValues();
 
+  /// Empties the descriptive texts.
+  void ClearTexts();
+
   /// The identity: never 0, never reused, not stored, the same through renames and moves.
   std::uint32_t GetUid() const;
   /// The identity as messages and views carry it.

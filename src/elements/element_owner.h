@@ -20,6 +20,8 @@ struct NamedNumber {
 
 class ElementOwner {
  public:
+  virtual ~ElementOwner() = default;
+
   /// Numbers all elements anew and finds out who uses whom.
   virtual void RebuildSymbolTable() = 0;
 
@@ -47,7 +49,6 @@ class ElementOwner {
   ElementOwner() = default;
   ElementOwner(const ElementOwner&) = default;
   ElementOwner& operator=(const ElementOwner&) = default;
-  ~ElementOwner() = default;
 };
 
 }  // namespace tessal

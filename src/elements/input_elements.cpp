@@ -135,19 +135,24 @@ void CEL_Input::ApplyBuiltin() {
   }
   CatalogueBuiltin row;
   if (GetBuiltinById(builtInId.IntValue(), row) != 0 || row.kind != input.builtinKind) return;
-  isUserSpecified.SetBool(false);
+  {
+    // As one change: the rules for a unit type that a modeller chooses are not for the catalogue's.
+    const NotificationsOff silent;
+    isUserSpecified.SetBool(false);
+    scope.SetText(LayerText(row.layer));
+    spatialVariation.SetText(VariationText(row.variation));
+    unqType.SetInt(row.unitType);
+    unit.SetText(row.unit);
+    // Wide open first, so that no limit stands in the way of the default.
+    minValue.SetReal(std::numeric_limits<double>::lowest());
+    maxValue.SetReal(std::numeric_limits<double>::max());
+    defaultValue.SetReal(row.defaultValue);
+    minValue.SetReal(row.minimum);
+    maxValue.SetReal(row.maximum);
+  }
   SetDataEditable(false);
-  scope.SetText(LayerText(row.layer));
-  spatialVariation.SetText(VariationText(row.variation));
-  unqType.SetInt(row.unitType);
-  unit.SetText(row.unit);
-  // Wide open first, so that no limit stands in the way of the default.
-  minValue.SetReal(std::numeric_limits<double>::lowest());
-  maxValue.SetReal(std::numeric_limits<double>::max());
-  defaultValue.SetReal(row.defaultValue);
-  minValue.SetReal(row.minimum);
-  maxValue.SetReal(row.maximum);
   SelectPresentValues();
+  RebuildOwner();
 }
 
 void CEL_Input::ApplyUnitType() {

@@ -67,9 +67,8 @@ void CEL_Miscanellous::Reset() {
   ResetOwn();
   tessalVersion.SetReal(SoftwareVersion());
   parserVersion.SetReal(ParserVersion());
-  description.SetText("");
-  onlineHelp.SetText("");
-  documentation.SetText("");
+  ClearTexts();
+  functionHead.ClearTexts();
   DropFunctions();
   visibilities.Reset();
 }

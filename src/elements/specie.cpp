@@ -168,7 +168,8 @@ void CEL_Lagrange_Specie::DropMembers() {
 }
 
 void CEL_Lagrange_Specie::Reset() {
-  for (CEL_Property* text : {&symbol, &description, &documentation, &onlineHelp}) text->SetText("");
+  symbol.SetText("");
+  ClearTexts();
   index = 0;
   ResetOwn();
   DropMembers();

@@ -52,6 +52,11 @@ CEL_Visibility::CEL_Visibility() : CEL_Element("Visibility Group Definitions") {
   SetFileFlags(false, false, true);
 }
 
+void CEL_Visibility::Reset() {
+  ClearTexts();
+  groups.clear();
+}
+
 void CEL_Visibility::Read(KvfNode settings, int& status) {
   const KvfNode definitions = kvfSectionByNameNum(settings, section::kVisibilityGroups, 1);
   if (definitions == nullptr) return;

@@ -32,7 +32,7 @@ class CEL_Visibility final : public CEL_Element {
   void Read(KvfNode settings, int& status) override;
   /// Writes the sub-section, with the numbers of symbol records in the place of identities.
   void Write(KvfHandle file, int& status) override;
-  void Reset() override { groups.clear(); }
+  void Reset() override;
   void GetFields(std::vector<ElementField>& /*fields*/) const override {}
   int SetFields(const std::vector<ElementField>& /*fields*/) override { return 0; }
 

@@ -97,6 +97,7 @@ TEST(Creation, ANewElementStandsAheadOfItsUsersOfTheSameKind) {
   EXPECT_EQ(loaded->GetProcess(1).symbol.Text(), "later");
   request.kind = 99;
   EXPECT_EQ(loaded->CreateElement(request).uid, 0U);
+  EXPECT_TRUE(NotifyChanges()) << "also behind a request that makes nothing";
 }
 
 }  // namespace

@@ -115,7 +115,12 @@ TEST(Editing, ABuiltinTakesItsFieldsAlongAndLocksThem) {
   EXPECT_EQ(forcing.defaultValue.RealValue(), -1.0);
   EXPECT_EQ(forcing.scope.Text() + forcing.spatialVariation.Text(), "WSHORISONTAL");
   EXPECT_FALSE(forcing.isUserSpecified.BoolValue());
-  EXPECT_FALSE(forcing.maxValue.Editable());
+  EXPECT_NE(forcing.unqType.IntValue(), 999) << "the catalogue's unit type stands";
+  for (const CEL_Property* taken :
+       {&forcing.scope, &forcing.spatialVariation, &forcing.unqType, &forcing.unqUnit, &forcing.unit,
+        &forcing.defaultValue, &forcing.minValue, &forcing.maxValue}) {
+    EXPECT_FALSE(taken->Editable());
+  }
   forcing.builtInId.SelectChoice("User defined");
   forcing.builtInId.ApplySelection();
   EXPECT_TRUE(forcing.maxValue.Editable());

@@ -1,0 +1,75 @@
+// What the editor does not know of a file stays in it, and what one file held never gets into another.
+#include <gtest/gtest.h>
+
+#include "core/error_registry.h"
+#include "core/loaded_template.h"
+#include "support/template_text.h"
+
+namespace tessal {
+namespace {
+
+using test::LoadedTemplate;
+using test::ReadFile;
+using test::TemplateText;
+
+std::size_t CountOf(const std::string& text, const std::string& part) {
+  std::size_t count = 0;
+  for (std::size_t place = text.find(part); place != std::string::npos; place = text.find(part, place + 1))
+    ++count;
+  return count;
+}
+
+TEST(KeptContent, SectionsStayWhereverTheyStood) {
+  const std::string setup = TemplateText().Constant("k").Text().substr(1);
+  const std::string first = "[FIRST] // ahead\n   // of it\n   A = 1\nEndSect\n\n";
+  const std::string last = "[LAST]\n   B = 'two\nlines'\n   [INNER]\n   EndSect\nEndSect\n\n";
+  for (const std::string& text : {"\n" + setup + first + last, "\n" + first + setup + last,
+                                  "\n" + first + last + setup, "\n" + first + last}) {
+    LoadedTemplate loaded(text);
+    ASSERT_TRUE(loaded.Loaded()) << test::Messages();
+    for (int save = 1; save <= 2; ++save) {
+      ASSERT_TRUE(loaded->SaveWrapper(loaded.Path()));
+      const std::string saved = ReadFile(loaded.Path());
+      EXPECT_EQ(CountOf(saved, "[FIRST] // ahead\r\n   // of it\r\n   A = 1\r\nEndSect"), 1U) << saved;
+      EXPECT_EQ(CountOf(saved, "   B = 'two\r\nlines'\r\n   [INNER]\r\n"), 1U) << saved;
+      EXPECT_EQ(CountOf(saved, "[TESSAL_SETUP]"), 1U) << saved;
+      ASSERT_TRUE(loaded->LoadWrapper(loaded.Path()));
+    }
+  }
+}
+
+TEST(KeptContent, NothingOfOneFileGetsIntoTheNext) {
+  LoadedTemplate full(
+      TemplateText()
+          .Misc("[EXTERNAL_FUNCTIONS]\nDESCRIPTION = 'leak'\nONLINE_HELP = ''\nDOCUMENTATION = ''\n"
+                "EndSect\n[VISIBILITY_GROUPS]\nDESCRIPTION = 'leak'\nONLINE_HELP = ''\n"
+                "DOCUMENTATION = ''\nGROUPS = 0\nEndSect\n")
+          .Behind("[EXTRA]\nA = 'leak'\nEndSect\n")
+          .Text());
+  for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
+    full->ListHead(list).description.SetText("leak");
+  }
+  ASSERT_TRUE(full.Loaded());
+  LoadedTemplate bare("\n[TESSAL_SETUP]\nDESCRIPTION = 'x'\nONLINE_HELP = ''\nDOCUMENTATION = ''\nEndSect\n");
+  ASSERT_TRUE(full->LoadWrapper(bare.Path()));
+  ASSERT_TRUE(full->SaveWrapper(full.Path() + ".copy"));
+  full->GetMisc()->AddExternalFunction();
+  full->AddVisibilityGroup();
+  ASSERT_TRUE(full->SaveWrapper(full.Path() + ".copy"));
+  EXPECT_EQ(CountOf(ReadFile(full.Path() + ".copy"), "leak"), 0U);
+}
+
+TEST(KeptContent, ASaveUnderANewNameThatFailsLeavesTheSettings) {
+  LoadedTemplate loaded(TemplateText().Misc("DOCUMENT_REVISION = 7\nOPTIMISE = 'NO'\n").Text());
+  EXPECT_FALSE(loaded->SaveWrapper("/nowhere/at/all.tessal"));
+  EXPECT_EQ(loaded->GetDocumentRevision(), 7);
+  EXPECT_EQ(loaded->GetMisc()->tessalVersion.RealValue(), 2017001 * 0.001);
+  EXPECT_FALSE(loaded->GetMisc()->optimise.BoolValue());
+  EXPECT_EQ(loaded->SaveFileName(), loaded.Path());
+  LoadedTemplate without(TemplateText().Text());
+  EXPECT_FALSE(without->SaveWrapper("/nowhere/at/all.tessal"));
+  EXPECT_EQ(without->GetMisc(), nullptr);
+}
+
+}  // namespace
+}  // namespace tessal
