@@ -93,15 +93,15 @@ CreatedElement TemplateCore::CreateElement(const CreateRequest& request) {
   // Off through the defaults below, and on behind them, whatever it was before.
   SetNotifyChanges(false);
   CreatedElement created;
-  CEL_Element* element = AddByRequest(request);
-  if (element == nullptr) return created;
-  if (!request.symbol.empty() && element->Kind() != kind::kHorizontalVector) {
-    GiveDefaultTexts(*element, request.symbol, root.documentation.Text());
+  if (CEL_Element* element = AddByRequest(request)) {
+    if (!request.symbol.empty() && element->Kind() != kind::kHorizontalVector) {
+      GiveDefaultTexts(*element, request.symbol, root.documentation.Text());
+    }
+    flags.modified = true;
+    RebuildSymbolTable();
+    created.uid = element->GetUid();
+    created.placed = MoveBeforeFirstUser(created.uid, created.predecessor);
   }
-  flags.modified = true;
-  RebuildSymbolTable();
-  created.uid = element->GetUid();
-  created.placed = MoveBeforeFirstUser(created.uid, created.predecessor);
   SetNotifyChanges(true);
   return created;
 }

@@ -106,14 +106,17 @@ bool TemplateCore::Load(const std::string& path) {
 }
 
 bool TemplateCore::ReadTemplate(const std::string& path) {
-  const OpenFile file(path);
-  if (file.Error() != kKvfOk || file.Handle() == 0) {
-    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, LoadErrorText(file, path) + "\n");
-    return false;
+  {
+    // Closed before the second reading: a large file need not lie in memory twice.
+    const OpenFile file(path);
+    if (file.Error() != kKvfOk || file.Handle() == 0) {
+      Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, LoadErrorText(file, path) + "\n");
+      return false;
+    }
+    saveFileName = path;
+    templateFileName = path;
+    if (!ReadSections(file.Handle(), 1)) return false;
   }
-  saveFileName = path;
-  templateFileName = path;
-  if (!ReadSections(file.Handle(), 1)) return false;
   keptTree.Clear();
   if (LoadKeyFileTree(path, keptTree) == 0) {
     const std::string& reason = LastKeyError().empty() ? KeyFileFailureText() : LastKeyError();
