@@ -74,6 +74,8 @@ class CView {
   virtual void OnInitialUpdate() {}
   /// Puts what the user has entered and not yet committed into the document, before a save or a close.
   virtual void OnCommit() {}
+  /// The view comes to the front among the views of other documents.
+  virtual void OnActivate() {}
   /// The widget that a host puts into its frame; none for a view without a screen.
   virtual QWidget* Widget() { return nullptr; }
 

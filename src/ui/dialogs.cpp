@@ -8,12 +8,20 @@
 #include <QUrl>
 
 #include "ui/auto_create_dialog.h"
+#include "ui/help_window.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
 namespace tessal {
 
 namespace {
+
+QMessageBox::StandardButton ShowBox(QWidget* parent, QMessageBox::Icon icon, const QString& title,
+                                    const QString& text, QMessageBox::StandardButtons buttons) {
+  QMessageBox box(icon, title, text, buttons, parent);
+  box.setTextFormat(Qt::PlainText);
+  return static_cast<QMessageBox::StandardButton>(box.exec());
+}
 
 class BoxDialogs final : public UserDialogs {
  public:
@@ -24,16 +32,16 @@ class BoxDialogs final : public UserDialogs {
   }
 
   void Warn(QWidget* parent, const QString& text) override {
-    QMessageBox box(QMessageBox::Warning, strings::kEditorName, text, QMessageBox::Ok, parent);
-    box.setTextFormat(Qt::PlainText);
-    box.exec();
+    ShowBox(parent, QMessageBox::Warning, strings::kEditorName, text, QMessageBox::Ok);
+  }
+
+  void ShowFailure(QWidget* parent, const QString& text) override {
+    ShowBox(parent, QMessageBox::Warning, strings::kError, text, QMessageBox::Ok);
   }
 
   bool Ask(QWidget* parent, const QString& question) override {
-    QMessageBox box(QMessageBox::Question, strings::kEditorName, question, QMessageBox::Yes | QMessageBox::No,
-                    parent);
-    box.setTextFormat(Qt::PlainText);
-    return box.exec() == QMessageBox::Yes;
+    return ShowBox(parent, QMessageBox::Question, strings::kEditorName, question,
+                   QMessageBox::Yes | QMessageBox::No) == QMessageBox::Yes;
   }
 
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override {
@@ -48,11 +56,16 @@ class BoxDialogs final : public UserDialogs {
   }
 
   bool OpenWithSystem(const QString& target) override {
-    const QUrl url = QFileInfo::exists(target) ? QUrl::fromLocalFile(QFileInfo(target).absoluteFilePath())
-                                               : QUrl(target, QUrl::StrictMode);
-    const bool canOpen = url.isLocalFile() || !url.scheme().isEmpty();
+    // Templates travel: a path may stand as another system writes it.
+    QString path = target;
+    if (!QFileInfo::exists(path)) path.replace(u'\\', u'/');
+    const QUrl url = QFileInfo::exists(path) ? QUrl::fromLocalFile(QFileInfo(path).absoluteFilePath())
+                                             : QUrl(target, QUrl::StrictMode);
+    const bool canOpen = url.isLocalFile() ? QFileInfo::exists(url.toLocalFile()) : !url.scheme().isEmpty();
     return canOpen && QDesktopServices::openUrl(url);
   }
+
+  void ShowHelp(QWidget* parent, int topic) override { OpenHelp(parent, topic); }
 };
 
 }  // namespace

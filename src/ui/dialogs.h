@@ -15,6 +15,8 @@ class UserDialogs : public DocumentDialogs {
  public:
   /// Shows a text in a box with an exclamation icon.
   virtual void Warn(QWidget* parent, const QString& text) = 0;
+  /// Shows what could not be done, in a box titled "Error".
+  virtual void ShowFailure(QWidget* parent, const QString& text) = 0;
   virtual bool Ask(QWidget* parent, const QString& question) = 0;
   /// Lets the user choose what an undefined symbol shall become; -1 when it is skipped.
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
@@ -22,6 +24,8 @@ class UserDialogs : public DocumentDialogs {
   virtual QString ChooseDocumentationFile(QWidget* parent, const QString& start) = 0;
   /// Asks the system to open a file or an address; false when it can not.
   virtual bool OpenWithSystem(const QString& target) = 0;
+  /// Opens the help at the topic with this number.
+  virtual void ShowHelp(QWidget* parent, int topic) = 0;
 };
 
 /// The dialogs on the screen.

@@ -2,6 +2,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <algorithm>
 
 #include "platform/host_settings.h"
 #include "ui/dialogs.h"
@@ -13,6 +14,11 @@ namespace {
 constexpr int kFileNotFound = 2;
 constexpr int kNoManualsAddress = -100;
 const QString kManualsFolder = QStringLiteral("Corvane/Manuals/CORVANE");
+
+/// The name behind the last folder, of whichever system the path is.
+QString BareName(const QString& path) {
+  return path.sliced(std::max(path.lastIndexOf(u'/'), path.lastIndexOf(u'\\')) + 1);
+}
 
 QString FailureText(const QString& text, int code) {
   return QStringLiteral("Failed to open\n%1\n\nReturn code %2 (0x%3)")
@@ -32,7 +38,7 @@ QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs) {
   }
   const QString address = QString::fromStdString(ManualsAddress());
   if (address.isEmpty()) return FailureText(text, kNoManualsAddress);
-  const QString target = QStringLiteral("%1/2017/General/%2").arg(address, QFileInfo(text).fileName());
+  const QString target = QStringLiteral("%1/2017/General/%2").arg(address, BareName(text));
   return dialogs.OpenWithSystem(target) ? QString() : FailureText(text, kFileNotFound);
 }
 

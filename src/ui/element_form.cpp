@@ -5,15 +5,17 @@
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
-#include <QPlainTextEdit>
 #include <QPushButton>
-#include <QStandardItemModel>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
+#include <limits>
+#include <memory>
 
 #include "core/document.h"
 #include "elements/property_io.h"
+#include "ui/child.h"
+#include "ui/control_ids.h"
 #include "ui/dialogs.h"
 #include "ui/documentation_link.h"
 #include "ui/expression_editor_dialog.h"
@@ -26,18 +28,13 @@ namespace tessal {
 
 namespace {
 
-/// The most characters that a text field takes.
-constexpr int kMostCharacters = 4096;
-constexpr int kLinesHeight = 3;
-
-bool IsTall(FieldEditor editor) {
-  return editor == FieldEditor::Expression;
-}
+constexpr int kLinesHeight = 4;
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
-  std::string digits = text.toStdString();
-  if (!digits.empty() && digits.front() == '+') digits.erase(0, 1);
+  const std::string entered = text.toStdString();
+  std::string_view digits = entered;
+  if (!digits.empty() && digits.front() == '+') digits.remove_prefix(1);
   double value = 0.0;
   std::from_chars(digits.data(), digits.data() + digits.size(), value);
   return value;
@@ -45,78 +42,134 @@ double ReadNumber(const QString& text) {
 
 QString TextIn(const QWidget& editor) {
   if (const auto* line = qobject_cast<const QLineEdit*>(&editor)) return line->text();
-  if (const auto* lines = qobject_cast<const QPlainTextEdit*>(&editor)) return lines->toPlainText();
-  if (const auto* field = qobject_cast<const CAutoRichEditCtrl*>(&editor)) return field->toPlainText();
+  if (const auto* field = qobject_cast<const CPlainTextField*>(&editor)) return field->ContentText();
   return {};
+}
+
+/// Whether a choice stands for the present value of a property; a NaN is like nothing.
+bool IsPresent(const CEL_Choice& choice, const CEL_Property& property) {
+  switch (property.Type()) {
+    case ValueType::Real:
+      return choice.realValue == property.RealValue();
+    case ValueType::Integer:
+      return choice.intValue == property.IntValue();
+    case ValueType::Boolean:
+      return choice.boolValue == property.BoolValue();
+    default:
+      return choice.fileText == property.Text();
+  }
+}
+
+/// The index of the choice that stands for the present value; the selected one when none does.
+int PresentChoice(const CEL_Property& property) {
+  const auto& choices = property.Choices();
+  const auto hit = std::find_if(choices.begin(), choices.end(), [&property](const CEL_Choice& choice) {
+    return IsPresent(choice, property);
+  });
+  return hit == choices.end() ? property.Selected() : static_cast<int>(hit - choices.begin());
+}
+
+bool IsShort(FieldEditor editor) {
+  switch (editor) {
+    case FieldEditor::ShortLine:
+    case FieldEditor::Number:
+    case FieldEditor::Integer:
+    case FieldEditor::Shown:
+    case FieldEditor::SortedChoice:
+    case FieldEditor::OrderedChoice:
+      return true;
+    default:
+      return false;
+  }
+}
+
+bool IsOneLine(FieldEditor editor) {
+  return IsShort(editor) || editor == FieldEditor::Symbol || editor == FieldEditor::Line ||
+         editor == FieldEditor::Documentation;
+}
+
+void LimitHeight(QWidget& editor) {
+  editor.setMaximumHeight(editor.fontMetrics().lineSpacing() * kLinesHeight);
 }
 
 }  // namespace
 
 CElementForm::CElementForm(const FormTable& formTable, const FormContext& context, QWidget* parent)
-    : CRightPaneBase(context, parent), table(formTable) {
-  auto* layout = new QGridLayout(this);
-  layout->setColumnStretch(1, 1);
-  int row = 0;
+    : CRightPaneBase(context, parent), table(formTable), layout(MakeChild<QGridLayout>(this)) {
+  for (const FormField& field : table.fields) AddField(field);
+  Arrange(1);
+  narrowWidth = layout->minimumSize().width();
+  Arrange(2);
+}
+
+void CElementForm::AddField(const FormField& field) {
+  Control control;
+  control.field = &field;
+  control.cell = MakeEditor(field, control);
+  control.editor->setObjectName(QString::number(field.control));
+  control.editor->setAccessibleName(QString::fromLatin1(field.label));
+  control.label = MakeChild<QLabel>(QString::fromLatin1(field.label), this);
+  control.label->setBuddy(control.editor);
+  controls.push_back(control);
+}
+
+void CElementForm::Arrange(int columnCount) {
+  if (columnCount == columns) return;
+  columns = columnCount;
+  while (const std::unique_ptr<QLayoutItem> gone{layout->takeAt(0)}) continue;
+  for (int row = 0; row < layout->rowCount(); ++row) layout->setRowStretch(row, 0);
+  constexpr int kGridColumns = 4;
+  int row = -1;
+  int column = kGridColumns;
   bool grows = false;
-  for (const FormField& field : table.fields) {
-    AddField(field, *layout, row);
-    if (IsTall(field.editor)) {
-      layout->setRowStretch(row, 1);
-      grows = true;
+  for (const Control& control : controls) {
+    const bool isShort = columns > 1 && IsShort(control.field->editor);
+    if (!isShort || column >= kGridColumns) {
+      ++row;
+      column = 0;
     }
-    ++row;
+    layout->addWidget(control.label, row, column,
+                      IsOneLine(control.field->editor) ? Qt::AlignVCenter : Qt::AlignTop);
+    layout->addWidget(control.cell, row, column + 1, 1, isShort ? 1 : kGridColumns - 1);
+    column = isShort ? column + 2 : kGridColumns;
+    if (control.field->editor != FieldEditor::Expression) continue;
+    layout->setRowStretch(row, 1);
+    grows = true;
   }
-  if (!grows) layout->setRowStretch(row, 1);
+  layout->setColumnStretch(1, 1);
+  layout->setColumnStretch(3, columns > 1 ? 1 : 0);
+  if (!grows) layout->setRowStretch(row + 1, 1);
 }
 
-void CElementForm::AddField(const FormField& field, QGridLayout& layout, int row) {
-  QWidget* cell = nullptr;
-  QLabel* note = nullptr;
-  QWidget* editor = MakeEditor(field, cell, note);
-  editor->setObjectName(QString::number(field.control));
-  editor->setAccessibleName(QString::fromLatin1(field.label));
-  auto* label = new QLabel(QString::fromLatin1(field.label), this);
-  label->setBuddy(editor);
-  layout.addWidget(label, row, 0, Qt::AlignTop);
-  layout.addWidget(cell, row, 1);
-  controls.push_back({&field, editor, label, note});
+QSize CElementForm::minimumSizeHint() const {
+  return {narrowWidth, layout->minimumSize().height()};
 }
 
-QWidget* CElementForm::MakeEditor(const FormField& field, QWidget*& cell, QLabel*& note) {
+void CElementForm::resizeEvent(QResizeEvent* resize) {
+  CRightPaneBase::resizeEvent(resize);
+  Arrange(width() >= 2 * narrowWidth ? 2 : 1);
+}
+
+QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
   switch (field.editor) {
+    case FieldEditor::Documentation:
+      return MakeDocumentation(field, control);
+    case FieldEditor::Expression:
+      return MakeExpression(field, control);
     case FieldEditor::Lines:
-      return cell = MakeLines();
-    case FieldEditor::Documentation: {
-      QLineEdit* line = nullptr;
-      cell = MakeDocumentation(line);
-      return line;
-    }
+      return control.editor = MakeLines();
     case FieldEditor::SortedChoice:
     case FieldEditor::OrderedChoice:
-      return cell = MakeCombo(field);
-    case FieldEditor::Expression: {
-      CAutoRichEditCtrl* edit = nullptr;
-      cell = MakeExpression(field, edit, note);
-      return edit;
-    }
-    case FieldEditor::ReferencedIn: {
-      auto* names = new CAutoRichEditCtrl(Core(), this);
-      names->setReadOnly(true);
-      names->setMaximumHeight(names->fontMetrics().lineSpacing() * (kLinesHeight + 1));
-      connect(names, &CAutoRichEditCtrl::LinkActivated, this, [this](std::uint32_t uid) {
-        const NumberHint argument(static_cast<std::int32_t>(uid));
-        Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
-      });
-      return cell = names;
-    }
+      return control.editor = MakeCombo();
+    case FieldEditor::ReferencedIn:
+      return control.editor = MakeReferences();
     default:
-      return cell = MakeLine(field);
+      return control.editor = MakeLine(field, this);
   }
 }
 
-QWidget* CElementForm::MakeLine(const FormField& field) {
-  auto* line = new QLineEdit(this);
-  line->setMaxLength(kMostCharacters);
+QLineEdit* CElementForm::MakeLine(const FormField& field, QWidget* parent) {
+  auto* line = MakeChild<QLineEdit>(parent);
   line->setReadOnly(field.editor == FieldEditor::Shown);
   connect(line, &QLineEdit::textEdited, this, [this] { NoteEdited(); });
   connect(line, &QLineEdit::editingFinished, this, [this] { NoteFocusLost(); });
@@ -124,69 +177,82 @@ QWidget* CElementForm::MakeLine(const FormField& field) {
 }
 
 QWidget* CElementForm::MakeLines() {
-  auto* lines = new QPlainTextEdit(this);
-  lines->setTabChangesFocus(true);
-  lines->setMaximumHeight(lines->fontMetrics().lineSpacing() * (kLinesHeight + 1));
-  connect(lines, &QPlainTextEdit::textChanged, this, [this] { NoteEdited(); });
+  auto* lines = MakeChild<CPlainTextField>(this);
+  LimitHeight(*lines);
+  connect(lines, &QTextEdit::textChanged, this, [this] { NoteEdited(); });
   WatchFocusLoss(*lines, [this] { NoteFocusLost(); });
   return lines;
 }
 
-QWidget* CElementForm::MakeCombo(const FormField& /*field*/) {
-  auto* combo = new QComboBox(this);
+QWidget* CElementForm::MakeCombo() {
+  auto* combo = MakeChild<QComboBox>(this);
   combo->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
+  // The wheel that scrolls the form must not choose on its way.
+  combo->setFocusPolicy(Qt::StrongFocus);
+  IgnoreWheelWithoutFocus(*combo);
   connect(combo, &QComboBox::activated, this, [this] { NoteChosen(); });
   return combo;
 }
 
-QWidget* CElementForm::MakeDocumentation(QLineEdit*& line) {
-  auto* cell = new QWidget(this);
-  auto* layout = new QHBoxLayout(cell);
-  layout->setContentsMargins(0, 0, 0, 0);
-  line = qobject_cast<QLineEdit*>(MakeLine({0, "", FieldEditor::Documentation, nullptr}));
-  auto* browse = new QPushButton(strings::kBrowse, cell);
+QWidget* CElementForm::MakeReferences() {
+  auto* names = MakeChild<CAutoRichEditCtrl>(Core(), this);
+  names->setReadOnly(true);
+  LimitHeight(*names);
+  connect(names, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
+  return names;
+}
+
+QWidget* CElementForm::MakeDocumentation(const FormField& field, Control& control) {
+  auto* cell = MakeChild<QWidget>(this);
+  auto* parts = MakeChild<QHBoxLayout>(cell);
+  parts->setContentsMargins(0, 0, 0, 0);
+  QLineEdit* line = MakeLine(field, cell);
+  auto* browse = MakeChild<QPushButton>(strings::kBrowse, cell);
+  browse->setObjectName(QString::number(control_id::kBrowse));
   browse->setAccessibleName(strings::kSelectDocumentation);
-  browse->setObjectName(QStringLiteral("1021"));
-  auto* view = new QPushButton(strings::kView, cell);
-  view->setAccessibleName(QStringLiteral("Open documentation"));
-  view->setObjectName(QStringLiteral("1129"));
-  layout->addWidget(line, 1);
-  layout->addWidget(browse);
-  layout->addWidget(view);
+  browse->setToolTip(strings::kSelectDocumentation);
+  auto* view = MakeChild<QPushButton>(strings::kView, cell);
+  view->setObjectName(QString::number(control_id::kView));
+  view->setAccessibleName(strings::kOpenDocumentation);
+  parts->addWidget(line, 1);
+  parts->addWidget(browse);
+  parts->addWidget(view);
   connect(browse, &QPushButton::clicked, this, [this, line] { BrowseDocumentation(*line); });
   connect(view, &QPushButton::clicked, this, [this, line] { OpenDocumentation(line->text()); });
+  control.editor = line;
   return cell;
 }
 
-QWidget* CElementForm::MakeExpression(const FormField& field, CAutoRichEditCtrl*& edit, QLabel*& note) {
-  auto* cell = new QWidget(this);
-  auto* layout = new QVBoxLayout(cell);
-  layout->setContentsMargins(0, 0, 0, 0);
-  edit = new CAutoRichEditCtrl(Core(), cell);
-  note = new QLabel(cell);
+QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) {
+  auto* cell = MakeChild<QWidget>(this);
+  auto* rows = MakeChild<QVBoxLayout>(cell);
+  rows->setContentsMargins(0, 0, 0, 0);
+  auto* edit = MakeChild<CAutoRichEditCtrl>(Core(), cell);
+  edit->setMinimumHeight(edit->fontMetrics().lineSpacing() * kLinesHeight);
+  auto* note = MakeChild<QLabel>(cell);
   note->setTextFormat(Qt::PlainText);
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
-  auto* keypad = new QPushButton(strings::kEdit, cell);
+  auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
+  keypad->setObjectName(QString::number(control_id::kKeypad));
   keypad->setAccessibleName(strings::kExpressionEditor);
-  layout->addWidget(edit, 1);
-  layout->addWidget(note);
-  layout->addWidget(keypad, 0, Qt::AlignRight);
-  connect(edit, &QTextEdit::textChanged, this,
-          [edit = edit, note = note] { note->setText(edit->ParserMessage()); });
-  connect(edit, &CAutoRichEditCtrl::LinkActivated, this, [this](std::uint32_t uid) {
-    const NumberHint argument(static_cast<std::int32_t>(uid));
-    Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
-  });
+  auto* under = MakeChild<QHBoxLayout>();
+  under->addWidget(note, 1);
+  under->addWidget(keypad, 0, Qt::AlignTop);
+  rows->addWidget(edit, 1);
+  rows->addLayout(under);
+  connect(edit, &QTextEdit::textChanged, note, [edit, note] { note->setText(edit->ParserMessage()); });
+  connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
+  WatchFocusLoss(*edit, [this] { NoteFocusLost(); });
   connect(keypad, &QPushButton::clicked, this, [this] { CExpressionEditorDlg(this).exec(); });
+  control.editor = edit;
+  control.note = note;
   return cell;
 }
 
-const CElementForm::Control* CElementForm::FindControl(int number) const {
-  const auto hit = std::find_if(controls.begin(), controls.end(), [number](const Control& control) {
-    return control.field->control == number;
-  });
-  return hit == controls.end() ? nullptr : &*hit;
+void CElementForm::JumpTo(std::uint32_t uid) {
+  const NumberHint argument(static_cast<std::int32_t>(uid));
+  Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 
 bool CElementForm::IsEnabled(const FormField& /*field*/, const CEL_Property& property) const {
@@ -196,63 +262,73 @@ bool CElementForm::IsEnabled(const FormField& /*field*/, const CEL_Property& pro
 void CElementForm::ItemToForm() {
   CEL_Element* element = Element();
   if (element == nullptr) return;
-  for (const Control& control : controls) Show(control, *element);
+  for (Control& control : controls) Show(control, *element);
   element->SetLoaded(true);
 }
 
-void CElementForm::Show(const Control& control, CEL_Element& element) {
+void CElementForm::Show(Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
   if (field.editor == FieldEditor::ReferencedIn) {
-    qobject_cast<CAutoRichEditCtrl*>(control.editor)->SetColouredText(ReferrerText(element).toStdString());
+    qobject_cast<CAutoRichEditCtrl*>(control.editor)->SetColouredText(ReferrerText(element));
     return;
   }
   const CEL_Property& property = field.property(element);
   const bool enabled = IsEnabled(field, property);
   if (auto* combo = qobject_cast<QComboBox*>(control.editor)) {
-    FillCombo(*combo, property, enabled);
+    FillCombo(*combo, field.editor, property, enabled);
     return;
   }
-  control.editor->setEnabled(enabled || field.editor == FieldEditor::Shown);
-  const std::string text = property.TextOf();
+  control.editor->setEnabled(enabled);
+  const QString text = ToScreen(property.TextOf());
   if (auto* line = qobject_cast<QLineEdit*>(control.editor)) {
-    line->setText(ToScreen(text));
-    if (!line->hasFocus()) line->setCursorPosition(0);
-  } else if (auto* lines = qobject_cast<QPlainTextEdit*>(control.editor)) {
-    lines->setPlainText(ToScreen(text));
+    line->setMaxLength(std::max(kMostCharacters, static_cast<int>(text.size())));
+    line->setText(text);
+    line->setCursorPosition(0);
+    control.shown = line->text();
   } else if (auto* expression = qobject_cast<CAutoRichEditCtrl*>(control.editor)) {
-    expression->SetColouredText(text);
+    expression->SetColouredText(property.TextOf());
     control.note->setText(expression->ParserMessage());
+  } else if (auto* lines = qobject_cast<CPlainTextField*>(control.editor)) {
+    lines->ShowText(text);
   }
 }
 
-QString CElementForm::ReferrerText(const CEL_Element& element) const {
+std::string CElementForm::ReferrerText(const CEL_Element& element) const {
   std::vector<std::string> names;
   Core().GetReferrerSymbols(element.GetUid(), names);
   if (names.empty()) return strings::kNotUsed;
-  QStringList shown;
-  for (const std::string& name : names) shown.append(ToScreen(name));
-  return shown.join(QStringLiteral(", "));
+  std::string text;
+  for (const std::string& name : names) {
+    if (!text.empty()) text += ", ";
+    text += name;
+  }
+  return text;
 }
 
-void CElementForm::FillCombo(QComboBox& combo, const CEL_Property& property, bool enabled) const {
-  const bool sorted = FindControl(combo.objectName().toInt())->field->editor == FieldEditor::SortedChoice;
+void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property,
+                             bool enabled) {
   combo.clear();
   combo.setEnabled(property.HasChoices() && enabled);
-  const auto& choices = property.Choices();
-  int present = property.Selected();
-  for (std::size_t index = 0; index < choices.size(); ++index) {
-    combo.addItem(ToScreen(choices[index].display), static_cast<int>(index));
+  QList<std::pair<QString, int>> entries;
+  for (const CEL_Choice& choice : property.Choices()) {
+    entries.append({ToScreen(choice.display), static_cast<int>(entries.size())});
   }
-  if (sorted) combo.model()->sort(0);
-  combo.setCurrentIndex(combo.findData(present));
+  if (editor == FieldEditor::SortedChoice) {
+    std::stable_sort(entries.begin(), entries.end(), [](const auto& left, const auto& right) {
+      return left.first.compare(right.first, Qt::CaseInsensitive) < 0;
+    });
+  }
+  for (const auto& [caption, index] : entries) combo.addItem(caption, index);
+  combo.setCurrentIndex(combo.findData(PresentChoice(property)));
 }
 
 void CElementForm::FormToItem() {
   CEL_Element* element = Element();
   if (element == nullptr) return;
   for (const Control& control : controls) {
-    if (control.field->editor != FieldEditor::Symbol) continue;
-    const std::string entered = EnteredSymbol(control, *element);
+    if (control.field->editor != FieldEditor::Symbol || !IsEdited(control)) continue;
+    const std::string edited = FromScreen(TextIn(*control.editor), element->symbol.Text());
+    const std::string entered(CleanText(edited));
     if (entered == element->symbol.Text()) continue;
     // The other fields are not written in this commit.
     Rename(entered);
@@ -262,46 +338,46 @@ void CElementForm::FormToItem() {
   if (StoreFields(*element)) ItemToForm();
 }
 
-std::string CElementForm::EnteredSymbol(const Control& control, const CEL_Element& element) const {
-  const std::string entered = FromScreen(TextIn(*control.editor), element.symbol.Text());
-  return std::string(CleanText(entered));
-}
-
 bool CElementForm::StoreFields(CEL_Element& element) {
   bool changed = false;
   for (const Control& control : controls) changed = Store(control, element) || changed;
   return changed;
 }
 
+bool CElementForm::IsEdited(const Control& control) {
+  const auto* field = qobject_cast<const CPlainTextField*>(control.editor);
+  return field != nullptr ? field->IsEdited() : TextIn(*control.editor) != control.shown;
+}
+
 bool CElementForm::Store(const Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
-  const bool stored = field.editor != FieldEditor::Symbol && field.editor != FieldEditor::Shown &&
-                      field.editor != FieldEditor::ReferencedIn;
-  if (!stored) return false;
+  const bool isStored = field.editor != FieldEditor::Symbol && field.editor != FieldEditor::Shown &&
+                        field.editor != FieldEditor::ReferencedIn;
+  if (!isStored) return false;
   CEL_Property& property = field.property(element);
   if (field.onlyWhileEnabled && !IsEnabled(field, property)) return false;
   if (const auto* combo = qobject_cast<const QComboBox*>(control.editor))
     return StoreChoice(*combo, property);
+  // A text that nobody edited stays, however it looks on the screen.
+  if (!IsEdited(control)) return false;
   const QString text = TextIn(*control.editor);
   const bool isNumber = field.editor == FieldEditor::Number || field.editor == FieldEditor::Integer;
   return isNumber ? StoreNumber(text, property) : StoreText(text, property);
 }
 
-bool CElementForm::StoreText(const QString& text, CEL_Property& property) const {
-  if (text == ToScreen(property.Text())) return false;
-  const std::string former = property.Text();
-  const std::string entered = FromScreen(text, former);
+bool CElementForm::StoreText(const QString& text, CEL_Property& property) {
+  const std::string entered = FromScreen(text, property.Text());
   property.SetText(CleanText(entered));
-  return property.Text() != former;
+  // The form is filled anew even when blanks were all that changed.
+  return true;
 }
 
-bool CElementForm::StoreNumber(const QString& text, CEL_Property& property) const {
-  const std::string former = property.TextOf();
-  if (text.toStdString() == former) return false;
+bool CElementForm::StoreNumber(const QString& text, CEL_Property& property) {
   const double value = ReadNumber(text.trimmed());
   if (property.Type() == ValueType::Integer) {
-    constexpr double kLimit = 2147483647.0;
-    property.SetInt(static_cast<std::int32_t>(std::clamp(value, -kLimit - 1.0, kLimit)));
+    using Limits = std::numeric_limits<std::int32_t>;
+    const double whole = std::isnan(value) ? 0.0 : std::clamp<double>(value, Limits::min(), Limits::max());
+    property.SetInt(static_cast<std::int32_t>(whole));
   } else if (std::isfinite(value)) {
     property.SetReal(value);
   }
@@ -309,11 +385,11 @@ bool CElementForm::StoreNumber(const QString& text, CEL_Property& property) cons
   return true;
 }
 
-bool CElementForm::StoreChoice(const QComboBox& combo, CEL_Property& property) const {
-  const int index = combo.currentData().isValid() ? combo.currentData().toInt() : -1;
-  if (index < 0 || !combo.isEnabled()) return false;
+bool CElementForm::StoreChoice(const QComboBox& combo, CEL_Property& property) {
+  const QVariant entry = combo.currentData();
+  if (!entry.isValid() || !property.Editable()) return false;
   const std::string former = property.TextOf();
-  property.SelectIndex(index);
+  property.SelectIndex(entry.toInt());
   property.ApplySelection();
   return property.TextOf() != former;
 }
@@ -328,7 +404,7 @@ void CElementForm::BrowseDocumentation(QLineEdit& line) {
 
 void CElementForm::OpenDocumentation(const QString& text) {
   const QString failure = OpenDocumentationFile(text, Dialogs());
-  if (!failure.isEmpty()) Dialogs().Warn(this, failure);
+  if (!failure.isEmpty()) Dialogs().ShowFailure(this, failure);
 }
 
 }  // namespace tessal

@@ -13,7 +13,6 @@ class QComboBox;
 class QGridLayout;
 class QLabel;
 class QLineEdit;
-class QPlainTextEdit;
 
 namespace tessal {
 
@@ -23,6 +22,7 @@ class CEL_Property;
 enum class FieldEditor {
   Symbol,         ///< one line; a change is a rename
   Line,           ///< one line of text
+  ShortLine,      ///< one line of a word or two
   Lines,          ///< several lines of text
   Documentation,  ///< one line, with buttons to browse for a file and to open it
   Number,         ///< a real
@@ -59,19 +59,22 @@ class CElementForm : public CRightPaneBase {
   CElementForm(const FormTable& formTable, const FormContext& context, QWidget* parent);
 
   int HelpNumber() const override { return table.help; }
+  QSize minimumSizeHint() const override;
 
  protected:
+  void resizeEvent(QResizeEvent* resize) override;
   void ItemToForm() override;
   void FormToItem() override;
 
   struct Control {
-    const FormField* field;
-    QWidget* editor;
-    QLabel* label;
-    QLabel* note;  ///< under an expression: what the parser says
+    const FormField* field = nullptr;
+    QWidget* editor = nullptr;
+    QLabel* label = nullptr;
+    QWidget* cell = nullptr;  ///< the editor with what stands beside it
+    QLabel* note = nullptr;  ///< under an expression: what the parser says
+    QString shown;           ///< the text that the last load gave a line
   };
 
-  const Control* FindControl(int number) const;
   /// Whether a control may be used; the property's flag, unless the form knows better.
   virtual bool IsEnabled(const FormField& field, const CEL_Property& property) const;
   /// Writes the fields behind the symbol; true when any has changed.
@@ -80,27 +83,35 @@ class CElementForm : public CRightPaneBase {
   const std::vector<Control>& Controls() const { return controls; }
 
  private:
-  void AddField(const FormField& field, QGridLayout& layout, int row);
-  QWidget* MakeEditor(const FormField& field, QWidget*& cell, QLabel*& note);
-  QWidget* MakeLine(const FormField& field);
+  void AddField(const FormField& field);
+  /// Lays the fields out; short ones share a row when there are two columns.
+  void Arrange(int columnCount);
+  /// Makes the editor of a field. The cell that it stands in may hold more beside it.
+  QWidget* MakeEditor(const FormField& field, Control& control);
+  QLineEdit* MakeLine(const FormField& field, QWidget* parent);
   QWidget* MakeLines();
-  QWidget* MakeCombo(const FormField& field);
-  QWidget* MakeDocumentation(QLineEdit*& line);
-  QWidget* MakeExpression(const FormField& field, CAutoRichEditCtrl*& edit, QLabel*& note);
+  QWidget* MakeCombo();
+  QWidget* MakeReferences();
+  QWidget* MakeDocumentation(const FormField& field, Control& control);
+  QWidget* MakeExpression(const FormField& field, Control& control);
 
-  void Show(const Control& control, CEL_Element& element);
-  void FillCombo(QComboBox& combo, const CEL_Property& property, bool enabled) const;
-  QString ReferrerText(const CEL_Element& element) const;
-  bool StoreText(const QString& text, CEL_Property& property) const;
-  bool StoreNumber(const QString& text, CEL_Property& property) const;
-  bool StoreChoice(const QComboBox& combo, CEL_Property& property) const;
-  std::string EnteredSymbol(const Control& control, const CEL_Element& element) const;
+  void Show(Control& control, CEL_Element& element);
+  static void FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property, bool enabled);
+  std::string ReferrerText(const CEL_Element& element) const;
+  void JumpTo(std::uint32_t uid);
+  static bool IsEdited(const Control& control);
+  static bool StoreText(const QString& text, CEL_Property& property);
+  static bool StoreNumber(const QString& text, CEL_Property& property);
+  static bool StoreChoice(const QComboBox& combo, CEL_Property& property);
 
   void BrowseDocumentation(QLineEdit& line);
   void OpenDocumentation(const QString& text);
 
   const FormTable& table;
   std::vector<Control> controls;
+  QGridLayout* layout;
+  int columns = 0;
+  int narrowWidth = 0;  ///< what one column needs
 };
 
 }  // namespace tessal

@@ -1,8 +1,12 @@
 #include "ui/element_tree.h"
 
 #include <algorithm>
+#include <memory>
 
 #include "core/template_core.h"
+#include "ui/child.h"
+#include "ui/control_ids.h"
+#include "ui/strings.h"
 #include "ui/text_bytes.h"
 
 namespace tessal {
@@ -33,11 +37,12 @@ std::string MarkedCaption(const CEL_Element& element) {
 }
 
 CElementTree::CElementTree(QWidget* parent) : QTreeWidget(parent) {
+  setObjectName(QString::number(control_id::kTree));
   setHeaderHidden(true);
   setIndentation(kIndent);
   setUniformRowHeights(true);
   setContextMenuPolicy(Qt::CustomContextMenu);
-  setAccessibleName(QStringLiteral("Elements of the template"));
+  setAccessibleName(strings::kElements);
 }
 
 CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
@@ -46,7 +51,7 @@ CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
 
 QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, std::int32_t kind, std::int32_t id,
                                       const std::string& caption) {
-  auto* item = new ElementItem;
+  auto* item = MakeChild<ElementItem>();
   item->data.kind = kind;
   item->data.id = id;
   item->setText(0, ToScreen(caption));
@@ -64,10 +69,10 @@ void CElementTree::InsertFolder(std::int32_t kind, std::int32_t id, const Elemen
 void CElementTree::Build(TemplateCore& core) {
   clear();
   groupItems.clear();
-  auto* root = new ElementItem;
+  auto* root = MakeChild<ElementItem>();
   root->data.kind = node_kind::kRoot;
   root->data.id = folder_id::kRoot;
-  root->setText(0, QStringLiteral("Tessal Setup"));
+  root->setText(0, strings::kSetup);
   addTopLevelItem(root);
   InsertFolder(kind::kStateVariableList, folder_id::kStateVariables, core.StateVariables());
   InsertFolder(kind::kConstantList, folder_id::kConstants, core.Constants());
@@ -81,7 +86,8 @@ void CElementTree::Build(TemplateCore& core) {
 }
 
 QTreeWidgetItem* CElementTree::FindById(std::int32_t id) const {
-  for (QTreeWidgetItemIterator item(const_cast<CElementTree*>(this)); *item != nullptr; ++item) {
+  if (RootItem() == nullptr) return nullptr;
+  for (QTreeWidgetItemIterator item(RootItem()); *item != nullptr; ++item) {
     if (DataOf(**item).id == id) return *item;
   }
   return nullptr;
@@ -138,8 +144,16 @@ void CElementTree::ShowParticles(TemplateCore& core) {
 void CElementTree::RemoveBranch(std::int32_t folderId) {
   QTreeWidgetItem* branch = FindById(folderId);
   if (branch == nullptr) return;
+  for (const QTreeWidgetItem* item = currentItem(); item != nullptr; item = item->parent()) {
+    if (item == branch) setCurrentItem(RootItem());
+  }
   if (folderId == folder_id::kMiscellaneous) groupItems.clear();
-  delete branch;
+  RemoveNode(*branch);
+}
+
+void CElementTree::RemoveNode(QTreeWidgetItem& item) {
+  if (item.parent() == nullptr) return;
+  const std::unique_ptr<QTreeWidgetItem> gone(item.parent()->takeChild(item.parent()->indexOfChild(&item)));
 }
 
 void CElementTree::AddGroup(const std::string& name) {
@@ -153,7 +167,7 @@ void CElementTree::AddGroup(const std::string& name) {
 
 void CElementTree::RemoveGroup(std::size_t position) {
   if (position >= groupItems.size()) return;
-  delete groupItems[position];
+  RemoveNode(*groupItems[position]);
   groupItems.erase(groupItems.begin() + static_cast<std::ptrdiff_t>(position));
   for (std::size_t place = position; place < groupItems.size(); ++place)
     --DataOf(*groupItems[place]).groupIndex;

@@ -38,6 +38,8 @@ class CElementTree final : public QTreeWidget {
   void ShowMisc(TemplateCore& core);
   void ShowParticles(TemplateCore& core);
   void RemoveBranch(std::int32_t folderId);
+  /// Removes a node and what stands behind it; the root stays.
+  static void RemoveNode(QTreeWidgetItem& item);
   void AddGroup(const std::string& name);
   /// Removes the node of the group at a position from 0; the groups behind it move up by one number.
   void RemoveGroup(std::size_t position);

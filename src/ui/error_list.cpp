@@ -6,6 +6,8 @@
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
+#include "ui/child.h"
+#include "ui/control_ids.h"
 #include "ui/element_tree.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
@@ -19,13 +21,17 @@ constexpr int kUidRole = Qt::UserRole;
 }  // namespace
 
 CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
+  setObjectName(QString::number(control_id::kErrorList));
   setColumnCount(2);
   setHeaderLabels({strings::kItemColumn, strings::kMessageColumn});
   setRootIsDecorated(false);
   setUniformRowHeights(true);
   setAllColumnsShowFocus(true);
-  setAccessibleName(QStringLiteral("Messages"));
-  const auto choose = [this](QTreeWidgetItem* row) { emit ElementChosen(row->data(0, kUidRole).toInt()); };
+  setAccessibleName(strings::kMessages);
+  // A choice makes the list anew: where a click also activates, the second signal finds its row gone.
+  const auto choose = [this](const QTreeWidgetItem* row) {
+    if (row != nullptr) emit ElementChosen(row->data(0, kUidRole).toInt());
+  };
   connect(this, &QTreeWidget::itemClicked, this, choose);
   connect(this, &QTreeWidget::itemActivated, this, choose);
 }
@@ -36,7 +42,7 @@ std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
   // symbol, ahead of what stands there.
   std::size_t place = 0;
   for (const auto& undefined : core.UndefinedSymbols()) {
-    const QString message = QStringLiteral("Undefined symbol ") + ToScreen(undefined->symbol);
+    const QString message = strings::kUndefinedSymbol + ToScreen(undefined->symbol);
     for (const std::uint32_t user : undefined->usedBy) {
       const CEL_Element* element = core.GetElement(user);
       const QString caption = element == nullptr ? QString() : ToScreen(ElementCaption(*element));
@@ -69,7 +75,7 @@ void CErrorList::RefreshErrorList(TemplateCore& core) {
   items.reserve(static_cast<qsizetype>(rows.size()));
   QTreeWidgetItem* reselected = nullptr;
   for (const Row& row : rows) {
-    auto* item = new QTreeWidgetItem({row.item, row.message});
+    auto* item = MakeChild<QTreeWidgetItem>(QStringList{row.item, row.message});
     item->setData(0, kUidRole, row.uid);
     item->setToolTip(1, row.message.toHtmlEscaped());
     items.append(item);

@@ -7,6 +7,7 @@
 #include <QTreeWidget>
 #include <array>
 
+#include "ui/child.h"
 #include "ui/strings.h"
 
 namespace tessal {
@@ -37,21 +38,21 @@ constexpr std::array<Key, 33> kKeys = {{
 
 CExpressionEditorDlg::CExpressionEditorDlg(QWidget* parent) : QDialog(parent) {
   setWindowTitle(strings::kExpressionEditor);
-  auto* layout = new QGridLayout(this);
-  auto* tree = new QTreeWidget(this);
+  auto* layout = MakeChild<QGridLayout>(this);
+  auto* tree = MakeChild<QTreeWidget>(this);
   tree->setHeaderHidden(true);
   tree->setAccessibleName(QStringLiteral("Symbols"));
-  auto* text = new QTextEdit(this);
+  auto* text = MakeChild<QTextEdit>(this);
   text->setAccessibleName(QStringLiteral("Expression"));
-  auto* keys = new QGridLayout;
+  auto* keys = MakeChild<QGridLayout>();
   for (std::size_t place = 0; place < kKeys.size(); ++place) {
-    auto* key = new QPushButton(QString::fromUtf16(kKeys[place].text), this);
+    auto* key = MakeChild<QPushButton>(QString::fromUtf16(kKeys[place].text), this);
     key->setObjectName(QString::number(kKeys[place].control));
     key->setAutoDefault(false);
     const int index = static_cast<int>(place);
     keys->addWidget(key, index / kKeysPerRow, index % kKeysPerRow);
   }
-  auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, this);
+  auto* buttons = MakeChild<QDialogButtonBox>(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, this);
   connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
   connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
   layout->addWidget(tree, 0, 0, 2, 1);

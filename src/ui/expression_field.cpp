@@ -2,7 +2,7 @@
 
 #include <QContextMenuEvent>
 #include <QHelpEvent>
-#include <QMimeData>
+#include <QMouseEvent>
 #include <QSignalBlocker>
 #include <QToolTip>
 
@@ -42,21 +42,17 @@ class ScreenPositions final {
 }  // namespace
 
 CAutoRichEditCtrl::CAutoRichEditCtrl(const TemplateCore& templateCore, QWidget* parent)
-    : QTextEdit(parent), core(templateCore) {
-  setAcceptRichText(false);
-  setTabChangesFocus(true);
-  setMouseTracking(true);
+    : CPlainTextField(parent), core(templateCore) {
   viewport()->setMouseTracking(true);
 }
 
 void CAutoRichEditCtrl::SetColouredText(const std::string& text) {
   setUpdatesEnabled(false);
   content = text;
-  setPlainText(ToScreen(text));
+  // What was typed last must not lend its looks to the new text.
+  setCurrentCharFormat(QTextCharFormat());
+  ShowText(ToScreen(text));
   Colour();
-  moveCursor(QTextCursor::Start);
-  document()->clearUndoRedoStacks();
-  document()->setModified(false);
   setUpdatesEnabled(true);
 }
 
@@ -84,6 +80,8 @@ void CAutoRichEditCtrl::Colour() {
     cursor.setCharFormat(format);
   }
   cursor.endEditBlock();
+  document()->clearUndoRedoStacks();
+  document()->setModified(false);
 }
 
 QString CAutoRichEditCtrl::ParserMessage() const {
@@ -91,7 +89,7 @@ QString CAutoRichEditCtrl::ParserMessage() const {
   std::int32_t line = 0;
   std::int32_t position = 0;
   std::string message;
-  const int parsed = ParseExpressionText(FromScreen(toPlainText(), content), tree, line, position, message);
+  const int parsed = ParseExpressionText(FromScreen(ContentText(), content), tree, line, position, message);
   ResetExpressionScanner();
   return parsed != 0 ? QString() : ToScreen(message).trimmed();
 }
@@ -101,7 +99,7 @@ std::uint32_t CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
   if (name.isEmpty()) return 0;
   std::int32_t id = 0;
   std::int32_t elementKind = 0;
-  if (!core.FindElementBySymbol(name.toStdString(), id, elementKind)) return 0;
+  if (!core.FindElementBySymbol(FromScreen(name, content), id, elementKind)) return 0;
   const CEL_Element* element = core.GetElementBySequence(static_cast<std::uint32_t>(id));
   return element == nullptr ? 0 : element->GetUid();
 }
@@ -113,38 +111,38 @@ QString CAutoRichEditCtrl::TipOf(std::uint32_t uid) const {
 }
 
 bool CAutoRichEditCtrl::event(QEvent* happened) {
-  if (happened->type() == QEvent::ToolTip) {
-    const auto* help = static_cast<QHelpEvent*>(happened);
-    const std::uint32_t uid = LinkAt(viewport()->mapFrom(this, help->pos()));
-    if (uid != 0) {
-      QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
-    } else {
-      QToolTip::hideText();
-    }
-    return true;
+  if (happened->type() != QEvent::ToolTip) return CPlainTextField::event(happened);
+  const auto* help = static_cast<QHelpEvent*>(happened);
+  const std::uint32_t uid = LinkAt(viewport()->mapFrom(this, help->pos()));
+  if (uid == 0) {
+    QToolTip::hideText();
+  } else {
+    QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
   }
-  return QTextEdit::event(happened);
+  return true;
+}
+
+void CAutoRichEditCtrl::mouseMoveEvent(QMouseEvent* move) {
+  CPlainTextField::mouseMoveEvent(move);
+  viewport()->setCursor(anchorAt(move->pos()).isEmpty() ? Qt::IBeamCursor : Qt::PointingHandCursor);
 }
 
 void CAutoRichEditCtrl::contextMenuEvent(QContextMenuEvent* request) {
-  const std::uint32_t uid = LinkAt(viewport()->mapFromGlobal(request->globalPos()));
+  const bool byKey = request->reason() == QContextMenuEvent::Keyboard;
+  const QPoint point =
+      byKey ? cursorRect().center() : viewport()->mapFromGlobal(request->globalPos());
+  const std::uint32_t uid = LinkAt(point);
   if (uid != 0) {
     emit LinkActivated(uid);
     return;
   }
-  QTextEdit::contextMenuEvent(request);
+  CPlainTextField::contextMenuEvent(request);
 }
 
 void CAutoRichEditCtrl::changeEvent(QEvent* change) {
-  QTextEdit::changeEvent(change);
+  CPlainTextField::changeEvent(change);
   // Another palette wants other colours; what the user is typing stays.
-  if (change->type() == QEvent::PaletteChange && !document()->isModified()) SetColouredText(content);
-}
-
-void CAutoRichEditCtrl::insertFromMimeData(const QMimeData* source) {
-  QString text = source->text();
-  text.remove(QChar(u'\0'));
-  textCursor().insertText(text, QTextCharFormat());
+  if (change->type() == QEvent::PaletteChange && !IsEdited()) SetColouredText(content);
 }
 
 }  // namespace tessal

@@ -2,15 +2,16 @@
 // read-only twin lists the elements that use an element.
 #pragma once
 
-#include <QTextEdit>
-#include <functional>
+#include <cstdint>
 #include <string>
+
+#include "ui/plain_text_field.h"
 
 namespace tessal {
 
 class TemplateCore;
 
-class CAutoRichEditCtrl final : public QTextEdit {
+class CAutoRichEditCtrl final : public CPlainTextField {
   Q_OBJECT
 
  public:
@@ -22,21 +23,23 @@ class CAutoRichEditCtrl final : public QTextEdit {
   /// The parser's message on the present content; empty when it parses. Leaves no trace in the scanner.
   QString ParserMessage() const;
 
+  /// The identity of the element whose link lies at a point of the viewport, 0 for none.
+  std::uint32_t LinkAt(const QPoint& point) const;
+  /// What is shown while the pointer rests on an element's link: its kind and its description.
+  QString TipOf(std::uint32_t uid) const;
+
  signals:
-  /// A link was clicked with the right button.
+  /// A link was clicked with the right button, or the menu was asked for while the caret stood on it.
   void LinkActivated(std::uint32_t uid);
 
  protected:
   bool event(QEvent* happened) override;
+  void mouseMoveEvent(QMouseEvent* move) override;
   void contextMenuEvent(QContextMenuEvent* request) override;
   void changeEvent(QEvent* change) override;
-  void insertFromMimeData(const QMimeData* source) override;
 
  private:
   void Colour();
-  /// The identity of the element whose link lies at a point of the viewport, 0 for none.
-  std::uint32_t LinkAt(const QPoint& point) const;
-  QString TipOf(std::uint32_t uid) const;
 
   const TemplateCore& core;
   std::string content;

@@ -5,6 +5,8 @@
 #include <array>
 
 #include "core/document.h"
+#include "ui/child.h"
+#include "ui/control_ids.h"
 #include "ui/strings.h"
 
 namespace tessal {
@@ -23,11 +25,11 @@ CEL_Property& Of(CEL_Element& element) {
 
 using enum FieldEditor;
 
-constexpr FormField kSymbol{1097, "Symbol", Symbol, Of<&CEL_Element::symbol>};
-constexpr FormField kDescription{1074, "Description", Lines, Of<&CEL_Element::description>};
-constexpr FormField kOnlineHelp{1083, "Online help", Line, Of<&CEL_Element::onlineHelp>};
-constexpr FormField kDocumentation{1076, "Documentation", Documentation, Of<&CEL_Element::documentation>};
-constexpr FormField kReferencedIn{1094, "Referenced in", ReferencedIn, nullptr};
+constexpr FormField kSymbol{control_id::kSymbol, "Symbol", Symbol, Of<&CEL_Element::symbol>};
+constexpr FormField kDescription{control_id::kDescription, "Description", Lines, Of<&CEL_Element::description>};
+constexpr FormField kOnlineHelp{control_id::kOnlineHelp, "Online help", Line, Of<&CEL_Element::onlineHelp>};
+constexpr FormField kDocumentation{control_id::kDocumentation, "Documentation", Documentation, Of<&CEL_Element::documentation>};
+constexpr FormField kReferencedIn{control_id::kReferencedIn, "Referenced in", ReferencedIn, nullptr};
 constexpr FormField kUnitType{1045, "Unq type", SortedChoice, Of<&CEL_Element::unqType>};
 
 constexpr int kScopeControl = 1055;
@@ -40,7 +42,7 @@ constexpr FormField kStateVariableFields[] = {
     kDocumentation,
     {kScopeControl, "Scope", SortedChoice, Of<&CEL_StateVariable::scope>},
     {1059, "Transport", SortedChoice, Of<&CEL_StateVariable::transport>},
-    {1079, "Unit", Line, Of<&CEL_StateVariable::unit>},
+    {1079, "Unit", ShortLine, Of<&CEL_StateVariable::unit>},
     kUnitType,
     {1071, "Default value", Number, Of<&CEL_StateVariable::defaultValue>},
     {1085, "Minimum value", Number, Of<&CEL_StateVariable::minValue>},
@@ -65,7 +67,7 @@ constexpr FormField kInputFields[] = {
     {1062, "User specified", OrderedChoice, Of<&CEL_Input::isUserSpecified>},
     {1042, "Built in ID", OrderedChoice, Of<&CEL_Input::builtInId>},
     kUnitType,
-    {1079, "Unit", Line, Of<&CEL_Input::unit>, true},
+    {1079, "Unit", ShortLine, Of<&CEL_Input::unit>, true},
     {1071, "Default value", Number, Of<&CEL_Input::defaultValue>, true},
     {1085, "Minimum value", Number, Of<&CEL_Input::minValue>, true},
     {1084, "Maximum value", Number, Of<&CEL_Input::maxValue>, true},
@@ -80,7 +82,7 @@ constexpr FormField kAuxiliaryFields[] = {
     {kScopeControl, "Scope", SortedChoice, Of<&CEL_ExpressionElement::scope>},
     {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
     {1050, "Output", SortedChoice, Of<&CEL_Auxilliary_Variable::output>},
-    {1079, "Unit", Line, Of<&CEL_ExpressionElement::unit>},
+    {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
     {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
     kReferencedIn,
 };
@@ -94,7 +96,7 @@ constexpr FormField kProcessFields[] = {
     {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
     {1050, "Output", SortedChoice, Of<&CEL_Process::output>},
     {1052, "Process type", SortedChoice, Of<&CEL_Process::processType>},
-    {1079, "Unit", Line, Of<&CEL_ExpressionElement::unit>},
+    {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
     {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
     kReferencedIn,
 };
@@ -107,7 +109,7 @@ constexpr FormField kDerivedOutputFields[] = {
     {kScopeControl, "Scope", SortedChoice, Of<&CEL_ExpressionElement::scope>},
     {1046, "Format", SortedChoice, Of<&CEL_Derived_Output::format>},
     {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
-    {1079, "Unit", Line, Of<&CEL_ExpressionElement::unit>},
+    {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
     {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
 };
 
@@ -126,7 +128,7 @@ constexpr FormField kMiscFields[] = {
     {1070, "Debug log", Line, Of<&CEL_Miscanellous::debugLog>},
     {kRandomBearingControl, "ABM: random bearing", SortedChoice, Of<&CEL_Miscanellous::randomParticleDir>},
     {kSearchTreeControl, "ABM: search tree", SortedChoice, Of<&CEL_Miscanellous::buildSpatialTree>},
-    {1068, "Checksum", Line, Of<&CEL_Miscanellous::checksum>},
+    {1068, "Checksum", ShortLine, Of<&CEL_Miscanellous::checksum>},
     {1049, "Optimise expressions", SortedChoice, Of<&CEL_Miscanellous::optimise>},
     {1060, "Angle Unit", SortedChoice, Of<&CEL_Miscanellous::trigonometrics>},
 };
@@ -202,9 +204,9 @@ bool CMiscView::IsEnabled(const FormField& field, const CEL_Property& property) 
 }
 
 CNoView::CNoView(const FormContext& context, QWidget* parent) : CRightPaneBase(context, parent) {
-  auto* layout = new QVBoxLayout(this);
-  auto* text = new QLabel(strings::kNoView, this);
-  text->setObjectName(QStringLiteral("1086"));
+  auto* layout = MakeChild<QVBoxLayout>(this);
+  auto* text = MakeChild<QLabel>(strings::kNoView, this);
+  text->setObjectName(QString::number(control_id::kNoView));
   text->setAlignment(Qt::AlignCenter);
   text->setWordWrap(true);
   layout->addWidget(text);

@@ -13,11 +13,14 @@
 #include <array>
 
 #include "core/document.h"
+#include "ui/child.h"
+#include "ui/control_ids.h"
 #include "ui/create_hint.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
 #include "ui/form_tables.h"
+#include "ui/help_window.h"
 #include "ui/label.h"
 #include "ui/node_commands.h"
 #include "ui/strings.h"
@@ -34,6 +37,8 @@ constexpr int kSmallestErrors = 50;
 constexpr QSize kSmallestView(500, 300);
 constexpr int kTitleWeight = 700;
 constexpr int kTitleHeight = 14;
+constexpr int kMargin = 4;
+constexpr QSize kIcons(18, 18);
 
 std::int32_t NumberOf(const UpdateHint* argument) {
   const auto* number = dynamic_cast<const NumberHint*>(argument);
@@ -50,6 +55,7 @@ CMainView::CMainView(CTessalDoc& shownDocument, UserDialogs& userDialogs)
 CMainView::~CMainView() {
   // The form holds on to its node's data: it goes first.
   form.reset();
+  document.RemoveView(*this);
 }
 
 TemplateCore& CMainView::Core() const {
@@ -64,21 +70,28 @@ void CMainView::OnInitialUpdate() {
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
   connect(tree, &QTreeWidget::customContextMenuRequested, this, &CMainView::OpenContextMenu);
   connect(errorList, &CErrorList::ElementChosen, this, &CMainView::SelectById);
+  auto* help = MakeChild<QAction>(strings::kHelp, this);
+  help->setShortcut(QKeySequence::HelpContents);
+  help->setShortcutContext(Qt::WidgetWithChildrenShortcut);
+  connect(help, &QAction::triggered, this, &CMainView::ShowHelp);
+  addAction(help);
   tree->setCurrentItem(tree->RootItem());
   UpdateNavigation();
 }
 
 void CMainView::BuildToolBar() {
-  toolBar = new QToolBar(this);
+  toolBar = MakeChild<QToolBar>(this);
+  toolBar->setObjectName(QString::number(control_id::kNavigation));
+  toolBar->setIconSize(kIcons);
   back = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowBack), strings::kNavigateBack, this,
                             [this] { SelectById(history.Back()); });
   forward = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowForward), strings::kNavigateForward,
                                this, [this] { SelectById(history.Forward()); });
   back->setShortcut(QKeySequence::Back);
   forward->setShortcut(QKeySequence::Forward);
-  historyMenu = new QMenu(this);
+  historyMenu = MakeChild<QMenu>(this);
   connect(historyMenu, &QMenu::aboutToShow, this, &CMainView::FillHistoryMenu);
-  auto* button = new QToolButton(toolBar);
+  auto* button = MakeChild<QToolButton>(toolBar);
   button->setText(strings::kNavigationHistory);
   button->setToolTip(strings::kNavigationHistory);
   button->setMenu(historyMenu);
@@ -87,38 +100,40 @@ void CMainView::BuildToolBar() {
 }
 
 void CMainView::BuildLayout() {
-  title = new CLabel(this);
+  title = MakeChild<CLabel>(this);
+  title->setObjectName(QString::number(control_id::kTitle));
   title->SetFontWeight(kTitleWeight);
   title->SetFontHeight(kTitleHeight);
-  tree = new CElementTree(this);
+  tree = MakeChild<CElementTree>(this);
   tree->setMinimumWidth(kSmallestTree);
   tree->installEventFilter(this);
-  errorList = new CErrorList(this);
+  errorList = MakeChild<CErrorList>(this);
   errorList->setMinimumHeight(kSmallestErrors);
 
-  auto* area = new QScrollArea(this);
+  auto* area = MakeChild<QScrollArea>(this);
   area->setWidgetResizable(true);
   area->setFrameShape(QFrame::NoFrame);
-  holder = new QWidget(area);
-  holderLayout = new QVBoxLayout(holder);
+  holder = MakeChild<QWidget>(area);
+  holder->setObjectName(QString::number(control_id::kRightPane));
+  holderLayout = MakeChild<QVBoxLayout>(holder);
   holderLayout->setContentsMargins(0, 0, 0, 0);
   area->setWidget(holder);
 
-  auto* titleDetail = new QWidget(this);
+  auto* titleDetail = MakeChild<QWidget>(this);
   titleDetail->setMinimumWidth(kSmallestForm);
-  auto* detailLayout = new QVBoxLayout(titleDetail);
+  auto* detailLayout = MakeChild<QVBoxLayout>(titleDetail);
   detailLayout->setContentsMargins(0, 0, 0, 0);
   detailLayout->addWidget(title);
   detailLayout->addWidget(area, 1);
 
-  auto* treeDetail = new QSplitter(Qt::Horizontal, this);
+  auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
   treeDetail->setObjectName(QStringLiteral("TreeDetail"));
   treeDetail->addWidget(tree);
   treeDetail->addWidget(titleDetail);
   treeDetail->setStretchFactor(1, 1);
   treeDetail->setMinimumHeight(kSmallestUpper);
   treeDetail->setChildrenCollapsible(false);
-  auto* topBottom = new QSplitter(Qt::Vertical, this);
+  auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
   topBottom->setObjectName(QStringLiteral("TopBottom"));
   topBottom->addWidget(treeDetail);
   topBottom->addWidget(errorList);
@@ -129,7 +144,9 @@ void CMainView::BuildLayout() {
   treeDetail->setSizes({kUsualTree, 3 * kUsualTree});
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
 
-  auto* layout = new QVBoxLayout(this);
+  auto* layout = MakeChild<QVBoxLayout>(this);
+  layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
+  layout->setSpacing(0);
   layout->addWidget(toolBar);
   layout->addWidget(topBottom, 1);
 }
@@ -188,27 +205,41 @@ void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHi
   MarkDocument();
 }
 
+void CMainView::OnActivate() {
+  errorList->RefreshErrorList(Core());
+}
+
 void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*previous*/) {
   // The form still shows the node that is being left: its entries are written before it goes.
   Commit();
-  RefreshCaption();
+  RefreshCaption(current);
   ReplaceForm(current);
   if (current != nullptr) {
-    const CItemData& data = CElementTree::DataOf(*current);
-    history.Add(data.id, current->text(0).toStdString());
-    helpNumber = HelpNumberOfKind(data.kind);
+    const CItemData& node = CElementTree::DataOf(*current);
+    history.Add(node.id, current->text(0).toStdString());
+    helpNumber = HelpNumberOfKind(node.kind);
   }
   UpdateNavigation();
 }
 
+void CMainView::CloseForm() {
+  shown = nullptr;
+  if (!form) return;
+  // What led here may be a signal of one of the form's own controls.
+  form->Close();
+  form->hide();
+  holderLayout->removeWidget(form.get());
+  form.release()->deleteLater();
+}
+
 void CMainView::ReplaceForm(QTreeWidgetItem* item) {
-  form.reset();
-  formItem = nullptr;
+  CloseForm();
   if (item == nullptr) return;
-  formItem = &CElementTree::DataOf(*item);
-  form = MakeForm({document, dialogs, *formItem}, holder);
+  shown = item;
+  form = MakeForm({document, dialogs, CElementTree::DataOf(*item)}, holder);
   holderLayout->addWidget(form.get());
   form->Load();
+  QWidget::setTabOrder(tree, form.get());
 }
 
 void CMainView::Commit() {
@@ -216,21 +247,28 @@ void CMainView::Commit() {
     form->Commit();
     MarkDocument();
   }
-  RefreshCaption();
+  RefreshCaption(shown);
   errorList->RefreshErrorList(Core());
 }
 
-void CMainView::RefreshCaption() {
-  QTreeWidgetItem* item = tree->currentItem();
+void CMainView::RefreshCaption(QTreeWidgetItem* item) {
   if (item == nullptr) return;
-  const std::int32_t id = CElementTree::DataOf(*item).id;
-  const CEL_Element* element = id > 0 ? Core().GetElement(static_cast<std::uint32_t>(id)) : nullptr;
-  const bool isFolder = CElementTree::DataOf(*item).kind >= kind::kRoot;
+  const CItemData& node = CElementTree::DataOf(*item);
+  const CEL_Element* element = node.id > 0 ? Core().GetElement(static_cast<std::uint32_t>(node.id)) : nullptr;
+  const bool isFolder = node.kind >= kind::kRoot;
   if (element != nullptr && !isFolder) {
     const QString caption = ToScreen(MarkedCaption(*element));
     if (!caption.isEmpty()) item->setText(0, caption);
   }
   title->setText(item->text(0));
+}
+
+int CMainView::HelpNumber() const {
+  return form && form->HelpNumber() != CRightPaneBase::kNoHelp ? form->HelpNumber() : helpNumber;
+}
+
+void CMainView::ShowHelp() {
+  dialogs.ShowHelp(this, kFirstHelpTopic + HelpNumber());
 }
 
 void CMainView::SelectById(std::int32_t id) {
@@ -289,33 +327,36 @@ void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement
   const CEL_Element* element = Core().GetElement(created.uid);
   if (request.kind == static_cast<std::uint32_t>(kind::kSpecie)) tree->ShowParticles(Core());
   QTreeWidgetItem* folder = FolderFor(request);
-  if (element == nullptr || folder == nullptr || tree->FindById(element->MessageUid()) != nullptr) return;
-  QTreeWidgetItem* item = nullptr;
-  if (element->Kind() == kind::kSpecie) {
+  if (element == nullptr || folder == nullptr) return;
+  // A folder that was made only now holds the element already.
+  QTreeWidgetItem* item = tree->FindById(element->MessageUid());
+  if (item == nullptr && element->Kind() == kind::kSpecie) {
     item = tree->InsertSpecie(*folder, static_cast<const CEL_Lagrange_Specie&>(*element));
-  } else {
-    int place = folder->childCount();
-    if (created.placed) {
-      QTreeWidgetItem* before =
-          created.predecessor == 0 ? nullptr : tree->FindById(static_cast<std::int32_t>(created.predecessor));
-      place = before == nullptr ? 0 : folder->indexOfChild(before) + 1;
-    }
-    item = tree->InsertElement(*folder, *element, place);
+  } else if (item == nullptr) {
+    item = tree->InsertElement(*folder, *element, PlaceOf(created, *folder));
   }
   item->setText(0, ToScreen(MarkedCaption(*element)));
+}
+
+int CMainView::PlaceOf(const CreatedElement& created, const QTreeWidgetItem& folder) const {
+  if (!created.placed) return folder.childCount();
+  if (created.predecessor == 0) return 0;
+  QTreeWidgetItem* before = tree->FindById(static_cast<std::int32_t>(created.predecessor));
+  return before == nullptr ? 0 : folder.indexOfChild(before) + 1;
 }
 
 void CMainView::OpenContextMenu(const QPoint& point) {
   QTreeWidgetItem* item = tree->itemAt(point);
   if (item == nullptr) return;
-  const CItemData data = CElementTree::DataOf(*item);
-  const NodeCommands commands = CommandsOfNode(data, Core());
+  const CItemData node = CElementTree::DataOf(*item);
+  const NodeCommands commands = CommandsOfNode(node, Core());
   if (commands.kindToCreate == 0) return;
   QMenu menu(this);
-  QAction* create = menu.addAction(strings::kCreateNew, this, [this, data] { CreateFromMenu(data); });
+  QAction* create = menu.addAction(strings::kCreateNew, this, [this, node] { CreateFromMenu(node); });
   create->setEnabled(commands.canCreate);
   if (commands.offersDelete) {
-    QAction* remove = menu.addAction(strings::kDelete, this, [this, item] { DeleteFromMenu(*item); });
+    QAction* remove = menu.addAction(strings::kDelete, this,
+                                     [this, node] { DeleteFromMenu(node.id, node.groupIndex); });
     remove->setEnabled(commands.canDelete);
   }
   menu.exec(tree->viewport()->mapToGlobal(point));
@@ -340,20 +381,19 @@ void CMainView::DeleteNode(QTreeWidgetItem& item) {
     if (next == nullptr) next = parent;
     if (next != nullptr) tree->setCurrentItem(next);
   }
-  delete &item;
+  CElementTree::RemoveNode(item);
 }
 
-void CMainView::DeleteFromMenu(QTreeWidgetItem& item) {
-  const CItemData data = CElementTree::DataOf(item);
-  if (data.kind == kind::kVisibilityGroup) {
-    const auto& groups = tree->GroupItems();
-    const auto hit = std::find(groups.begin(), groups.end(), &item);
-    if (hit != groups.end()) DeleteGroup(static_cast<std::int32_t>(hit - groups.begin()));
+void CMainView::DeleteFromMenu(std::int32_t id, std::int32_t groupIndex) {
+  if (groupIndex > 0) {
+    DeleteGroup(groupIndex - 1);
   } else {
-    // The commit that goes with leaving the node may have made it undeletable.
-    const auto uid = static_cast<std::uint32_t>(data.id);
-    if (!Core().CanDelete(uid)) return;
-    DeleteNode(item);
+    // A form with something unwritten may use the element by now.
+    Commit();
+    const auto uid = static_cast<std::uint32_t>(id);
+    QTreeWidgetItem* item = tree->FindById(id);
+    if (item == nullptr || !Core().CanDelete(uid)) return;
+    DeleteNode(*item);
     Core().DeleteElement(uid);
   }
   errorList->RefreshErrorList(Core());
@@ -373,17 +413,20 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
   if (watched == tree && happened->type() == QEvent::KeyPress && form) {
     const auto* key = static_cast<QKeyEvent*>(happened);
     if (key->key() == Qt::Key_Tab && key->modifiers() == Qt::NoModifier) {
-      const auto fields = form->findChildren<QWidget*>();
-      const auto first = std::find_if(fields.begin(), fields.end(), [](const QWidget* field) {
-        return field->isEnabled() && field->isVisible() && (field->focusPolicy() & Qt::TabFocus) != 0;
-      });
-      if (first != fields.end()) {
-        (*first)->setFocus(Qt::TabFocusReason);
-        return true;
-      }
+      FocusForm();
+      return true;
     }
   }
   return QWidget::eventFilter(watched, happened);
+}
+
+void CMainView::FocusForm() {
+  const auto fields = form->findChildren<QWidget*>();
+  const auto first = std::find_if(fields.begin(), fields.end(), [](const QWidget* field) {
+    return field->isEnabled() && field->isVisible() && (field->focusPolicy() & Qt::TabFocus) != 0;
+  });
+  QWidget* target = first == fields.end() ? static_cast<QWidget*>(errorList) : *first;
+  target->setFocus(Qt::TabFocusReason);
 }
 
 }  // namespace tessal

@@ -37,6 +37,8 @@ class CMainView final : public QWidget, public CView {
   void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) override;
   /// Commits the open form.
   void OnCommit() override { Commit(); }
+  /// Makes the messages of the process those of this template again.
+  void OnActivate() override;
   QWidget* Widget() override { return this; }
 
   CElementTree& Tree() const { return *tree; }
@@ -44,7 +46,9 @@ class CMainView final : public QWidget, public CView {
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
   const CNavigationHistory& History() const { return history; }
-  int HelpNumber() const { return helpNumber; }
+  /// The number of the help topic for the form, or for the node where it has none.
+  int HelpNumber() const;
+  QMenu& HistoryMenu() const { return *historyMenu; }
 
   /// Selects the node with this id and makes it visible; nothing happens when there is none.
   void SelectById(std::int32_t id);
@@ -61,8 +65,11 @@ class CMainView final : public QWidget, public CView {
 
   void OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* previous);
   void ReplaceForm(QTreeWidgetItem* item);
+  void CloseForm();
   void Commit();
-  void RefreshCaption();
+  void RefreshCaption(QTreeWidgetItem* item);
+  void FocusForm();
+  void ShowHelp();
   void UpdateNavigation();
   void FillHistoryMenu();
   void MarkDocument();
@@ -70,11 +77,12 @@ class CMainView final : public QWidget, public CView {
 
   void OpenContextMenu(const QPoint& point);
   void CreateFromMenu(const CItemData& clicked);
-  void DeleteFromMenu(QTreeWidgetItem& item);
+  void DeleteFromMenu(std::int32_t id, std::int32_t groupIndex);
   void DeleteNode(QTreeWidgetItem& item);
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;
   void InsertCreated(const CreateRequest& request, const CreatedElement& created);
+  int PlaceOf(const CreatedElement& created, const QTreeWidgetItem& folder) const;
 
   CTessalDoc& document;
   UserDialogs& dialogs;
@@ -89,7 +97,7 @@ class CMainView final : public QWidget, public CView {
   QWidget* holder = nullptr;
   QVBoxLayout* holderLayout = nullptr;
   std::unique_ptr<CRightPaneBase> form;
-  CItemData* formItem = nullptr;
+  QTreeWidgetItem* shown = nullptr;  ///< the node that the form shows
   CNavigationHistory history;
   int helpNumber = 109;
 };

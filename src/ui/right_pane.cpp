@@ -36,15 +36,15 @@ class FormQuestions final : public CreationQuestions {
 }  // namespace
 
 CRightPaneBase::CRightPaneBase(const FormContext& formContext, QWidget* parent)
-    : QWidget(parent), context(formContext) {}
+    : QWidget(parent), where(formContext) {}
 
 TemplateCore& CRightPaneBase::Core() const {
-  return context.document.Core();
+  return where.document.Core();
 }
 
 CEL_Element* CRightPaneBase::Element() const {
-  if (context.item.id == folder_id::kMiscellaneous) return Core().GetMisc();
-  return context.item.id < 1 ? nullptr : Core().GetElement(static_cast<std::uint32_t>(context.item.id));
+  if (where.item.id == folder_id::kMiscellaneous) return Core().GetMisc();
+  return where.item.id < 1 ? nullptr : Core().GetElement(static_cast<std::uint32_t>(where.item.id));
 }
 
 void CRightPaneBase::Load() {
@@ -60,7 +60,7 @@ void CRightPaneBase::Commit() {
   if (committing) return;
   committing = true;
   FormToItem();
-  FormQuestions questions(*this, context.dialogs, context.document);
+  FormQuestions questions(*this, where.dialogs, where.document);
   const bool created = Core().OfferUndefinedSymbols(questions);
   dirty = false;
   committing = false;

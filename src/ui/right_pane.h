@@ -35,20 +35,22 @@ class CRightPaneBase : public QWidget {
   /// A commit that comes while one is running does nothing.
   void Commit();
 
-  /// The number of the help topic.
+  /// Turns the form deaf for good: its node may go before it does.
+  void Close() { closed = true; }
+
+  /// The number of the help topic of forms that have none of their own.
+  static constexpr int kNoHelp = 107;
   virtual int HelpNumber() const { return kNoHelp; }
   bool IsDirty() const { return dirty; }
 
  protected:
-  static constexpr int kNoHelp = 107;
-
   virtual void ItemToForm() {}
   virtual void FormToItem() {}
 
-  CTessalDoc& Document() const { return context.document; }
+  CTessalDoc& Document() const { return where.document; }
   TemplateCore& Core() const;
-  UserDialogs& Dialogs() const { return context.dialogs; }
-  CItemData& Item() const { return context.item; }
+  UserDialogs& Dialogs() const { return where.dialogs; }
+  CItemData& Item() const { return where.item; }
   CEL_Element* Element() const;
 
   // What controls report. Nothing counts while the form is being filled or written.
@@ -60,13 +62,14 @@ class CRightPaneBase : public QWidget {
   bool Rename(const std::string& newSymbol);
 
  private:
-  bool IsDeaf() const { return loading || committing; }
+  bool IsDeaf() const { return loading || committing || closed; }
   void RequestCommit();
 
-  FormContext context;
+  FormContext where;
   bool dirty = false;
   bool loading = false;
   bool committing = false;
+  bool closed = false;
 };
 
 }  // namespace tessal

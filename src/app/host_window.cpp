@@ -1,0 +1,297 @@
+#include "app/host_window.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QCloseEvent>
+#include <QDragEnterEvent>
+#include <QDropEvent>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QMenu>
+#include <QMenuBar>
+#include <QMessageBox>
+#include <QMimeData>
+#include <QSettings>
+#include <QTabWidget>
+#include <algorithm>
+
+#include "app/open_document.h"
+#include "app/recent_files.h"
+#include "platform/docview.h"
+
+namespace tessal {
+
+namespace {
+
+const QString kGeometryKey = QStringLiteral("geometry");
+constexpr QSize kUsualSize(1100, 760);
+
+QStringList LocalFiles(const QMimeData& mime) {
+  QStringList files;
+  for (const QUrl& url : mime.urls()) {
+    if (url.isLocalFile()) files.append(url.toLocalFile());
+  }
+  return files;
+}
+
+/// One file in one spelling, whatever links and dots lead to it.
+QString FullPath(const QString& path) {
+  const QFileInfo file(path);
+  const QString canonical = file.canonicalFilePath();
+  return canonical.isEmpty() ? file.absoluteFilePath() : canonical;
+}
+
+}  // namespace
+
+HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, const QString& editorName)
+    : docTemplate(std::move(documentTemplate)),
+      name(editorName),
+      tabs(std::make_unique<QTabWidget>(this).release()) {
+  tabs->setDocumentMode(true);
+  tabs->setTabsClosable(true);
+  tabs->setMovable(true);
+  tabs->setAccessibleName(tr("Open documents"));
+  setCentralWidget(tabs);
+  setAcceptDrops(true);
+  resize(kUsualSize);
+  restoreGeometry(QSettings().value(kGeometryKey).toByteArray());
+  MakeMenus();
+  connect(tabs, &QTabWidget::currentChanged, this, &HostWindow::Activate);
+  connect(tabs, &QTabWidget::tabCloseRequested, this, [this](int index) {
+    tabs->setCurrentIndex(index);
+    CloseCurrent();
+  });
+  UpdateTitles();
+}
+
+HostWindow::~HostWindow() {
+  // The views are widgets of the tabs, and owned here: they leave the tabs before those go.
+  const QSignalBlocker quiet(tabs);
+  tabs->clear();
+  documents.clear();
+}
+
+void HostWindow::MakeMenus() {
+  QMenu* file = menuBar()->addMenu(tr("&File"));
+  file->addAction(tr("&New"), QKeySequence::New, this, &HostWindow::NewDocument);
+  file->addAction(tr("&Open..."), QKeySequence::Open, this, &HostWindow::ChooseFiles);
+  recentMenu = file->addMenu(tr("Open &Recent"));
+  connect(recentMenu, &QMenu::aboutToShow, this, &HostWindow::FillRecentMenu);
+  file->addSeparator();
+  documentActions.append(file->addAction(tr("&Save"), QKeySequence::Save, this, &HostWindow::SaveCurrent));
+  documentActions.append(
+      file->addAction(tr("Save &As..."), QKeySequence(tr("Ctrl+Shift+S")), this, &HostWindow::SaveCurrentAs));
+  file->addSeparator();
+  documentActions.append(file->addAction(tr("&Close"), QKeySequence::Close, this, &HostWindow::CloseCurrent));
+  file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
+  QMenu* help = menuBar()->addMenu(tr("&Help"));
+  help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
+}
+
+void HostWindow::FillRecentMenu() {
+  recentMenu->clear();
+  const QStringList files = RecentFiles();
+  for (const QString& path : files) {
+    recentMenu->addAction(QFileInfo(path).fileName() + QStringLiteral("  \u2013  ") + QFileInfo(path).path(), this,
+                          [this, path] { OpenFile(path); });
+  }
+  if (files.isEmpty()) {
+    recentMenu->addAction(tr("No files yet"))->setEnabled(false);
+    return;
+  }
+  recentMenu->addSeparator();
+  recentMenu->addAction(tr("&Clear List"), &ClearRecentFiles);
+}
+
+void HostWindow::ShowAbout() {
+  QMessageBox::about(this, tr("About %1").arg(name),
+                     tr("%1 %2\n\nTemplates of aquatic process models.").arg(name, qApp->applicationVersion()));
+}
+
+QString HostWindow::FileFilter() const {
+  return QString::fromStdString(docTemplate->GetDocString(CMultiDocTemplate::kFilterName)) +
+         tr(";;All files (*)");
+}
+
+void HostWindow::NewDocument() {
+  auto made = std::make_unique<OpenDocument>(docTemplate->CreateNewDocument());
+  if (!made->Document().OnNewDocument()) return;
+  const std::string plain = docTemplate->GetDocString(CMultiDocTemplate::kNewFileName);
+  made->Document().SetTitle(plain + std::to_string(++newDocuments));
+  AddTab(std::move(made));
+}
+
+void HostWindow::ChooseFiles() {
+  const QString folder = Current() == nullptr ? QString() : QFileInfo(Current()->Path()).path();
+  OpenFiles(QFileDialog::getOpenFileNames(this, tr("Open"), folder, FileFilter()));
+}
+
+void HostWindow::OpenFiles(const QStringList& paths) {
+  for (const QString& path : paths) OpenFile(path);
+}
+
+bool HostWindow::OpenFile(const QString& path) {
+  const QString full = FullPath(path);
+  if (OpenDocument* open = FindByPath(full)) {
+    tabs->setCurrentWidget(open->Widget());
+    return true;
+  }
+  auto opened = std::make_unique<OpenDocument>(docTemplate->CreateNewDocument());
+  if (!opened->Open(full)) {
+    // The messages of the file that failed give way to those of the document in front.
+    opened.reset();
+    Activate();
+    return false;
+  }
+  AddRecentFile(full);
+  AddTab(std::move(opened));
+  return true;
+}
+
+void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
+  opened->Show(*docTemplate);
+  opened->View().SetFrameTitleUpdate([this] { UpdateTitles(); });
+  documents.push_back(std::move(opened));
+  OpenDocument& shown = *documents.back();
+  {
+    // The view is empty yet, and its messages are the newest.
+    const QSignalBlocker quiet(tabs);
+    tabs->setCurrentIndex(tabs->addTab(shown.Widget(), shown.Title()));
+  }
+  shown.View().OnInitialUpdate();
+  UpdateTitles();
+  shown.Widget()->setFocus();
+}
+
+OpenDocument* HostWindow::FindByWidget(const QWidget* widget) const {
+  const auto hit = std::find_if(documents.begin(), documents.end(),
+                                [widget](const auto& open) { return open->Widget() == widget; });
+  return hit == documents.end() ? nullptr : hit->get();
+}
+
+OpenDocument* HostWindow::FindByPath(const QString& path) const {
+  const auto hit = std::find_if(documents.begin(), documents.end(), [&path](const auto& open) {
+    return !open->Path().isEmpty() && FullPath(open->Path()) == path;
+  });
+  return hit == documents.end() ? nullptr : hit->get();
+}
+
+OpenDocument* HostWindow::Current() const {
+  return FindByWidget(tabs->currentWidget());
+}
+
+int HostWindow::DocumentCount() const {
+  return static_cast<int>(documents.size());
+}
+
+bool HostWindow::SaveCurrent() {
+  OpenDocument* saved = Current();
+  if (saved == nullptr) return false;
+  if (saved->Path().isEmpty()) return SaveUnderNewName(*saved);
+  if (saved->IsFileChanged() &&
+      QMessageBox::warning(this, name,
+                           tr("The file '%1' was changed by somebody else since it was read.\n\nReplace it?")
+                               .arg(saved->Path()),
+                           QMessageBox::Yes | QMessageBox::No, QMessageBox::No) != QMessageBox::Yes) {
+    return false;
+  }
+  return Save(*saved, saved->Path());
+}
+
+bool HostWindow::SaveCurrentAs() {
+  OpenDocument* saved = Current();
+  return saved != nullptr && SaveUnderNewName(*saved);
+}
+
+bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
+  const QString extension = QString::fromStdString(docTemplate->GetDocString(CMultiDocTemplate::kFilterExtension));
+  QFileDialog dialog(this, tr("Save As"), saved.Path(), FileFilter());
+  dialog.setAcceptMode(QFileDialog::AcceptSave);
+  dialog.setDefaultSuffix(extension.mid(1));
+  if (dialog.exec() != QDialog::Accepted) return false;
+  const QString path = dialog.selectedFiles().value(0);
+  const OpenDocument* other = FindByPath(FullPath(path));
+  if (other != nullptr && other != &saved) {
+    QMessageBox::warning(this, name, tr("The file '%1' is open in another tab.").arg(path));
+    return false;
+  }
+  if (!Save(saved, path)) return false;
+  AddRecentFile(path);
+  return true;
+}
+
+bool HostWindow::Save(OpenDocument& saved, const QString& path) {
+  // What is being entered belongs into the file, and its messages to the question before it is written.
+  saved.View().OnCommit();
+  const bool done = saved.Save(path);
+  UpdateTitles();
+  return done;
+}
+
+bool HostWindow::MayClose(OpenDocument& closing) {
+  tabs->setCurrentWidget(closing.Widget());
+  closing.View().OnCommit();
+  if (!closing.Document().IsModified()) return true;
+  const auto answer = QMessageBox::warning(
+      this, name, tr("Save the changes to '%1'?").arg(closing.Path().isEmpty() ? closing.Title() : closing.Path()),
+      QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
+  return answer == QMessageBox::Save ? SaveCurrent() : answer == QMessageBox::Discard;
+}
+
+bool HostWindow::CloseCurrent() {
+  OpenDocument* closing = Current();
+  if (closing == nullptr || !MayClose(*closing)) return false;
+  Drop(*closing);
+  return true;
+}
+
+void HostWindow::Drop(OpenDocument& closed) {
+  closed.Document().OnCloseDocument();
+  const auto hit = std::find_if(documents.begin(), documents.end(),
+                                [&closed](const auto& open) { return open.get() == &closed; });
+  const std::unique_ptr<OpenDocument> gone = std::move(*hit);
+  documents.erase(hit);
+  tabs->removeTab(tabs->indexOf(gone->Widget()));
+  gone->Widget()->setParent(nullptr);
+  UpdateTitles();
+}
+
+void HostWindow::Activate() {
+  if (OpenDocument* front = Current()) front->View().OnActivate();
+  UpdateTitles();
+}
+
+void HostWindow::UpdateTitles() {
+  for (const auto& open : documents) {
+    const int tab = tabs->indexOf(open->Widget());
+    if (tab < 0) continue;
+    // An ampersand in a file's name is no mark of a key.
+    tabs->setTabText(tab, open->Title().replace(u'&', QStringLiteral("&&")));
+    tabs->setTabToolTip(tab, open->Path());
+  }
+  const OpenDocument* front = Current();
+  setWindowTitle(front == nullptr ? name : front->Title() + QStringLiteral(" \u2013 ") + name);
+  for (QAction* action : documentActions) action->setEnabled(front != nullptr);
+}
+
+void HostWindow::closeEvent(QCloseEvent* close) {
+  // Each document is asked about before any goes, so that a Cancel leaves everything open.
+  for (const auto& open : documents) {
+    if (MayClose(*open)) continue;
+    close->ignore();
+    return;
+  }
+  QSettings().setValue(kGeometryKey, saveGeometry());
+  close->accept();
+}
+
+void HostWindow::dragEnterEvent(QDragEnterEvent* drag) {
+  if (!LocalFiles(*drag->mimeData()).isEmpty()) drag->acceptProposedAction();
+}
+
+void HostWindow::dropEvent(QDropEvent* drop) {
+  drop->acceptProposedAction();
+  OpenFiles(LocalFiles(*drop->mimeData()));
+}
+
+}  // namespace tessal

@@ -1,0 +1,70 @@
+// The window of the host: it owns the documents, shows each in a tab, and drives them through the document
+// template of the editor's module. What is in a document is none of its business.
+#pragma once
+
+#include <QMainWindow>
+#include <QStringList>
+#include <memory>
+#include <vector>
+
+class QMenu;
+class QTabWidget;
+
+namespace tessal {
+
+class CMultiDocTemplate;
+class OpenDocument;
+
+class HostWindow final : public QMainWindow {
+  Q_OBJECT
+
+ public:
+  HostWindow(std::unique_ptr<CMultiDocTemplate> documents, const QString& editorName);
+  ~HostWindow() override;
+
+  void NewDocument();
+  /// Opens a file in a tab of its own, or shows the tab that has it already. False when it did not load; the
+  /// document has told why.
+  bool OpenFile(const QString& path);
+  void OpenFiles(const QStringList& paths);
+  /// The document in front; none when no document is open.
+  OpenDocument* Current() const;
+  int DocumentCount() const;
+  bool SaveCurrent();
+  bool SaveCurrentAs();
+  /// Closes the document in front, and asks first when it holds unsaved work. False when the user would rather not.
+  bool CloseCurrent();
+
+ protected:
+  void closeEvent(QCloseEvent* close) override;
+  void dragEnterEvent(QDragEnterEvent* drag) override;
+  void dropEvent(QDropEvent* drop) override;
+
+ private:
+  void MakeMenus();
+  void FillRecentMenu();
+  void ChooseFiles();
+  void ShowAbout();
+  QString FileFilter() const;
+
+  void AddTab(std::unique_ptr<OpenDocument> opened);
+  OpenDocument* FindByWidget(const QWidget* widget) const;
+  OpenDocument* FindByPath(const QString& path) const;
+  bool Save(OpenDocument& saved, const QString& path);
+  bool SaveUnderNewName(OpenDocument& saved);
+  /// Whether a document may go: it is unmodified, or the user has saved it or given it up.
+  bool MayClose(OpenDocument& closing);
+  void Drop(OpenDocument& closed);
+  void UpdateTitles();
+  void Activate();
+
+  std::unique_ptr<CMultiDocTemplate> docTemplate;
+  QString name;
+  QTabWidget* tabs;
+  QMenu* recentMenu = nullptr;
+  QList<QAction*> documentActions;  ///< those that need a document in front
+  std::vector<std::unique_ptr<OpenDocument>> documents;
+  int newDocuments = 0;
+};
+
+}  // namespace tessal

@@ -1,0 +1,62 @@
+#include "ui/plain_text_field.h"
+
+#include <QMimeData>
+#include <QSignalBlocker>
+#include <algorithm>
+
+namespace tessal {
+
+CPlainTextField::CPlainTextField(QWidget* parent) : QTextEdit(parent) {
+  setAcceptRichText(false);
+  setTabChangesFocus(true);
+  connect(document(), &QTextDocument::contentsChange, this, [this](int position, int /*removed*/, int added) {
+    changedAt = position;
+    changedCount = added;
+  });
+  connect(this, &QTextEdit::textChanged, this, &CPlainTextField::TakeOutExcess);
+}
+
+void CPlainTextField::ShowText(const QString& text) {
+  limit = std::max(kMostCharacters, static_cast<int>(text.size()));
+  setPlainText(text);
+  shown = ContentText();
+  moveCursor(QTextCursor::Start);
+  document()->clearUndoRedoStacks();
+  document()->setModified(false);
+}
+
+QString CPlainTextField::ContentText() const {
+  QString text = document()->toRawText();
+  text.replace(QChar::ParagraphSeparator, u'\n');
+  text.replace(QChar::LineSeparator, u'\n');
+  return text;
+}
+
+void CPlainTextField::TakeOutExcess() {
+  // Behind the last character stands the end of the document.
+  const int excess = document()->characterCount() - 1 - limit;
+  if (excess <= 0) return;
+  const int end = std::min(changedAt + changedCount, document()->characterCount() - 1);
+  QTextCursor cursor(document());
+  cursor.joinPreviousEditBlock();
+  cursor.setPosition(std::max(end - excess, 0));
+  cursor.setPosition(end, QTextCursor::KeepAnchor);
+  cursor.removeSelectedText();
+  cursor.endEditBlock();
+}
+
+void CPlainTextField::insertFromMimeData(const QMimeData* source) {
+  QString text = source->text();
+  text.remove(QChar(u'\0'));
+  const qsizetype room =
+      limit - (document()->characterCount() - 1) + textCursor().selectedText().size();
+  textCursor().insertText(text.left(std::max<qsizetype>(room, 0)), QTextCharFormat());
+  ensureCursorVisible();
+}
+
+void CPlainTextField::keyPressEvent(QKeyEvent* key) {
+  if (!isReadOnly() && !textCursor().hasSelection()) setCurrentCharFormat(QTextCharFormat());
+  QTextEdit::keyPressEvent(key);
+}
+
+}  // namespace tessal

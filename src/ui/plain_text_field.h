@@ -1,0 +1,39 @@
+// A field of several lines that holds plain text and nothing else: what is pasted loses its looks, zero bytes
+// are dropped, and nothing is taken beyond the limit of a field.
+#pragma once
+
+#include <QTextEdit>
+
+namespace tessal {
+
+/// The most characters that a field of a form takes. A text that came longer from a file stays as it is.
+inline constexpr int kMostCharacters = 4096;
+
+class CPlainTextField : public QTextEdit {
+  Q_OBJECT
+
+ public:
+  explicit CPlainTextField(QWidget* parent);
+
+  /// Replaces the content. The caret stands at the start, and nothing is left to undo.
+  void ShowText(const QString& text);
+  /// The content to the letter, lines parted by line feeds.
+  QString ContentText() const;
+  /// Whether the content is another than the one shown last.
+  bool IsEdited() const { return ContentText() != shown; }
+
+ protected:
+  void insertFromMimeData(const QMimeData* source) override;
+  /// Typing behind a word must not take over that word's looks.
+  void keyPressEvent(QKeyEvent* key) override;
+
+ private:
+  void TakeOutExcess();
+
+  QString shown;
+  int limit = kMostCharacters;
+  int changedAt = 0;
+  int changedCount = 0;
+};
+
+}  // namespace tessal
