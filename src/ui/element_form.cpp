@@ -325,17 +325,20 @@ void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Pro
 void CElementForm::FormToItem() {
   CEL_Element* element = Element();
   if (element == nullptr) return;
+  bool isStale = false;
   for (const Control& control : controls) {
     if (control.field->editor != FieldEditor::Symbol || !IsEdited(control)) continue;
     const std::string edited = FromScreen(TextIn(*control.editor), element->symbol.Text());
     const std::string entered(CleanText(edited));
-    if (entered == element->symbol.Text()) continue;
+    // Blanks around the symbol that it has already go without a rename.
+    isStale = entered == element->symbol.Text();
+    if (isStale) continue;
     // The other fields are not written in this commit.
     Rename(entered);
     ItemToForm();
     return;
   }
-  if (StoreFields(*element)) ItemToForm();
+  if (StoreFields(*element) || isStale) ItemToForm();
 }
 
 bool CElementForm::StoreFields(CEL_Element& element) {

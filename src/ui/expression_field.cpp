@@ -39,6 +39,15 @@ class ScreenPositions final {
   int position = 0;
 };
 
+/// A look at a text neither takes over nor leaves behind the comment that another text has left open.
+class ScannerRest final {
+ public:
+  ScannerRest() { ResetExpressionScanner(); }
+  ScannerRest(const ScannerRest&) = delete;
+  ScannerRest& operator=(const ScannerRest&) = delete;
+  ~ScannerRest() { ResetExpressionScanner(); }
+};
+
 }  // namespace
 
 CAutoRichEditCtrl::CAutoRichEditCtrl(const TemplateCore& templateCore, QWidget* parent)
@@ -58,6 +67,7 @@ void CAutoRichEditCtrl::SetColouredText(const std::string& text) {
 
 void CAutoRichEditCtrl::Colour() {
   std::vector<ExpressionToken> tokens;
+  const ScannerRest rest;
   if (!ScanExpressionTokens(content, tokens) || tokens.empty()) return;
   const QSignalBlocker quiet(this);
   const QColor ground = palette().color(QPalette::Base);
@@ -89,13 +99,24 @@ QString CAutoRichEditCtrl::ParserMessage() const {
   std::int32_t line = 0;
   std::int32_t position = 0;
   std::string message;
+  const ScannerRest rest;
   const int parsed = ParseExpressionText(FromScreen(ContentText(), content), tree, line, position, message);
-  ResetExpressionScanner();
   return parsed != 0 ? QString() : ToScreen(message).trimmed();
 }
 
 std::uint32_t CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
-  const QString name = anchorAt(point);
+  return ElementNamed(anchorAt(point));
+}
+
+std::uint32_t CAutoRichEditCtrl::LinkAtCaret() const {
+  QTextCursor caret = textCursor();
+  const QString before = caret.charFormat().anchorHref();
+  caret.movePosition(QTextCursor::NextCharacter);
+  const QString behind = caret.charFormat().anchorHref();
+  return ElementNamed(behind.isEmpty() ? before : behind);
+}
+
+std::uint32_t CAutoRichEditCtrl::ElementNamed(const QString& name) const {
   if (name.isEmpty()) return 0;
   std::int32_t id = 0;
   std::int32_t elementKind = 0;
@@ -129,9 +150,7 @@ void CAutoRichEditCtrl::mouseMoveEvent(QMouseEvent* move) {
 
 void CAutoRichEditCtrl::contextMenuEvent(QContextMenuEvent* request) {
   const bool byKey = request->reason() == QContextMenuEvent::Keyboard;
-  const QPoint point =
-      byKey ? cursorRect().center() : viewport()->mapFromGlobal(request->globalPos());
-  const std::uint32_t uid = LinkAt(point);
+  const std::uint32_t uid = byKey ? LinkAtCaret() : LinkAt(viewport()->mapFromGlobal(request->globalPos()));
   if (uid != 0) {
     emit LinkActivated(uid);
     return;

@@ -40,6 +40,9 @@ class CAutoRichEditCtrl final : public CPlainTextField {
 
  private:
   void Colour();
+  std::uint32_t LinkAtCaret() const;
+  /// The identity of the element with a symbol, 0 for none.
+  std::uint32_t ElementNamed(const QString& name) const;
 
   const TemplateCore& core;
   std::string content;

@@ -41,6 +41,7 @@ class CMainView final : public QWidget, public CView {
   void OnActivate() override;
   QWidget* Widget() override { return this; }
 
+  CTessalDoc& Document() const { return document; }
   CElementTree& Tree() const { return *tree; }
   CErrorList& ErrorList() const { return *errorList; }
   /// The form of the selected node; none before the first selection.

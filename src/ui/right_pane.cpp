@@ -38,6 +38,12 @@ class FormQuestions final : public CreationQuestions {
 CRightPaneBase::CRightPaneBase(const FormContext& formContext, QWidget* parent)
     : QWidget(parent), where(formContext) {}
 
+CRightPaneBase::~CRightPaneBase() {
+  closed = true;
+  // The fields go first: one that loses the focus on its way out still reports to its form.
+  qDeleteAll(findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly));
+}
+
 TemplateCore& CRightPaneBase::Core() const {
   return where.document.Core();
 }

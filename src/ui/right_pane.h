@@ -28,6 +28,7 @@ class CRightPaneBase : public QWidget {
 
  public:
   CRightPaneBase(const FormContext& context, QWidget* parent);
+  ~CRightPaneBase() override;
 
   /// Fills the form from its element. No control counts as edited meanwhile.
   void Load();

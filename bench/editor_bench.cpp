@@ -1,0 +1,82 @@
+// What a modeller sees of the editor's speed: a template opened until its window is painted, and one commit of a
+// form with the messages that follow it. On the platform without a screen.
+#include <benchmark/benchmark.h>
+
+#include <QApplication>
+#include <QLineEdit>
+#include <QPixmap>
+#include <memory>
+#include <stdexcept>
+
+#include "core/document.h"
+#include "generated_template.h"
+#include "ui/dialogs.h"
+#include "ui/element_tree.h"
+#include "ui/main_view.h"
+#include "ui/right_pane.h"
+
+namespace {
+
+using namespace tessal;
+using bench::FileOfSize;
+using bench::ScratchFolder;
+
+constexpr QSize kScreen(1100, 760);
+
+struct OpenEditor {
+  explicit OpenEditor(const std::string& path) : document(ScreenDialogs()) {
+    if (!document.OnOpenDocument(path)) throw std::runtime_error("no template");
+    view = std::make_unique<CMainView>(document, ScreenDialogs());
+    document.AddView(*view);
+    view->OnInitialUpdate();
+    view->resize(kScreen);
+    view->show();
+  }
+
+  CTessalDoc document;
+  std::unique_ptr<CMainView> view;
+};
+
+void FirstPaint(benchmark::State& state) {
+  const ScratchFolder folder;
+  const std::string path = FileOfSize(folder, state.range(0));
+  for ([[maybe_unused]] auto iteration : state) {
+    const OpenEditor editor(path);
+    benchmark::DoNotOptimize(editor.view->grab().width());
+  }
+}
+BENCHMARK(FirstPaint)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// Selects an element and commits a changed field of its form over and over.
+void CommitIn(benchmark::State& state, std::uint32_t (*uidOf)(TemplateCore& core)) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  editor.view->SelectById(static_cast<std::int32_t>(uidOf(editor.view->Document().Core())));
+  auto* field = editor.view->Form()->findChild<QLineEdit*>("1079");
+  int turn = 0;
+  for ([[maybe_unused]] auto iteration : state) {
+    field->setText(QString::number(++turn));
+    editor.view->OnCommit();
+  }
+}
+
+std::uint32_t MiddleProcess(TemplateCore& core) {
+  return core.GetProcess(core.GetProcessCount() / 2).GetUid();
+}
+
+std::uint32_t FirstConstant(TemplateCore& core) {
+  return core.GetConstant(0).GetUid();
+}
+
+BENCHMARK_CAPTURE(CommitIn, process, MiddleProcess)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(CommitIn, constant, FirstConstant)->Arg(5'000)->Unit(benchmark::kMillisecond);
+
+}  // namespace
+
+int main(int count, char** arguments) {
+  qputenv("QT_QPA_PLATFORM", "offscreen");
+  const QApplication application(count, arguments);
+  benchmark::Initialize(&count, arguments);
+  benchmark::RunSpecifiedBenchmarks();
+  return 0;
+}

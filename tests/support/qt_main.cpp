@@ -1,0 +1,24 @@
+// The main of test programs that show widgets: on the platform without a screen, and without the user's settings.
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QStandardPaths>
+#include <QTemporaryDir>
+
+extern "C" const char* __lsan_default_suppressions();
+
+/// What the font library keeps for the life of the process.
+extern "C" const char* __lsan_default_suppressions() {
+  return "leak:libfontconfig\n";
+}
+
+int main(int count, char** arguments) {
+  const QTemporaryDir settings;
+  qputenv("XDG_CONFIG_HOME", settings.path().toUtf8());
+  qputenv("QT_QPA_PLATFORM", "offscreen");
+  QApplication application(count, arguments);
+  QApplication::setOrganizationName(QStringLiteral("Tessal"));
+  QApplication::setApplicationName(QStringLiteral("tests"));
+  testing::InitGoogleTest(&count, arguments);
+  return RUN_ALL_TESTS();
+}

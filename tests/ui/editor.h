@@ -1,0 +1,99 @@
+// An open editor for tests: a document with its main view on a screen that nobody sees, a user who answers by
+// script, and what such a user can do.
+#pragma once
+
+#include <QComboBox>
+#include <QLineEdit>
+#include <QStringList>
+#include <QTreeWidgetItem>
+#include <cstdint>
+#include <deque>
+#include <memory>
+#include <string>
+
+#include "core/document.h"
+#include "support/qt_print.h"
+#include "support/temporary_folder.h"
+#include "ui/dialogs.h"
+#include "ui/element_tree.h"
+#include "ui/error_list.h"
+#include "ui/expression_field.h"
+#include "ui/main_view.h"
+#include "ui/right_pane.h"
+
+namespace tessal::test {
+
+/// Answers every question, and notes what was asked and shown, in order.
+class ScriptedUser final : public UserDialogs {
+ public:
+  void ShowMessage(const std::string& text) override;
+  bool AskYesNo(const std::string& question) override;
+  void Warn(QWidget* parent, const QString& text) override;
+  void ShowFailure(QWidget* parent, const QString& text) override;
+  bool Ask(QWidget* parent, const QString& question) override;
+  int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override;
+  QString ChooseDocumentationFile(QWidget* parent, const QString& start) override;
+  bool OpenWithSystem(const QString& target) override;
+  void ShowHelp(QWidget* parent, int topic) override;
+
+  /// What was asked and shown since the last call.
+  QStringList TakeLog();
+
+  std::deque<bool> answers;  ///< to questions; Yes when used up
+  std::deque<int> choices;   ///< of kinds; skips when used up
+  QString documentationFile;
+  QStringList openable;  ///< what the system can open
+
+ private:
+  QStringList log;
+};
+
+class Editor final {
+ public:
+  explicit Editor(const std::string& templateText);
+  Editor(const Editor&) = delete;
+  Editor& operator=(const Editor&) = delete;
+  ~Editor();
+
+  bool IsOpen() const { return view != nullptr; }
+  TemplateCore& Core() { return document->Core(); }
+  CTessalDoc& Document() { return *document; }
+  CMainView& View() { return *view; }
+  CElementTree& Tree() { return view->Tree(); }
+  ScriptedUser& User() { return user; }
+  const std::string& Path() const { return path; }
+
+  /// The first node with this caption.
+  QTreeWidgetItem* Node(const QString& caption);
+  void Select(const QString& caption);
+  QString Selected() { return Tree().currentItem()->text(0); }
+  std::int32_t IdOf(const QString& caption) { return CElementTree::DataOf(*Node(caption)).id; }
+  /// The captions of a node's children.
+  QStringList Children(const QString& caption);
+
+  /// A control of the open form by its number.
+  template <class Control>
+  Control& Field(int number) {
+    return *view->Form()->findChild<Control*>(QString::number(number));
+  }
+  QString Text(int number);
+  /// Types over what stands in a field; the focus stays there.
+  void Type(int number, const QString& text);
+  /// Types, and leaves the field.
+  void Enter(int number, const QString& text);
+  void LeaveField();
+  void Choose(int number, const QString& caption);
+  QStringList Offered(int number);
+
+  /// The rows of the error list as "item: message".
+  QStringList Rows();
+
+ private:
+  TemporaryFolder folder;
+  std::string path;
+  ScriptedUser user;
+  std::unique_ptr<CTessalDoc> document;
+  std::unique_ptr<CMainView> view;
+};
+
+}  // namespace tessal::test
