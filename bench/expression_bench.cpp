@@ -1,10 +1,12 @@
-// Expressions: to trees, to identifiers, and checked, as a validation does for every element.
+// Expressions: to trees, to identifiers, and checked, as a validation does for every element; and the look-up
+// of a function, which a check does for every call.
 #include <benchmark/benchmark.h>
 
 #include <string>
 #include <vector>
 
 #include "expr/expression_node.h"
+#include "expr/function_catalogue.h"
 #include "expr/identifiers.h"
 #include "expr/parser.h"
 #include "expr/semantic_checks.h"
@@ -52,9 +54,24 @@ void Check(benchmark::State& state) {
   state.SetItemsProcessed(state.iterations());
 }
 
+/// The first row, the last one, a name in small letters, and a name without a row.
+void FindFunctionByName(benchmark::State& state) {
+  constexpr const char* kNames[] = {"ABS", "MOONPHASE", "oxygensaturation_weiss", "NO_SUCH_FUNCTION"};
+  const std::string name = kNames[state.range(0)];
+  std::string internalName;
+  std::int32_t count = 0;
+  std::int32_t functionClass = 0;
+  std::int32_t id = 0;
+  for ([[maybe_unused]] auto turn : state) {
+    benchmark::DoNotOptimize(FindFunctionUpper(name, internalName, count, functionClass, id));
+  }
+  state.SetItemsProcessed(state.iterations());
+}
+
 }  // namespace
 
 // 0 short, 1 typical, 2 long.
 BENCHMARK(Parse)->DenseRange(0, 2);
 BENCHMARK(Identifiers)->DenseRange(0, 2);
 BENCHMARK(Check)->DenseRange(0, 2);
+BENCHMARK(FindFunctionByName)->DenseRange(0, 3);
