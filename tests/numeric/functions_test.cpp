@@ -80,7 +80,7 @@ TEST(Angles, AreBroughtWithinOneTurn) {
       {"not finite", RadiansToDegrees(-HUGE_VAL), kNaN},
       {"not a number", RadiansToDegrees(kNaN), kNaN},
   });
-  for (const double huge : {1e10, -1e10, 1e300, -1e300}) {
+  for (const double huge : {1e10, -1e10, 1e300, -1e300, 1.7e308, -1.7e308}) {
     EXPECT_TRUE(RadiansToDegrees(huge) >= 0 && RadiansToDegrees(huge) <= 360) << huge;
     EXPECT_TRUE(DegreesToRadians(huge) >= 0 && DegreesToRadians(huge) <= 2 * kPi) << huge;
   }

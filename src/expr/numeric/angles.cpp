@@ -24,7 +24,10 @@ double Pi() {
 }
 
 double RadiansToDegrees(double radians) {
-  return WithinOneTurn(radians * kDegreesPerRadian, 360);
+  // Beyond this the degrees would be infinite; so many turns may go first.
+  constexpr double kLargestRadians = std::numeric_limits<double>::max() / kDegreesPerRadian;
+  const double reduced = std::fabs(radians) > kLargestRadians ? std::fmod(radians, 2 * kPi) : radians;
+  return WithinOneTurn(reduced * kDegreesPerRadian, 360);
 }
 
 double DegreesToRadians(double degrees) {
