@@ -141,7 +141,7 @@ double SetGetSpecie(double id, double value) {
   const SpecieRow& row = kSpecies.at(static_cast<std::size_t>(number) - 1);
   const double factor = Carbonate().factors.*row.specie;
   const bool backToSalinity = row.comesFromSalinity && value == kFromSalinity;
-  if (backToSalinity || value >= 0) {
+  if (!(value < 0) || backToSalinity) {
     const double total = backToSalinity ? kFromSalinity : value * factor;
     // An engine may repeat this call in each of its steps, so the log takes changes only.
     if (total != Carbonate().totals.*row.specie) LogTotal(row, total);

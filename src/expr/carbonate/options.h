@@ -58,7 +58,7 @@ double SetDicAlkFactors(double dic, double alkalinity);
 
 /// `SETGET_SPECIE`: reads or stores one total. The floor of the id selects 1 boron, 2 fluoride, 3 sulphate,
 /// 4 phosphate, 5 silicate; -1 for any other id. Exactly -1 for the first three: from salinity again, and -1
-/// comes back. Another negative value (and NaN) only reads. Returns the stored value over its factor.
+/// comes back. Another negative value only reads. Returns the stored value over its factor.
 double SetGetSpecie(double id, double value);
 
 }  // namespace tessal
