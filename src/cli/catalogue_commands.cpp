@@ -100,7 +100,7 @@ ExitCode RunEval(const std::string& name, const std::vector<std::string>& values
   if (!numbers) return kCallFault;
   double value = 0.0;
   if (EvaluateFunction(name, *numbers, value) == 0) return kContentFault;
-  PrintLine(RealText(value));
+  PrintLine(NumberText(value));
   return kFine;
 }
 
@@ -115,7 +115,7 @@ ExitCode RunCall(const std::string& name, const std::vector<std::string>& values
   }
   const std::optional<double> value = CallRow(name, *numbers);
   if (!value) return kContentFault;
-  PrintLine(RealText(*value));
+  PrintLine(NumberText(*value));
   return kFine;
 }
 

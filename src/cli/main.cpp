@@ -9,6 +9,8 @@
 
 #include "cli/commands.h"
 #include "cli/numbers.h"
+#include "cli/output.h"
+#include "expr/carbonate/options.h"
 
 namespace tessal::cli {
 
@@ -199,6 +201,9 @@ int RunTool(int count, char** arguments) {
   }
   ShowNumbers(line);
   const ExitCode exitCode = line.run();
+  // The option file and its log fail no command, but nobody should compute with other settings than those
+  // meant.
+  if (!CarbonateProblem().empty()) Complain(CarbonateProblem());
   return FlushOutput() ? exitCode : kCallFault;
 }
 

@@ -2,8 +2,13 @@
 
 #include <algorithm>
 #include <charconv>
+#include <cmath>
 #include <limits>
+#include <locale>
+#include <sstream>
 #include <system_error>
+
+#include "elements/property.h"
 
 namespace tessal::cli {
 
@@ -12,19 +17,28 @@ namespace {
 /// Stands before a hidden number. No argument of a shell begins with it.
 constexpr char kHidden = '\x01';
 
+/// A number that no double holds, which `std::from_chars` refuses: infinite, or 0 and its neighbours.
+double RoundedOutOfRange(std::string_view text) {
+  std::istringstream stream{std::string(text)};
+  stream.imbue(std::locale::classic());
+  double value = 0.0;
+  const bool inRange = static_cast<bool>(stream >> value);
+  return inRange ? value : std::copysign(std::numeric_limits<double>::infinity(), value);
+}
+
 }  // namespace
 
 std::optional<double> NumberOf(std::string_view text) {
-  if (text.starts_with('+')) text.remove_prefix(1);
+  if (text.starts_with('+') && !text.starts_with("+-")) text.remove_prefix(1);
   double value = 0.0;
   const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
   if (read.ptr != text.data() + text.size() || read.ec == std::errc::invalid_argument) return std::nullopt;
-  if (read.ec == std::errc::result_out_of_range) {
-    const bool tiny = text.find("e-") != std::string_view::npos || text.find("E-") != std::string_view::npos;
-    value = tiny ? 0.0 : std::numeric_limits<double>::infinity();
-    if (text.starts_with('-')) value = -value;
-  }
-  return value;
+  return read.ec == std::errc::result_out_of_range ? RoundedOutOfRange(text) : value;
+}
+
+std::string NumberText(double value) {
+  // The sign of a NaN says nothing.
+  return std::isnan(value) ? "nan" : RealText(value);
 }
 
 std::optional<std::vector<double>> NumbersOf(const std::vector<std::string>& texts) {

@@ -8,8 +8,12 @@
 
 namespace tessal::cli {
 
-/// The number that a whole text reads as, "nan" and "inf" among them; nothing for another text.
+/// The number that a whole text reads as, "nan" and "inf" among them; nothing for another text. One too large
+/// for a double is infinite.
 std::optional<double> NumberOf(std::string_view text);
+
+/// The shortest text that reads back; "nan" for every NaN.
+std::string NumberText(double value);
 
 /// All of them; nothing when one is no number.
 std::optional<std::vector<double>> NumbersOf(const std::vector<std::string>& texts);
