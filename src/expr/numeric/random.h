@@ -35,7 +35,8 @@ double PoissonDeviate(double mean);
 double GammaDeviate(double order);
 
 /// `B_RAND`: binomial, in whole numbers from 0 to the number of events, which is cut off. A probability
-/// outside 0 to 1 counts as 0 or 1; NaN for NaN.
+/// outside 0 to 1 counts as 0 or 1; NaN for NaN. Event by event below 25 events; rejection for more (Ahrens
+/// and Dieter 1974), but waiting times where less than one success is expected (Devroye 1986).
 double BinomialDeviate(double probability, double events);
 
 }  // namespace tessal
