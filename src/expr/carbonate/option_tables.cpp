@@ -265,8 +265,7 @@ constexpr std::array<CarbonicAcidOption, 14> kCarbonicAcidOptions{{
      "Goyet and Poisson 1989, Deep-Sea Res. A 36:1635-1654"},
     {kHanssonK1, kHanssonK2, sea::kK1, sea::kK2,
      "Hansson 1973, Deep-Sea Res. 20:461-478 and Acta Chem. Scand. 27:931-944, refit by Dickson and Millero "
-     "1987, "
-     "Deep-Sea Res. A 34:1733-1743 (corrigenda 36:983, 1989)"},
+     "1987, Deep-Sea Res. A 34:1733-1743 (corrigenda 36:983, 1989)"},
     {kMehrbachRefitK1, kMehrbachRefitK2, sea::kK1, sea::kK2,
      "Mehrbach et al. 1973, Limnol. Oceanogr. 18:897-907, refit by Dickson and Millero 1987, Deep-Sea Res. A "
      "34:1733-1743 (corrigenda 36:983, 1989)"},
@@ -275,14 +274,12 @@ constexpr std::array<CarbonicAcidOption, 14> kCarbonicAcidOptions{{
      "(corrigenda 36:983, 1989)"},
     {kMehrbachK1, kMehrbachK2, geosecs::kK1, geosecs::kK2,
      "Mehrbach et al. 1973, Limnol. Oceanogr. 18:897-907, as used by Takahashi, Williams, Bos 1982, GEOSECS "
-     "Pacific "
-     "Expedition vol. 3, chapter 3"},
+     "Pacific Expedition vol. 3, chapter 3"},
     {kMehrbachK1, kMehrbachK2, geosecs::kK1, geosecs::kK2,
      "Mehrbach et al. 1973, Limnol. Oceanogr. 18:897-907, as used by Peng et al. 1987, Tellus 39B:439-458"},
     {kFreshWaterK1, kFreshWaterK2, fresh::kK1, fresh::kK2,
      "Millero 1979, Geochim. Cosmochim. Acta 43:1651-1661, from Harned and Davis 1943, J. Am. Chem. Soc. "
-     "65:2030-2037 "
-     "and Harned and Scholes 1941, J. Am. Chem. Soc. 63:1706-1709 (fresh water)"},
+     "65:2030-2037 and Harned and Scholes 1941, J. Am. Chem. Soc. 63:1706-1709 (fresh water)"},
     {kCaiWangK1, kCaiWangK2, sea::kK1, sea::kK2, "Cai and Wang 1998, Limnol. Oceanogr. 43:657-668"},
     {kLuekerK1, kLuekerK2, sea::kK1, sea::kK2, "Lueker, Dickson, Keeling 2000, Mar. Chem. 70:105-119"},
     {kMojicaPrietoK1, kMojicaPrietoK2, sea::kK1, sea::kK2,
@@ -304,8 +301,7 @@ constexpr std::array<ConstantOption, 14> kWaterOptions{{
     {kMillero1979KW, sea::kKW, "Millero 1979, Geochim. Cosmochim. Acta 43:1651-1661"},
     {kFreshWaterKW, fresh::kKW,
      "Millero 1979, Geochim. Cosmochim. Acta 43:1651-1661, from Harned and Owen 1958, The Physical Chemistry "
-     "of "
-     "Electrolyte Solutions (fresh water)"},
+     "of Electrolyte Solutions (fresh water)"},
     kDefaultKW,
     kDefaultKW,
     kDefaultKW,
