@@ -18,8 +18,8 @@ constexpr double kUntouched = -12345;
 
 class EvaluateFunctionTest : public testing::Test {
  protected:
-  EvaluateFunctionTest() { InitCatalogues(); }
-  ~EvaluateFunctionTest() override {
+  void SetUp() override { InitCatalogues(); }
+  void TearDown() override {
     AnglesAreDegrees() = false;
     ReleaseCatalogues();
   }
