@@ -1,8 +1,10 @@
 #include "module/exports.h"
 
 #include <memory>
+#include <string>
 
 #include "core/document.h"
+#include "expr/carbonate/options.h"
 #include "ui/dialogs.h"
 #include "ui/main_view.h"
 
@@ -13,8 +15,13 @@ constexpr const char* kDocumentText =
     "\nTessal\nTessal\nTESSAL Files (*.tessal)\n.tessal\nTessal.Document\nTessal Setup.Document";
 constexpr const char* kEditorName = "Tessal";
 
+/// The first template of the process reads the option file; what is wrong with that is told once.
 std::unique_ptr<tessal::CDocument> MakeDocument() {
-  return std::make_unique<tessal::CTessalDoc>(tessal::ScreenDialogs());
+  const std::string known = tessal::CarbonateProblem();
+  auto made = std::make_unique<tessal::CTessalDoc>(tessal::ScreenDialogs());
+  const std::string& problem = tessal::CarbonateProblem();
+  if (!problem.empty() && problem != known) tessal::ScreenDialogs().ShowMessage(problem);
+  return made;
 }
 
 /// A host gives back the documents that it got from this module's template.
