@@ -21,6 +21,7 @@
 #include "ui/expression_editor_dialog.h"
 #include "ui/expression_field.h"
 #include "ui/focus_watch.h"
+#include "ui/label.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -28,7 +29,8 @@ namespace tessal {
 
 namespace {
 
-constexpr int kLinesHeight = 4;
+constexpr int kFewestLines = 2;
+constexpr int kMostLines = 4;
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
@@ -88,8 +90,13 @@ bool IsOneLine(FieldEditor editor) {
          editor == FieldEditor::Documentation;
 }
 
+int HeightOf(const QWidget& editor, int lines) {
+  return editor.fontMetrics().lineSpacing() * lines + editor.fontMetrics().height() / 2;
+}
+
 void LimitHeight(QWidget& editor) {
-  editor.setMaximumHeight(editor.fontMetrics().lineSpacing() * kLinesHeight);
+  editor.setMinimumHeight(HeightOf(editor, kFewestLines));
+  editor.setMaximumHeight(HeightOf(editor, kMostLines));
 }
 
 }  // namespace
@@ -139,6 +146,7 @@ void CElementForm::Arrange(int columnCount) {
   layout->setColumnStretch(1, 1);
   layout->setColumnStretch(3, columns > 1 ? 1 : 0);
   if (!grows) layout->setRowStretch(row + 1, 1);
+  updateGeometry();
 }
 
 QSize CElementForm::minimumSizeHint() const {
@@ -228,9 +236,8 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   auto* rows = MakeChild<QVBoxLayout>(cell);
   rows->setContentsMargins(0, 0, 0, 0);
   auto* edit = MakeChild<CAutoRichEditCtrl>(Core(), cell);
-  edit->setMinimumHeight(edit->fontMetrics().lineSpacing() * kLinesHeight);
-  auto* note = MakeChild<QLabel>(cell);
-  note->setTextFormat(Qt::PlainText);
+  edit->setMinimumHeight(HeightOf(*edit, kMostLines));
+  auto* note = MakeChild<CLabel>(cell);
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);

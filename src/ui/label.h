@@ -1,4 +1,4 @@
-// A label whose font is described field by field, as the title over the right pane needs it.
+// A label of plain text, whose font is described field by field as the title over the right pane needs it.
 #pragma once
 
 #include <QLabel>
@@ -10,6 +10,9 @@ class CLabel final : public QLabel {
 
  public:
   explicit CLabel(QWidget* parent) : QLabel(parent) { setTextFormat(Qt::PlainText); }
+
+  /// A height that hung on the width would keep a form from shrinking to what its fields need.
+  bool hasHeightForWidth() const override { return false; }
 
   /// The weight on the scale from 1 to 1000 (400 normal, 700 bold), and the height in pixels.
   void SetFontWeight(int weight);

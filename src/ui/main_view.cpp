@@ -1,6 +1,7 @@
 #include "ui/main_view.h"
 
 #include <QAction>
+#include <QFontInfo>
 #include <QKeyEvent>
 #include <QMenu>
 #include <QScrollArea>
@@ -103,7 +104,8 @@ void CMainView::BuildLayout() {
   title = MakeChild<CLabel>(this);
   title->setObjectName(QString::number(control_id::kTitle));
   title->SetFontWeight(kTitleWeight);
-  title->SetFontHeight(kTitleHeight);
+  // Where the user's font is larger than usual, the title is no smaller than what stands under it.
+  title->SetFontHeight(std::max(kTitleHeight, QFontInfo(font()).pixelSize() + 2));
   tree = MakeChild<CElementTree>(this);
   tree->setMinimumWidth(kSmallestTree);
   tree->installEventFilter(this);
