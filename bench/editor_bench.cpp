@@ -1,5 +1,5 @@
-// What a modeller sees of the editor's speed: a template opened until its window is painted, and one commit of a
-// form with the messages that follow it. On the platform without a screen.
+// What a modeller sees of the editor's speed: a template opened until its window is painted, and one commit
+// of a form with the messages that follow it. On the platform without a screen.
 #include <benchmark/benchmark.h>
 
 #include <QApplication>
@@ -68,7 +68,11 @@ std::uint32_t FirstConstant(TemplateCore& core) {
   return core.GetConstant(0).GetUid();
 }
 
-BENCHMARK_CAPTURE(CommitIn, process, MiddleProcess)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(CommitIn, process, MiddleProcess)
+    ->Arg(500)
+    ->Arg(5'000)
+    ->Arg(50'000)
+    ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(CommitIn, constant, FirstConstant)->Arg(5'000)->Unit(benchmark::kMillisecond);
 
 }  // namespace

@@ -31,14 +31,15 @@ Function Resolve(QLibrary& library, const char* name) {
 QStringList EditorModule::UsualPlaces(const QString& programFolder) {
   QStringList places;
   for (const char* folder : kFolders) {
-    places.append(QDir::cleanPath(QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + kModuleFile)));
+    places.append(
+        QDir::cleanPath(QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + kModuleFile)));
   }
   return places;
 }
 
 bool EditorModule::Load(const QStringList& places) {
-  const auto file =
-      std::find_if(places.begin(), places.end(), [](const QString& place) { return QFileInfo::exists(place); });
+  const auto file = std::find_if(places.begin(), places.end(),
+                                 [](const QString& place) { return QFileInfo::exists(place); });
   if (file == places.end()) {
     failure = QStringLiteral("The editor's module was not found. Looked for:\n\n%1").arg(places.join(u'\n'));
     return false;

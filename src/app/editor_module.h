@@ -1,4 +1,5 @@
-// The plug-in module that holds the editor: found beside the host, loaded, and asked for its document template.
+// The plug-in module that holds the editor: found beside the host, loaded, and asked for its document
+// template.
 #pragma once
 
 #include <QLibrary>
@@ -15,8 +16,8 @@ class EditorModule final {
   /// Where the module is looked for, seen from the folder of the host's program.
   static QStringList UsualPlaces(const QString& programFolder);
 
-  /// Loads the first of the files that is there. False, with a text for the user, when none is, or when it is no
-  /// module of this kind.
+  /// Loads the first of the files that is there. False, with a text for the user, when none is, or when it is
+  /// no module of this kind.
   bool Load(const QStringList& places);
   const QString& Failure() const { return failure; }
 

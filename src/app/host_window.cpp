@@ -92,8 +92,8 @@ void HostWindow::FillRecentMenu() {
   recentMenu->clear();
   const QStringList files = RecentFiles();
   for (const QString& path : files) {
-    recentMenu->addAction(QFileInfo(path).fileName() + QStringLiteral("  \u2013  ") + QFileInfo(path).path(), this,
-                          [this, path] { OpenFile(path); });
+    recentMenu->addAction(QFileInfo(path).fileName() + QStringLiteral("  \u2013  ") + QFileInfo(path).path(),
+                          this, [this, path] { OpenFile(path); });
   }
   if (files.isEmpty()) {
     recentMenu->addAction(tr("No files yet"))->setEnabled(false);
@@ -104,8 +104,9 @@ void HostWindow::FillRecentMenu() {
 }
 
 void HostWindow::ShowAbout() {
-  QMessageBox::about(this, tr("About %1").arg(name),
-                     tr("%1 %2\n\nTemplates of aquatic process models.").arg(name, qApp->applicationVersion()));
+  QMessageBox::about(
+      this, tr("About %1").arg(name),
+      tr("%1 %2\n\nTemplates of aquatic process models.").arg(name, qApp->applicationVersion()));
 }
 
 QString HostWindow::FileFilter() const {
@@ -204,7 +205,8 @@ bool HostWindow::SaveCurrentAs() {
 }
 
 bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
-  const QString extension = QString::fromStdString(docTemplate->GetDocString(CMultiDocTemplate::kFilterExtension));
+  const QString extension =
+      QString::fromStdString(docTemplate->GetDocString(CMultiDocTemplate::kFilterExtension));
   QFileDialog dialog(this, tr("Save As"), saved.Path(), FileFilter());
   dialog.setAcceptMode(QFileDialog::AcceptSave);
   dialog.setDefaultSuffix(extension.mid(1));
@@ -233,7 +235,8 @@ bool HostWindow::MayClose(OpenDocument& closing) {
   closing.View().OnCommit();
   if (!closing.Document().IsModified()) return true;
   const auto answer = QMessageBox::warning(
-      this, name, tr("Save the changes to '%1'?").arg(closing.Path().isEmpty() ? closing.Title() : closing.Path()),
+      this, name,
+      tr("Save the changes to '%1'?").arg(closing.Path().isEmpty() ? closing.Title() : closing.Path()),
       QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
   return answer == QMessageBox::Save ? SaveCurrent() : answer == QMessageBox::Discard;
 }

@@ -32,7 +32,8 @@ class HostWindow final : public QMainWindow {
   int DocumentCount() const;
   bool SaveCurrent();
   bool SaveCurrentAs();
-  /// Closes the document in front, and asks first when it holds unsaved work. False when the user would rather not.
+  /// Closes the document in front, and asks first when it holds unsaved work. False when the user would
+  /// rather not.
   bool CloseCurrent();
 
  protected:

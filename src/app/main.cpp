@@ -19,8 +19,8 @@ int RunHost(QApplication& application) {
   line.setApplicationDescription(QStringLiteral("Edits templates of aquatic process models."));
   line.addHelpOption();
   line.addVersionOption();
-  const QCommandLineOption moduleOption(QStringLiteral("module"), QStringLiteral("The file of the editor's module."),
-                                        QStringLiteral("file"));
+  const QCommandLineOption moduleOption(
+      QStringLiteral("module"), QStringLiteral("The file of the editor's module."), QStringLiteral("file"));
   line.addOption(moduleOption);
   line.addPositionalArgument(QStringLiteral("files"), QStringLiteral("Templates to open."),
                              QStringLiteral("[files...]"));

@@ -24,8 +24,8 @@ class OpenDocument final {
   /// The path of the document's file; empty before the first save.
   QString Path() const;
   bool Open(const QString& path);
-  /// Saves what the document holds; the caller commits what is being entered. The document stays modified, and
-  /// keeps its name, when that fails.
+  /// Saves what the document holds; the caller commits what is being entered. The document stays modified,
+  /// and keeps its name, when that fails.
   bool Save(const QString& path);
   /// Whether the document's file was written by somebody else since this document read or wrote it.
   bool IsFileChanged() const;

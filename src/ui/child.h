@@ -1,4 +1,5 @@
-// Widgets, layouts, actions and tree items that belong to a parent: whoever makes one here hands it over at once.
+// Widgets, layouts, actions and tree items that belong to a parent: whoever makes one here hands it over at
+// once.
 #pragma once
 
 #include <memory>

@@ -71,8 +71,8 @@ class CElementForm : public CRightPaneBase {
     QWidget* editor = nullptr;
     QLabel* label = nullptr;
     QWidget* cell = nullptr;  ///< the editor with what stands beside it
-    QLabel* note = nullptr;  ///< under an expression: what the parser says
-    QString shown;           ///< the text that the last load gave a line
+    QLabel* note = nullptr;   ///< under an expression: what the parser says
+    QString shown;            ///< the text that the last load gave a line
   };
 
   /// Whether a control may be used; the property's flag, unless the form knows better.

@@ -26,9 +26,11 @@ CEL_Property& Of(CEL_Element& element) {
 using enum FieldEditor;
 
 constexpr FormField kSymbol{control_id::kSymbol, "Symbol", Symbol, Of<&CEL_Element::symbol>};
-constexpr FormField kDescription{control_id::kDescription, "Description", Lines, Of<&CEL_Element::description>};
+constexpr FormField kDescription{control_id::kDescription, "Description", Lines,
+                                 Of<&CEL_Element::description>};
 constexpr FormField kOnlineHelp{control_id::kOnlineHelp, "Online help", Line, Of<&CEL_Element::onlineHelp>};
-constexpr FormField kDocumentation{control_id::kDocumentation, "Documentation", Documentation, Of<&CEL_Element::documentation>};
+constexpr FormField kDocumentation{control_id::kDocumentation, "Documentation", Documentation,
+                                   Of<&CEL_Element::documentation>};
 constexpr FormField kReferencedIn{control_id::kReferencedIn, "Referenced in", ReferencedIn, nullptr};
 constexpr FormField kUnitType{1045, "Unq type", SortedChoice, Of<&CEL_Element::unqType>};
 

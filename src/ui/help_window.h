@@ -1,5 +1,5 @@
-// The help of the editor: one page, TessalOnline.html, that lies beside the host's executable or in its folder
-// of shared files, with an anchor for each topic.
+// The help of the editor: one page, TessalOnline.html, that lies beside the host's executable or in its
+// folder of shared files, with an anchor for each topic.
 #pragma once
 
 #include <QString>

@@ -357,8 +357,8 @@ void CMainView::OpenContextMenu(const QPoint& point) {
   QAction* create = menu.addAction(strings::kCreateNew, this, [this, node] { CreateFromMenu(node); });
   create->setEnabled(commands.canCreate);
   if (commands.offersDelete) {
-    QAction* remove = menu.addAction(strings::kDelete, this,
-                                     [this, node] { DeleteFromMenu(node.id, node.groupIndex); });
+    QAction* remove =
+        menu.addAction(strings::kDelete, this, [this, node] { DeleteFromMenu(node.id, node.groupIndex); });
     remove->setEnabled(commands.canDelete);
   }
   menu.exec(tree->viewport()->mapToGlobal(point));

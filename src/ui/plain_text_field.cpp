@@ -48,8 +48,7 @@ void CPlainTextField::TakeOutExcess() {
 void CPlainTextField::insertFromMimeData(const QMimeData* source) {
   QString text = source->text();
   text.remove(QChar(u'\0'));
-  const qsizetype room =
-      limit - (document()->characterCount() - 1) + textCursor().selectedText().size();
+  const qsizetype room = limit - (document()->characterCount() - 1) + textCursor().selectedText().size();
   textCursor().insertText(text.left(std::max<qsizetype>(room, 0)), QTextCharFormat());
   ensureCursorVisible();
 }

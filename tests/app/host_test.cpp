@@ -179,7 +179,8 @@ TEST_F(Host, OpensEachFileOnceInATabOfItsOwn) {
   EXPECT_TRUE(window.OpenFile(QString::fromStdString(folder.File("./one.tessal"))));
   EXPECT_EQ(window.DocumentCount(), 2);
   EXPECT_EQ(window.Current()->Path(), QFileInfo(first).canonicalFilePath());
-  EXPECT_EQ(RecentFiles().mid(0, 2), (QStringList{QFileInfo(second).canonicalFilePath(), window.Current()->Path()}));
+  EXPECT_EQ(RecentFiles().mid(0, 2),
+            (QStringList{QFileInfo(second).canonicalFilePath(), window.Current()->Path()}));
   QFile::remove(second);
   EXPECT_EQ(RecentFiles().front(), window.Current()->Path()) << "files that are gone are not offered";
 }
@@ -313,8 +314,8 @@ TEST_F(Host, FiftyDocumentsLeaveNothingBehind) {
   openAndClose(kHalf);
   const long before = ResidentKilobytes();
   openAndClose(kHalf);
-  // A document of this size holds several megabytes: one that stayed each time would show. The sanitizers keep
-  // freed memory back for a while, up to their quarantine's size.
+  // A document of this size holds several megabytes: one that stayed each time would show. The sanitizers
+  // keep freed memory back for a while, up to their quarantine's size.
   constexpr long kMostGrowth = 300 * 1024;
   EXPECT_LT(ResidentKilobytes() - before, kMostGrowth);
 }

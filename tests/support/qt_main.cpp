@@ -1,4 +1,5 @@
-// The main of test programs that show widgets: on the platform without a screen, and without the user's settings.
+// The main of test programs that show widgets: on the platform without a screen, and without the user's
+// settings.
 #include <gtest/gtest.h>
 
 #include <QApplication>

@@ -82,7 +82,8 @@ TEST(Colours, TellWhatANameMeans) {
 
 TEST(Colours, StayReadableOnADarkGround) {
   const QColor dark(30, 30, 30);
-  for (const QRgb told : {qRgb(0, 0, 255), qRgb(0, 0, 0), qRgb(64, 64, 64), qRgb(0, 155, 0), qRgb(255, 0, 0)}) {
+  for (const QRgb told :
+       {qRgb(0, 0, 255), qRgb(0, 0, 0), qRgb(64, 64, 64), qRgb(0, 155, 0), qRgb(255, 0, 0)}) {
     EXPECT_EQ(ReadableColour(QColor(told), Qt::white), QColor(told)) << "the told colour on a light ground";
     EXPECT_GE(ReadableColour(QColor(told), dark).lightness(), 150);
   }

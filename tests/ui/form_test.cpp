@@ -77,7 +77,8 @@ TEST(Commit, AnExpressionWaitsForAnotherReason) {
   editor.Select("a");
   editor.Type(kExpression, "k");
   editor.View().OnCommit();
-  EXPECT_EQ(editor.Core().GetAuxiliary(0).expression.Text(), "k") << "a save takes along what is being entered";
+  EXPECT_EQ(editor.Core().GetAuxiliary(0).expression.Text(), "k")
+      << "a save takes along what is being entered";
 }
 
 TEST(Commit, LookingAtEveryNodeChangesNothing) {
@@ -161,8 +162,9 @@ TEST(Undefined, AsksOnceInTheOrderOfAppearance) {
   editor.User().choices = {kConstantChoice, -1};
   editor.View().OnCommit();
   const QString question = "There are undefined symbols!\n\nDo you want to create symbol '%1' ?";
-  EXPECT_EQ(editor.User().TakeLog(), (QStringList{question.arg("one"), question.arg("two"), "kind of two in 15",
-                                                  question.arg("three"), "kind of three in 15"}));
+  EXPECT_EQ(editor.User().TakeLog(),
+            (QStringList{question.arg("one"), question.arg("two"), "kind of two in 15", question.arg("three"),
+                         "kind of three in 15"}));
   EXPECT_EQ(editor.Children("Constants"), (QStringList{"k", "*two"}));
   EXPECT_EQ(editor.Text(kExpression), "one+two+three");
   EXPECT_EQ(editor.Rows(), (QStringList{"a: Undefined symbol one", "a: Undefined symbol three"}));
@@ -171,10 +173,8 @@ TEST(Undefined, AsksOnceInTheOrderOfAppearance) {
 }
 
 TEST(Undefined, ParticleKindsGoIntoTheClassOfTheUser) {
-  Editor editor(TemplateText()
-                    .Specie("A", "A_up", {{"A_up", "1"}})
-                    .Specie("B", "B_up", {{"B_up", "B_rate"}})
-                    .Text());
+  Editor editor(
+      TemplateText().Specie("A", "A_up", {{"A_up", "1"}}).Specie("B", "B_up", {{"B_up", "B_rate"}}).Text());
   ASSERT_TRUE(editor.IsOpen());
   constexpr int kSpecieConstantChoice = 6;
   editor.User().choices = {kSpecieConstantChoice};
@@ -234,8 +234,8 @@ TEST(Numbers, AreReadByTheRulesOfFiles) {
     const char* shown;
   };
   constexpr Row kRows[] = {
-      {"2.5", 2.5, "2.5"}, {"1e-3", 0.001, "0.001"}, {"+7", 7, "7"},    {"1,5", 1, "1"},
-      {"abc", 0, "0"},     {"4 mg", 4, "4"},         {"nan", 9, "9"},   {"inf", 9, "9"},
+      {"2.5", 2.5, "2.5"}, {"1e-3", 0.001, "0.001"}, {"+7", 7, "7"},  {"1,5", 1, "1"},
+      {"abc", 0, "0"},     {"4 mg", 4, "4"},         {"nan", 9, "9"}, {"inf", 9, "9"},
       {"", 0, "0"},        {" 6 ", 6, "6"},          {"009", 9, "9"},
   };
   for (const Row& row : kRows) {
@@ -270,7 +270,8 @@ TEST(Texts, OfFilesStayToTheByteUnlessEdited) {
   editor.Enter(kUnit, "kg");
   EXPECT_EQ(editor.Core().GetConstant(2).description.Text(), western);
   editor.Enter(kDescription, QString::fromUtf8("s\u00FC\u00DF"));
-  EXPECT_EQ(editor.Core().GetConstant(2).description.Text(), "s\xFC\xDF") << "in the encoding of the text before";
+  EXPECT_EQ(editor.Core().GetConstant(2).description.Text(), "s\xFC\xDF")
+      << "in the encoding of the text before";
 }
 
 void Paste(QWidget& field, const QString& plain) {
@@ -290,12 +291,14 @@ TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
   constexpr qsizetype kMegabyte = 1 << 20;
   const QString enormous(kMegabyte, u'1');
   editor.Select("a");
-  for (const int field : {kOnlineHelp, kDescription, kExpression}) Paste(editor.Field<QWidget>(field), enormous);
+  for (const int field : {kOnlineHelp, kDescription, kExpression})
+    Paste(editor.Field<QWidget>(field), enormous);
   editor.View().OnCommit();
   for (const CEL_Property* text : {&auxiliary.onlineHelp, &auxiliary.description, &auxiliary.expression}) {
     EXPECT_EQ(text->Text(), std::string(4096, '1'));
   }
-  Paste(editor.Field<QWidget>(kDescription), QStringLiteral("two\nlines") + QChar(u'\0') + QStringLiteral("!"));
+  Paste(editor.Field<QWidget>(kDescription),
+        QStringLiteral("two\nlines") + QChar(u'\0') + QStringLiteral("!"));
   Paste(editor.Field<QWidget>(kExpression), QStringLiteral("k\n + f"));
   editor.View().OnCommit();
   EXPECT_EQ(auxiliary.description.Text(), "two\nlines!");
@@ -400,7 +403,8 @@ TEST(Document, AsksBeforeItSavesMessagesOfItsOwn) {
   editor.User().answers = {false};
   const std::string before = test::ReadFile(editor.Path());
   EXPECT_FALSE(editor.Document().OnSaveDocument(editor.Path()));
-  EXPECT_EQ(editor.User().TakeLog(), QStringList{"This setup contains some errors or warnings.\nProceed anyway?"});
+  EXPECT_EQ(editor.User().TakeLog(),
+            QStringList{"This setup contains some errors or warnings.\nProceed anyway?"});
   EXPECT_EQ(test::ReadFile(editor.Path()), before);
   EXPECT_TRUE(editor.Document().IsModified());
   EXPECT_TRUE(editor.Document().OnSaveDocument(editor.Path()));

@@ -3,8 +3,8 @@
 
 #include <QAction>
 #include <QMenu>
-#include <QTimer>
 #include <QTest>
+#include <QTimer>
 #include <QToolBar>
 
 #include "support/template_text.h"
@@ -40,8 +40,9 @@ TemplateText SmallModel() {
 TEST(Tree, ShowsEveryKindInItsPlace) {
   Editor empty(TemplateText().Text());
   ASSERT_TRUE(empty.IsOpen());
-  EXPECT_EQ(Outline(*empty.Tree().RootItem()),
-            "Tessal Setup\n State Variables\n Constants\n Forcing\n Auxiliaries\n Processes\n Derived Outputs\n");
+  EXPECT_EQ(
+      Outline(*empty.Tree().RootItem()),
+      "Tessal Setup\n State Variables\n Constants\n Forcing\n Auxiliaries\n Processes\n Derived Outputs\n");
 
   Editor full(SmallModel()
                   .DerivedOutput("S")
@@ -50,12 +51,13 @@ TEST(Tree, ShowsEveryKindInItsPlace) {
                   .Misc()
                   .Text());
   ASSERT_TRUE(full.IsOpen());
-  EXPECT_EQ(Outline(*full.Tree().RootItem()),
-            "Tessal Setup\n State Variables\n  S\n Constants\n  k\n Forcing\n  f\n Auxiliaries\n  a\n Processes\n"
-            "  p\n Derived Outputs\n  Total\n Miscellaneous\n  Visibility Groups\n Particle Classes\n  Fish\n"
-            "   State Variables\n    Fish_Mass\n   Constants\n   Restricted area search\n"
-            "   Arithmetic Expressions\n    Fish_up\n   Horizontal Movement\n    Horizontal Vector1\n"
-            "   Downward Movement\n    Downward Velocity\n");
+  EXPECT_EQ(
+      Outline(*full.Tree().RootItem()),
+      "Tessal Setup\n State Variables\n  S\n Constants\n  k\n Forcing\n  f\n Auxiliaries\n  a\n Processes\n"
+      "  p\n Derived Outputs\n  Total\n Miscellaneous\n  Visibility Groups\n Particle Classes\n  Fish\n"
+      "   State Variables\n    Fish_Mass\n   Constants\n   Restricted area search\n"
+      "   Arithmetic Expressions\n    Fish_up\n   Horizontal Movement\n    Horizontal Vector1\n"
+      "   Downward Movement\n    Downward Velocity\n");
   EXPECT_TRUE(full.Tree().RootItem()->isExpanded());
   EXPECT_FALSE(full.Node("Constants")->isExpanded());
   EXPECT_TRUE(full.Node("Particle Classes")->isExpanded());
@@ -70,9 +72,9 @@ TEST(ErrorList, UsersOfUndefinedSymbolsStandOnTopInReverse) {
                     .Auxiliary("b2", "B")
                     .Text());
   ASSERT_TRUE(editor.IsOpen());
-  const QStringList expected = {
-      "a2: Undefined symbol A", "b2: Undefined symbol B", "b1: Undefined symbol B", "a1: Undefined symbol A",
-      "low: Warning: The (default) value is lower than the minimum!"};
+  const QStringList expected = {"a2: Undefined symbol A", "b2: Undefined symbol B", "b1: Undefined symbol B",
+                                "a1: Undefined symbol A",
+                                "low: Warning: The (default) value is lower than the minimum!"};
   EXPECT_EQ(editor.Rows(), expected);
 
   CErrorList& list = editor.View().ErrorList();
@@ -262,7 +264,8 @@ TEST(Hints, CreateGivesTextsAPlaceAndAStar) {
   EXPECT_EQ(editor.Core().GetAuxiliary(0).description.Text(), "fresh Description");
   EXPECT_TRUE(editor.Document().IsModified()) << "after each hint the document follows the template";
   editor.Select("*fresh");
-  EXPECT_EQ(editor.Children("Auxiliaries"), (QStringList{"*fresh", "a"})) << "the next refresh takes the star off";
+  EXPECT_EQ(editor.Children("Auxiliaries"), (QStringList{"*fresh", "a"}))
+      << "the next refresh takes the star off";
   editor.Select("a");
   EXPECT_EQ(editor.Children("Auxiliaries"), (QStringList{"fresh", "a"}));
 

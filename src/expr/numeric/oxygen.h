@@ -5,8 +5,8 @@
 namespace tessal {
 
 /// `OXYGENSATURATION`: the cubic in temperature for fresh water of Elmore and Hayes 1960, J. Sanit. Eng. Div.
-/// ASCE 86(SA4):41-53, with linear terms for salinity. Within 2 per cent of `OxygenSaturationWeiss` up to 25 degrees,
-/// and up to 4.5 per cent below it at 30.
+/// ASCE 86(SA4):41-53, with linear terms for salinity. Within 2 per cent of `OxygenSaturationWeiss` up to 25
+/// degrees, and up to 4.5 per cent below it at 30.
 double OxygenSaturation(double salinity, double temperature);
 
 /// `OXYGENSATURATION_WEISS`: Weiss 1970, Deep-Sea Res. 17:721-735, equation 4, turned from ml/l to mg/l.
