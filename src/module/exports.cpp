@@ -17,10 +17,10 @@ constexpr const char* kEditorName = "Tessal";
 
 /// The first template of the process reads the option file; what is wrong with that is told once.
 std::unique_ptr<tessal::CDocument> MakeDocument() {
-  const std::string known = tessal::CarbonateProblem();
+  const bool isTold = !tessal::CarbonateProblem().empty();
   auto made = std::make_unique<tessal::CTessalDoc>(tessal::ScreenDialogs());
   const std::string& problem = tessal::CarbonateProblem();
-  if (!problem.empty() && problem != known) tessal::ScreenDialogs().ShowMessage(problem);
+  if (!problem.empty() && !isTold) tessal::ScreenDialogs().ShowMessage(problem);
   return made;
 }
 

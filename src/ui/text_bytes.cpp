@@ -12,7 +12,7 @@ std::string FromScreen(const QString& text, std::string_view former) {
   if (text == ToScreen(former)) return std::string(former);
   QString clean = text;
   clean.remove(QChar(u'\0'));
-  const std::string edited = clean.toStdString();
+  std::string edited = clean.toStdString();
   if (IsUtf8(former)) return edited;
   return Utf8ToWindows1252(edited).value_or(edited);
 }

@@ -316,7 +316,7 @@ TEST_F(Host, FiftyDocumentsLeaveNothingBehind) {
   openAndClose(kHalf);
   // A document of this size holds several megabytes: one that stayed each time would show. The sanitizers
   // keep freed memory back for a while, up to their quarantine's size.
-  constexpr long kMostGrowth = 300 * 1024;
+  constexpr long kMostGrowth = 300L * 1024;
   EXPECT_LT(ResidentKilobytes() - before, kMostGrowth);
 }
 

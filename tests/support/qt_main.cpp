@@ -6,10 +6,10 @@
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
-extern "C" const char* __lsan_default_suppressions();
+// What the font library keeps for the life of the process. The name is the leak sanitizer's.
+extern "C" const char* __lsan_default_suppressions();  // NOLINT(bugprone-reserved-identifier)
 
-/// What the font library keeps for the life of the process.
-extern "C" const char* __lsan_default_suppressions() {
+extern "C" const char* __lsan_default_suppressions() {  // NOLINT(bugprone-reserved-identifier)
   return "leak:libfontconfig\n";
 }
 
