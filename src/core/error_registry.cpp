@@ -1,5 +1,7 @@
 #include "core/error_registry.h"
 
+#include <utility>
+
 namespace tessal {
 
 namespace {
@@ -14,13 +16,21 @@ std::string_view LevelWord(std::uint32_t level) {
 
 void ErrorRegistry::AddError(std::uint32_t level, std::string_view symbol, std::int32_t uid,
                              std::string_view text) {
-  if (level >= 1 && level <= kLevels) ++counts[level - 1];
-  records.push_back({level, std::string(symbol), uid, std::string(text)});
+  Append({level, std::string(symbol), uid, std::string(text), 0});
 }
 
 void ErrorRegistry::AddError(ErrorLevel level, std::string_view symbol, std::int32_t uid,
                              std::string_view text) {
   AddError(static_cast<std::uint32_t>(level), symbol, uid, text);
+}
+
+void ErrorRegistry::AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line) {
+  Append({static_cast<std::uint32_t>(level), std::string(symbol), -1, std::string(text), line});
+}
+
+void ErrorRegistry::Append(ErrorRecord record) {
+  if (record.level >= 1 && record.level <= kLevels) ++counts[record.level - 1];
+  records.push_back(std::move(record));
 }
 
 void ErrorRegistry::ReportElementError(std::string_view symbol, std::int32_t uid, std::string_view text) {

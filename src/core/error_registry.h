@@ -15,12 +15,14 @@ namespace tessal {
 /// How grave a message is. Only a fatal one changes the flow of control: it makes a load fail.
 enum class ErrorLevel : std::uint32_t { Notice = 1, Warning = 2, Critical = 3, Fatal = 4 };
 
-/// One message. `uid` is the identity of the element it speaks of, -1 for none.
+/// One message. `uid` is the identity of the element it speaks of, -1 for none. A message about the file
+/// itself, which has no element yet, knows its line (from 1; 0 for none).
 struct ErrorRecord {
   std::uint32_t level;
   std::string symbol;
   std::int32_t uid;
   std::string text;
+  int line;
 };
 
 /// The word of a level ("Warning"); empty for a number outside 1 to 4.
@@ -52,6 +54,9 @@ class ErrorRegistry final {
   /// Appends a record and raises the counter of its level (a level outside 1 to 4 has no counter).
   void AddError(std::uint32_t level, std::string_view symbol, std::int32_t uid, std::string_view text);
   void AddError(ErrorLevel level, std::string_view symbol, std::int32_t uid, std::string_view text);
+
+  /// Appends a record about a place in the file that is being read.
+  void AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line);
 
   /// The way of the element checks: a warning, and one more in `ExpressionWarningCount`.
   void ReportElementError(std::string_view symbol, std::int32_t uid, std::string_view text);
@@ -86,6 +91,8 @@ class ErrorRegistry final {
 
  private:
   static constexpr std::size_t kLevels = 4;
+
+  void Append(ErrorRecord record);
 
   std::vector<ErrorRecord> records;
   std::array<std::size_t, kLevels> counts{};

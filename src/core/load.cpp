@@ -42,23 +42,24 @@ class RebuildsOff final {
   bool& enabled;
 };
 
-std::string SyntaxErrorText(KvfHandle handle) {
+/// Where the syntax error of a failed load lies.
+struct SyntaxError {
+  explicit SyntaxError(KvfHandle handle) { kvfGetSyntaxErr(handle, line, position, near); }
+
   int line = 0;
   int position = 0;
   std::string near;
-  kvfGetSyntaxErr(handle, line, position, near);
-  return "Synthax error near line " + std::to_string(line) + " position " + std::to_string(position) + " : " +
-         near;
-}
+};
 
-std::string LoadErrorText(const OpenFile& file, const std::string& path) {
-  switch (file.Error()) {
+std::string LoadErrorText(int error, const SyntaxError& syntax, const std::string& path) {
+  switch (error) {
     case kKvfCannotOpen:
       return "Can not open file " + path;
     case kKvfCannotInitialiseStream:
       return "Can not initalise iput stream";
     case kKvfSyntaxError:
-      return SyntaxErrorText(file.Handle());
+      return "Synthax error near line " + std::to_string(syntax.line) + " position " +
+             std::to_string(syntax.position) + " : " + syntax.near;
     case kKvfCannotInitialiseParser:
       return "Can not initalise KVF parser!";
     case kKvfBadHandle:
@@ -70,6 +71,19 @@ std::string LoadErrorText(const OpenFile& file, const std::string& path) {
   }
 }
 
+void ReportFailedLoad(const OpenFile& file, const std::string& path) {
+  const SyntaxError syntax(file.Handle());
+  Errors().AddFileError(ErrorLevel::Fatal, kLoadSymbol, LoadErrorText(file.Error(), syntax, path) + "\n",
+                        syntax.line);
+}
+
+/// Why the item tree could not be read, in words for the modeller.
+std::string TreeFailureText(const std::string& path) {
+  if (!LastKeyError().empty()) return LastKeyError();
+  // The reader calls such a file missing.
+  return KeyFileSize(path) == 0 ? "the file is empty, or no regular file" : KeyFileFailureText();
+}
+
 /// A target that holds nothing stands for an empty template, and misses no key.
 bool IsEmptyTarget(KvfNode target) {
   return kvfGetNoSections(target) == 0 && !HasKeyword(target, key::kDescription) &&
@@ -79,7 +93,8 @@ bool IsEmptyTarget(KvfNode target) {
 }  // namespace
 
 bool TemplateCore::LoadWrapper(const std::string& path) {
-  return Load(path);
+  // A copy: the path may be the template's own file name, which the load empties first.
+  return Load(std::string(path));
 }
 
 bool TemplateCore::Load(const std::string& path) {
@@ -110,7 +125,7 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
     // Closed before the second reading: a large file need not lie in memory twice.
     const OpenFile file(path);
     if (file.Error() != kKvfOk || file.Handle() == 0) {
-      Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, LoadErrorText(file, path) + "\n");
+      ReportFailedLoad(file, path);
       return false;
     }
     saveFileName = path;
@@ -119,8 +134,7 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
   }
   keptTree.Clear();
   if (LoadKeyFileTree(path, keptTree) == 0) {
-    const std::string& reason = LastKeyError().empty() ? KeyFileFailureText() : LastKeyError();
-    Errors().AddError(ErrorLevel::Warning, "could not read template: ", -1, reason);
+    Errors().AddError(ErrorLevel::Warning, "could not read template: ", -1, TreeFailureText(path));
   }
   return true;
 }
@@ -128,15 +142,13 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
 bool TemplateCore::ReadSections(KvfHandle file, int targetNumber) {
   int status = 0;
   const KvfNode target = kvfTargetByNameNum(file, section::kTarget, targetNumber);
-  if (target != nullptr && !IsEmptyTarget(target)) {
+  if (target != nullptr) {
     const RebuildsOff noRebuilds(flags.rebuildEnabled);
-    root.Read(target, status);
+    if (!IsEmptyTarget(target)) root.Read(target, status);
     ReadMisc(target, status);
     ReadCollections(target, status);
     ReadEquations(target, status);
     ReadSpecies(target, status);
-  } else {
-    hasMisc = false;
   }
   RebuildSymbolTable();
   if (hasMisc) ApplyVisibilityGroups();
@@ -188,6 +200,11 @@ void TemplateCore::ReadEquations(KvfNode target, int& status) {
   const KvfNode equations = kvfSectionByNameNum(target, section::kStateVariableEquations, 1);
   if (equations == nullptr) return;
   const int count = kvfGetNoSections(equations);
+  if (static_cast<std::size_t>(count) > stateVariables.size()) {
+    Errors().AddFileError(ErrorLevel::Critical, "",
+                          "STATE_VARIABLE_EQUATIONS has more sub-sections than there are state variables",
+                          kvfGetLine(equations));
+  }
   for (int number = 1; number <= count; ++number) {
     GetStateVariable(static_cast<std::size_t>(number - 1))
         .ReadEquation(kvfSectionByNum(equations, number), status);

@@ -73,15 +73,15 @@ void CEL_Miscanellous::Reset() {
   visibilities.Reset();
 }
 
-void CEL_Miscanellous::SetAbsentValues() {
-  documentRevision.SetInt(-1);
-  optimise.SetBool(false);
-  trigonometrics.SetText(kRadians);
+void CEL_Miscanellous::SetAbsentValues(KvfNode section) {
+  if (!HasKeyword(section, key::kDocumentRevision)) documentRevision.SetInt(-1);
+  if (!HasKeyword(section, key::kOptimise)) optimise.SetBool(false);
+  if (!HasKeyword(section, key::kTrigonometrics)) trigonometrics.SetText(kRadians);
 }
 
 void CEL_Miscanellous::Read(KvfNode section, int& status) {
   if (!kvfIsSection(section)) return;
-  SetAbsentValues();
+  SetAbsentValues(section);
   CEL_Element::Read(section, status);
   tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
   parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));

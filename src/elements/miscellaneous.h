@@ -48,7 +48,8 @@ class CEL_Miscanellous final : public CEL_Element {
   CEL_Property trigonometrics{ValueType::Text};
 
  private:
-  void SetAbsentValues();
+  /// What an old file means by the keywords that it lacks.
+  void SetAbsentValues(KvfNode section);
   void DropFunctions();
 
   bool* templateModified = nullptr;

@@ -26,7 +26,7 @@ void ReportMissing(KvfNode section, std::string_view key, int& status) {
   text += key;
   text += " in ";
   text += kvfGetNameGlb(section);
-  Errors().AddError(ErrorLevel::Critical, "", -1, text);
+  Errors().AddFileError(ErrorLevel::Critical, "", text, kvfGetLine(section));
   LastKeyErrorText() = std::move(text);
 }
 

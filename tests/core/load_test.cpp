@@ -1,5 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <string>
+#include <string_view>
+
 #include "core/error_registry.h"
 #include "core/loaded_template.h"
 #include "support/template_text.h"
@@ -56,12 +60,51 @@ TEST(Load, FilesWithoutMuchInThemLoad) {
   for (const char* text : {"", "\n[OTHER]\nEndSect\n", "\n[TESSAL_SETUP]\nEndSect\n", "// nothing\n"}) {
     LoadedTemplate loaded(text);
     EXPECT_TRUE(loaded.Loaded()) << text;
-    EXPECT_EQ(loaded->GetMisc(), nullptr) << text;
+    const bool hasTarget = std::string_view(text).find("TESSAL") != std::string_view::npos;
+    EXPECT_EQ(loaded->GetMisc() == nullptr, hasTarget) << text << ": only a target tells that it has none";
     EXPECT_EQ(loaded->SymbolTable().size(), 0U);
     EXPECT_EQ(Errors().GetErrorCount(3) + Errors().GetErrorCount(4), 0U) << text << Messages();
   }
   LoadedTemplate loaded("\n[TESSAL_SETUP]\nEndSect\n");
   EXPECT_EQ(Messages(), "");
+  LoadedTemplate empty("");
+  EXPECT_EQ(Messages(), "2 could not read template: : the file is empty, or no regular file\n");
+}
+
+TEST(Load, ATemplateCanBeReadAgainFromItsOwnFile) {
+  LoadedTemplate loaded(TemplateText().Constant("k").Text());
+  EXPECT_TRUE(loaded->LoadWrapper(loaded->TemplateFileName())) << Messages();
+  EXPECT_EQ(loaded->GetConstantCount(), 1U);
+  EXPECT_EQ(loaded->SaveFileName(), loaded.Path());
+}
+
+TEST(Load, MessagesAboutTheFileKnowTheirLine) {
+  const auto lineOf = [](std::string_view part) {
+    for (const ErrorRecord& record : Errors().Records()) {
+      if (record.text.find(part) != std::string::npos) return record.line;
+    }
+    return -1;
+  };
+  const std::string text = TemplateText().Constant("k").Without("UNIT").Text();
+  const auto heads =
+      std::count(text.begin(), text.begin() + static_cast<std::ptrdiff_t>(text.find("[CONSTANT_1]")), '\n');
+  LoadedTemplate missing(text);
+  EXPECT_EQ(lineOf("could not find key UNIT in CONSTANT_1"), heads + 1);
+  LoadedTemplate broken("\n[TESSAL_SETUP]\n A = ]\nEndSect\n");
+  EXPECT_EQ(lineOf("Synthax error"), 3);
+  LoadedTemplate crowded("\n[TESSAL_SETUP]\n[STATE_VARIABLE_EQUATIONS]\n[E]\nEndSect\nEndSect\nEndSect\n");
+  EXPECT_EQ(lineOf("STATE_VARIABLE_EQUATIONS has more sub-sections than there are state variables"), 3);
+}
+
+TEST(Load, SettingsThatStandInTheFileAreNoAbsentOnes) {
+  // The missing version keeps the integers behind it from being read; they keep what they had.
+  std::string text = TemplateText().Misc("DOCUMENT_REVISION = 3\nOPTIMISE = 'YES'\n").Text();
+  text.erase(text.find("PARSER_VERSION"), std::string_view("PARSER_VERSION = 2017.001\n").size());
+  LoadedTemplate loaded(text);
+  EXPECT_EQ(Messages(), "3 : could not find key PARSER_VERSION in MISC\n");
+  EXPECT_EQ(loaded->GetDocumentRevision(), 0);
+  EXPECT_TRUE(loaded->GetMisc()->optimise.BoolValue());
+  EXPECT_EQ(loaded->GetMisc()->trigonometrics.Text(), "Radians");
 }
 
 TEST(Load, ReportsOneOfARunOfMissingNumbers) {
