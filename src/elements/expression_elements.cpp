@@ -82,6 +82,8 @@ void CEL_ExpressionElement::OnPropertyChanged(CEL_Property& changed) {
   }
   const std::string_view variation = SpatialVariationOfScope(scope.Text());
   if (!variation.empty()) spatialVariation.SetText(variation);
+  // A form opens on the selection, and would store it over the new variation.
+  SelectPresentValues();
 }
 
 CEL_Auxilliary_Variable::CEL_Auxilliary_Variable(std::string_view caption)

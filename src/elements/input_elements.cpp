@@ -114,6 +114,7 @@ void CEL_Input::OnPropertyChanged(CEL_Property& changed) {
   } else if (&changed == &scope) {
     const std::string_view variation = SpatialVariationOfScope(scope.Text());
     if (!variation.empty()) spatialVariation.SetText(variation);
+    SelectPresentValues();
   } else {
     RebuildOwner();
   }
@@ -159,6 +160,7 @@ void CEL_Input::ApplyUnitType() {
   const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
   if (row == nullptr) {
     unqType.SetInt(kUserDefinedUnit);
+    SelectPresentValues();
     unit.SetEditable(true);
     return;
   }

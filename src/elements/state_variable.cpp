@@ -105,6 +105,7 @@ void CEL_StateVariable::OnPropertyChanged(CEL_Property& changed) {
   const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
   if (row == nullptr) {
     unqType.SetInt(kUserDefinedUnit);
+    SelectPresentValues();
     unit.SetEditable(true);
     return;
   }

@@ -120,6 +120,7 @@ TEST(Elements, AScopeBringsItsVariation) {
   CEL_Process process("p");
   process.scope.SetText("SED");
   EXPECT_EQ(process.spatialVariation.Text(), "HORISONTAL");
+  EXPECT_EQ(process.spatialVariation.SelectedFileText(), "HORISONTAL") << "or a form stores the old one";
   process.scope.SetText("WC");
   EXPECT_EQ(process.spatialVariation.Text(), "HORISONTAL_AND_VERTICAL");
   process.scope.SetText("elsewhere");
