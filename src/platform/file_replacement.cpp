@@ -101,6 +101,13 @@ std::string Protection(const std::string& target) {
 }  // namespace
 
 std::optional<std::string> ReadWholeFile(const std::string& path, std::string& failure) {
+  std::error_code unknown;
+  const auto type = std::filesystem::status(path, unknown).type();
+  if (type == std::filesystem::file_type::character || type == std::filesystem::file_type::block) {
+    // A device may have no end.
+    failure = "can not read file '" + path + "': it is a device";
+    return std::nullopt;
+  }
   std::ifstream file(path, std::ios::binary);
   std::ostringstream content;
   if (!file) {
