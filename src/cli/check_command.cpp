@@ -14,12 +14,13 @@ using Json = nlohmann::ordered_json;
 void PrintText(const TemplateMessages& messages) {
   for (const TemplateMessage& message : messages.errors) {
     PrintLine(messages.path + ": " + Coloured(message.word, message.level) + ": " +
-              (message.symbol.empty() ? "generic" : message.symbol) + ": " + message.text);
+              (message.symbol.empty() ? "generic" : OnOneLine(message.symbol)) + ": " +
+              OnOneLine(message.text));
   }
   for (const UndefinedName& undefined : messages.undefined) {
-    for (const std::string& user : undefined.usedBy) {
-      PrintLine(messages.path + ": " + Coloured("Undefined", 0) + ": " + user + ": Undefined symbol " +
-                undefined.symbol);
+    for (const UndefinedName::User& user : undefined.usedBy) {
+      PrintLine(messages.path + ": " + Coloured("Undefined", 0) + ": " + OnOneLine(user.symbol) +
+                ": Undefined symbol " + undefined.symbol);
     }
   }
 }
@@ -37,7 +38,7 @@ Json ToJson(const TemplateMessages& messages) {
   Json undefined = Json::array();
   for (const UndefinedName& name : messages.undefined) {
     Json users = Json::array();
-    for (const std::string& user : name.usedBy) users.push_back(JsonText(user));
+    for (const UndefinedName::User& user : name.usedBy) users.push_back(JsonText(user.symbol));
     undefined.push_back({{"symbol", JsonText(name.symbol)}, {"usedBy", users}});
   }
   return {{"path", JsonText(messages.path)},

@@ -1,10 +1,12 @@
 // The command line: which commands there are, with which arguments and options.
 #include <CLI/CLI.hpp>
+#include <charconv>
 #include <csignal>
 #include <exception>
 #include <functional>
 #include <map>
 #include <string>
+#include <system_error>
 #include <vector>
 
 #include "cli/commands.h"
@@ -51,13 +53,27 @@ CLI::Option* AddFile(CLI::App& command, std::string& file) {
   return command.add_option("FILE", file, "a template file")->required();
 }
 
+/// The level that a text names. Read here, as the option parser does not know the hidden negative numbers.
+int LevelIn(const std::string& text) {
+  int level = 0;
+  const auto read = std::from_chars(text.data(), text.data() + text.size(), level);
+  if (read.ec != std::errc() || read.ptr != text.data() + text.size()) {
+    throw CLI::ConversionError(text, "--level");
+  }
+  return level;
+}
+
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   CLI::App* check = AddCommand(app, line, "check", "lists the messages of templates",
                                [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
   check->add_option("FILE", line.files, "template files")->required();
   check->add_option("--format", line.format, "text, json or sarif")
       ->transform(CLI::CheckedTransformer(kCheckFormats));
-  check->add_option("--level", line.lowestLevel, "hides messages below this level");
+  check
+      ->add_option_function<std::string>(
+          "--level", [&line](const std::string& text) { line.lowestLevel = LevelIn(ShownNumber(text)); },
+          "hides messages below this level")
+      ->type_name("LEVEL");
 
   CLI::App* symbols = AddCommand(app, line, "symbols", "lists the symbol table of a template",
                                  [&line] { return RunSymbols(line.file, line.format); });

@@ -93,6 +93,17 @@ std::string Coloured(std::string_view word, unsigned level) {
   return "\x1b[" + std::string(colour) + "m" + std::string(word) + "\x1b[0m";
 }
 
+std::string OnOneLine(std::string_view text) {
+  std::string line(text);
+  for (char& character : line) {
+    const auto byte = static_cast<unsigned char>(character);
+    constexpr unsigned char kFirstPrintable = 0x20;
+    constexpr unsigned char kDelete = 0x7F;
+    if (byte < kFirstPrintable || byte == kDelete) character = ' ';
+  }
+  return line;
+}
+
 std::string_view WithoutLineFeed(std::string_view text) {
   if (text.ends_with('\n')) text.remove_suffix(1);
   return text;

@@ -36,6 +36,9 @@ bool WantsColour();
 /// The word in the colour of its gravity (1 to 4), where colour is wanted.
 std::string Coloured(std::string_view word, unsigned level);
 
+/// A text that stands on one line: control characters, line feeds and tabs among them, become blanks.
+std::string OnOneLine(std::string_view text);
+
 /// A text without its trailing line feed.
 std::string_view WithoutLineFeed(std::string_view text);
 

@@ -81,9 +81,10 @@ std::string SarifText(const std::vector<TemplateMessages>& files) {
           ResultOf(RuleOf(message.level), file.path, message.line, symbol + ": " + message.text));
     }
     for (const UndefinedName& undefined : file.undefined) {
-      std::string text = "Undefined symbol " + undefined.symbol + ", used by";
-      for (const std::string& user : undefined.usedBy) text += " " + user;
-      results.push_back(ResultOf(RuleOf(kUndefinedLevel), file.path, undefined.line, text));
+      for (const UndefinedName::User& user : undefined.usedBy) {
+        results.push_back(ResultOf(RuleOf(kUndefinedLevel), file.path, user.line,
+                                   user.symbol + ": Undefined symbol " + undefined.symbol));
+      }
     }
   }
   const Json driver = {{"name", "tessal"}, {"version", TESSAL_VERSION}, {"rules", rules}};

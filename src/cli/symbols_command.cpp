@@ -1,4 +1,3 @@
-#include <algorithm>
 #include <nlohmann/json.hpp>
 
 #include "cli/commands.h"
@@ -11,12 +10,6 @@ namespace tessal::cli {
 namespace {
 
 using Json = nlohmann::ordered_json;
-
-std::string OnOneLine(std::string text) {
-  std::replace(text.begin(), text.end(), '\n', ' ');
-  std::replace(text.begin(), text.end(), '\t', ' ');
-  return text;
-}
 
 Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
   return {{"sequence", record.sequence},
@@ -44,7 +37,7 @@ ExitCode RunSymbols(const std::string& file, Format format) {
     return kFine;
   }
   for (const SymbolRecord& record : core.SymbolTable()) {
-    PrintLine(std::to_string(record.sequence) + '\t' + core.RecordSymbol(record) + '\t' +
+    PrintLine(std::to_string(record.sequence) + '\t' + OnOneLine(core.RecordSymbol(record)) + '\t' +
               std::string(record.element->KindText()) + '\t' + OnOneLine(record.text));
   }
   return kFine;

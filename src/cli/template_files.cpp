@@ -13,7 +13,7 @@ void ComplainWithMessages(std::string_view what, const std::string& file) {
   Complain(std::string(what) + " '" + file + "'");
   for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
     Errors().FormatError(index, text);
-    Complain(WithoutLineFeed(text));
+    Complain(OnOneLine(WithoutLineFeed(text)));
   }
 }
 

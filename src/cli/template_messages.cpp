@@ -1,5 +1,7 @@
 #include "cli/template_messages.h"
 
+#include <unordered_map>
+
 #include "cli/output.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
@@ -9,7 +11,44 @@ namespace tessal::cli {
 
 namespace {
 
-TemplateMessage Describe(const ErrorRecord& record, const TemplateCore& core) {
+/// The elements that messages speak of, by their identities. A template may give as many messages as it has
+/// elements, and a walk through the symbol table for each would take its square.
+class ElementIndex final {
+ public:
+  explicit ElementIndex(TemplateCore& core) {
+    for (const SymbolRecord& record : core.SymbolTable()) {
+      entries.try_emplace(record.uid, Entry{record.element, &record});
+    }
+    Add(core.Root());
+    for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
+      Add(core.ListHead(list));
+    }
+    if (CEL_Miscanellous* misc = core.GetMisc()) Add(*misc);
+  }
+
+  /// The element with that identity, or none.
+  const CEL_Element* Find(std::uint32_t uid) const {
+    const auto hit = entries.find(uid);
+    return hit == entries.end() ? nullptr : hit->second.element;
+  }
+  /// Its first record, or none.
+  const SymbolRecord* RecordOf(std::uint32_t uid) const {
+    const auto hit = entries.find(uid);
+    return hit == entries.end() ? nullptr : hit->second.record;
+  }
+
+ private:
+  struct Entry {
+    const CEL_Element* element;
+    const SymbolRecord* record;
+  };
+
+  void Add(const CEL_Element& element) { entries.try_emplace(element.GetUid(), Entry{&element, nullptr}); }
+
+  std::unordered_map<std::uint32_t, Entry> entries;
+};
+
+TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements) {
   TemplateMessage message;
   message.level = record.level;
   message.word = LevelWord(record.level);
@@ -17,22 +56,21 @@ TemplateMessage Describe(const ErrorRecord& record, const TemplateCore& core) {
   message.uid = record.uid > 0 ? record.uid : -1;
   message.text = WithoutLineFeed(record.text);
   const CEL_Element* element =
-      record.uid > 0 ? core.GetElement(static_cast<std::uint32_t>(record.uid)) : nullptr;
+      record.uid > 0 ? elements.Find(static_cast<std::uint32_t>(record.uid)) : nullptr;
   message.kind = element == nullptr ? 0 : element->Kind();
-  message.line = element == nullptr ? 0 : element->SourceLine();
+  message.line = element == nullptr ? record.line : element->SourceLine();
   return message;
 }
 
-UndefinedName Describe(const UndefinedSymbol& undefined, const TemplateCore& core) {
+UndefinedName Describe(const UndefinedSymbol& undefined, const ElementIndex& elements,
+                       const TemplateCore& core) {
   UndefinedName name;
   name.symbol = undefined.symbol;
-  name.line = 0;
   for (const std::uint32_t uid : undefined.usedBy) {
-    std::string user = "unknown";
-    core.GetSymbolOfUid(uid, user);
-    name.usedBy.push_back(user);
-    const CEL_Element* element = core.GetElement(uid);
-    if (name.line == 0 && element != nullptr) name.line = element->SourceLine();
+    const SymbolRecord* record = elements.RecordOf(uid);
+    name.usedBy.push_back(
+        record == nullptr ? UndefinedName::User{"unknown", 0}
+                          : UndefinedName::User{core.RecordSymbol(*record), record->element->SourceLine()});
   }
   return name;
 }
@@ -44,11 +82,13 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   messages.path = file;
   TemplateCore core;
   messages.loaded = core.LoadWrapper(file);
+  const ElementIndex elements(core);
   for (const ErrorRecord& record : Errors().Records()) {
-    if (static_cast<int>(record.level) >= lowestLevel) messages.errors.push_back(Describe(record, core));
+    if (static_cast<int>(record.level) >= lowestLevel) messages.errors.push_back(Describe(record, elements));
   }
-  for (const auto& undefined : core.UndefinedSymbols())
-    messages.undefined.push_back(Describe(*undefined, core));
+  for (const auto& undefined : core.UndefinedSymbols()) {
+    messages.undefined.push_back(Describe(*undefined, elements, core));
+  }
   return messages;
 }
 

@@ -13,14 +13,18 @@ struct TemplateMessage {
   std::string symbol;
   std::int32_t uid;
   std::int32_t kind;  ///< the element's, 0 for none
-  int line;           ///< of the element's sub-section, from 1; 0 for none
+  int line;           ///< of the element's sub-section or of the place in the file, from 1; 0 for none
   std::string text;
 };
 
 struct UndefinedName {
+  struct User {
+    std::string symbol;
+    int line;  ///< of its sub-section, from 1; 0 for none
+  };
+
   std::string symbol;
-  std::vector<std::string> usedBy;  ///< the symbols of the users
-  int line;                         ///< of the first user's sub-section; 0 for none
+  std::vector<User> usedBy;
 };
 
 struct TemplateMessages {

@@ -156,6 +156,8 @@ TEST(Tool, ChecksFiles) {
   EXPECT_EQ(RunTool({"check", "--level", "3", good}).exitCode, 0);
   EXPECT_EQ(RunTool({"check", bad, "--level", "3"}).output,
             bad + ": Undefined: a: Undefined symbol nobody\n");
+  EXPECT_EQ(RunTool({"check", "--level", "-1", good}).exitCode, 0);
+  EXPECT_EQ(RunTool({"check", "--level", "2.5", good}).exitCode, 2);
 
   run = RunTool({"check", "--format", "json", bad});
   EXPECT_EQ(run.exitCode, 1);
@@ -173,6 +175,80 @@ TEST(Tool, ChecksFiles) {
   for (const json& result : results) {
     EXPECT_FALSE(result["message"]["text"].get<std::string>().empty());
     EXPECT_GT(result["locations"][0]["physicalLocation"]["region"]["startLine"], 1);
+  }
+}
+
+TEST(Tool, TellsWhereMessagesStand) {
+  const TemporaryFolder folder;
+  const std::string text = TemplateText()
+                               .Misc()
+                               .Constant("two\nlines")
+                               .Without("UNIT")
+                               .Auxiliary("a", "nobody")
+                               .Auxiliary("b", "nobody")
+                               .Text();
+  std::string marked = text;
+  marked.replace(marked.find("''"), 2, "'!'");                         // the template's description
+  marked.replace(marked.find("''", marked.find("[MISC]")), 2, "'!'");  // the settings'
+  const std::string file = folder.Write("m.tessal", marked);
+  const auto lineOf = [&text](std::string_view part) {
+    const auto end = text.begin() + static_cast<std::ptrdiff_t>(text.find(part));
+    return 1 + static_cast<int>(std::count(text.begin(), end, '\n'));
+  };
+  const json report = json::parse(RunTool({"check", "--format", "sarif", file}).output);
+  std::string found;
+  for (const json& result : report["runs"][0]["results"]) {
+    const json& location = result["locations"][0]["physicalLocation"];
+    found += std::to_string(location["region"]["startLine"].get<int>()) + " ";
+  }
+  std::string expected;
+  for (const char* part : {"[CONSTANT_1]", "[CONSTANT_1]", "[TESSAL_SETUP]", "[MISC]",
+                           "[AUXILIARY_VARIABLE_1]", "[AUXILIARY_VARIABLE_2]"}) {
+    expected += std::to_string(lineOf(part)) + " ";
+  }
+  EXPECT_EQ(found, expected);
+  const json errors = json::parse(RunTool({"check", "--format", "json", file}).output)["files"][0]["errors"];
+  EXPECT_EQ(errors[2]["kind"], 21);
+  EXPECT_EQ(errors[3]["kind"], 15);
+  EXPECT_EQ(errors[1]["text"], "two\nlines, illegal symbol name (keyword or illegal characters used)");
+  // A text of several lines is one line for people and scripts.
+  const std::string output = RunTool({"check", file}).output;
+  EXPECT_EQ(std::count(output.begin(), output.end(), '\n'), 6);
+}
+
+TEST(Tool, BadFilesGiveAMessageAndEnd) {
+  const TemporaryFolder folder;
+  const int depth = 100'000;
+  std::string nested = "\n[TESSAL_SETUP]\n";
+  for (int level = 0; level < depth; ++level) nested += "[A]\n";
+  for (int level = 0; level <= depth; ++level) nested += "EndSect\n";
+  const std::string longText(10'000'000, 'x');
+  struct Row {
+    std::string path;
+    int exitCode;
+    const char* part;
+  };
+  const Row rows[] = {
+      {folder.File("missing"), 2, "Can not open file"},
+      {folder.Path().string(), 2, "Can not open file"},
+      {"/dev/zero", 2, "Can not open file"},
+      {folder.Write("empty", ""), 1, "the file is empty"},
+      {folder.Write("zeros", std::string(1000, '\0')), 1, "could not read template"},
+      {folder.Write("noise", "\x7f\x1b[31m\xff\x01"), 2, "Synthax error near line 1 position 1 :   [31m"},
+      {folder.Write("nested", nested), 1, "could not find key DESCRIPTION"},
+      {folder.Write("open", nested.substr(0, nested.size() - 9)), 2, "Synthax error"},
+      {folder.Write("long", TemplateText().Constant("k").With("UNIT", "'" + longText + "'").Text()), 0, ""},
+      {folder.Write("symbol", TemplateText().Constant(longText).Text()), 0, ""},
+      {folder.Write("number", TemplateText().Constant("k", "1e99999").Text()), 1, "higher than the maximum"},
+      {folder.Write("token", TemplateText().Auxiliary("a", longText).Text()), 1, "token too long"},
+      {folder.Write("deep", TemplateText().Auxiliary("a", std::string(20'000, '(')).Text()), 1,
+       "memory exhausted"},
+  };
+  for (const Row& row : rows) {
+    const auto run = RunTool({"check", row.path});
+    EXPECT_EQ(run.exitCode, row.exitCode) << row.path << run.output.substr(0, 500);
+    EXPECT_NE(run.output.find(row.part), std::string::npos) << row.path << run.output.substr(0, 500);
+    EXPECT_EQ(run.errors, "") << row.path;
   }
 }
 
