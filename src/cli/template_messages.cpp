@@ -5,6 +5,7 @@
 #include "cli/output.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
+#include "expr/scanner.h"
 #include "platform/text_encoding.h"
 
 namespace tessal::cli {
@@ -80,6 +81,8 @@ UndefinedName Describe(const UndefinedSymbol& undefined, const ElementIndex& ele
 TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   TemplateMessages messages;
   messages.path = file;
+  // A comment that a file leaves open must not swallow the expressions of the next one.
+  ResetExpressionScanner();
   TemplateCore core;
   messages.loaded = core.LoadWrapper(file);
   const ElementIndex elements(core);

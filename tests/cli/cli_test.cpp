@@ -211,6 +211,10 @@ TEST(Tool, TellsWhereMessagesStand) {
   EXPECT_EQ(errors[2]["kind"], 21);
   EXPECT_EQ(errors[3]["kind"], 15);
   EXPECT_EQ(errors[1]["text"], "two\nlines, illegal symbol name (keyword or illegal characters used)");
+  // What one file leaves open is closed before the next.
+  const std::string open = folder.Write("open.tessal", TemplateText().Auxiliary("a", "1 /* open").Text());
+  const std::string next = folder.Write("next.tessal", TemplateText().Auxiliary("a", "1").Text());
+  EXPECT_EQ(RunTool({"check", open, next}).output.find(next), std::string::npos);
   // A text of several lines is one line for people and scripts.
   const std::string output = RunTool({"check", file}).output;
   EXPECT_EQ(std::count(output.begin(), output.end(), '\n'), 6);
