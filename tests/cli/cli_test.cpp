@@ -227,6 +227,7 @@ TEST(Tool, BadFilesGiveAMessageAndEnd) {
   for (int level = 0; level < depth; ++level) nested += "[A]\n";
   for (int level = 0; level <= depth; ++level) nested += "EndSect\n";
   const std::string longText(10'000'000, 'x');
+  const std::string longName(100'000, 'x');
   struct Row {
     std::string path;
     int exitCode;
@@ -242,9 +243,9 @@ TEST(Tool, BadFilesGiveAMessageAndEnd) {
       {folder.Write("nested", nested), 1, "could not find key DESCRIPTION"},
       {folder.Write("open", nested.substr(0, nested.size() - 9)), 2, "Synthax error"},
       {folder.Write("long", TemplateText().Constant("k").With("UNIT", "'" + longText + "'").Text()), 0, ""},
-      {folder.Write("symbol", TemplateText().Constant(longText).Text()), 0, ""},
+      {folder.Write("symbol", TemplateText().Constant(longName).Text()), 0, ""},
       {folder.Write("number", TemplateText().Constant("k", "1e99999").Text()), 1, "higher than the maximum"},
-      {folder.Write("token", TemplateText().Auxiliary("a", longText).Text()), 1, "token too long"},
+      {folder.Write("token", TemplateText().Auxiliary("a", longName).Text()), 1, "token too long"},
       {folder.Write("deep", TemplateText().Auxiliary("a", std::string(20'000, '(')).Text()), 1,
        "memory exhausted"},
   };
