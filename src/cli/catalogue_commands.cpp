@@ -78,11 +78,12 @@ std::optional<std::vector<double>> ValuesOrComplain(const std::vector<std::strin
 
 }  // namespace
 
-ExitCode RunFunctions(const std::string& name) {
-  if (name.empty()) {
-    for (const CatalogueFunction& function : Functions()) PrintLine(FunctionRow(function));
-    return kFine;
-  }
+ExitCode RunFunctions() {
+  for (const CatalogueFunction& function : Functions()) PrintLine(FunctionRow(function));
+  return kFine;
+}
+
+ExitCode RunFunction(const std::string& name) {
   const CatalogueFunction* function = FindFunction(name);
   if (function == nullptr) return kContentFault;
   PrintLine(FunctionRow(*function));

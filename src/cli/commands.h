@@ -47,7 +47,8 @@ ExitCode RunExpressionCheck(const ExpressionCall& call);
 ExitCode RunIdentifiers(const ExpressionCall& call);
 
 // Catalogues.
-ExitCode RunFunctions(const std::string& name);
+ExitCode RunFunctions();
+ExitCode RunFunction(const std::string& name);
 ExitCode RunBuiltins();
 ExitCode RunEval(const std::string& name, const std::vector<std::string>& values);
 ExitCode RunCall(const std::string& name, const std::vector<std::string>& values,

@@ -161,9 +161,13 @@ void AddExpressionCommands(CLI::App& app, CommandLine& line) {
 }
 
 void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* functions = AddCommand(app, line, "functions", "lists the function catalogue",
-                                   [&line] { return RunFunctions(line.name); });
-  functions->add_option("NAME", line.name, "one function");
+  CLI::App* functions = app.add_subcommand("functions", "lists the function catalogue");
+  const CLI::Option* one = functions->add_option("NAME", line.name, "one function");
+  functions->callback([&line, one] {
+    // An empty name is a name too, and no function's.
+    const bool asksForOne = one->count() > 0;
+    line.run = [&line, asksForOne] { return asksForOne ? RunFunction(line.name) : RunFunctions(); };
+  });
   AddCommand(app, line, "builtins", "lists the built-in variables", [] { return RunBuiltins(); });
 
   CLI::App* eval = AddCommand(app, line, "eval", "computes a plain function",
@@ -198,6 +202,15 @@ void ShowNumbers(CommandLine& line) {
   }
 }
 
+/// The argument that stands where a command is awaited and is none; nothing when that is not what is wrong.
+const char* UnknownCommand(const CLI::App& app, int count, char** arguments) {
+  const CLI::App* called = &app;
+  int place = 1;
+  for (; !called->get_subcommands().empty(); ++place) called = called->get_subcommands().front();
+  const bool awaitsCommand = called->get_require_subcommand_min() > 0;
+  return awaitsCommand && place < count && *arguments[place] != '-' ? arguments[place] : nullptr;
+}
+
 int RunTool(int count, char** arguments) {
   CLI::App app{"Reads, checks, documents and saves templates of aquatic process models.", "tessal"};
   app.set_version_flag("--version", std::string("tessal ") + TESSAL_VERSION);
@@ -211,8 +224,9 @@ int RunTool(int count, char** arguments) {
     app.parse(ArgumentsForParser(count, arguments));
   } catch (const CLI::ParseError& stop) {
     if (stop.get_exit_code() == 0) return app.exit(stop);
-    const bool unknown = count > 1 && app.get_subcommands().empty() && *arguments[1] != '-';
-    Complain(unknown ? "unknown command '" + std::string(arguments[1]) + "'" : ShownNumber(stop.what()));
+    const char* unknown = UnknownCommand(app, count, arguments);
+    Complain(unknown != nullptr ? "unknown command '" + std::string(unknown) + "'"
+                                : ShownNumber(stop.what()));
     return kCallFault;
   }
   ShowNumbers(line);

@@ -14,7 +14,7 @@ namespace tessal::cli {
 
 namespace {
 
-/// Stands before a hidden number. No argument of a shell begins with it.
+/// Stands before a hidden argument, and before one that begins with it itself.
 constexpr char kHidden = '\x01';
 
 /// A number that no double holds, which `std::from_chars` refuses: infinite, or 0 and its neighbours.
@@ -64,7 +64,8 @@ std::vector<std::string> SplitAtCommas(std::string_view text) {
 }
 
 std::string HiddenNumber(const std::string& argument) {
-  return argument.starts_with('-') && NumberOf(argument) ? kHidden + argument : argument;
+  const bool isHidden = argument.starts_with(kHidden) || (argument.starts_with('-') && NumberOf(argument));
+  return isHidden ? kHidden + argument : argument;
 }
 
 std::string ShownNumber(const std::string& argument) {

@@ -9,6 +9,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <system_error>
 
 namespace tessal::cli {
 
@@ -75,7 +76,9 @@ std::string ReadStandardInput() {
   std::array<char, 1U << 14U> buffer{};
   ssize_t count = 0;
   while ((count = read(STDIN_FILENO, buffer.data(), buffer.size())) != 0) {
-    if (count < 0 && errno != EINTR) break;
+    if (count < 0 && errno != EINTR) {
+      throw std::system_error(errno, std::generic_category(), "can not read standard input");
+    }
     if (count > 0) text.append(buffer.data(), static_cast<std::size_t>(count));
   }
   return text;

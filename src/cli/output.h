@@ -27,7 +27,7 @@ bool FlushOutput();
 /// One line on standard error, with the tool's name.
 void Complain(std::string_view text);
 
-/// The whole of standard input.
+/// The whole of standard input. Raises `std::system_error` when it cannot be read to its end.
 std::string ReadStandardInput();
 
 /// Whether the result goes to a terminal that wants colour.
