@@ -183,7 +183,7 @@ std::string Content(const TemplateCore& core) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   constexpr int kMostEdits = 60;
   ResetExpressionScanner();
-  UserFunctionNames().clear();
+  ResetUserFunctionNames();
   SetNotifyChanges(true);
   TemplateCore core;
   Choices choices(data, size);

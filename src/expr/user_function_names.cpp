@@ -1,27 +1,53 @@
 #include "expr/user_function_names.h"
 
-#include <algorithm>
+#include <iterator>
+#include <unordered_map>
 
 namespace tessal {
 
-std::vector<std::string>& UserFunctionNames() {
-  static std::vector<std::string> names;
+namespace {
+
+/// The list, and where each name stands in it: every symbol of every check is looked up here.
+struct Names {
+  std::list<std::string> list;
+  std::unordered_map<std::string_view, std::list<std::string>::iterator> places;
+};
+
+Names& TheNames() {
+  static Names names;
   return names;
+}
+
+}  // namespace
+
+const std::list<std::string>& UserFunctionNames() {
+  return TheNames().list;
 }
 
 bool RegisterUserFunctionName(std::string_view name) {
   if (IsUserFunctionName(name)) return false;
-  UserFunctionNames().emplace_back(name);
+  Names& names = TheNames();
+  names.list.emplace_back(name);
+  names.places.emplace(names.list.back(), std::prev(names.list.end()));
   return true;
 }
 
 void UnregisterUserFunctionName(std::string_view name) {
-  std::erase(UserFunctionNames(), name);
+  Names& names = TheNames();
+  const auto hit = names.places.find(name);
+  if (hit == names.places.end()) return;
+  const auto place = hit->second;
+  names.places.erase(hit);
+  names.list.erase(place);
 }
 
 bool IsUserFunctionName(std::string_view name) {
-  const auto& names = UserFunctionNames();
-  return std::find(names.begin(), names.end(), name) != names.end();
+  return TheNames().places.contains(name);
+}
+
+void ResetUserFunctionNames() {
+  TheNames().places.clear();
+  TheNames().list.clear();
 }
 
 }  // namespace tessal

@@ -153,7 +153,7 @@ TEST(ElementFiles, HoldEveryValueUnderItsKeyword) {
                                      : 0;
     EXPECT_EQ(Errors().Records().size(), messages) << row.name << Errors().JoinErrors();
   }
-  UserFunctionNames().clear();
+  ResetUserFunctionNames();
 }
 
 TEST(ElementFiles, LoseBlanksAtTheEndsOfTextsOnly) {

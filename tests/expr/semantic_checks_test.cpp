@@ -14,7 +14,7 @@ class SemanticChecks : public testing::Test {
   void SetUp() override {
     ResetExpressionScanner();
     Errors().Reset();
-    UserFunctionNames().clear();
+    ResetUserFunctionNames();
   }
   void TearDown() override { SetUp(); }
 
