@@ -1,4 +1,6 @@
 // Commands on key files as such: their trees and what differs between two.
+#include <algorithm>
+#include <optional>
 #include <regex>
 #include <sstream>
 
@@ -14,11 +16,13 @@ namespace {
 /// Reads a tree. A file that cannot be read at all is the machine's fault, one that is no key file its own.
 ExitCode ReadTree(const std::string& file, CKvfSectionItem& tree) {
   std::string failure;
-  if (!ReadWholeFile(file, failure)) {
+  const std::optional<std::string> text = ReadWholeFile(file, failure);
+  if (!text) {
     Complain(failure);
     return kCallFault;
   }
-  if (LoadKeyFileTree(file, tree) != 0) return kFine;
+  // What was read once is parsed: a pipe gives its text only once.
+  if ((text->empty() ? LoadKeyFileTree(file, tree) : ParseKeyFileTree(*text, tree)) != 0) return kFine;
   Complain(file + ": " + KeyFileFailureText());
   return kContentFault;
 }
@@ -37,6 +41,11 @@ ExitCode RunTree(const std::string& file) {
 
 ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,
                  bool onlyKeywords) {
+  const auto tooLong = [](const std::string& name) { return name.size() > kLongestIgnoredName; };
+  if (std::any_of(ignored.begin(), ignored.end(), tooLong)) {
+    Complain("a name to ignore is longer than " + std::to_string(kLongestIgnoredName) + " bytes");
+    return kCallFault;
+  }
   CKvfSectionItem first;
   CKvfSectionItem second;
   // A file that is no key file cannot be compared: that is no difference.

@@ -5,6 +5,7 @@
 #include <regex>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 
 #include "keyfile/item_tree.h"
 
@@ -12,14 +13,30 @@ namespace tessal {
 
 namespace {
 
-/// Longer names match no expression: the search recurses along the name.
-constexpr std::size_t kLongestMatched = 4096;
+/// Longer names match no expression: a search may cost the square of the name's length.
+constexpr std::size_t kLongestMatched = 1000;
+
+std::regex CompileOne(const std::string& expression) {
+  if (expression.size() > kLongestIgnoredName) {
+    throw std::regex_error(std::regex_constants::error_complexity);
+  }
+#ifdef __GLIBCXX__
+  try {
+    // Without the flag a search may try every way through the expression, for longer than anyone waits.
+    return std::regex(expression, std::regex::ECMAScript | std::regex_constants::__polynomial);
+  } catch (const std::regex_error& failure) {
+    // Only back references are refused so.
+    if (failure.code() != std::regex_constants::error_complexity) throw;
+  }
+#endif
+  return std::regex(expression);
+}
 
 std::vector<std::regex> Compile(const IgnoredNames* names) {
   std::vector<std::regex> expressions;
   if (names == nullptr) return expressions;
   expressions.reserve(names->size());
-  for (const std::string& name : *names) expressions.emplace_back(name);
+  for (const std::string& name : *names) expressions.push_back(CompileOne(name));
   return expressions;
 }
 
@@ -118,11 +135,11 @@ class CKvfSectionItem::Comparison final {
     std::unordered_map<std::string_view, std::vector<CKvfKeyItem*>> keywords;
   };
 
-  /// Does not stop at the first partner: every unmatched one of the name is compared.
-  std::size_t CompareSections(CKvfSectionItem& child, const std::vector<CKvfSectionItem*>& candidates) {
+  /// Does not stop at the first partner: every unmatched one of the name is compared, and none is left for
+  /// the next child of the name.
+  std::size_t CompareSections(CKvfSectionItem& child, std::vector<CKvfSectionItem*>& candidates) {
     std::size_t differences = 0;
-    for (CKvfSectionItem* candidate : candidates) {
-      if (candidate->mark != kUnmatched) continue;
+    for (CKvfSectionItem* candidate : std::exchange(candidates, {})) {
       const bool same = Run(child, *candidate);
       if (!same) ++differences;
       child.mark = candidate->mark = same ? kSame : kDifferent;
@@ -130,10 +147,9 @@ class CKvfSectionItem::Comparison final {
     return differences;
   }
 
-  static std::size_t CompareKeywords(CKvfKeyItem& child, const std::vector<CKvfKeyItem*>& candidates) {
+  static std::size_t CompareKeywords(CKvfKeyItem& child, std::vector<CKvfKeyItem*>& candidates) {
     std::size_t differences = 0;
-    for (CKvfKeyItem* candidate : candidates) {
-      if (candidate->mark != kUnmatched) continue;
+    for (CKvfKeyItem* candidate : std::exchange(candidates, {})) {
       const bool same = child.Compare(*candidate, nullptr, nullptr, false);
       if (!same) ++differences;
       child.mark = candidate->mark = same ? kSame : kDifferent;

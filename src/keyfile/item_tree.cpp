@@ -30,6 +30,7 @@ bool CKvfBaseItem::Compare(CKvfBaseItem& /*other*/, std::ostream* /*report*/,
 void CKvfBaseItem::Write(std::ostream& /*stream*/) const {}
 
 void CKvfBaseItem::Clear() {
+  kind = kNone;
   name.clear();
   comment.clear();
   parent = nullptr;
@@ -99,8 +100,8 @@ void CKvfSectionItem::CopyChildren(const CKvfSectionItem& source) {
   for (const auto& child : source.children) AppendChild(child->Copy());
 }
 
-void CKvfSectionItem::Assign(const CKvfSectionItem& source) {
-  if (&source == this) return;
+void CKvfSectionItem::CopyFields(const CKvfSectionItem& source) {
+  kind = source.kind;
   name = source.name;
   comment = source.comment;
   line = source.line;
@@ -108,6 +109,11 @@ void CKvfSectionItem::Assign(const CKvfSectionItem& source) {
   mark = source.mark;
   depth = 0;
   startComment = source.startComment;
+}
+
+void CKvfSectionItem::Assign(const CKvfSectionItem& source) {
+  if (&source == this) return;
+  CopyFields(source);
   CopyChildren(source);
 }
 
@@ -127,7 +133,8 @@ void CKvfSectionItem::AdoptChild(std::unique_ptr<CKvfBaseItem> child) {
   children.push_back(std::move(child));
 }
 
-void CKvfSectionItem::TakeChildren(CKvfSectionItem& source) {
+void CKvfSectionItem::TakeOver(CKvfSectionItem& source) {
+  CopyFields(source);
   std::vector<std::unique_ptr<CKvfBaseItem>> taken = std::exchange(source.children, {});
   children.reserve(children.size() + taken.size());
   for (auto& child : taken) AppendChild(std::move(child));

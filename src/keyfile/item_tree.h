@@ -20,6 +20,9 @@ class CKvfSectionItem;
 /// Regular expressions for the names that a comparison leaves out.
 using IgnoredNames = std::set<std::string>;
 
+/// A longer expression is refused as a faulty one: reading it recurses along it.
+inline constexpr std::size_t kLongestIgnoredName = 1000;
+
 class CKvfBaseItem {
  public:
   enum Kind : std::int32_t { kNone = 0, kComment = 1, kSection = 2, kKeyword = 3 };
@@ -35,6 +38,8 @@ class CKvfBaseItem {
   virtual bool Compare(CKvfBaseItem& other, std::ostream* report, const IgnoredNames* ignoreNames,
                        bool onlyKeywords);
   virtual void Write(std::ostream& stream) const;
+  /// Empties the item, which is of no kind from then on; taking another's fields gives a section its kind
+  /// back.
   virtual void Clear();
   /// A copy with the parent of its source and depth 0.
   virtual std::unique_ptr<CKvfBaseItem> Copy() const = 0;
@@ -110,8 +115,8 @@ class CKvfSectionItem final : public CKvfBaseItem {
   void AppendChild(std::unique_ptr<CKvfBaseItem> child);
   /// Takes an item in under construction: its depth is set later, with that of the whole tree.
   void AdoptChild(std::unique_ptr<CKvfBaseItem> child);
-  /// Takes all children of another section over, behind the present ones.
-  void TakeChildren(CKvfSectionItem& source);
+  /// Takes the fields of another section and, behind the present children, its children themselves.
+  void TakeOver(CKvfSectionItem& source);
   std::size_t CountChildren(Kind childKind) const;
   /// The child with that place from 0 among those of its kind, or none.
   CKvfBaseItem* ChildByKind(std::size_t index, Kind childKind) const;
@@ -125,6 +130,7 @@ class CKvfSectionItem final : public CKvfBaseItem {
  private:
   class Comparison;
 
+  void CopyFields(const CKvfSectionItem& source);
   void CopyChildren(const CKvfSectionItem& source);
   void ReportDifferences(std::ostream& report, int side, bool onlyKeywords) const;
 

@@ -47,7 +47,7 @@ int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target) {
   FailureText().clear();
   const std::string readable = KvfReadableText(text);
   if (readable.size() > static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() / 2)) {
-    FailureText() = "Error memory exhausted in line 0, column 0";
+    FailureText() = "Error memory exhaustedin line 0, column 0";
     return 0;
   }
   ReadState state(readable);
@@ -56,8 +56,7 @@ int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target) {
                     std::to_string(state.Column());
     return 0;
   }
-  target.name = state.Root()->name;
-  target.TakeChildren(*state.Root());
+  target.TakeOver(*state.Root());
   return 1;
 }
 

@@ -26,6 +26,7 @@ TEST(Tool, AnswersCallsThatAreOffWithOneLineAndTwo) {
       {{"check", "--nonsense", "x"}, "--nonsense"},
       {{"check", "--format", "xml", "x"}, "xml"},
       {{"symbols", "--format", "sarif", "x"}, "sarif"},
+      {{"expr", "nonsense"}, "unknown command 'nonsense'"},
       {{"expr", "parse"}, "EXPR"},
       {{"expr", "parse", "--nonsense"}, "--nonsense"},
       {{"eval", "SIN", "one"}, "number"},
@@ -72,6 +73,7 @@ TEST(Tool, LooksAtExpressions) {
        "",
        1,
        "258\tIDENTIFIER\t0\t0\t0\t0\ta\n291\t-\t1\t1\t1\t1\t^\n259\tINT_NUM\t2\t2\t2\t2\t1\n"},
+      {{"expr", "tokens", "\x01"}, "", 1, "291\t-\t0\t0\t0\t0\t\x01\n"},
       {{"expr", "tokens", "--lines"},
        "a+b\r\n\na /*\n*/ c ^\n",
        1,
@@ -118,6 +120,7 @@ TEST(Tool, AsksTheCatalogues) {
   const Row rows[] = {
       {{"functions", "arctan2"}, 0, "4\tARCTAN2\t1\t2\tx,y\n"},
       {{"functions", "nonsense"}, 1, ""},
+      {{"functions", ""}, 1, ""},
       {{"eval", "abs", "-1.5"}, 0, "1.5\n"},
       {{"eval", "FLOOR", "1.5"}, 1, ""},
       {{"eval", "SIN"}, 1, ""},
@@ -314,6 +317,16 @@ TEST(Tool, SavesMakesAndRenames) {
   EXPECT_EQ(table[0]["referencedBy"], json::array({2}));
 }
 
+TEST(Tool, TellsOfAnInputThatCannotBeRead) {
+  for (const char* input : {"</", "<&-"}) {
+    EXPECT_EQ(RunShell(std::string("\"$T\" expr parse - 2>/dev/null ") + input), 2) << input;
+    EXPECT_EQ(RunShell(std::string("\"$T\" expr check --lines 2>&1 ") + input +
+                       " | grep -q '^tessal: can not read standard input: '"),
+              0)
+        << input;
+  }
+}
+
 TEST(Tool, ComparesKeyFiles) {
   const TemporaryFolder folder;
   const std::string left = folder.Write("a", "\n[T]\nA = 1\nEndSect\n");
@@ -322,7 +335,10 @@ TEST(Tool, ComparesKeyFiles) {
   EXPECT_EQ(RunTool({"diff", left, right}).exitCode, 1);
   EXPECT_EQ(RunTool({"diff", left, right, "--ignore", "^A$", "--ignore", "x"}).exitCode, 0);
   EXPECT_EQ(RunTool({"diff", left, right, "--ignore", "["}).exitCode, 2);
+  EXPECT_EQ(RunTool({"diff", left, right, "--ignore", std::string(100'000, '(')}).exitCode, 2);
   EXPECT_EQ(RunTool({"diff", left, folder.File("missing")}).exitCode, 2);
+  // A pipe gives its text only once, and has no size.
+  EXPECT_EQ(RunShell("cat '" + left + "' | \"$T\" diff /dev/stdin '" + left + "' >/dev/null"), 0);
   EXPECT_EQ(RunTool({"tree", left}).output, "[T]\n   A = 1\nEndSect\n\n\n\n");
   const auto broken = RunTool({"tree", folder.Write("c", "[T]\n")});
   EXPECT_EQ(broken.exitCode, 1);

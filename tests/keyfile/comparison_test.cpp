@@ -48,6 +48,21 @@ TEST(Comparison, IgnoresNamesByExpression) {
 TEST(Comparison, DoesNotStopAtTheFirstPartner) {
   EXPECT_EQ(Compared("A = 1\n", "A = 1\nA = 2\n"),
             "different: Section .T is different (line 1)\nKeyword .T.A is different (line 3)\n");
+  // The first of a name takes all partners; the next one finds none left.
+  EXPECT_EQ(Compared("A = 1\nA = 2\n", "A = 1\nA = 2\n"),
+            "different: Section .T is different (line 1)\nKeyword .T.A is different (line 3)\n"
+            "Keyword .T.A is missing\n");
+  EXPECT_EQ(Compared("A = 1\nA = 2\n", "A = 1\n"), std::string("same: ") + kNone);
+}
+
+TEST(Comparison, EndsForExpressionsThatHaveTooManyWays) {
+  const std::string longest = std::string(1000, 'a') + " = 1\n";
+  const IgnoredNames backtracking = {"(a+)+b"};
+  EXPECT_EQ(Compared(longest, longest, &backtracking), std::string("same: Ignored names : (a+)+b\n") + kNone);
+  const IgnoredNames repeated = {"^(.)\\1$"};
+  EXPECT_EQ(Compared("AA = 1\n", "AA = 2\n", &repeated).substr(0, 5), "same:");
+  const IgnoredNames longer = {std::string(kLongestIgnoredName + 1, 'a')};
+  EXPECT_THROW(Compared("A = 1\n", "A = 1\n", &longer), std::regex_error);
 }
 
 TEST(Comparison, KeywordsTellTheirOwnDifference) {

@@ -72,6 +72,10 @@ TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
   other.Clear();
   EXPECT_EQ(other.startComment, "kept");
   EXPECT_TRUE(other.Children().empty());
+  EXPECT_EQ(other.ItemKind(), CKvfBaseItem::kNone);
+  other.Assign(root);
+  EXPECT_EQ(other.ItemKind(), CKvfBaseItem::kSection);
+  EXPECT_EQ(other.startComment, "");
 }
 
 }  // namespace
