@@ -116,12 +116,7 @@ bool TemplateCore::SaveWrapper(const std::string& path) {
 }
 
 bool TemplateCore::Save(const std::string& path) {
-  try {
-    return path == saveFileName ? WriteTemplateFile(path) : SaveAs(path);
-  } catch (const std::exception& failure) {
-    ReportFailure(failure.what());
-    return false;
-  }
+  return path == saveFileName ? WriteTemplateFile(path) : SaveAs(path);
 }
 
 bool TemplateCore::SaveAs(const std::string& path) {
@@ -148,7 +143,12 @@ bool TemplateCore::SaveAs(const std::string& path) {
 
 bool TemplateCore::WriteTemplateFile(const std::string& path) {
   const std::int32_t formerRevision = misc.documentRevision.IntValue();
-  const std::string reason = WriteThrough(path);
+  std::string reason;
+  try {
+    reason = WriteThrough(path);
+  } catch (const std::exception& failure) {
+    reason = failure.what();
+  }
   if (!reason.empty()) {
     // What is in memory stays unsaved, and its revision uncounted.
     misc.documentRevision.SetInt(formerRevision);
@@ -164,18 +164,15 @@ bool TemplateCore::WriteTemplateFile(const std::string& path) {
 
 std::string TemplateCore::WriteThrough(const std::string& path) {
   const std::string temporary = path + "$";
+  std::string text;
   {
     const Image image;
     if (!WriteSections(image.Handle())) return "the template holds what the file format can not";
-    if (kvfWrite(image.Handle(), temporary) != kKvfOk) {
-      std::string reason = kvfGetWriteFailure();
-      RemoveFile(temporary);
-      return reason;
-    }
+    if (kvfWrite(image.Handle(), temporary) != kKvfOk) return kvfGetWriteFailure();
+    // Not read back from the temporary file: another save of the same template may be writing it by now.
+    text = kvfGetText(image.Handle());
   }
-  std::string reason;
-  const std::optional<std::string> text = ReadWholeFile(temporary, reason);
-  if (text) reason = ReplaceFile(path, WithTypeLine(*text + KeptSectionsText()));
+  std::string reason = ReplaceFile(path, WithTypeLine(text + KeptSectionsText()));
   const std::string removal = RemoveFile(temporary);
   if (!removal.empty()) std::fprintf(stderr, "could not delete temporary file %s\n", temporary.c_str());
   return reason;

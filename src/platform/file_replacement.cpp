@@ -54,6 +54,19 @@ bool WriteAll(int descriptor, std::string_view content) {
   return true;
 }
 
+/// Flushes to the disk. What has no disk behind it, a pipe or a terminal, is no failure.
+bool Flush(int descriptor) {
+  return fsync(descriptor) == 0 || errno == EINVAL || errno == ENOTSUP;
+}
+
+/// Writes everything and closes. The empty text, or what failed; `errno` then tells why.
+std::string_view WriteAndClose(Descriptor& file, std::string_view content) {
+  if (!WriteAll(file.Number(), content)) return "can not write file";
+  if (!Flush(file.Number())) return "can not flush file";
+  if (!file.Close()) return "can not close file";
+  return {};
+}
+
 /// The permissions that a new file gets where no old one gives them.
 mode_t UsualMode() {
   constexpr mode_t kReadWriteForAll = 0666;
@@ -62,40 +75,83 @@ mode_t UsualMode() {
   return kReadWriteForAll & ~mask;
 }
 
-/// Gives the new file the old one's permissions and, as far as that is allowed, its owner.
+/// What a file system refuses that knows no owners or permissions, or that leaves them to the superuser.
+bool IsForOthersToDecide(int error) {
+  return error == EPERM || error == ENOTSUP || error == ENOSYS;
+}
+
+/// Gives the new file the old one's owner and group, as far as that is allowed. Only the superuser may give
+/// files away; for others it belongs to the one who saves, in the old group if they are a member of it.
+bool TakeOwner(int descriptor, const struct stat& old, const struct stat& fresh) {
+  constexpr uid_t kSameOwner = static_cast<uid_t>(-1);
+  if (fresh.st_uid == old.st_uid && fresh.st_gid == old.st_gid) return true;
+  if (fchown(descriptor, old.st_uid, old.st_gid) == 0) return true;
+  if (!IsForOthersToDecide(errno)) return false;
+  return fchown(descriptor, kSameOwner, old.st_gid) == 0 || IsForOthersToDecide(errno);
+}
+
+/// Gives the new file the owner and the permissions of the one at the target, or the usual permissions.
 bool TakeAttributes(int descriptor, const std::string& target) {
+  constexpr mode_t kPermissionBits = 07777;
   struct stat old = {};
-  if (stat(target.c_str(), &old) != 0) return fchmod(descriptor, UsualMode()) == 0;
   struct stat fresh = {};
   if (fstat(descriptor, &fresh) != 0) return false;
-  if (fresh.st_uid != old.st_uid || fresh.st_gid != old.st_gid) {
-    // Only the superuser may give files away; for others the file becomes the one who saves it.
-    if (fchown(descriptor, old.st_uid, old.st_gid) != 0 && errno != EPERM) return false;
+  mode_t mode = 0;
+  if (stat(target.c_str(), &old) == 0) {
+    if (!TakeOwner(descriptor, old, fresh)) return false;
+    mode = old.st_mode & kPermissionBits;
+  } else {
+    if (errno != ENOENT) return false;
+    mode = UsualMode();
   }
-  constexpr mode_t kPermissionBits = 07777;
-  return fchmod(descriptor, old.st_mode & kPermissionBits) == 0;
+  return mode == (fresh.st_mode & kPermissionBits) || fchmod(descriptor, mode) == 0 ||
+         IsForOthersToDecide(errno);
 }
 
-/// Makes the rename itself last through a power failure. A file system that cannot do so is no failure.
-void FlushFolder(const std::filesystem::path& folder) {
-  const Descriptor opened(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  if (opened.IsOpen()) fsync(opened.Number());
+/// Makes the rename itself last through a power failure. A folder that can not be opened or flushed as such
+/// is no failure; a disk that refuses is.
+bool FlushFolder(const std::filesystem::path& folder) {
+  const Descriptor opened(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+  if (!opened.IsOpen() || fsync(opened.Number()) == 0) return true;
+  return errno != EIO && errno != ENOSPC && errno != EDQUOT;
 }
 
-/// The file that a path means, through symbolic links; the path itself when there is none yet.
-std::filesystem::path RealTarget(const std::string& path) {
-  std::error_code error;
-  std::filesystem::path real = std::filesystem::weakly_canonical(path, error);
-  return error ? std::filesystem::path(path) : real;
+/// The file that a path means: where its symbolic links lead, also when nothing stands there yet. Nothing,
+/// with the error number, where that can not be told.
+std::optional<std::filesystem::path> RealTarget(const std::string& path, int& error) {
+  constexpr int kMostLinks = 40;
+  std::filesystem::path real = path;
+  for (int links = 0; links <= kMostLinks; ++links) {
+    std::error_code failure;
+    const std::filesystem::path next = std::filesystem::read_symlink(real, failure);
+    error = failure.value();
+    if (error == EINVAL || error == ENOENT) return real;  // no link, or nothing there
+    if (error != 0) return std::nullopt;
+    real = real.parent_path() / next;
+  }
+  error = ELOOP;
+  return std::nullopt;
 }
 
-/// Why an existing target may not be written, or the empty text. A rename would pass over a write protection.
+/// Why what stands at the target may not be replaced, or the empty text. A rename would pass over a write
+/// protection, and would put a plain file in the place of a pipe or a device.
 std::string Protection(const std::string& target) {
-  if (access(target.c_str(), F_OK) != 0) return {};
+  struct stat old = {};
+  if (stat(target.c_str(), &old) != 0) {
+    return errno == ENOENT ? std::string() : Reason("can not write file", target, errno);
+  }
+  if (S_ISDIR(old.st_mode)) return Reason("can not write file", target, EISDIR);
+  if (!S_ISREG(old.st_mode)) return "can not replace '" + target + "': it is no plain file";
   if (access(target.c_str(), W_OK) != 0) return Reason("can not write file", target, errno);
-  std::error_code error;
-  if (std::filesystem::is_directory(target, error)) return Reason("can not write file", target, EISDIR);
   return {};
+}
+
+/// Writes the content into the new file and lets it take the target's place. The empty text, or what failed.
+std::string_view FillAndRename(Descriptor& file, std::string_view content, const std::string& fresh,
+                               const std::string& target) {
+  if (!TakeAttributes(file.Number(), target)) return "can not keep the permissions of file";
+  if (const std::string_view failed = WriteAndClose(file, content); !failed.empty()) return failed;
+  return rename(fresh.c_str(), target.c_str()) == 0 ? "" : "can not replace file";
 }
 
 }  // namespace
@@ -132,25 +188,38 @@ std::string WriteWholeFile(const std::string& path, std::string_view content) {
   constexpr mode_t kReadWriteForAll = 0666;
   Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, kReadWriteForAll));
   if (!file.IsOpen()) return Reason("can not open file for writing", path, errno);
-  if (WriteAll(file.Number(), content) && fsync(file.Number()) == 0 && file.Close()) return {};
-  return Reason("can not write file", path, errno);
+  const std::string_view failed = WriteAndClose(file, content);
+  return failed.empty() ? std::string() : Reason(failed, path, errno);
+}
+
+std::string WriteFreshFile(const std::string& path, std::string_view content) {
+  constexpr mode_t kReadWriteForOwner = 0600;
+  unlink(path.c_str());
+  Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, kReadWriteForOwner));
+  if (!file.IsOpen()) return Reason("can not open file for writing", path, errno);
+  const std::string_view failed = WriteAndClose(file, content);
+  if (failed.empty()) return {};
+  std::string reason = Reason(failed, path, errno);
+  unlink(path.c_str());
+  return reason;
 }
 
 std::string ReplaceFile(const std::string& target, std::string_view content) {
-  const std::filesystem::path real = RealTarget(target);
-  if (std::string reason = Protection(real.string()); !reason.empty()) return reason;
-  std::string fresh = real.string() + "$XXXXXX";
+  int error = 0;
+  const std::optional<std::filesystem::path> real = RealTarget(target, error);
+  if (!real) return Reason("can not write file", target, error);
+  if (std::string reason = Protection(real->string()); !reason.empty()) return reason;
+  std::string fresh = real->string() + "$XXXXXX";
   Descriptor file(mkostemp(fresh.data(), O_CLOEXEC));
   if (!file.IsOpen()) return Reason("can not create a file beside", target, errno);
-  const bool written = WriteAll(file.Number(), content) && TakeAttributes(file.Number(), real.string()) &&
-                       fsync(file.Number()) == 0 && file.Close();
-  if (!written || rename(fresh.c_str(), real.c_str()) != 0) {
-    const int error = errno;
+  const std::string_view failed = FillAndRename(file, content, fresh, real->string());
+  if (!failed.empty()) {
+    std::string reason = Reason(failed, target, errno);
     unlink(fresh.c_str());
-    return Reason(written ? "can not replace file" : "can not write file", target, error);
+    return reason;
   }
-  FlushFolder(real.parent_path());
-  return {};
+  return FlushFolder(real->parent_path()) ? std::string()
+                                          : Reason("can not flush the folder of file", target, errno);
 }
 
 std::string RemoveFile(const std::string& path) {

@@ -18,9 +18,14 @@ std::uintmax_t FileSize(const std::string& path);
 /// Writes a file from its start and flushes it to the disk. Returns the empty text, or the reason in words.
 std::string WriteWholeFile(const std::string& path, std::string_view content);
 
+/// The same into a new file that only its owner may read, for what others shall not see half-done. A file or
+/// a link that stood there goes; what the link led to stays. After a failure nothing is left.
+std::string WriteFreshFile(const std::string& path, std::string_view content);
+
 /// Writes the content into a new file beside the target and, when every byte is on disk, lets it take the
 /// target's place in one step. The target's permissions stay, and a symbolic link stays a link to the file
-/// that is replaced. Returns the empty text, or the reason in words; the old file is then whole.
+/// that is replaced or made. Returns the empty text, or the reason in words. The old file is then whole, or,
+/// where only the folder could not be flushed, the new one is.
 std::string ReplaceFile(const std::string& target, std::string_view content);
 
 /// Removes a file. Returns the empty text, or the reason in words.

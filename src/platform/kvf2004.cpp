@@ -261,8 +261,13 @@ int kvfAddString(KvfHandle handle, std::string_view value) {
 int kvfWrite(KvfHandle handle, const std::string& path) {
   KvfImage* image = ImageOf(handle);
   if (image == nullptr) return kKvfBadHandle;
-  TheLibrary().writeFailure = WriteWholeFile(path, WriteKvfImage(*image));
+  TheLibrary().writeFailure = WriteFreshFile(path, WriteKvfImage(*image));
   return TheLibrary().writeFailure.empty() ? kKvfOk : Note(kKvfWriteFailed);
+}
+
+std::string kvfGetText(KvfHandle handle) {
+  KvfImage* image = ImageOf(handle);
+  return image == nullptr ? std::string() : WriteKvfImage(*image);
 }
 
 std::string kvfGetWriteFailure() {

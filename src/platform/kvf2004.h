@@ -79,9 +79,12 @@ int kvfAddDouble(KvfHandle handle, double value);
 /// Refuses a text that holds both ' and |, or a zero byte.
 int kvfAddString(KvfHandle handle, std::string_view value);
 
-/// Writes the image as text with CRLF line ends; 0 when every byte reached the file and was flushed to it,
-/// else an error number; `kvfGetWriteFailure` then tells the reason in words.
+/// Writes the image as text with CRLF line ends into a new file, in the place of what stood there; 0 when
+/// every byte reached the file and was flushed to it, else an error number; `kvfGetWriteFailure` then tells
+/// the reason in words.
 int kvfWrite(KvfHandle handle, const std::string& path);
+/// The text that `kvfWrite` writes; empty for a bad handle.
+std::string kvfGetText(KvfHandle handle);
 std::string kvfGetWriteFailure();
 
 }  // namespace tessal

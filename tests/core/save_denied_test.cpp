@@ -1,6 +1,7 @@
 // Saves that the system refuses: no room, no permission. Each runs in a process of its own, with fewer
 // rights.
 #include <gtest/gtest.h>
+#include <sys/mount.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -8,6 +9,7 @@
 
 #include <csignal>
 #include <filesystem>
+#include <fstream>
 
 #include "core/error_registry.h"
 #include "core/loaded_template.h"
@@ -95,6 +97,47 @@ TEST_F(DeniedSave, AFileThatMayNotBeWritten) {
   ExpectUntouched();
   TakeRights(0700, 0600);
   EXPECT_EQ(SaveInChild(loaded, BecomeNobody), kSaved);
+}
+
+TEST_F(DeniedSave, AFileOfAnotherUser) {
+  if (geteuid() != 0) GTEST_SKIP() << "only the superuser makes files of others";
+  constexpr uid_t kNobody = 65534;
+  TakeRights(0700, 0644);
+  ASSERT_EQ(chown(loaded.Path().c_str(), 0, 0), 0);
+  EXPECT_EQ(SaveInChild(loaded, BecomeNobody), kRefusedWithReason) << "only its owner may write it";
+  ExpectUntouched();
+  // One that all may write becomes the file of who saves it, as open to others as before.
+  ASSERT_EQ(chmod(loaded.Path().c_str(), 0666), 0);
+  EXPECT_EQ(SaveInChild(loaded, BecomeNobody), kSaved);
+  struct stat saved = {};
+  ASSERT_EQ(stat(loaded.Path().c_str(), &saved), 0);
+  EXPECT_EQ(saved.st_uid, kNobody);
+  EXPECT_EQ(saved.st_mode & 07777, 0666U);
+  EXPECT_NE(ReadFile(loaded.Path()), before);
+  // The superuser leaves the file with its owner.
+  EXPECT_EQ(SaveInChild(loaded, [] {}), kSaved);
+  ASSERT_EQ(stat(loaded.Path().c_str(), &saved), 0);
+  EXPECT_EQ(saved.st_uid, kNobody);
+}
+
+TEST_F(DeniedSave, ASmallDiskThatRunsFull) {
+  const test::TemporaryFolder mountPoint;
+  const std::string path = mountPoint.File("small.tessal");
+  // Room for the old file and for one, two or three quarters, and all of the next.
+  for (const std::size_t quarters : {1U, 2U, 3U, 4U, 6U}) {
+    const std::string room = "size=" + std::to_string(before.size() * (4 + quarters) / 4);
+    if (mount("tmpfs", mountPoint.Path().c_str(), "tmpfs", 0, room.c_str()) != 0)
+      GTEST_SKIP() << "no file systems of our own here";
+    std::ofstream(path, std::ios::binary) << before;
+    TemplateCore core;
+    EXPECT_TRUE(core.LoadWrapper(path));
+    Errors().ClearErrors();
+    EXPECT_FALSE(core.SaveWrapper(path));
+    EXPECT_NE(test::Messages().find("No space left"), std::string::npos) << test::Messages();
+    EXPECT_EQ(ReadFile(path), before);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(mountPoint.Path()), {}), 1);
+    EXPECT_EQ(umount(mountPoint.Path().c_str()), 0);
+  }
 }
 
 }  // namespace

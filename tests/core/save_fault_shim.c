@@ -8,6 +8,7 @@
 #include <stdarg.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/stat.h>
 #include <sys/types.h>
 #include <unistd.h>
 
@@ -57,6 +58,20 @@ int close(int descriptor) {
     return -1;
   }
   return NEXT(close)(descriptor);
+}
+
+int fstat(int descriptor, struct stat* status) { return strikes() ? -1 : NEXT(fstat)(descriptor, status); }
+
+int stat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(stat)(path, status); }
+
+int access(const char* path, int mode) { return strikes() ? -1 : NEXT(access)(path, mode); }
+
+ssize_t readlink(const char* path, char* target, size_t room) {
+  return strikes() ? -1 : NEXT(readlink)(path, target, room);
+}
+
+int fchown(int descriptor, uid_t owner, gid_t group) {
+  return strikes() ? -1 : NEXT(fchown)(descriptor, owner, group);
 }
 
 int fchmod(int descriptor, mode_t mode) { return strikes() ? -1 : NEXT(fchmod)(descriptor, mode); }
