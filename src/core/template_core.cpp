@@ -35,8 +35,6 @@ TemplateCore::~TemplateCore() {
   processes.clear();
   derivedOutputs.clear();
   species.clear();
-  // The names of the user functions go with the template that declared them.
-  misc.Reset();
   ReleaseCatalogues();
 }
 

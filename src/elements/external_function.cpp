@@ -2,7 +2,6 @@
 
 #include <array>
 
-#include "expr/user_function_names.h"
 #include "keyfile/keywords.h"
 
 namespace tessal {
@@ -46,22 +45,24 @@ CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Eleme
   SetKind(kind::kExternalFunction);
   Bind(kRows, {&publicName, &parameters, &usedAs, &dll, &entryPoint});
   ListenTo({&publicName, &parameters, &usedAs});
+  claim.Claim(publicName.Text());
 }
 
 void CEL_ExternalFunction::Reset() {
   ResetOwn();
+  EnableParameters();
+  claim.Claim(publicName.Text());
 }
 
 void CEL_ExternalFunction::Read(KvfNode section, int& status) {
   CEL_Element::Read(section, status);
   EnableParameters();
-  RegisterUserFunctionName(publicName.Text());
+  claim.Claim(publicName.Text());
 }
 
 void CEL_ExternalFunction::OnPropertyChanged(CEL_Property& changed) {
   if (&changed == &publicName) {
-    UnregisterUserFunctionName(publicName.PrevText());
-    RegisterUserFunctionName(publicName.Text());
+    claim.Claim(publicName.Text());
   } else if (&changed == &usedAs) {
     EnableParameters();
   } else {

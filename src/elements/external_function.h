@@ -3,6 +3,7 @@
 #pragma once
 
 #include "elements/element.h"
+#include "expr/user_function_names.h"
 
 namespace tessal {
 
@@ -22,6 +23,8 @@ class CEL_ExternalFunction final : public CEL_Element {
 
  private:
   void EnableParameters();
+
+  UserFunctionClaim claim;
 };
 
 }  // namespace tessal

@@ -1,12 +1,11 @@
 #include "elements/miscellaneous.h"
 
-#include <algorithm>
 #include <array>
+#include <limits>
 
 #include "elements/element_checks.h"
 #include "elements/property_io.h"
 #include "elements/version_stamp.h"
-#include "expr/user_function_names.h"
 #include "keyfile/keywords.h"
 
 namespace tessal {
@@ -69,7 +68,7 @@ void CEL_Miscanellous::Reset() {
   parserVersion.SetReal(ParserVersion());
   ClearTexts();
   functionHead.ClearTexts();
-  DropFunctions();
+  functions.clear();
   visibilities.Reset();
 }
 
@@ -97,7 +96,10 @@ void CEL_Miscanellous::Read(KvfNode section, int& status) {
 }
 
 void CEL_Miscanellous::Write(KvfHandle file, int& status) {
-  if (documentRevision.IntValue() >= 0) documentRevision.SetInt(documentRevision.IntValue() + 1);
+  const std::int32_t revision = documentRevision.IntValue();
+  if (revision >= 0 && revision < std::numeric_limits<std::int32_t>::max()) {
+    documentRevision.SetInt(revision + 1);
+  }
   CEL_Element::Write(file, status);
   if (!functions.empty()) {
     kvfAddSection(file, section::kExternalFunctions);
@@ -143,19 +145,9 @@ CEL_ExternalFunction& CEL_Miscanellous::AddExternalFunction() {
 
 bool CEL_Miscanellous::RemoveExternalFunction(std::size_t index) {
   if (index >= functions.size()) return false;
-  const std::string name = functions[index]->publicName.Text();
   functions.erase(functions.begin() + static_cast<std::ptrdiff_t>(index));
-  const bool stillUsed = std::any_of(functions.begin(), functions.end(), [&name](const auto& function) {
-    return function->publicName.Text() == name;
-  });
-  if (!stillUsed) UnregisterUserFunctionName(name);
   MarkModified();
   return true;
-}
-
-void CEL_Miscanellous::DropFunctions() {
-  for (const auto& function : functions) UnregisterUserFunctionName(function->publicName.Text());
-  functions.clear();
 }
 
 }  // namespace tessal

@@ -50,7 +50,6 @@ class CEL_Miscanellous final : public CEL_Element {
  private:
   /// What an old file means by the keywords that it lacks.
   void SetAbsentValues(KvfNode section);
-  void DropFunctions();
 
   bool* templateModified = nullptr;
   CEL_ListHead functionHead{kind::kExternalFunction, ""};

@@ -1,6 +1,7 @@
 #include "expr/user_function_names.h"
 
 #include <iterator>
+#include <map>
 #include <unordered_map>
 
 namespace tessal {
@@ -11,6 +12,7 @@ namespace {
 struct Names {
   std::list<std::string> list;
   std::unordered_map<std::string_view, std::list<std::string>::iterator> places;
+  std::map<std::string, int> claims;  ///< how many declarations claim a name
 };
 
 Names& TheNames() {
@@ -48,6 +50,25 @@ bool IsUserFunctionName(std::string_view name) {
 void ResetUserFunctionNames() {
   TheNames().places.clear();
   TheNames().list.clear();
+  TheNames().claims.clear();
+}
+
+void UserFunctionClaim::Claim(std::string_view name) {
+  if (holds && claimed == name) return;
+  Release();
+  claimed = name;
+  holds = true;
+  ++TheNames().claims[claimed];
+  RegisterUserFunctionName(claimed);
+}
+
+void UserFunctionClaim::Release() {
+  if (!holds) return;
+  holds = false;
+  const auto count = TheNames().claims.find(claimed);
+  if (count == TheNames().claims.end() || --count->second > 0) return;
+  TheNames().claims.erase(count);
+  UnregisterUserFunctionName(claimed);
 }
 
 }  // namespace tessal

@@ -18,4 +18,23 @@ bool IsUserFunctionName(std::string_view name);
 /// Empties the list, for tests.
 void ResetUserFunctionNames();
 
+/// One declaration's claim on a public name. A name stays in the list as long as a declaration claims it, be
+/// it another one of the same template or one of another open template.
+class UserFunctionClaim final {
+ public:
+  UserFunctionClaim() = default;
+  UserFunctionClaim(const UserFunctionClaim&) = delete;
+  UserFunctionClaim& operator=(const UserFunctionClaim&) = delete;
+  ~UserFunctionClaim() { Release(); }
+
+  /// Gives the name claimed so far up, and registers this one.
+  void Claim(std::string_view name);
+
+ private:
+  void Release();
+
+  std::string claimed;
+  bool holds = false;
+};
+
 }  // namespace tessal
