@@ -170,8 +170,11 @@ bool TemplateCore::DeleteElement(std::uint32_t uid) {
   if (record == nullptr) return false;
   // First, so that an element whose deletion is refused has left its groups all the same.
   if (hasMisc) LeaveVisibilityGroups(*record->element);
+  const std::int32_t elementKind = record->element->Kind();
   if (!record->referencedBy.empty() || !EraseRecordElement(*record)) return false;
   RebuildSymbolTable();
+  // With a search function the need for a spatial tree may go.
+  if (elementKind == kind::kSpatialFunction || elementKind == kind::kSpecie) RefreshSearchFunctionChoices();
   flags.modified = true;
   return true;
 }

@@ -29,7 +29,11 @@ void TemplateCore::NumberSpecies() {
   std::map<std::int32_t, std::int32_t> numbers;  // new by old
   for (std::size_t place = 0; place < species.size(); ++place) {
     const auto number = static_cast<std::int32_t>(place + 1);
-    numbers.emplace(species[place]->Index(), number);
+    const std::int32_t former = species[place]->Index();
+    numbers.emplace(former, number);
+    for (const auto& function : species[place]->spatialFunctions) {
+      if (function->specieId.IntValue() == former) function->specieId.SetInt(number);
+    }
     species[place]->SetIndex(number);
     species[place]->StampMembers();
   }

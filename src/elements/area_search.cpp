@@ -187,6 +187,7 @@ void CEL_Lagrange_Spatial_Function::OnPropertyChanged(CEL_Property& changed) {
 void CEL_Lagrange_Spatial_Function::OnFrameworkChanged() {
   if (framework.Text() == kEuler || framework.Text() == kLagrange) {
     variableId.SetInt(-1);
+    property.SelectChoice(property.Text());
     property.ApplySelection();
     property.SetEditable(true);
   }

@@ -223,8 +223,13 @@ CEL_Lagrange_Arithmetical_Expression& CEL_Lagrange_Specie::AddArithmeticExpressi
 }
 
 CEL_Lagrange_Horizontal_Vector& CEL_Lagrange_Specie::AddHorizontalVector() {
-  horizontalVectors.push_back(std::make_unique<CEL_Lagrange_Horizontal_Vector>(
-      "Horizontal Vector" + std::to_string(horizontalVectors.size() + 1)));
+  std::size_t number = horizontalVectors.size() + 1;
+  const auto caption = [&number] { return "Horizontal Vector" + std::to_string(number); };
+  while (std::any_of(horizontalVectors.begin(), horizontalVectors.end(),
+                     [&caption](const auto& vector) { return vector->symbol.Text() == caption(); })) {
+    ++number;
+  }
+  horizontalVectors.push_back(std::make_unique<CEL_Lagrange_Horizontal_Vector>(caption()));
   Adopt(*horizontalVectors.back(), kind::kHorizontalVectorList);
   return *horizontalVectors.back();
 }

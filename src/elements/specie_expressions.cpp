@@ -52,6 +52,12 @@ CEL_Lagrange_Arithmetical_Expression::CEL_Lagrange_Arithmetical_Expression(std::
   ListenTo({&symbol, &unit, &expression});
 }
 
+void CEL_Lagrange_Arithmetical_Expression::Reset() {
+  const std::int32_t number = specie.IntValue();
+  ResetOwn();
+  specie.SetInt(number);
+}
+
 bool CEL_Lagrange_Arithmetical_Expression::Check() {
   const bool expressed = CheckExpression(*this, expression);
   const bool worded = CheckTextContent(*this);

@@ -11,7 +11,8 @@ class CEL_Lagrange_Arithmetical_Expression final : public CEL_Element {
  public:
   explicit CEL_Lagrange_Arithmetical_Expression(std::string_view caption);
 
-  void Reset() override { ResetOwn(); }
+  /// Leaves the number of the class, to which it still belongs.
+  void Reset() override;
   bool Check() override;
   bool ParseExpression() override;
 

@@ -93,6 +93,12 @@ CEL_Lagrange_StateVariable::CEL_Lagrange_StateVariable(std::string_view caption)
   ListenTo({&symbol, &unqType, &unqUnit, &equation});
 }
 
+void CEL_Lagrange_StateVariable::Reset() {
+  const std::int32_t number = specie.IntValue();
+  CEL_SpecieValue::Reset();
+  specie.SetInt(number);
+}
+
 bool CEL_Lagrange_StateVariable::Check() {
   const bool inRange = CheckDefaultInRange(*this, minValue, defaultValue, maxValue);
   const bool named = CheckSymbolForm(*this);

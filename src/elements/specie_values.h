@@ -29,6 +29,8 @@ class CEL_Lagrange_StateVariable final : public CEL_SpecieValue {
  public:
   explicit CEL_Lagrange_StateVariable(std::string_view caption);
 
+  /// Leaves the number of the class, to which it still belongs.
+  void Reset() override;
   bool Check() override;
   bool ParseExpression() override;
 

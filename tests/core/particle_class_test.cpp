@@ -87,6 +87,35 @@ TEST_F(ThreeClasses, ASearchForADeletedClassLooksForNone) {
   EXPECT_FALSE(search.Check()) << "and not for the one that is made next";
 }
 
+TEST_F(ThreeClasses, AChangeOfPurposeLeavesTheProperty) {
+  search.property.SetText("HDIR");
+  search.purpose.SetText("MAGNITUDE");
+  EXPECT_EQ(search.property.Text(), "HDIR");
+  EXPECT_EQ(search.variableId.IntValue(), -1);
+}
+
+TEST_F(ThreeClasses, TheSpatialTreeGoesWithTheLastSearchThatNeedsIt) {
+  loaded->RefreshSearchFunctionChoices();
+  ASSERT_TRUE(loaded->GetMisc()->buildSpatialTree.BoolValue());
+  ASSERT_TRUE(loaded->MoveElement(loaded.Uid("C"), loaded.Uid("A"), true));
+  EXPECT_EQ(search.specieId.IntValue(), 1) << "the number of its class";
+  ASSERT_TRUE(loaded->DeleteElement(search.GetUid()));
+  EXPECT_FALSE(loaded->GetMisc()->buildSpatialTree.BoolValue());
+}
+
+TEST_F(ThreeClasses, ResetLeavesMembersInTheirClass) {
+  auto& specie = loaded->GetSpecie(2);
+  specie.stateVariables[0]->Reset();
+  specie.arithmeticExpressions[0]->Reset();
+  EXPECT_EQ(specie.stateVariables[0]->specie.IntValue(), 3);
+  EXPECT_EQ(specie.arithmeticExpressions[0]->specie.IntValue(), 3);
+  specie.AddHorizontalVector();
+  specie.AddHorizontalVector();
+  loaded->RebuildSymbolTable();
+  ASSERT_TRUE(loaded->DeleteElement(specie.horizontalVectors[0]->GetUid()));
+  EXPECT_EQ(specie.AddHorizontalVector().symbol.Text(), "Horizontal Vector4") << "no name twice";
+}
+
 TEST_F(ThreeClasses, AClassWithoutMembersWritesAllItsLists) {
   TemplateCore core;
   core.AddSpecie();
