@@ -12,7 +12,7 @@ namespace tessal::cli {
 
 ExitCode RunSave(const std::string& file, const std::string& output) {
   TemplateCore core;
-  if (!LoadOrComplain(core, file)) return kCallFault;
+  if (!LoadToSave(core, file)) return kCallFault;
   return SaveOrComplain(core, output.empty() ? file : output) ? kFine : kCallFault;
 }
 
@@ -28,7 +28,7 @@ ExitCode RunNew(const std::string& output, bool overwrite) {
 
 ExitCode RunRename(const RenameCall& call) {
   TemplateCore core;
-  if (!LoadOrComplain(core, call.file)) return kCallFault;
+  if (!LoadToSave(core, call.file)) return kCallFault;
   const std::string newSymbol(CleanText(call.newSymbol));
   std::string refusal = RenameRefusal(core, newSymbol);
   if (refusal.empty() && !core.RenameSymbol(call.oldSymbol, newSymbol, !call.onlySymbol)) {

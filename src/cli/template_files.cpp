@@ -27,6 +27,16 @@ bool LoadOrComplain(TemplateCore& core, const std::string& file) {
   return loaded;
 }
 
+bool LoadToSave(TemplateCore& core, const std::string& file) {
+  if (!LoadOrComplain(core, file)) return false;
+  for (const ErrorRecord& record : Errors().Records()) {
+    if (record.symbol != kNotKeptSymbol) continue;
+    Complain("'" + file + "': sections beside TESSAL_SETUP, if there are any, are not kept: " +
+             std::string(WithoutLineFeed(record.text)));
+  }
+  return true;
+}
+
 bool SaveOrComplain(TemplateCore& core, const std::string& file) {
   // What the load found is no part of why a save fails.
   Errors().ClearErrors();

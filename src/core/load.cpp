@@ -134,7 +134,7 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
   }
   keptTree.Clear();
   if (LoadKeyFileTree(path, keptTree) == 0) {
-    Errors().AddError(ErrorLevel::Warning, "could not read template: ", -1, TreeFailureText(path));
+    Errors().AddError(ErrorLevel::Warning, kNotKeptSymbol, -1, TreeFailureText(path));
   }
   return true;
 }

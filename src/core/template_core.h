@@ -25,6 +25,9 @@
 
 namespace tessal {
 
+/// The symbol of the message that a load leaves when it could not keep the file's further top-level sections.
+inline constexpr std::string_view kNotKeptSymbol = "could not read template: ";
+
 /// The switches of one template. Every property holds the address of the first.
 struct TemplateFlags {
   bool modified = false;

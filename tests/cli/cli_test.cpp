@@ -300,6 +300,11 @@ TEST(Tool, SavesMakesAndRenames) {
   EXPECT_EQ(RunTool({"save", folder.File("missing")}).exitCode, 2);
   EXPECT_EQ(RunTool({"save", fresh, "--output", "/nowhere/x"}).exitCode, 2);
 
+  const auto lossy = RunTool(
+      {"save", folder.Write("l.tessal", "\n[TESSAL_SETUP]\nEndSect\n// stray\n[X]\nA = 1\nEndSect\n")});
+  EXPECT_EQ(lossy.exitCode, 0);
+  EXPECT_NE(lossy.errors.find("not kept"), std::string::npos) << "a loss is told";
+
   const std::string file =
       folder.Write("m.tessal", TemplateText().Constant("k").Auxiliary("a", "k+k").Text());
   auto run = RunTool({"rename", file, "k", "sin"});
