@@ -10,6 +10,7 @@
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/user_function_names.h"
+#include "support/template_content.h"
 #include "template_file.h"
 
 namespace {
@@ -54,20 +55,37 @@ void Add(TemplateCore& core, Choices& choices) {
   if (isUnnamed || core.SymbolExists(request.symbol)) request.symbol.clear();
   if (request.kind > 7 && core.GetSpecieCount() > 0) {
     const auto& specie = core.GetSpecie(choices.Pick(core.GetSpecieCount()));
+    // Any list head names its class.
     request.ownerId = specie.Head(kind::kSpecieConstantList).MessageUid();
   }
   core.CreateElement(request);
   SetNotifyChanges(true);
 }
 
+/// An element with values: one with a record, the settings, or a user function.
+CEL_Element* AnyElement(TemplateCore& core, Choices& choices) {
+  CEL_Miscanellous* misc = core.GetMisc();
+  const auto& functions = misc->ExternalFunctions();
+  switch (choices.Pick(4)) {
+    case 0:
+      return misc;
+    case 1:
+      return functions.empty() ? nullptr : functions[choices.Pick(functions.size())].get();
+    default:
+      return core.GetElement(AnyUid(core, choices));
+  }
+}
+
 void ChangeField(TemplateCore& core, Choices& choices) {
-  CEL_Element* element = core.GetElement(AnyUid(core, choices));
+  CEL_Element* element = AnyElement(core, choices);
   if (element == nullptr) return;
   std::vector<ElementField> fields;
   element->GetFields(fields);
   ElementField& field = fields[choices.Pick(fields.size())];
   // Names go through the rename, numbers of records through the table.
   if (field.name == "Symbol" || field.name == "Name" || field.name == "ID" || field.name == "Specie") return;
+  // Versions are rounded to three decimals, which the stamps of a save have.
+  if (field.name.ends_with(" version")) return;
   // A search function's loading gives up texts that are no choices.
   const auto& allowed = field.choiceTexts;
   field.text = allowed.empty() ? kTexts[choices.Pick(kTexts.size())] : allowed[choices.Pick(allowed.size())];
@@ -75,6 +93,36 @@ void ChangeField(TemplateCore& core, Choices& choices) {
   field.realValue = static_cast<double>(choices.Pick(9)) - 4.5;
   field.boolValue = choices.Pick(2) == 0;
   element->SetFields({field});
+}
+
+/// The texts of the root, of a list head, or of a group.
+void ChangeTexts(TemplateCore& core, Choices& choices) {
+  const char* text = kTexts[choices.Pick(kTexts.size())];
+  auto& groups = core.GetMisc()->Visibilities().groups;
+  switch (choices.Pick(5)) {
+    case 0:
+      core.Root().onlineHelp.SetText(text);
+      break;
+    case 1:
+      core.ListHead(static_cast<std::int32_t>(kind::kStateVariableList + choices.Pick(6)))
+          .description.SetText(text);
+      break;
+    case 2:
+      if (core.GetSpecieCount() == 0) break;
+      core.GetSpecie(choices.Pick(core.GetSpecieCount()))
+          .Head(static_cast<std::int32_t>(kind::kSpecieStateVariableList + choices.Pick(5)))
+          .documentation.SetText(text);
+      break;
+    case 3:
+      core.GetMisc()->ExternalFunctionHead().description.SetText(text);
+      break;
+    default:
+      if (groups.empty()) break;
+      VisibilityGroup& group = groups[choices.Pick(groups.size())];
+      group.name = text;
+      if (!group.levels.empty()) group.levels[choices.Pick(group.levels.size())].description = text;
+      break;
+  }
 }
 
 void ChangeGroups(TemplateCore& core, Choices& choices) {
@@ -104,7 +152,7 @@ void ChangeGroups(TemplateCore& core, Choices& choices) {
 }
 
 void Edit(TemplateCore& core, Choices& choices) {
-  switch (choices.Pick(8)) {
+  switch (choices.Pick(9)) {
     case 0:
     case 1:
       Add(core, choices);
@@ -134,6 +182,9 @@ void Edit(TemplateCore& core, Choices& choices) {
       }
       core.RefreshSearchFunctionChoices();
       break;
+    case 7:
+      ChangeTexts(core, choices);
+      break;
     default:
       ChangeField(core, choices);
       break;
@@ -151,31 +202,22 @@ void CheckTable(const TemplateCore& core) {
   }
 }
 
-/// What a file does not hold: the names of derived outputs, the units of elements without unit data, and the
-/// key that the forcings of particle classes have always lost.
-bool IsLostOnTheWay(const CEL_Element& element, const std::string& field) {
-  const bool isForcing = element.Kind() == kind::kSpecieForcing;
-  const bool hasNoUnit = isForcing || element.Kind() == kind::kSpatialFunction;
-  if (element.Kind() == kind::kDerivedOutput) return field == "Symbol";
-  return (hasNoUnit && field.starts_with("UNQ ")) || (isForcing && field == "Spatial Variation");
+std::string StartText(const std::string& path) {
+  std::string failure;
+  return ReadWholeFile(path, failure).value_or("");
 }
 
-/// Every value of every element as text.
-std::string Content(const TemplateCore& core) {
-  std::string text;
-  std::vector<ElementField> fields;
-  for (const SymbolRecord& record : core.SymbolTable()) {
-    fields.clear();
-    record.element->GetFields(fields);
-    for (const ElementField& field : fields) {
-      if (IsLostOnTheWay(*record.element, field.name)) continue;
-      text += field.name + "=" + FieldText(field) + "\n";
-    }
-    for (const auto& [group, level] : record.element->Visibility()) {
-      text += std::to_string(group) + "/" + std::to_string(level) + "\n";
-    }
-  }
-  return text;
+/// The sections that a template carries over for others, with comments wherever they may stand.
+void LoadFurtherSections(TemplateCore& core) {
+  const std::string path = fuzz::ScratchFile("start.tessal");
+  static const bool kWritten =
+      TemplateCore().SaveWrapper(path) &&
+      WriteWholeFile(path, StartText(path) +
+                               "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // behind\r\n"
+                               "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")
+          .empty();
+  Require(kWritten && core.LoadWrapper(path), "the start is there");
+  SetNotifyChanges(true);
 }
 
 }  // namespace
@@ -184,9 +226,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   constexpr int kMostEdits = 60;
   ResetExpressionScanner();
   ResetUserFunctionNames();
-  SetNotifyChanges(true);
   TemplateCore core;
   Choices choices(data, size);
+  LoadFurtherSections(core);
   for (int edit = 0; edit < kMostEdits && !choices.Done(); ++edit) {
     Edit(core, choices);
     CheckTable(core);
@@ -200,12 +242,13 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Require(!Errors().Records().empty(), "a failed save says why");
     return 0;
   }
-  const std::string content = Content(core);
+  const std::string content = test::TemplateContent(core);
   ResetExpressionScanner();
   TemplateCore again;
   Require(again.LoadWrapper(path), "what was saved loads");
-  const std::string loaded = Content(again);
+  const std::string loaded = test::TemplateContent(again);
   if (loaded != content) std::fprintf(stderr, "%s\n-- becomes --\n%s\n", content.c_str(), loaded.c_str());
   Require(loaded == content, "and holds the same values");
+  Require(content.find("// at its head") != std::string::npos, "among them the further sections");
   return 0;
 }
