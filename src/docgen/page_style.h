@@ -1,6 +1,8 @@
-// How the page looks where no MathJax renders it. Browsers know MathML Core, which has no fences of its own
-// and ignores unknown elements' brackets; the rules give them back: round brackets around a fence, commas
-// between the arguments of a function, and a brace ahead of the two rows of a conditional.
+// How the page looks where no MathJax renders it. Browsers know MathML Core, which lays an `mfenced` out as a
+// plain row: without brackets, without the commas between arguments and without the brace of a conditional.
+// The rules draw them. Everything stays in mathematical layout, where generated text is not shown and
+// flexible boxes lose the spaces around operators; so brackets are borders, which also grow with what they
+// hold, and the brace and the comma are small pictures in the rules themselves.
 #pragma once
 
 #include <string_view>
@@ -8,18 +10,28 @@
 namespace tessal {
 
 inline constexpr std::string_view kPageStyle =
-    "<style>\n"
-    "math { font-size: 1.1em; }\n"
-    "math mfenced { display: inline-flex; align-items: center; }\n"
-    "math mfenced::before { content: '('; padding-right: 0.1em; }\n"
-    "math mfenced::after { content: ')'; padding-left: 0.1em; }\n"
-    "math mfenced:not([separators]) > mrow:not(:last-child)::after { content: ','; padding-right: 0.3em; }\n"
-    "math mfenced[open='{'] { border-left: 2px solid; border-top-left-radius: 0.6em;\n"
-    "  border-bottom-left-radius: 0.6em; padding-left: 0.4em; margin-left: 0.3em; vertical-align: middle; }\n"
-    "math mfenced[open='{']::before, math mfenced[open='{']::after { content: none; }\n"
-    "math mtd { text-align: left; padding: 0.2em 0.4em; }\n"
-    "math mtext[mathcolor='blue'] { color: blue; }\n"
-    "math mtext[mathcolor='green'] { color: green; font-weight: bold; font-style: italic; }\n"
-    "</style>";
+    R"css(<style>
+math { font-size: 1.1em; width: max-content; }
+math mfenced { margin: 0 0.1em; padding: 0.12em 0.25em; border: solid; border-width: 0 0.07em;
+  border-radius: 0.5em / 50%; }
+math mfenced:not([separators]) { padding: 0 0.25em; }
+math mfenced:not([separators]) > mrow { padding: 0.25em 0; }
+math mfenced:not([separators]) > mrow:not(:last-child) { padding-right: 0.6em;
+  background: no-repeat right 0.25em top calc(50% + 0.4em) / 0.2em 0.4em url("data:image/svg+xml,%3Csvg xmlns='http://www.w3.org/2000/svg' viewBox='0 0 10 20'%3E%3Cpath d='M3 5a3 3 0 1 1 4 4Q7 15 1 19Q4 14 4 10Z'/%3E%3C/svg%3E");
+  -webkit-print-color-adjust: exact; print-color-adjust: exact; }
+math mfenced:empty { padding: 0.75em 0.25em 0.2em; }
+math mfenced[open] { margin: 0 0 0 0.2em; padding: 0; border-width: 0 0 0 0.6em; border-radius: 0;
+  border-image: url("data:image/svg+xml,%3Csvg xmlns='http://www.w3.org/2000/svg' width='12' height='100' viewBox='0 0 12 100' preserveAspectRatio='none'%3E%3Cpath d='M11 1Q6 1 6 12V38Q6 50 1 50Q6 50 6 62V88Q6 99 11 99' fill='none' stroke='black' stroke-width='1.3' vector-effect='non-scaling-stroke'/%3E%3C/svg%3E") 0 0 0 12 stretch; }
+math mtd { padding: 0.2em 0.4em; text-align: left; math-style: normal; }
+math mfrac > mrow { padding: 0.1em 0; }
+math mfrac mfrac > *, math msup > :last-child mfrac > * { math-depth: 1; }
+math msup > :last-child msup > :last-child { math-depth: 2; }
+math mtext[mathcolor='blue'] { color: blue; }
+math mtext[mathcolor='green'] { color: green; font-weight: bold; font-style: italic; }
+math mi + mtext[mathcolor='green'] { margin: 0 0.3em; }
+math :not(mfrac, msup, mfenced:not([separators])) > :is(mi, mn, mrow, mfrac, mfenced, mtext:not([mathcolor]))
+  + :is(mi, mn, mrow, mfrac, mfenced:not([open]), mtext:not([mathcolor='green'])) { margin-left: 0.6em; }
+math > mrow > mfrac:first-child > mrow:first-child > mi:last-child { margin-left: 0; }
+</style>)css";
 
 }  // namespace tessal
