@@ -3,7 +3,6 @@
 
 #include "cli/commands.h"
 #include "cli/numbers.h"
-#include "elements/property.h"
 #include "expr/builtin_catalogue.h"
 #include "expr/evaluate.h"
 #include "expr/function_catalogue.h"
@@ -32,7 +31,7 @@ std::string BuiltinRow(const CatalogueBuiltin& row) {
     text += '\t';
     text += part;
   }
-  for (const double number : {row.defaultValue, row.minimum, row.maximum}) text += '\t' + RealText(number);
+  for (const double number : {row.defaultValue, row.minimum, row.maximum}) text += '\t' + NumberText(number);
   return text + '\t' + (IsDeprecatedBuiltin(row.id) ? "1" : "0");
 }
 

@@ -12,7 +12,7 @@ namespace tessal::cli {
 /// for a double is infinite.
 std::optional<double> NumberOf(std::string_view text);
 
-/// The shortest text that reads back; "nan" for every NaN.
+/// The shortest text that reads back, for scripts; "nan" for every NaN.
 std::string NumberText(double value);
 
 /// All of them; nothing when one is no number.

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <charconv>
+#include <cmath>
 #include <utility>
 
 namespace tessal {
@@ -54,8 +55,14 @@ void SetNotifyChanges(bool on) {
 }
 
 std::string RealText(double value) {
+  // The shortest form on its own would make 1e-04 of 0.0001 and 1e+05 of 100000.
+  constexpr double kSmallestPlain = 1e-4;
+  constexpr double kLargestPlain = 1e15;
+  const double size = std::abs(value);
+  const bool plain = size == 0.0 || (size >= kSmallestPlain && size < kLargestPlain);
   std::array<char, 32> buffer{};
-  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
+  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
+                                    plain ? std::chars_format::fixed : std::chars_format::scientific);
   return {buffer.data(), result.ptr};
 }
 
@@ -169,6 +176,7 @@ void CEL_Property::RaiseChange() {
   if (modifiedFlag != nullptr) *modifiedFlag = true;
   if (!NotifyChanges()) return;
   // By index: a listener may register another one while it is told.
+  // NOLINTNEXTLINE(modernize-loop-convert)
   for (std::size_t index = 0; index < listeners.size(); ++index) listeners[index]->OnPropertyChanged(*this);
 }
 

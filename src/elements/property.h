@@ -79,7 +79,8 @@ class NotificationsOff final {
   bool wereOn;
 };
 
-/// A real in its shortest decimal form that reads back to the same value.
+/// A real with the fewest digits that read back to the same value, with an exponent only where the number is
+/// very small (below 0.0001) or very large (1e15 and more).
 std::string RealText(double value);
 
 class CEL_Property final {
