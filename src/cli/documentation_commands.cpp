@@ -25,7 +25,7 @@ std::filesystem::path UsualPage(const std::string& file) {
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
-  Print(OverviewText(core));
+  Print(OverviewText(core, BuildOverview(core)));
   return kFine;
 }
 

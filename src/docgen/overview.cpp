@@ -1,7 +1,7 @@
 #include "docgen/overview.h"
 
 #include <algorithm>
-#include <array>
+#include <utility>
 
 #include "core/template_core.h"
 #include "elements/property_io.h"
@@ -9,11 +9,6 @@
 namespace tessal {
 
 namespace {
-
-constexpr std::size_t kColumns = 5;
-
-constexpr std::array<std::string_view, kColumns> kHeader = {"No.", "Symbol", "Type",
-                                                            "Expression/ Default value", "Description"};
 
 /// The name behind a search function's reference by number.
 std::string NameOfReference(const TemplateCore& core, std::int32_t reference, const std::string& otherwise) {
@@ -79,16 +74,17 @@ class OverviewBuilder final {
   template <class Elements, class TextOf>
   void AddAll(const Elements& elements, const std::string& ofClass, TextOf textOf) {
     for (const auto& element : elements) {
-      rows.push_back({std::to_string(++counted), element->symbol.Text(),
-                      std::string(element->KindText()) + ofClass, textOf(*element),
-                      element->description.Text(), element->GetUid()});
+      rows.push_back(
+          {{std::to_string(++counted), element->symbol.Text(), std::string(element->KindText()) + ofClass,
+            textOf(*element), element->description.Text()},
+           element->GetUid()});
     }
   }
 
   void AddMovement(const CEL_Element& movement, std::string type, const CEL_Property& expression,
                    const char* description) {
     rows.push_back(
-        {"-", movement.symbol.Text(), std::move(type), expression.Text(), description, movement.GetUid()});
+        {{"-", movement.symbol.Text(), std::move(type), expression.Text(), description}, movement.GetUid()});
   }
 
   const TemplateCore& core;
@@ -103,16 +99,31 @@ std::string Cleaned(std::string text) {
   return std::string(CleanText(text));
 }
 
-using Cells = std::array<std::string, kColumns>;
+using Cells = std::array<std::string, kOverviewColumnCount>;
+using Widths = std::array<std::size_t, kOverviewColumnCount>;
 
-/// The first three columns stand right, the others left; tabs part them.
-void AppendRow(const Cells& cells, const std::array<std::size_t, kColumns>& widths, std::string& text) {
-  constexpr std::size_t kRightAligned = 3;
-  for (std::size_t column = 0; column < kColumns; ++column) {
+Cells TextCells(Cells cells) {
+  for (std::size_t column = 0; column < cells.size(); ++column) {
+    if (kOverviewColumns[column].cleaned) cells[column] = Cleaned(std::move(cells[column]));
+  }
+  return cells;
+}
+
+Cells TextTitles() {
+  Cells titles;
+  for (std::size_t column = 0; column < titles.size(); ++column) {
+    titles[column] = kOverviewColumns[column].textTitle;
+  }
+  return titles;
+}
+
+/// Each column is one wider than its longest text; tabs part them.
+void AppendRow(const Cells& cells, const Widths& longest, std::string& text) {
+  for (std::size_t column = 0; column < cells.size(); ++column) {
     if (column > 0) text += '\t';
-    const std::size_t width = widths[column] + 1;
-    const std::string padding(width > cells[column].size() ? width - cells[column].size() : 0, ' ');
-    text += column < kRightAligned ? padding + cells[column] : cells[column] + padding;
+    const std::size_t width = longest[column] + 1;
+    const std::string padding(width - std::min(width, cells[column].size()), ' ');
+    text += kOverviewColumns[column].rightAligned ? padding + cells[column] : cells[column] + padding;
   }
   text += "\r\n";
 }
@@ -123,25 +134,23 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core) {
   return OverviewBuilder(core).Build();
 }
 
-std::string OverviewText(const TemplateCore& core) {
+std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows) {
   std::string text = "Template " + core.TemplateFileName() + "\r\n";
   // No line end follows the revision: the header row begins behind it.
   if (core.GetMisc() != nullptr && core.GetDocumentRevision() > 0) {
     text += "\nRevision " + std::to_string(core.GetDocumentRevision());
   }
   std::vector<Cells> table;
-  std::array<std::size_t, kColumns> widths{};
-  for (OverviewRow& row : BuildOverview(core)) {
-    table.push_back({std::move(row.number), std::move(row.symbol), std::move(row.type),
-                     Cleaned(std::move(row.expression)), Cleaned(std::move(row.description))});
-    for (std::size_t column = 0; column < kColumns; ++column) {
-      widths[column] = std::max(widths[column], table.back()[column].size());
+  table.reserve(rows.size());
+  Widths longest{};
+  for (const OverviewRow& row : rows) {
+    table.push_back(TextCells(row.cells));
+    for (std::size_t column = 0; column < longest.size(); ++column) {
+      longest[column] = std::max(longest[column], table.back()[column].size());
     }
   }
-  Cells header;
-  std::copy(kHeader.begin(), kHeader.end(), header.begin());
-  AppendRow(header, widths, text);
-  for (const Cells& cells : table) AppendRow(cells, widths, text);
+  AppendRow(TextTitles(), longest, text);
+  for (const Cells& cells : table) AppendRow(cells, longest, text);
   return text;
 }
 

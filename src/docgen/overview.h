@@ -1,26 +1,47 @@
-// The overview of a template: every element in one table, as the editor lists it and as a text for reports.
+// The overview of a template: every element in one table. The editor shows it as a list, from which a row
+// leads to its element; the text of it goes into reports.
 #pragma once
 
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace tessal {
 
 class TemplateCore;
 
+inline constexpr std::size_t kOverviewColumnCount = 5;
+
+struct OverviewColumn {
+  std::string_view title;      ///< above the column of the list
+  std::string_view textTitle;  ///< in the first row of the text
+  bool rightAligned;           ///< in the text; otherwise to the left
+  bool cleaned;                ///< in the text, without line ends and tabs, and without blanks at its ends
+};
+
+inline constexpr std::array<OverviewColumn, kOverviewColumnCount> kOverviewColumns = {{
+    {"No.", "No.", true, false},
+    {"Symbol", "Symbol", true, false},
+    {"Type", "Type", true, false},
+    {"Expression", "Expression/ Default value", false, true},
+    {"Description", "Description", false, true},
+}};
+
 struct OverviewRow {
-  std::string number;  ///< from 1; "-" for movements, which do not count
-  std::string symbol;
-  std::string type;
-  std::string expression;  ///< or the default value, or a search function's summary
-  std::string description;
-  std::uint32_t uid = 0;
+  /// In the order of the columns. The number counts from 1 and is "-" for movements, which do not count; the
+  /// expression is the default value of an input and the summary of a search function.
+  std::array<std::string, kOverviewColumnCount> cells;
+  std::uint32_t uid = 0;  ///< the element that the row tells of
 };
 
 std::vector<OverviewRow> BuildOverview(const TemplateCore& core);
 
-/// The table as aligned text with its header. Rows end in carriage return and line feed.
-std::string OverviewText(const TemplateCore& core);
+/// The rows as aligned text, with the template's file name and, above 0, its revision ahead of them. Rows end
+/// in carriage return and line feed. Widths go by the rows alone: a longer title pushes its own row out of
+/// line.
+std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows);
 
 }  // namespace tessal

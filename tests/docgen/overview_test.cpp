@@ -26,7 +26,7 @@ TEST(Overview, NumbersRunOnAndMovementsDoNotCount) {
   core.RebuildSymbolTable();
   std::string table;
   for (const OverviewRow& row : BuildOverview(core)) {
-    table += row.number + " " + row.symbol + " [" + row.type + "] " + row.expression + "\n";
+    table += row.cells[0] + " " + row.cells[1] + " [" + row.cells[2] + "] " + row.cells[3] + "\n";
   }
   EXPECT_EQ(table,
             "1 S [State Variable] p\n2 k [Constant] 0.1\n3 p [Process] k\n"
@@ -38,7 +38,7 @@ TEST(Overview, NumbersRunOnAndMovementsDoNotCount) {
             "7 B_Mass [Lagrange State Variable (B)] 0\n"
             "- Horizontal Vector1 [Direction (B)] 0\n- Horizontal Vector1 [Speed (B)] 0\n"
             "- Downward Velocity [Downward Velocity (B)] 0\n");
-  const auto summary = [&core] { return BuildOverview(core)[4].expression; };
+  const auto summary = [&core] { return BuildOverview(core)[4].cells[3]; };
   search.variableId.SetInt(1);
   EXPECT_EQ(summary(), "DIRECTION(NONE[S])");
   search.framework.SetText("LAGRANGE");
@@ -61,12 +61,12 @@ TEST(Overview, TheTextIsAlignedAndCleaned) {
                                                         .With("DESCRIPTION", "'two\nlines'")
                                                         .Text());
   ASSERT_TRUE(core.LoadWrapper(path));
-  EXPECT_EQ(OverviewText(core),
+  EXPECT_EQ(OverviewText(core, BuildOverview(core)),
             "Template " + path +
                 "\r\n\nRevision 7No.\tSymbol\t      Type\tExpression/ Default value\tDescription\r\n"
                 " 1\t a\t Auxiliary\t1 + 2 \ttwolines \r\n");
   TemplateCore empty;
-  EXPECT_EQ(OverviewText(empty),
+  EXPECT_EQ(OverviewText(empty, BuildOverview(empty)),
             "Template \r\nNo.\tSymbol\tType\tExpression/ Default value\tDescription\r\n");
 }
 
