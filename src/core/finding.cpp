@@ -130,15 +130,21 @@ bool TemplateCore::GetReferrerSymbols(std::uint32_t uid, std::vector<std::string
   symbols.clear();
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
+  symbols = ReferrerSymbols(*record);
+  return true;
+}
+
+std::vector<std::string> TemplateCore::ReferrerSymbols(const SymbolRecord& record) const {
+  std::vector<std::string> symbols;
   // By record number, which is at hand; a movement whose two expressions both use the symbol stands once.
   const CEL_Element* previous = nullptr;
-  for (const std::uint32_t sequence : record->referencedBy) {
+  for (const std::uint32_t sequence : record.referencedBy) {
     const SymbolRecord* referrer = FindRecordBySequence(sequence);
     if (referrer == nullptr || referrer->element == previous) continue;
     previous = referrer->element;
     symbols.push_back(RecordSymbol(*referrer));
   }
-  return true;
+  return symbols;
 }
 
 bool TemplateCore::FindElementBySymbol(std::string_view symbol, std::int32_t& id,

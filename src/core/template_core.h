@@ -104,6 +104,8 @@ class TemplateCore final : public ElementOwner {
   const SymbolRecord* FindRecordBySequence(std::uint32_t sequence) const;
   /// The first record of the element: a horizontal movement's is that of its direction.
   const SymbolRecord* FindRecordByUid(std::uint32_t uid) const;
+  /// The same for an element of this template that is at hand: without a search, behind a rebuild.
+  const SymbolRecord* RecordOfElement(const CEL_Element& element) const;
   /// The element with this identity: one with a record, a list head of a particle class, or a user function.
   /// A kind above 0 must be that of an element with a record.
   CEL_Element* GetElement(std::uint32_t uid, std::int32_t kindFilter = 0) const;
@@ -116,6 +118,8 @@ class TemplateCore final : public ElementOwner {
   bool IsReferenced(std::uint32_t uid) const;
   bool GetReferrerUids(std::uint32_t uid, std::vector<std::uint32_t>& uids) const;
   bool GetReferrerSymbols(std::uint32_t uid, std::vector<std::string>& symbols) const;
+  /// The symbols of those who use the record's element, each user once.
+  std::vector<std::string> ReferrerSymbols(const SymbolRecord& record) const;
   /// Finds a collection element (no movement, no class) by its symbol; the kind is 20 when there is none.
   bool FindElementBySymbol(std::string_view symbol, std::int32_t& id, std::int32_t& elementKind) const;
   /// The class that one of its list heads belongs to.
@@ -225,7 +229,6 @@ class TemplateCore final : public ElementOwner {
   void LeaveVisibilityGroups(CEL_Element& element);
 
   void AppendRecordSymbol(const SymbolRecord& record, std::string& text) const;
-  const SymbolRecord* RecordOfElement(const CEL_Element& element) const;
   SymbolRecord& Record(std::uint32_t sequence) { return symbolTable[sequence - 1]; }
   const SymbolRecord& Record(std::uint32_t sequence) const { return symbolTable[sequence - 1]; }
   bool CheckRecordOrder(const SymbolRecord& record) const;

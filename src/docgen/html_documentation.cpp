@@ -1,8 +1,10 @@
 #include "docgen/html_documentation.h"
 
 #include <array>
+#include <filesystem>
 #include <span>
 #include <string_view>
+#include <system_error>
 #include <vector>
 
 #include "core/template_core.h"
@@ -93,16 +95,6 @@ class PageWriter final {
     Line(std::string(text) + std::to_string(count) + "</li>");
   }
 
-  const SymbolRecord* RecordOf(const CEL_Element& element) const {
-    // The element's number is the place of its record, or of its second one.
-    const auto place = static_cast<std::uint32_t>(element.id.IntValue());
-    for (const std::uint32_t sequence : {place - 1, place}) {
-      const SymbolRecord* record = core.FindRecordBySequence(sequence);
-      if (record != nullptr && record->element == &element) return record;
-    }
-    return nullptr;
-  }
-
   void WriteHead() {
     Line(kDoctype);
     Line("<html>");
@@ -167,9 +159,9 @@ class PageWriter final {
     constexpr std::size_t kTimeLength = 26;
     Line("<div id=footer>");
     Line("<hr>");
-    std::array<char, kTimeLength * 2> time{};
-    // The fixed form of asctime ends in a line break of its own.
-    if (std::strftime(time.data(), time.size(), "%a %b %e %H:%M:%S %Y\n", &created) > 0) {
+    // The same words in every language of the system, with a line break of their own at the end.
+    std::array<char, kTimeLength> time{};
+    if (asctime_r(&created, time.data()) != nullptr) {
       page += "<br>Document created : ";
       Line(time.data());
     }
@@ -241,7 +233,7 @@ class PageWriter final {
     if (const ElementField* symbol = FindField(fields, "Symbol")) return symbol->text;
     const bool isMovement =
         element.Kind() == kind::kHorizontalVector || element.Kind() == kind::kVerticalEquation;
-    const SymbolRecord* record = isMovement ? RecordOf(element) : nullptr;
+    const SymbolRecord* record = isMovement ? core.RecordOfElement(element) : nullptr;
     return record == nullptr ? std::string() : core.RecordSymbol(*record);
   }
 
@@ -292,17 +284,11 @@ class PageWriter final {
     Line("</td>");
     Line("<td>");
     std::string links;
-    const SymbolRecord* record = RecordOf(element);
-    const CEL_Element* previous = nullptr;
-    for (const std::uint32_t sequence :
-         record == nullptr ? std::vector<std::uint32_t>() : record->referencedBy) {
-      const SymbolRecord* user = core.FindRecordBySequence(sequence);
-      // A movement that uses the element in both of its expressions stands once.
-      if (user == nullptr || user->element == previous) continue;
-      previous = user->element;
-      const std::string name = core.RecordSymbol(*user);
-      if (!links.empty()) links += ", ";
-      links += "<a href=#ref_" + name + ">" + name + "</a>";
+    if (const SymbolRecord* record = core.RecordOfElement(element)) {
+      for (const std::string& name : core.ReferrerSymbols(*record)) {
+        if (!links.empty()) links += ", ";
+        links.append("<a href=#ref_").append(name).append(">").append(name).append("</a>");
+      }
     }
     Line(links.empty() ? "- not used -" : links);
     Line("</td>");
@@ -320,8 +306,21 @@ std::string HtmlDocumentation(const TemplateCore& core, bool embedMathJax, const
   return PageWriter(core, embedMathJax).Write(created);
 }
 
+std::string PrepareUsualPagePath(const std::string& templateFile) {
+  const std::filesystem::path file(templateFile);
+  const std::filesystem::path folder = file.parent_path() / "HTML_doc";
+  std::error_code shownByTheWrite;
+  std::filesystem::create_directory(folder, shownByTheWrite);
+  return (folder / file.filename().replace_extension(".html")).string();
+}
+
 bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, bool embedMathJax,
                              std::string& failure) {
+  std::error_code notThere;
+  if (std::filesystem::equivalent(path, core.TemplateFileName(), notThere)) {
+    failure = "can not write the page over its template '" + path + "'";
+    return false;
+  }
   const std::time_t now = std::time(nullptr);
   std::tm local = {};
   localtime_r(&now, &local);

@@ -8,7 +8,12 @@ namespace tessal {
 
 class TemplateCore;
 
-/// Writes the page. False, with the reason in words, when not every byte reached the file.
+/// Where the page of a template file goes when nobody names a place: the folder `HTML_doc` beside the file,
+/// and in it the file's plain name. Makes the folder; one that cannot be made shows when the page is written.
+std::string PrepareUsualPagePath(const std::string& templateFile);
+
+/// Writes the page. False, with the reason in words, when not every byte reached the file, or when the path
+/// is that of the template itself, which is then left alone.
 bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, bool embedMathJax,
                              std::string& failure);
 
