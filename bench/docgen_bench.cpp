@@ -1,4 +1,4 @@
-// The documentation page of a large template.
+// The documentation page and the overview of a large template.
 #include <benchmark/benchmark.h>
 
 #include <ctime>
@@ -24,17 +24,30 @@ void Fill(TemplateCore& core, std::int64_t elements) {
   }
 }
 
-void Page(benchmark::State& state) {
-  TemplateCore core;
+/// Fills the template with that many elements, with its symbol table.
+void Make(TemplateCore& core, std::int64_t elements) {
   core.SetRebuildEnabled(false);
-  Fill(core, state.range(0));
+  Fill(core, elements);
   core.SetRebuildEnabled(true);
   core.RebuildSymbolTable();
+}
+
+void Page(benchmark::State& state) {
+  TemplateCore core;
+  Make(core, state.range(0));
   const std::tm time = {};
   for ([[maybe_unused]] auto turn : state)
     benchmark::DoNotOptimize(HtmlDocumentation(core, false, time).size());
 }
 
+void Overview(benchmark::State& state) {
+  TemplateCore core;
+  Make(core, state.range(0));
+  for ([[maybe_unused]] auto turn : state)
+    benchmark::DoNotOptimize(OverviewText(core, BuildOverview(core)).size());
+}
+
 }  // namespace
 
+BENCHMARK(Overview)->Arg(1'000)->Arg(10'000)->Unit(benchmark::kMillisecond);
 BENCHMARK(Page)->Arg(1'000)->Arg(10'000)->Unit(benchmark::kMillisecond);

@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -288,6 +289,38 @@ TEST(Tool, EveryExampleIsCleanButTheOneWithFaults) {
     EXPECT_GT(RunTool({"overview", copy}).output.size(), 100U);
   }
   EXPECT_EQ(clean, 5);
+}
+
+TEST(Tool, TellsWhyAPageCannotBeWritten) {
+  const TemporaryFolder folder;
+  const std::string text = TemplateText().Constant("k").Text();
+  const std::string file = folder.Write("m.tessal", text);
+  folder.Write("HTML_doc", "a file");
+  const std::pair<std::vector<std::string>, const char*> rows[] = {
+      {{"html", file}, "HTML_doc/m.html': Not a directory"},
+      {{"html", file, "--output", folder.Path().string()}, "Is a directory"},
+      {{"html", file, "--output", folder.File("no/page.html")}, "No such file"},
+      {{"html", file, "--output", "/dev/full"}, "No space left"},
+      {{"html", file, "--output", file}, "over its template"},
+      {{"html", folder.File("none.tessal")}, "none.tessal"},
+      {{"overview", folder.File("none.tessal")}, "none.tessal"},
+  };
+  for (const auto& [arguments, part] : rows) {
+    const auto run = RunTool(arguments);
+    EXPECT_EQ(run.exitCode, 2) << part;
+    EXPECT_EQ(run.output, "") << part;
+    EXPECT_NE(run.errors.find(part), std::string::npos) << part << ": " << run.errors;
+  }
+  EXPECT_EQ(ReadFile(file), text);
+  EXPECT_EQ(ReadFile(folder.File("HTML_doc")), "a file");
+  EXPECT_EQ(RunShell("\"$T\" html '" + file + "' --output /dev/stdout | grep -q '</html>'"), 0);
+  if (geteuid() != 0) {
+    std::filesystem::create_directory(folder.File("locked"));
+    std::filesystem::permissions(folder.File("locked"), std::filesystem::perms::owner_read);
+    const auto run = RunTool({"html", file, "--output", folder.File("locked/page.html")});
+    EXPECT_EQ(run.exitCode, 2) << run.errors;
+    std::filesystem::permissions(folder.File("locked"), std::filesystem::perms::owner_all);
+  }
 }
 
 TEST(Tool, SavesMakesAndRenames) {

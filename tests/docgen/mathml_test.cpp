@@ -15,7 +15,7 @@ constexpr const char* kEnd = "</mrow></math>\n";
 /// The right side of an expression's block.
 std::string RightSide(const std::string& expression) {
   ResetExpressionScanner();
-  const std::string block = ExpressionToMathML(expression, "s", false);
+  std::string block = ExpressionToMathML(expression, "s", false);
   const std::string start = kStart;
   const std::string end = kEnd;
   if (block.substr(0, start.size()) != start || !block.ends_with(end)) return block;
@@ -59,10 +59,45 @@ TEST(MathML, WritesEachConstruct) {
            "<mi>a</mi><mo>&#x2264;</mo><mn>1</mn></mfenced><mfenced open=\"{\" close=\"\"><mtable>" + row +
            "THEN</mtext></mtd><mtd columnalign=\"left\"><mi>b</mi></mtd></mtr>" + row +
            "ELSE</mtext></mtd><mtd columnalign=\"left\"><mi>c</mi></mtd></mtr></mtable> </mfenced> "},
+      // A conditional in a sum stays within the sum's fence, and its own sums share it.
+      {"1+IF a>b THEN c ELSE d-1",
+       fence + "<mn>1</mn><mo>+</mo><mtext mathcolor=\"blue\">IF</mtext>" + fence +
+           "<mi>a</mi><mo>></mo><mi>b</mi></mfenced><mfenced open=\"{\" close=\"\"><mtable>" + row +
+           "THEN</mtext></mtd><mtd columnalign=\"left\"><mi>c</mi></mtd></mtr>" + row +
+           "ELSE</mtext></mtd><mtd columnalign=\"left\"><mi>d</mi><mo>-</mo><mn>1</mn></mtd></mtr></mtable> "
+           "</mfenced> </mfenced>"},
+      {"f(a;g(b+c);d)",
+       "<mrow><mtext mathvariant=\"bold-italic\" "
+       "mathcolor=\"green\">F</mtext><mfenced><mrow><mi>a</mi></mrow>"
+       "<mrow><mrow><mtext mathvariant=\"bold-italic\" mathcolor=\"green\">G</mtext><mfenced><mrow>" +
+           fence +
+           "<mi>b</mi><mo>+</mo><mi>c</mi></mfenced></mrow></mfenced></mrow></mrow><mrow><mi>d</mi></mrow>"
+           "</mfenced></mrow>"},
+      {"T{(3, x), (A, [P], 1, 2, 3, 4)}",
+       "<mn>3</mn><mi>x</mi><mi>A</mi><mtext>[P]</mtext><mn>1</mn><mn>2</mn><mn>3</mn><mn>4</mn>"},
+      {"EXCEEDANCE_FREQUENCY(a==1)", fence + "<mi>a</mi><mo>=</mo><mn>1</mn></mfenced>"},
       {"a +", ""},
       {"", ""},
   };
   for (const Row& each : rows) EXPECT_EQ(RightSide(each.expression), each.markUp) << each.expression;
+}
+
+TEST(MathML, BooleanOperatorsShowAsConditionals) {
+  const std::pair<const char*, int> rows[] = {
+      {"IF a>b THEN 1 ELSE 2", 1},
+      {"IF NOT a>b THEN 1 ELSE 2", 2},
+      {"IF a>b AND c>d THEN 1 ELSE 2", 3},
+      {"IF a>b OR c>d THEN 1 ELSE 2", 3},
+  };
+  for (const auto& [expression, conditionals] : rows) {
+    const std::string text = RightSide(expression);
+    int tables = 0;
+    for (std::size_t place = text.find("<mtable>"); place != std::string::npos;
+         place = text.find("<mtable>", place + 1)) {
+      ++tables;
+    }
+    EXPECT_EQ(tables, conditionals) << expression;
+  }
 }
 
 TEST(MathML, RelationsAndDerivatives) {

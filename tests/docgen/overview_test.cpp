@@ -38,6 +38,11 @@ TEST(Overview, NumbersRunOnAndMovementsDoNotCount) {
             "7 B_Mass [Lagrange State Variable (B)] 0\n"
             "- Horizontal Vector1 [Direction (B)] 0\n- Horizontal Vector1 [Speed (B)] 0\n"
             "- Downward Velocity [Downward Velocity (B)] 0\n");
+  for (const OverviewRow& row : BuildOverview(core)) {
+    const CEL_Element* element = core.GetElement(row.uid);
+    ASSERT_NE(element, nullptr) << row.cells[1];
+    EXPECT_EQ(element->symbol.Text(), row.cells[1]) << "a row leads to its element";
+  }
   const auto summary = [&core] { return BuildOverview(core)[4].cells[3]; };
   search.variableId.SetInt(1);
   EXPECT_EQ(summary(), "DIRECTION(NONE[S])");

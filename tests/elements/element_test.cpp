@@ -2,13 +2,17 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+
 #include "core/error_registry.h"
 #include "elements/area_search.h"
 #include "elements/expression_elements.h"
+#include "elements/external_function.h"
 #include "elements/input_elements.h"
 #include "elements/miscellaneous.h"
 #include "elements/specie.h"
 #include "elements/state_variable.h"
+#include "elements/visibility.h"
 
 namespace tessal {
 namespace {
@@ -30,6 +34,15 @@ TEST(Elements, ListTheirFieldsInOrder) {
   EXPECT_EQ(
       Labels(CEL_Constant("c")),
       base + "Is user specified|Build in ID|Scope|Spatial Variation|Unit|Default Value|Min Value|Max Value|");
+  EXPECT_EQ(Labels(CEL_Forcing("f")), Labels(CEL_Constant("c")));
+  EXPECT_EQ(Labels(CEL_Lagrange_Constant("c")),
+            base + "Spatial Variation|Unit|Default Value|Min Value|Max Value|");
+  EXPECT_EQ(Labels(CEL_Lagrange_Forcing("f")), Labels(CEL_Lagrange_Constant("c")));
+  EXPECT_EQ(Labels(CEL_Lagrange_Arithmetical_Expression("a")),
+            base + "Expression type|Specie|Output|Spatial Variation|Unit|Expression|");
+  EXPECT_EQ(Labels(CEL_ExternalFunction("x")), base + "Public Name|Parameter Count|Used as|DLL|Entry Point|");
+  EXPECT_EQ(Labels(CEL_Visibility()), "");
+  EXPECT_EQ(Labels(CEL_ListHead(kind::kRoot, "r")), base.substr(base.find('|') + 1));
   EXPECT_EQ(Labels(CEL_Auxilliary_Variable("a")), base + "Output|Scope|Spatial Variation|Unit|Expression|");
   EXPECT_EQ(Labels(CEL_Process("p")),
             base +
@@ -52,6 +65,51 @@ TEST(Elements, ListTheirFieldsInOrder) {
             base +
                 "Function_ID|Variable ID|Specie ID|Radius|Dimension|Spatial "
                 "Variation|Purpose|Framework|Property|Math|Lookfor|");
+}
+
+TEST(Elements, TellTheirFieldsAsText) {
+  CEL_Process process("p");
+  process.controlValue.SetReal(0.0001);
+  process.expression.SetText("1 +");
+  std::vector<ElementField> fields;
+  process.GetFields(fields);
+  const std::pair<const char*, const char*> rows[] = {{"Caption", "Process"},
+                                                      {"Symbol", "p"},
+                                                      {"UNQ Type", "999"},
+                                                      {"Output", "True/Yes"},
+                                                      {"Control ID", "-1"},
+                                                      {"Control Value", "0.0001"},
+                                                      {"Spatial Variation", "HORISONTAL_AND_VERTICAL"},
+                                                      {"Expression", "1 +"}};
+  for (const auto& [name, text] : rows) {
+    const ElementField* field = FindField(fields, name);
+    ASSERT_NE(field, nullptr) << name;
+    EXPECT_EQ(FieldText(*field), text) << name;
+  }
+  EXPECT_EQ(FindField(fields, "Expression")->kind, FieldKind::Expression);
+  EXPECT_EQ(FindField(fields, "Scope")->choiceTexts, (std::vector<std::string>{"WS", "WC", "WB", "SED"}));
+  EXPECT_EQ(FindField(fields, "Spatial Variation")->choiceTexts,
+            (std::vector<std::string>{"NONE", "HORIZONTAL", "HORIZONTAL_AND_VERTICAL"}));
+  EXPECT_TRUE(FindField(fields, "Unit")->choiceTexts.empty());
+  EXPECT_EQ(FieldText(ElementField()), "invalid");
+}
+
+TEST(Elements, NumbersReadAsPeopleWriteThem) {
+  const std::pair<double, const char*> rows[] = {{0.0, "0"},
+                                                 {0.0001, "0.0001"},
+                                                 {0.00001, "1e-05"},
+                                                 {100000.0, "100000"},
+                                                 {1234567.0, "1234567"},
+                                                 {1e15, "1e+15"},
+                                                 {-2.5, "-2.5"},
+                                                 {0.1 + 0.2, "0.30000000000000004"},
+                                                 {1e-35, "1e-35"},
+                                                 {123456789012345.6, "123456789012345.6"},
+                                                 {-1.7976931348623157e308, "-1.7976931348623157e+308"}};
+  for (const auto& [value, text] : rows) {
+    EXPECT_EQ(RealText(value), text);
+    EXPECT_EQ(std::strtod(RealText(value).c_str(), nullptr), value);
+  }
 }
 
 TEST(Elements, SetTheFieldsTheyKnowAndCountThem) {
