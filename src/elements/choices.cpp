@@ -58,6 +58,7 @@ const ChoiceList& NoScopeChoices() {
 const ChoiceList& SpatialVariationChoices() {
   static const ChoiceList kList = [] {
     std::vector<CEL_Choice> choices;
+    choices.reserve(kSpatialVariations.size());
     for (const DisplayedText& row : kSpatialVariations) {
       choices.push_back(CEL_Choice::Text(row.display, row.fileText));
     }
