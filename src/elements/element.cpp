@@ -65,24 +65,6 @@ void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
   }
 }
 
-/// Selects the choice that stands for the property's value, so that a form opens on it.
-void SelectPresentValue(CEL_Property& property) {
-  const auto& choices = property.Choices();
-  const auto hit = std::find_if(choices.begin(), choices.end(), [&property](const CEL_Choice& choice) {
-    switch (property.Type()) {
-      case ValueType::Real:
-        return choice.realValue == property.RealValue();
-      case ValueType::Integer:
-        return choice.intValue == property.IntValue();
-      case ValueType::Boolean:
-        return choice.boolValue == property.BoolValue();
-      default:
-        return choice.fileText == property.Text();
-    }
-  });
-  property.SelectIndex(hit == choices.end() ? -1 : static_cast<std::int32_t>(hit - choices.begin()));
-}
-
 }  // namespace
 
 CEL_Element::CEL_Element(bool withSymbol, bool withId, bool withDescription)
@@ -139,9 +121,11 @@ void CEL_Element::ResetOwn() {
 }
 
 void CEL_Element::SelectPresentValues() {
-  SelectPresentValue(unqType);
-  SelectPresentValue(unqUnit);
-  for (const OwnProperty& own : ownProperties) SelectPresentValue(*own.property);
+  unqType.SelectIndex(unqType.PresentChoice());
+  unqUnit.SelectIndex(unqUnit.PresentChoice());
+  for (const OwnProperty& own : ownProperties) {
+    own.property->SelectIndex(own.property->PresentChoice());
+  }
 }
 
 std::vector<CEL_Property*> CEL_Element::BaseProperties() {

@@ -134,6 +134,23 @@ bool CEL_Property::HasChoice(std::string_view display) const {
                      [display](const CEL_Choice& choice) { return choice.display == display; });
 }
 
+std::int32_t CEL_Property::PresentChoice() const {
+  const auto& all = Choices();
+  const auto hit = std::find_if(all.begin(), all.end(), [this](const CEL_Choice& choice) {
+    switch (type) {
+      case ValueType::Real:
+        return choice.realValue == realValue;
+      case ValueType::Integer:
+        return choice.intValue == intValue;
+      case ValueType::Boolean:
+        return choice.boolValue == boolValue;
+      default:
+        return choice.fileText == text;
+    }
+  });
+  return hit == all.end() ? -1 : static_cast<std::int32_t>(hit - all.begin());
+}
+
 void CEL_Property::SelectChoice(std::string_view display) {
   const auto& list = Choices();
   const auto hit = std::find_if(list.begin(), list.end(),

@@ -131,6 +131,9 @@ class CEL_Property final {
   void ClearChoices() { choices.reset(); }
   bool HasChoice(std::string_view display) const;
 
+  /// Index of the first choice that stands for the present value, -1 for none. A NaN is like nothing.
+  std::int32_t PresentChoice() const;
+
   /// Index of the selected choice, -1 for none.
   std::int32_t Selected() const { return selected; }
   /// Selects the first choice with exactly this display text, or none.

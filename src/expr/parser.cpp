@@ -4,8 +4,8 @@
 
 namespace tessal {
 
-int ParseExpressionText(std::string text, ExpressionNode& node, std::int32_t& line, std::int32_t& position,
-                        std::string& message) {
+int ParseExpressionText(const std::string& text, ExpressionNode& node, std::int32_t& line,
+                        std::int32_t& position, std::string& message) {
   line = -1;
   position = -1;
   message.clear();

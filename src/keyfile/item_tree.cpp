@@ -44,6 +44,7 @@ std::string CKvfBaseItem::Path() const {
   std::vector<const CKvfBaseItem*> way;
   for (const CKvfBaseItem* item = this; item->parent != nullptr; item = item->parent) way.push_back(item);
   std::string path;
+  // NOLINTNEXTLINE(modernize-loop-convert)
   for (auto item = way.rbegin(); item != way.rend(); ++item) path += "." + (*item)->name;
   return path;
 }

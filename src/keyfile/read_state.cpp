@@ -141,6 +141,7 @@ void ReadState::Finish(std::uint32_t header, std::uint32_t /*targets*/) {
     TurnRound(*items[header]);
     root->AdoptChild(std::move(items[header]));
   }
+  // NOLINTNEXTLINE(modernize-loop-convert)
   for (auto target = targetsBackwards.rbegin(); target != targetsBackwards.rend(); ++target) {
     root->AdoptChild(std::move(*target));
   }

@@ -48,29 +48,6 @@ QString TextIn(const QWidget& editor) {
   return {};
 }
 
-/// Whether a choice stands for the present value of a property; a NaN is like nothing.
-bool IsPresent(const CEL_Choice& choice, const CEL_Property& property) {
-  switch (property.Type()) {
-    case ValueType::Real:
-      return choice.realValue == property.RealValue();
-    case ValueType::Integer:
-      return choice.intValue == property.IntValue();
-    case ValueType::Boolean:
-      return choice.boolValue == property.BoolValue();
-    default:
-      return choice.fileText == property.Text();
-  }
-}
-
-/// The index of the choice that stands for the present value; the selected one when none does.
-int PresentChoice(const CEL_Property& property) {
-  const auto& choices = property.Choices();
-  const auto hit = std::find_if(choices.begin(), choices.end(), [&property](const CEL_Choice& choice) {
-    return IsPresent(choice, property);
-  });
-  return hit == choices.end() ? property.Selected() : static_cast<int>(hit - choices.begin());
-}
-
 bool IsShort(FieldEditor editor) {
   switch (editor) {
     case FieldEditor::ShortLine:
@@ -326,7 +303,8 @@ void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Pro
     });
   }
   for (const auto& [caption, index] : entries) combo.addItem(caption, index);
-  combo.setCurrentIndex(combo.findData(PresentChoice(property)));
+  const std::int32_t present = property.PresentChoice();
+  combo.setCurrentIndex(combo.findData(present < 0 ? property.Selected() : present));
 }
 
 void CElementForm::FormToItem() {

@@ -39,7 +39,7 @@ class ExpressionMaker final {
 
  private:
   std::string Condition(int depth) {
-    const std::string comparison = Expression(depth) + " >= " + Leaf();
+    std::string comparison = Expression(depth) + " >= " + Leaf();
     switch (Pick(4)) {
       case 0:
         return comparison + " AND " + Leaf() + " != " + Leaf();

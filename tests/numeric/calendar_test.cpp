@@ -88,7 +88,9 @@ TEST(Calendar, FarDatesComeBack) {
 
 TEST(Calendar, TimeOfDayIsCutOffWithinASecond) {
   for (int second = 0; second < 86400; ++second) {
-    const double time = SerialDate(2024, 5, 17, second / 3600, second / 60 % 60, second % 60);
+    const int hour = second / 3600;
+    const int minute = second / 60 % 60;
+    const double time = SerialDate(2024, 5, 17, hour, minute, second % 60);
     const double read = HourOf(time) * 3600 + MinuteOf(time) * 60 + SecondOf(time);
     ASSERT_TRUE(read == second || read == second - 1) << second << " reads " << read;
     ASSERT_EQ(DayOf(time), 17);
