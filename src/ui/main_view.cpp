@@ -77,6 +77,8 @@ void CMainView::OnInitialUpdate() {
   connect(help, &QAction::triggered, this, &CMainView::ShowHelp);
   addAction(help);
   tree->setCurrentItem(tree->RootItem());
+  // A host that gives the view the focus gives it to the tree.
+  setFocusProxy(tree);
   UpdateNavigation();
 }
 

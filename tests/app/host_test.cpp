@@ -199,6 +199,7 @@ TEST_F(Host, SavesWhatIsBeingEnteredAndTakesTheMarkOff) {
   const QString path = Model("m.tessal");
   ASSERT_TRUE(window.OpenFile(path));
   EXPECT_EQ(window.windowTitle(), QString::fromUtf8("m.tessal \u2013 Tessal"));
+  EXPECT_EQ(QApplication::focusWidget()->objectName(), "1127") << "the keyboard begins in the tree";
   Edit("typed");
   EXPECT_TRUE(window.SaveCurrent());
   EXPECT_TRUE(QString::fromStdString(test::ReadFile(path.toStdString())).contains("typed"));
