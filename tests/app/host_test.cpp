@@ -315,9 +315,8 @@ TEST_F(Host, FiftyDocumentsLeaveNothingBehind) {
   openAndClose(kHalf);
   const long before = ResidentKilobytes();
   openAndClose(kHalf);
-  // A document of this size holds several megabytes: one that stayed each time would show. The sanitizers
-  // keep freed memory back for a while, up to their quarantine's size.
-  constexpr long kMostGrowth = 300L * 1024;
+  // A document of this size with its view holds about a megabyte: each one that stayed would show.
+  constexpr long kMostGrowth = 15L * 1024;
   EXPECT_LT(ResidentKilobytes() - before, kMostGrowth);
 }
 

@@ -6,11 +6,17 @@
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
-// What the font library keeps for the life of the process. The name is the leak sanitizer's.
+// Settings of the sanitizers, under the names that they look for: what the font library keeps for the life of
+// the process is no leak, and little freed memory is held back, so that a test may watch the process's size.
 extern "C" const char* __lsan_default_suppressions();  // NOLINT(bugprone-reserved-identifier)
+extern "C" const char* __asan_default_options();       // NOLINT(bugprone-reserved-identifier)
 
 extern "C" const char* __lsan_default_suppressions() {  // NOLINT(bugprone-reserved-identifier)
   return "leak:libfontconfig\n";
+}
+
+extern "C" const char* __asan_default_options() {  // NOLINT(bugprone-reserved-identifier)
+  return "quarantine_size_mb=8";
 }
 
 int main(int count, char** arguments) {
