@@ -38,6 +38,8 @@ constexpr int kSmallestErrors = 50;
 constexpr QSize kSmallestView(500, 300);
 constexpr int kTitleWeight = 700;
 constexpr int kTitleHeight = 14;
+constexpr int kUsualTree = 260;
+constexpr int kUsualErrors = 140;
 constexpr int kMargin = 4;
 constexpr QSize kIcons(18, 18);
 
@@ -103,16 +105,42 @@ void CMainView::BuildToolBar() {
 }
 
 void CMainView::BuildLayout() {
-  title = MakeChild<CLabel>(this);
-  title->setObjectName(QString::number(control_id::kTitle));
-  title->SetFontWeight(kTitleWeight);
-  // Where the user's font is larger than usual, the title is no smaller than what stands under it.
-  title->SetFontHeight(std::max(kTitleHeight, QFontInfo(font()).pixelSize() + 2));
   tree = MakeChild<CElementTree>(this);
   tree->setMinimumWidth(kSmallestTree);
   tree->installEventFilter(this);
   errorList = MakeChild<CErrorList>(this);
   errorList->setMinimumHeight(kSmallestErrors);
+
+  auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
+  treeDetail->setObjectName(QStringLiteral("TreeDetail"));
+  treeDetail->addWidget(tree);
+  treeDetail->addWidget(MakeTitleDetail());
+  treeDetail->setStretchFactor(1, 1);
+  treeDetail->setMinimumHeight(kSmallestUpper);
+  treeDetail->setChildrenCollapsible(false);
+  treeDetail->setSizes({kUsualTree, 3 * kUsualTree});
+
+  auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
+  topBottom->setObjectName(QStringLiteral("TopBottom"));
+  topBottom->addWidget(treeDetail);
+  topBottom->addWidget(errorList);
+  topBottom->setStretchFactor(0, 1);
+  topBottom->setChildrenCollapsible(false);
+  topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
+
+  auto* layout = MakeChild<QVBoxLayout>(this);
+  layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
+  layout->setSpacing(0);
+  layout->addWidget(toolBar);
+  layout->addWidget(topBottom, 1);
+}
+
+QWidget* CMainView::MakeTitleDetail() {
+  title = MakeChild<CLabel>(this);
+  title->setObjectName(QString::number(control_id::kTitle));
+  title->SetFontWeight(kTitleWeight);
+  // Where the user's font is larger than usual, the title is no smaller than what stands under it.
+  title->SetFontHeight(std::max(kTitleHeight, QFontInfo(font()).pixelSize() + 2));
 
   auto* area = MakeChild<QScrollArea>(this);
   area->setWidgetResizable(true);
@@ -124,35 +152,13 @@ void CMainView::BuildLayout() {
   area->setWidget(holder);
 
   auto* titleDetail = MakeChild<QWidget>(this);
+  titleDetail->setObjectName(QStringLiteral("TitleDetail"));
   titleDetail->setMinimumWidth(kSmallestForm);
-  auto* detailLayout = MakeChild<QVBoxLayout>(titleDetail);
-  detailLayout->setContentsMargins(0, 0, 0, 0);
-  detailLayout->addWidget(title);
-  detailLayout->addWidget(area, 1);
-
-  auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
-  treeDetail->setObjectName(QStringLiteral("TreeDetail"));
-  treeDetail->addWidget(tree);
-  treeDetail->addWidget(titleDetail);
-  treeDetail->setStretchFactor(1, 1);
-  treeDetail->setMinimumHeight(kSmallestUpper);
-  treeDetail->setChildrenCollapsible(false);
-  auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
-  topBottom->setObjectName(QStringLiteral("TopBottom"));
-  topBottom->addWidget(treeDetail);
-  topBottom->addWidget(errorList);
-  topBottom->setStretchFactor(0, 1);
-  topBottom->setChildrenCollapsible(false);
-  constexpr int kUsualTree = 260;
-  constexpr int kUsualErrors = 140;
-  treeDetail->setSizes({kUsualTree, 3 * kUsualTree});
-  topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
-
-  auto* layout = MakeChild<QVBoxLayout>(this);
-  layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
-  layout->setSpacing(0);
-  layout->addWidget(toolBar);
-  layout->addWidget(topBottom, 1);
+  auto* rows = MakeChild<QVBoxLayout>(titleDetail);
+  rows->setContentsMargins(0, 0, 0, 0);
+  rows->addWidget(title);
+  rows->addWidget(area, 1);
+  return titleDetail;
 }
 
 void CMainView::MarkDocument() {

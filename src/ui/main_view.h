@@ -62,6 +62,8 @@ class CMainView final : public QWidget, public CView {
  private:
   void BuildToolBar();
   void BuildLayout();
+  /// The title with the holder of the forms under it.
+  QWidget* MakeTitleDetail();
   TemplateCore& Core() const;
 
   void OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* previous);
