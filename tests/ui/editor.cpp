@@ -60,6 +60,12 @@ QStringList ScriptedUser::TakeLog() {
   return std::exchange(log, {});
 }
 
+TemplateText SmallModel() {
+  TemplateText text;
+  text.StateVariable("S", "p").Constant("k").Forcing("f").Auxiliary("a", "k*f").Process("p", "a*S");
+  return text;
+}
+
 Editor::Editor(const std::string& templateText)
     : path(folder.Write("model.tessal", templateText)), document(std::make_unique<CTessalDoc>(user)) {
   if (!document->OnOpenDocument(path)) return;

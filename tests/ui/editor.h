@@ -13,6 +13,7 @@
 
 #include "core/document.h"
 #include "support/qt_print.h"
+#include "support/template_text.h"
 #include "support/temporary_folder.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
@@ -47,6 +48,10 @@ class ScriptedUser final : public UserDialogs {
  private:
   QStringList log;
 };
+
+/// One element of each kind with a symbol: the auxiliary a uses k and f, the process p uses a, and S is made
+/// of p.
+TemplateText SmallModel();
 
 class Editor final {
  public:

@@ -17,6 +17,7 @@ namespace tessal {
 namespace {
 
 using test::Editor;
+using test::SmallModel;
 using test::TemplateText;
 
 constexpr int kSymbol = 1097;
@@ -32,14 +33,8 @@ constexpr int kMinimum = 1085;
 constexpr int kExpression = 1115;
 constexpr int kReferencedIn = 1094;
 
-TemplateText Model() {
-  TemplateText text;
-  text.StateVariable("S", "p").Constant("k").Forcing("f").Auxiliary("a", "k*f").Process("p", "a*S");
-  return text;
-}
-
 TEST(Commit, ComesWithTheLossOfFocusAndNotBefore) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   CEL_Constant& constant = editor.Core().GetConstant(0);
   editor.Select("k");
@@ -64,7 +59,7 @@ TEST(Commit, ComesWithTheLossOfFocusAndNotBefore) {
 }
 
 TEST(Commit, AnExpressionWaitsForAnotherReason) {
-  Editor editor(Model().Constant("k2").Text());
+  Editor editor(SmallModel().Constant("k2").Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("a");
   editor.Enter(kExpression, "k*k2");
@@ -116,7 +111,7 @@ TEST(Rename, AsksAndRefusesInItsOrder) {
       {"spare", "other", true, {}, "other", "k*f"},
   };
   for (const Row& row : rows) {
-    Editor editor(Model().Constant("spare").Text());
+    Editor editor(SmallModel().Constant("spare").Text());
     ASSERT_TRUE(editor.IsOpen());
     editor.Select(row.node);
     editor.Enter(kSymbol, row.entered);
@@ -128,7 +123,7 @@ TEST(Rename, AsksAndRefusesInItsOrder) {
 }
 
 TEST(Rename, WithoutItsUsesLeavesThemUndefined) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("k");
   editor.User().answers = {false, false};
@@ -140,7 +135,7 @@ TEST(Rename, WithoutItsUsesLeavesThemUndefined) {
 }
 
 TEST(Rename, WritesNothingElse) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("k");
   auto& symbol = editor.Field<QLineEdit>(kSymbol);
@@ -153,7 +148,7 @@ TEST(Rename, WritesNothingElse) {
 }
 
 TEST(Undefined, AsksOnceInTheOrderOfAppearance) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("a");
   editor.Type(kExpression, "one+two+three");
@@ -186,7 +181,7 @@ TEST(Undefined, ParticleKindsGoIntoTheClassOfTheUser) {
 }
 
 TEST(Choice, ReachesTheTemplateAtOnceAndBringsWhatHangsOnIt) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("k");
   editor.Choose(kUnitType, "Process rate");
@@ -219,7 +214,7 @@ TEST(Choice, ReachesTheTemplateAtOnceAndBringsWhatHangsOnIt) {
 }
 
 TEST(Choice, ANewScopeBringsItsSpatialVariation) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("p");
   ASSERT_EQ(editor.Text(kSpatial), "HORIZONTAL_AND_VERTICAL");
@@ -239,7 +234,7 @@ TEST(Numbers, AreReadByTheRulesOfFiles) {
       {"", 0, "0"},        {" 6 ", 6, "6"},          {"009", 9, "9"},
   };
   for (const Row& row : kRows) {
-    Editor editor(Model().Text());
+    Editor editor(SmallModel().Text());
     ASSERT_TRUE(editor.IsOpen());
     editor.Core().GetConstant(0).defaultValue.SetReal(9);
     editor.Select("k");
@@ -252,7 +247,7 @@ TEST(Numbers, AreReadByTheRulesOfFiles) {
 TEST(Texts, OfFilesStayToTheByteUnlessEdited) {
   const std::string longText(5000, 'x');
   const std::string western = "gr\xFCn und blau";
-  Editor editor(Model()
+  Editor editor(SmallModel()
                     .Constant("long")
                     .With("DESCRIPTION", "|" + longText + "|")
                     .With("ONLINE_HELP", "|" + longText + "|")
@@ -285,7 +280,7 @@ void Paste(QWidget& field, const QString& plain) {
 }
 
 TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   CEL_Auxilliary_Variable& auxiliary = editor.Core().GetAuxiliary(0);
   constexpr qsizetype kMegabyte = 1 << 20;
@@ -312,7 +307,7 @@ TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
 }
 
 TEST(ReferencedIn, NamesTheUsers) {
-  Editor editor(Model().DerivedOutput("k").Text());
+  Editor editor(SmallModel().DerivedOutput("k").Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("a");
   EXPECT_EQ(editor.Text(kReferencedIn), "p");
@@ -328,7 +323,7 @@ TEST(Settings, ParticleFieldsAreOpenWithAParticleClass) {
   constexpr int kBearing = 1054;
   constexpr int kSearchTree = 1041;
   for (const bool particles : {false, true}) {
-    TemplateText text = Model().Misc("DOCUMENT_REVISION = 7\n");
+    TemplateText text = SmallModel().Misc("DOCUMENT_REVISION = 7\n");
     if (particles) text.Specie("Fish", "Fish_up", {{"Fish_up", "1"}});
     Editor editor(text.Text());
     ASSERT_TRUE(editor.IsOpen());
@@ -336,7 +331,7 @@ TEST(Settings, ParticleFieldsAreOpenWithAParticleClass) {
     EXPECT_EQ(editor.Field<QWidget>(kBearing).isEnabled(), particles);
     EXPECT_EQ(editor.Field<QWidget>(kSearchTree).isEnabled(), particles);
   }
-  Editor editor(Model().Misc("DOCUMENT_REVISION = 7\n").Text());
+  Editor editor(SmallModel().Misc("DOCUMENT_REVISION = 7\n").Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("Miscellaneous");
   EXPECT_EQ(editor.Text(1077), "2017.001");
@@ -380,7 +375,7 @@ TEST(Documentation, IsLookedForInThreePlaces) {
 }
 
 TEST(Documentation, AChosenFileWaitsForTheNextCommit) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("k");
   editor.User().documentationFile = "/docs/manual";
@@ -396,7 +391,7 @@ TEST(Documentation, AChosenFileWaitsForTheNextCommit) {
 }
 
 TEST(Document, AsksBeforeItSavesMessagesOfItsOwn) {
-  Editor editor(Model().Text());
+  Editor editor(SmallModel().Text());
   ASSERT_TRUE(editor.IsOpen());
   editor.Select("k");
   editor.Enter(kDefault, "-1");

@@ -17,6 +17,7 @@ namespace tessal {
 namespace {
 
 using test::Editor;
+using test::SmallModel;
 using test::TemplateText;
 
 /// The captions of a tree, indented.
@@ -29,12 +30,6 @@ std::string Outline(const QTreeWidgetItem& item, const std::string& indent = "")
 void Send(Editor& editor, int number, std::int32_t argument = 0) {
   const NumberHint hint(argument);
   editor.Document().UpdateAllViews(nullptr, number, &hint);
-}
-
-TemplateText SmallModel() {
-  TemplateText text;
-  text.StateVariable("S", "p").Constant("k").Forcing("f").Auxiliary("a", "k*f").Process("p", "a*S");
-  return text;
 }
 
 TEST(Tree, ShowsEveryKindInItsPlace) {
