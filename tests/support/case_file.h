@@ -1,0 +1,56 @@
+// Expectations as text. A file of cases says what goes in and, after each call, what comes out; a listing is
+// one whole text in a file of its own. Both lie below tests/, and both are written again from what the
+// program does when TESSAL_BLESS is set (`./dev test --bless`): the diff of the file is then the review.
+//
+// A file of cases:
+//
+//     # What stands before the first case is a remark.
+//     == The title of a case
+//     input, as many lines as it has
+//     > call with its words
+//     what the call gives, line by line
+//     > another call
+//
+// Empty lines only separate. In input and output a backslash begins what a line cannot show: `\\`, `\t`,
+// `\r`, `\xHH`,
+// `\s` for a blank at a line's end, `\>` and `\=` at its start; a lone backslash is an empty line, and `\c`
+// ends a text that has no line feed at its end.
+#pragma once
+
+#include <functional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace tessal::test {
+
+struct CaseCall {
+  std::string words;     ///< what follows the prompt
+  std::string expected;  ///< with its line ends
+  int line = 0;          ///< of the prompt in the file, from 1
+};
+
+struct Case {
+  std::string title;
+  std::string input;  ///< without the last line's end
+  std::vector<CaseCall> calls;
+  int line = 0;
+};
+
+/// Answers one call of a case.
+using Answer = std::function<std::string(const CaseCall&)>;
+
+/// Runs all calls of all cases of a file. Each case begins with a fresh answer, so that an answer may keep
+/// state from call to call.
+void RunCases(std::string_view file, const std::function<Answer(const Case&)>& begin);
+
+/// Compares a text with the file that holds it.
+void ExpectListing(std::string_view file, std::string_view actual);
+
+/// Whether expectations are written instead of compared.
+bool Blessing();
+
+/// A text as case files and listings show it: escaped, each line ended.
+std::string ShownText(std::string_view text);
+
+}  // namespace tessal::test
