@@ -39,7 +39,7 @@ std::size_t ListErrors(TemplateCore& core) {
   core.ValidateTemplate();
   std::vector<std::pair<std::string, std::string>> rows;
   for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
-    std::int32_t uid = 0;
+    Uid uid = Uid::None;
     auto& [symbol, text] = rows.emplace_back();
     Errors().GetErrorForList(index, symbol, uid, text);
   }

@@ -41,22 +41,22 @@ constexpr std::array<const char*, 12> kTexts = {
     "a + ^", "[XPOS]"};
 constexpr std::array<const char*, 8> kNames = {"a", "b", "K", "Mass", "new_name", "Fish", "SIN", "two words"};
 
-std::uint32_t AnyUid(const TemplateCore& core, Choices& choices) {
+Uid AnyUid(const TemplateCore& core, Choices& choices) {
   const auto& table = core.SymbolTable();
-  return table.empty() ? 0 : table[choices.Pick(table.size())].element->GetUid();
+  return table.empty() ? Uid::None : table[choices.Pick(table.size())].element->GetUid();
 }
 
 void Add(TemplateCore& core, Choices& choices) {
   CreateRequest request;
-  request.kind = static_cast<std::uint32_t>(1 + choices.Pick(13));
+  request.kind = KindAfter(ElementKind::StateVariable, choices.Pick(13));
   request.symbol = choices.Pick(2) == 0 ? "" : kNames[choices.Pick(kNames.size() - 1)];
   // A derived output has no symbol in the file: its place names it.
-  const bool isUnnamed = request.kind == static_cast<std::uint32_t>(kind::kDerivedOutput);
+  const bool isUnnamed = request.kind == ElementKind::DerivedOutput;
   if (isUnnamed || core.SymbolExists(request.symbol)) request.symbol.clear();
-  if (request.kind > 7 && core.GetSpecieCount() > 0) {
+  if (request.kind > ElementKind::Specie && core.GetSpecieCount() > 0) {
     const auto& specie = core.GetSpecie(choices.Pick(core.GetSpecieCount()));
     // Any list head names its class.
-    request.ownerId = specie.Head(kind::kSpecieConstantList).MessageUid();
+    request.ownerId = specie.Head(ElementKind::SpecieConstantList).GetUid();
   }
   core.CreateElement(request);
   SetNotifyChanges(true);
@@ -104,13 +104,12 @@ void ChangeTexts(TemplateCore& core, Choices& choices) {
       core.Root().onlineHelp.SetText(text);
       break;
     case 1:
-      core.ListHead(static_cast<std::int32_t>(kind::kStateVariableList + choices.Pick(6)))
-          .description.SetText(text);
+      core.ListHead(KindAfter(ElementKind::StateVariableList, choices.Pick(6))).description.SetText(text);
       break;
     case 2:
       if (core.GetSpecieCount() == 0) break;
       core.GetSpecie(choices.Pick(core.GetSpecieCount()))
-          .Head(static_cast<std::int32_t>(kind::kSpecieStateVariableList + choices.Pick(5)))
+          .Head(KindAfter(ElementKind::SpecieStateVariableList, choices.Pick(5)))
           .documentation.SetText(text);
       break;
     case 3:
@@ -161,13 +160,13 @@ void Edit(TemplateCore& core, Choices& choices) {
       core.DeleteElement(AnyUid(core, choices));
       break;
     case 3: {
-      const std::uint32_t moved = AnyUid(core, choices);
+      const Uid moved = AnyUid(core, choices);
       core.MoveElement(moved, AnyUid(core, choices), choices.Pick(2) == 0);
       break;
     }
     case 4: {
       const CEL_Element* renamed = core.GetElement(AnyUid(core, choices));
-      if (renamed == nullptr || renamed->Kind() == kind::kDerivedOutput) break;
+      if (renamed == nullptr || renamed->Kind() == ElementKind::DerivedOutput) break;
       core.RenameSymbol(renamed->symbol.Text(), kNames[choices.Pick(kNames.size())], choices.Pick(2) == 0);
       break;
     }

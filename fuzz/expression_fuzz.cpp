@@ -69,7 +69,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   CheckTokens(text);
   CheckParse(text);
   tessal::ResetExpressionScanner();
-  tessal::CheckFunctionsSpecified("fuzz", 1, text);
+  tessal::CheckFunctionsSpecified("fuzz", Uid{1}, text);
   tessal::IsReservedName(text);
   tessal::IsValidSymbol(text);
   tessal::Errors().Reset();

@@ -17,7 +17,7 @@ using fuzz::Require;
 std::vector<std::string> SymbolsOf(const TemplateCore& core) {
   std::vector<std::string> symbols;
   for (const SymbolRecord& record : core.SymbolTable()) {
-    Require(record.element->Kind() != kind::kNone, "a record has an element of a kind");
+    Require(record.element->Kind() != ElementKind::None, "a record has an element of a kind");
     symbols.push_back(core.RecordSymbol(record));
     for (const std::uint32_t used : record.references) {
       const SymbolRecord* other = core.FindRecordBySequence(used);

@@ -31,8 +31,8 @@ Json ToJson(const TemplateMessages& messages) {
     errors.push_back({{"level", message.level},
                       {"word", message.word},
                       {"symbol", JsonText(message.symbol)},
-                      {"uid", message.uid},
-                      {"kind", message.kind},
+                      {"uid", NumberOf(message.uid)},
+                      {"kind", NumberOf(message.kind)},
                       {"text", JsonText(message.text)}});
   }
   Json undefined = Json::array();

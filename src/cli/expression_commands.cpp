@@ -111,7 +111,7 @@ Answer TokenLine(const std::string& expression) {
 
 Answer Findings(const std::string& expression) {
   Errors().ClearErrors();
-  CheckFunctionsSpecified("", 0, expression);
+  CheckFunctionsSpecified("", Uid::None, expression);
   Answer answer;
   for (const ErrorRecord& record : Errors().Records()) {
     answer.text += std::string(WithoutLineFeed(record.text)) + '\n';

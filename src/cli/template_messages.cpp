@@ -21,19 +21,17 @@ class ElementIndex final {
       entries.try_emplace(record.uid, Entry{record.element, &record});
     }
     Add(core.Root());
-    for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
-      Add(core.ListHead(list));
-    }
+    for (const auto& head : core.ListHeads()) Add(*head);
     if (CEL_Miscanellous* misc = core.GetMisc()) Add(*misc);
   }
 
   /// The element with that identity, or none.
-  const CEL_Element* Find(std::uint32_t uid) const {
+  const CEL_Element* Find(Uid uid) const {
     const auto hit = entries.find(uid);
     return hit == entries.end() ? nullptr : hit->second.element;
   }
   /// Its first record, or none.
-  const SymbolRecord* RecordOf(std::uint32_t uid) const {
+  const SymbolRecord* RecordOf(Uid uid) const {
     const auto hit = entries.find(uid);
     return hit == entries.end() ? nullptr : hit->second.record;
   }
@@ -46,7 +44,7 @@ class ElementIndex final {
 
   void Add(const CEL_Element& element) { entries.try_emplace(element.GetUid(), Entry{&element, nullptr}); }
 
-  std::unordered_map<std::uint32_t, Entry> entries;
+  std::unordered_map<Uid, Entry> entries;
 };
 
 TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements) {
@@ -54,11 +52,10 @@ TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements
   message.level = record.level;
   message.word = LevelWord(record.level);
   message.symbol = record.symbol;
-  message.uid = record.uid > 0 ? record.uid : -1;
+  message.uid = IsElement(record.uid) ? record.uid : kNoElement;
   message.text = WithoutLineFeed(record.text);
-  const CEL_Element* element =
-      record.uid > 0 ? elements.Find(static_cast<std::uint32_t>(record.uid)) : nullptr;
-  message.kind = element == nullptr ? 0 : element->Kind();
+  const CEL_Element* element = IsElement(record.uid) ? elements.Find(record.uid) : nullptr;
+  message.kind = element == nullptr ? ElementKind::None : element->Kind();
   message.line = element == nullptr ? record.line : element->SourceLine();
   return message;
 }
@@ -67,7 +64,7 @@ UndefinedName Describe(const UndefinedSymbol& undefined, const ElementIndex& ele
                        const TemplateCore& core) {
   UndefinedName name;
   name.symbol = undefined.symbol;
-  for (const std::uint32_t uid : undefined.usedBy) {
+  for (const Uid uid : undefined.usedBy) {
     const SymbolRecord* record = elements.RecordOf(uid);
     name.usedBy.push_back(
         record == nullptr ? UndefinedName::User{"unknown", 0}

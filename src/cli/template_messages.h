@@ -5,15 +5,18 @@
 #include <string>
 #include <vector>
 
+#include "elements/element_kind.h"
+#include "platform/uid.h"
+
 namespace tessal::cli {
 
 struct TemplateMessage {
   std::uint32_t level;
   std::string word;
   std::string symbol;
-  std::int32_t uid;
-  std::int32_t kind;  ///< the element's, 0 for none
-  int line;           ///< of the element's sub-section or of the place in the file, from 1; 0 for none
+  Uid uid;
+  ElementKind kind;  ///< the element's
+  int line;          ///< of the element's sub-section or of the place in the file, from 1; 0 for none
   std::string text;
 };
 

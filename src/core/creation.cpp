@@ -13,37 +13,37 @@ constexpr std::uint32_t kPlainKindsMask = 31;
 /// What a name may become, by the kind of its last user that has a row here. The masks carry the rules of
 /// scope and order into the offer.
 struct OfferRow {
-  std::int32_t userKind;
+  ElementKind userKind;
   std::uint32_t mask;
 };
 
 constexpr std::array<OfferRow, 8> kOffers = {{
-    {kind::kStateVariable, 16},
-    {kind::kAuxiliary, 15},
-    {kind::kSpecieStateVariable, 256},
-    {kind::kSpecieConstant, 486},
-    {kind::kSpatialFunction, 486},
-    {kind::kHorizontalVector, 486},
-    {kind::kVerticalEquation, 486},
-    {kind::kArithmeticExpression, 487},
+    {ElementKind::StateVariable, 16},
+    {ElementKind::Auxiliary, 15},
+    {ElementKind::SpecieStateVariable, 256},
+    {ElementKind::SpecieConstant, 486},
+    {ElementKind::SpatialFunction, 486},
+    {ElementKind::HorizontalVector, 486},
+    {ElementKind::VerticalEquation, 486},
+    {ElementKind::ArithmeticExpression, 487},
 }};
 
 /// The kind, and for a member of a particle class the list, that each index of the choice stands for.
 struct ChoiceRow {
-  std::int32_t kind;
-  std::int32_t listKind;
+  ElementKind kind;
+  ElementKind listKind;
 };
 
 constexpr std::array<ChoiceRow, 9> kChoices = {{
-    {kind::kStateVariable, 0},
-    {kind::kConstant, 0},
-    {kind::kForcing, 0},
-    {kind::kAuxiliary, 0},
-    {kind::kProcess, 0},
-    {kind::kSpecieStateVariable, kind::kSpecieStateVariableList},
-    {kind::kSpecieConstant, kind::kSpecieConstantList},
-    {kind::kSpatialFunction, kind::kSpatialFunctionList},
-    {kind::kArithmeticExpression, kind::kArithmeticExpressionList},
+    {ElementKind::StateVariable, ElementKind::None},
+    {ElementKind::Constant, ElementKind::None},
+    {ElementKind::Forcing, ElementKind::None},
+    {ElementKind::Auxiliary, ElementKind::None},
+    {ElementKind::Process, ElementKind::None},
+    {ElementKind::SpecieStateVariable, ElementKind::SpecieStateVariableList},
+    {ElementKind::SpecieConstant, ElementKind::SpecieConstantList},
+    {ElementKind::SpatialFunction, ElementKind::SpatialFunctionList},
+    {ElementKind::ArithmeticExpression, ElementKind::ArithmeticExpressionList},
 }};
 
 void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, const std::string& documentation) {
@@ -56,33 +56,33 @@ void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, const std
 }  // namespace
 
 CEL_Element* TemplateCore::AddByRequest(const CreateRequest& request) {
-  CEL_Lagrange_Specie* specie = GetParentSpecie(static_cast<std::uint32_t>(request.ownerId));
-  switch (static_cast<std::int32_t>(request.kind)) {
-    case kind::kStateVariable:
+  CEL_Lagrange_Specie* specie = GetParentSpecie(request.ownerId);
+  switch (request.kind) {
+    case ElementKind::StateVariable:
       return &AddStateVariable();
-    case kind::kConstant:
+    case ElementKind::Constant:
       return &AddConstant();
-    case kind::kForcing:
+    case ElementKind::Forcing:
       return &AddForcing();
-    case kind::kAuxiliary:
+    case ElementKind::Auxiliary:
       return &AddAuxiliary();
-    case kind::kProcess:
+    case ElementKind::Process:
       return &AddProcess();
-    case kind::kDerivedOutput:
+    case ElementKind::DerivedOutput:
       return &AddDerivedOutput();
-    case kind::kSpecie:
+    case ElementKind::Specie:
       return &AddSpecie();
-    case kind::kSpecieStateVariable:
+    case ElementKind::SpecieStateVariable:
       return specie == nullptr ? nullptr : &specie->AddStateVariable();
-    case kind::kSpecieConstant:
+    case ElementKind::SpecieConstant:
       return specie == nullptr ? nullptr : &specie->AddConstant();
-    case kind::kSpecieForcing:
+    case ElementKind::SpecieForcing:
       return specie == nullptr ? nullptr : &specie->AddForcing();
-    case kind::kSpatialFunction:
+    case ElementKind::SpatialFunction:
       return specie == nullptr ? nullptr : &specie->AddSpatialFunction();
-    case kind::kArithmeticExpression:
+    case ElementKind::ArithmeticExpression:
       return specie == nullptr ? nullptr : &specie->AddArithmeticExpression();
-    case kind::kHorizontalVector:
+    case ElementKind::HorizontalVector:
       return specie == nullptr ? nullptr : &specie->AddHorizontalVector();
     default:
       return nullptr;
@@ -94,7 +94,7 @@ CreatedElement TemplateCore::CreateElement(const CreateRequest& request) {
   SetNotifyChanges(false);
   CreatedElement created;
   if (CEL_Element* element = AddByRequest(request)) {
-    if (!request.symbol.empty() && element->Kind() != kind::kHorizontalVector) {
+    if (!request.symbol.empty() && element->Kind() != ElementKind::HorizontalVector) {
       GiveDefaultTexts(*element, request.symbol, root.documentation.Text());
     }
     flags.modified = true;
@@ -110,20 +110,20 @@ CreateRequest TemplateCore::RequestFor(const UndefinedSymbol& undefined, int cho
   CreateRequest request;
   const ChoiceRow& row = kChoices.at(static_cast<std::size_t>(choice));
   request.symbol = undefined.symbol;
-  request.kind = static_cast<std::uint32_t>(row.kind);
-  if (row.listKind == 0) return request;
-  for (const std::uint32_t user : undefined.usedBy) {
+  request.kind = row.kind;
+  if (row.listKind == ElementKind::None) return request;
+  for (const Uid user : undefined.usedBy) {
     const SymbolRecord* record = FindRecordByUid(user);
     if (record == nullptr || record->specieIndex < 0) continue;
     const auto& specie = At(species, static_cast<std::size_t>(record->specieIndex));
-    request.ownerId = specie.Head(row.listKind).MessageUid();
+    request.ownerId = specie.Head(row.listKind).GetUid();
   }
   return request;
 }
 
 std::uint32_t TemplateCore::OfferMask(const UndefinedSymbol& undefined) const {
   std::uint32_t mask = kPlainKindsMask;
-  for (const std::uint32_t user : undefined.usedBy) {
+  for (const Uid user : undefined.usedBy) {
     const SymbolRecord* record = FindRecordByUid(user);
     if (record == nullptr) continue;
     for (const OfferRow& row : kOffers) {

@@ -4,20 +4,23 @@
 #include <cstdint>
 #include <string>
 
+#include "elements/element_kind.h"
+#include "platform/uid.h"
+
 namespace tessal {
 
 /// What is to be made.
 struct CreateRequest {
-  std::string symbol;        ///< empty: the element keeps its default name and has no texts
-  std::uint32_t kind = 0;    ///< one of the kinds 1 to 13
-  std::int32_t ownerId = 0;  ///< for kinds 8 to 13 the identity of the list head in the particle class
+  std::string symbol;                    ///< empty: the element keeps its default name and has no texts
+  ElementKind kind = ElementKind::None;  ///< one of those from StateVariable to HorizontalVector
+  Uid ownerId = Uid::None;  ///< for kinds 8 to 13 the identity of the list head in the particle class
 };
 
 /// A new element and its place among its siblings.
 struct CreatedElement {
-  std::uint32_t uid = 0;          ///< 0 when nothing was made
-  bool placed = false;            ///< moved ahead of its users, behind the predecessor
-  std::uint32_t predecessor = 0;  ///< identity of the element before it, 0 for the first place
+  Uid uid = Uid::None;          ///< 0 when nothing was made
+  bool placed = false;          ///< moved ahead of its users, behind the predecessor
+  Uid predecessor = Uid::None;  ///< identity of the element before it, 0 for the first place
 };
 
 /// How the offer to create undefined symbols asks. The editor shows boxes; the tool and the tests answer.

@@ -31,31 +31,31 @@ bool EraseFrom(Sequence<Element>& sequence, std::size_t index) {
   return true;
 }
 
-bool IsParticleKind(std::int32_t elementKind) {
-  return elementKind >= kind::kSpecieStateVariable;
+bool IsParticleKind(ElementKind elementKind) {
+  return elementKind >= ElementKind::SpecieStateVariable;
 }
 
 /// Kinds whose order of declaration an expression depends on.
-bool IsOrdered(std::int32_t elementKind) {
-  return elementKind == kind::kAuxiliary || elementKind == kind::kProcess ||
-         elementKind == kind::kArithmeticExpression;
+bool IsOrdered(ElementKind elementKind) {
+  return elementKind == ElementKind::Auxiliary || elementKind == ElementKind::Process ||
+         elementKind == ElementKind::ArithmeticExpression;
 }
 
 /// Calls the operation with the class's sequence of members of the kind; false for a kind without one.
 template <class Operation>
-bool WithMemberSequence(CEL_Lagrange_Specie& specie, std::int32_t elementKind, Operation operation) {
+bool WithMemberSequence(CEL_Lagrange_Specie& specie, ElementKind elementKind, Operation operation) {
   switch (elementKind) {
-    case kind::kSpecieStateVariable:
+    case ElementKind::SpecieStateVariable:
       return operation(specie.stateVariables);
-    case kind::kSpecieConstant:
+    case ElementKind::SpecieConstant:
       return operation(specie.constants);
-    case kind::kSpecieForcing:
+    case ElementKind::SpecieForcing:
       return operation(specie.forcings);
-    case kind::kSpatialFunction:
+    case ElementKind::SpatialFunction:
       return operation(specie.spatialFunctions);
-    case kind::kArithmeticExpression:
+    case ElementKind::ArithmeticExpression:
       return operation(specie.arithmeticExpressions);
-    case kind::kHorizontalVector:
+    case ElementKind::HorizontalVector:
       return operation(specie.horizontalVectors);
     default:
       return false;
@@ -66,25 +66,25 @@ bool WithMemberSequence(CEL_Lagrange_Specie& specie, std::int32_t elementKind, O
 
 template <class Operation>
 bool TemplateCore::WithSequenceOf(const SymbolRecord& record, Operation operation) {
-  const std::int32_t elementKind = record.element->Kind();
+  const ElementKind elementKind = record.element->Kind();
   if (IsParticleKind(elementKind)) {
     return WithMemberSequence(At(species, static_cast<std::size_t>(record.specieIndex)), elementKind,
                               operation);
   }
   switch (elementKind) {
-    case kind::kStateVariable:
+    case ElementKind::StateVariable:
       return operation(stateVariables);
-    case kind::kConstant:
+    case ElementKind::Constant:
       return operation(constants);
-    case kind::kForcing:
+    case ElementKind::Forcing:
       return operation(forcings);
-    case kind::kAuxiliary:
+    case ElementKind::Auxiliary:
       return operation(auxiliaries);
-    case kind::kProcess:
+    case ElementKind::Process:
       return operation(processes);
-    case kind::kDerivedOutput:
+    case ElementKind::DerivedOutput:
       return operation(derivedOutputs);
-    case kind::kSpecie:
+    case ElementKind::Specie:
       return operation(species);
     default:
       return false;
@@ -103,7 +103,7 @@ void TemplateCore::FinishAdding() {
 }
 
 template <class Element>
-Element& TemplateCore::AddTo(Sequence<Element>& sequence, std::int32_t listKind, std::string_view prefix) {
+Element& TemplateCore::AddTo(Sequence<Element>& sequence, ElementKind listKind, std::string_view prefix) {
   auto element = std::make_unique<Element>(MakeUniqueSymbol(prefix, sequence.size() + 1));
   Adopt(*element, ListHead(listKind));
   element->documentation.SetText(root.documentation.Text());
@@ -116,27 +116,27 @@ Element& TemplateCore::AddTo(Sequence<Element>& sequence, std::int32_t listKind,
 }
 
 CEL_StateVariable& TemplateCore::AddStateVariable() {
-  return AddTo(stateVariables, kind::kStateVariableList, "StateVariable_");
+  return AddTo(stateVariables, ElementKind::StateVariableList, "StateVariable_");
 }
 
 CEL_Constant& TemplateCore::AddConstant() {
-  return AddTo(constants, kind::kConstantList, "Constant_");
+  return AddTo(constants, ElementKind::ConstantList, "Constant_");
 }
 
 CEL_Forcing& TemplateCore::AddForcing() {
-  return AddTo(forcings, kind::kForcingList, "Forcing_");
+  return AddTo(forcings, ElementKind::ForcingList, "Forcing_");
 }
 
 CEL_Auxilliary_Variable& TemplateCore::AddAuxiliary() {
-  return AddTo(auxiliaries, kind::kAuxiliaryList, "Auxiliary_");
+  return AddTo(auxiliaries, ElementKind::AuxiliaryList, "Auxiliary_");
 }
 
 CEL_Process& TemplateCore::AddProcess() {
-  return AddTo(processes, kind::kProcessList, "Process_");
+  return AddTo(processes, ElementKind::ProcessList, "Process_");
 }
 
 CEL_Derived_Output& TemplateCore::AddDerivedOutput() {
-  return AddTo(derivedOutputs, kind::kDerivedOutputList, "Derived Output ");
+  return AddTo(derivedOutputs, ElementKind::DerivedOutputList, "Derived Output ");
 }
 
 CEL_Lagrange_Specie& TemplateCore::AddSpecie() {
@@ -150,76 +150,77 @@ CEL_Lagrange_Specie& TemplateCore::AddSpecie() {
   return *species.back();
 }
 
-bool TemplateCore::CanDelete(std::uint32_t uid) const {
+bool TemplateCore::CanDelete(Uid uid) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   switch (record->element->Kind()) {
-    case kind::kHorizontalVector:
+    case ElementKind::HorizontalVector:
       return At(species, static_cast<std::size_t>(record->specieIndex)).horizontalVectors.size() > 1;
-    case kind::kVerticalEquation:
+    case ElementKind::VerticalEquation:
       return false;
-    case kind::kExternalFunction:
+    case ElementKind::ExternalFunction:
       return true;
     default:
       return record->referencedBy.empty();
   }
 }
 
-bool TemplateCore::DeleteElement(std::uint32_t uid) {
+bool TemplateCore::DeleteElement(Uid uid) {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   // First, so that an element whose deletion is refused has left its groups all the same.
   if (hasMisc) LeaveVisibilityGroups(*record->element);
-  const std::int32_t elementKind = record->element->Kind();
+  const ElementKind elementKind = record->element->Kind();
   if (!record->referencedBy.empty() || !EraseRecordElement(*record)) return false;
   RebuildSymbolTable();
   // With a search function the need for a spatial tree may go.
-  if (elementKind == kind::kSpatialFunction || elementKind == kind::kSpecie) RefreshSearchFunctionChoices();
+  if (elementKind == ElementKind::SpatialFunction || elementKind == ElementKind::Specie)
+    RefreshSearchFunctionChoices();
   flags.modified = true;
   return true;
 }
 
 bool TemplateCore::EraseRecordElement(const SymbolRecord& record) {
-  if (record.element->Kind() == kind::kHorizontalVector &&
+  if (record.element->Kind() == ElementKind::HorizontalVector &&
       At(species, static_cast<std::size_t>(record.specieIndex)).horizontalVectors.size() < 2) {
     return false;
   }
   const auto index = static_cast<std::size_t>(record.index);
-  const bool isSpecie = record.element->Kind() == kind::kSpecie;
+  const bool isSpecie = record.element->Kind() == ElementKind::Specie;
   if (isSpecie) ForgetSpecie(At(species, index).Index());
   const bool erased = WithSequenceOf(record, [index](auto& sequence) { return EraseFrom(sequence, index); });
   if (isSpecie) NumberSpecies();
   return erased;
 }
 
-bool TemplateCore::CanMove(std::uint32_t uid, std::uint32_t targetUid) const {
+bool TemplateCore::CanMove(Uid uid, Uid targetUid) const {
   const SymbolRecord* moved = FindRecordByUid(uid);
   const SymbolRecord* target = FindRecordByUid(targetUid);
   if (moved == nullptr || target == nullptr) return true;
-  const std::int32_t elementKind = moved->element->Kind();
+  const ElementKind elementKind = moved->element->Kind();
   if (elementKind != target->element->Kind()) return true;
   if (IsParticleKind(elementKind) && moved->specieIndex != target->specieIndex) return true;
   if (!IsOrdered(elementKind)) return true;
   const auto staysAhead = [target](std::uint32_t used) { return used < target->sequence; };
   if (!std::all_of(moved->references.begin(), moved->references.end(), staysAhead)) return false;
-  return std::all_of(moved->referencedBy.begin(), moved->referencedBy.end(),
-                     [this, target](std::uint32_t user) {
-                       const SymbolRecord* record = FindRecordBySequence(user);
-                       if (record == nullptr) return false;
-                       const std::int32_t userKind = record->element->Kind();
-                       // Equations use what they use regardless of order.
-                       if (userKind == kind::kStateVariable || userKind == kind::kSpecieStateVariable)
-                         return true;
-                       return user > target->sequence;
-                     });
+  return std::all_of(
+      moved->referencedBy.begin(), moved->referencedBy.end(), [this, target](std::uint32_t user) {
+        const SymbolRecord* record = FindRecordBySequence(user);
+        if (record == nullptr) return false;
+        const ElementKind userKind = record->element->Kind();
+        // Equations use what they use regardless of order.
+        if (userKind == ElementKind::StateVariable || userKind == ElementKind::SpecieStateVariable)
+          return true;
+        return user > target->sequence;
+      });
 }
 
-bool TemplateCore::MoveElement(std::uint32_t uid, std::uint32_t targetUid, bool before) {
+bool TemplateCore::MoveElement(Uid uid, Uid targetUid, bool before) {
   if (!CanMove(uid, targetUid)) return false;
   const SymbolRecord* moved = FindRecordByUid(uid);
   const SymbolRecord* target = FindRecordByUid(targetUid);
   if (moved == nullptr || target == nullptr) return false;
-  const std::int32_t elementKind = moved->element->Kind();
+  const ElementKind elementKind = moved->element->Kind();
   const bool siblings = elementKind == target->element->Kind() &&
                         (!IsParticleKind(elementKind) || moved->specieIndex == target->specieIndex);
   if (!siblings) return false;
@@ -233,15 +234,15 @@ bool TemplateCore::MoveRecordElement(const SymbolRecord& record, std::size_t tar
   const auto from = static_cast<std::size_t>(record.index);
   const bool moved =
       WithSequenceOf(record, [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
-  if (record.element->Kind() == kind::kSpecie) NumberSpecies();
+  if (record.element->Kind() == ElementKind::Specie) NumberSpecies();
   return moved;
 }
 
-bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predecessor) {
-  predecessor = 0;
+bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
+  predecessor = Uid::None;
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr || record->referencedByUids.empty()) return false;
-  const std::int32_t elementKind = record->element->Kind();
+  const ElementKind elementKind = record->element->Kind();
   const bool hasUserOfKind = std::any_of(
       record->referencedBy.begin(), record->referencedBy.end(), [this, elementKind](std::uint32_t user) {
         const SymbolRecord* candidate = FindRecordBySequence(user);
@@ -250,7 +251,7 @@ bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predece
   if (!hasUserOfKind) return false;
   // The last user decides the place, whatever its kind; the user of the same kind is only the condition.
   const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());
-  const bool moves = elementKind == kind::kStateVariable || IsOrdered(elementKind);
+  const bool moves = elementKind == ElementKind::StateVariable || IsOrdered(elementKind);
   if (moves && last != nullptr) {
     // A place behind the element's own leaves it where it is.
     const auto place = static_cast<std::size_t>(std::min(last->index, record->index));
@@ -261,8 +262,8 @@ bool TemplateCore::MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predece
   return true;
 }
 
-std::uint32_t TemplateCore::UidAt(const SymbolRecord& sibling, std::size_t place) {
-  std::uint32_t uid = 0;
+Uid TemplateCore::UidAt(const SymbolRecord& sibling, std::size_t place) {
+  Uid uid = Uid::None;
   WithSequenceOf(sibling, [place, &uid](auto& sequence) {
     uid = At(sequence, place).GetUid();
     return true;

@@ -14,18 +14,16 @@ std::string_view LevelWord(std::uint32_t level) {
   return level < kLevelWords.size() ? kLevelWords[level] : kLevelWords[0];
 }
 
-void ErrorRegistry::AddError(std::uint32_t level, std::string_view symbol, std::int32_t uid,
-                             std::string_view text) {
+void ErrorRegistry::AddError(std::uint32_t level, std::string_view symbol, Uid uid, std::string_view text) {
   Append({level, std::string(symbol), uid, std::string(text), 0});
 }
 
-void ErrorRegistry::AddError(ErrorLevel level, std::string_view symbol, std::int32_t uid,
-                             std::string_view text) {
+void ErrorRegistry::AddError(ErrorLevel level, std::string_view symbol, Uid uid, std::string_view text) {
   AddError(static_cast<std::uint32_t>(level), symbol, uid, text);
 }
 
 void ErrorRegistry::AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line) {
-  Append({static_cast<std::uint32_t>(level), std::string(symbol), -1, std::string(text), line});
+  Append({static_cast<std::uint32_t>(level), std::string(symbol), kNoElement, std::string(text), line});
 }
 
 void ErrorRegistry::Append(ErrorRecord record) {
@@ -33,7 +31,7 @@ void ErrorRegistry::Append(ErrorRecord record) {
   records.push_back(std::move(record));
 }
 
-void ErrorRegistry::ReportElementError(std::string_view symbol, std::int32_t uid, std::string_view text) {
+void ErrorRegistry::ReportElementError(std::string_view symbol, Uid uid, std::string_view text) {
   AddError(ErrorLevel::Warning, symbol, uid, text);
   ++expressionWarningCount;
 }
@@ -47,7 +45,7 @@ std::size_t ErrorRegistry::GetErrorCount(std::uint32_t level) const {
   return level >= 1 && level <= kLevels ? counts[level - 1] : records.size();
 }
 
-bool ErrorRegistry::GetError(std::size_t index, std::uint32_t& level, std::string& symbol, std::int32_t& uid,
+bool ErrorRegistry::GetError(std::size_t index, std::uint32_t& level, std::string& symbol, Uid& uid,
                              std::string& text) const {
   if (index >= records.size()) return false;
   const ErrorRecord& record = records[index];
@@ -66,8 +64,8 @@ bool ErrorRegistry::FormatError(std::size_t index, std::string& text) const {
   const ErrorRecord& record = records[index];
   // The word stands glued to the text: people search their logs for this form.
   text = std::string(LevelWord(record.level)) + record.text;
-  if (record.uid > 0) {
-    text += " symbol \"" + record.symbol + "\" ( UID=" + std::to_string(record.uid) + ")";
+  if (IsElement(record.uid)) {
+    text += " symbol \"" + record.symbol + "\" ( UID=" + std::to_string(NumberOf(record.uid)) + ")";
   }
   return true;
 }
@@ -83,17 +81,17 @@ std::string ErrorRegistry::JoinErrors() const {
   return joined;
 }
 
-void ErrorRegistry::GetErrorForList(std::size_t index, std::string& symbol, std::int32_t& uid,
+void ErrorRegistry::GetErrorForList(std::size_t index, std::string& symbol, Uid& uid,
                                     std::string& text) const {
   if (index >= records.size()) {
     symbol.clear();
-    uid = -1;
+    uid = kNoElement;
     text = "no errors";
     return;
   }
   const ErrorRecord& record = records[index];
   symbol = record.symbol;
-  uid = record.uid > 0 ? record.uid : -1;
+  uid = IsElement(record.uid) ? record.uid : kNoElement;
   text = std::string(LevelWord(record.level)) + ": " + record.text;
 }
 

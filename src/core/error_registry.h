@@ -10,7 +10,12 @@
 #include <string_view>
 #include <vector>
 
+#include "platform/uid.h"
+
 namespace tessal {
+
+/// What a message without an element has in the place of an identity.
+inline constexpr Uid kNoElement{-1};
 
 /// How grave a message is. Only a fatal one changes the flow of control: it makes a load fail.
 enum class ErrorLevel : std::uint32_t { Notice = 1, Warning = 2, Critical = 3, Fatal = 4 };
@@ -20,7 +25,7 @@ enum class ErrorLevel : std::uint32_t { Notice = 1, Warning = 2, Critical = 3, F
 struct ErrorRecord {
   std::uint32_t level;
   std::string symbol;
-  std::int32_t uid;
+  Uid uid;
   std::string text;
   int line;
 };
@@ -52,14 +57,14 @@ inline constexpr std::string_view kDeprecatedBuiltin =
 class ErrorRegistry final {
  public:
   /// Appends a record and raises the counter of its level (a level outside 1 to 4 has no counter).
-  void AddError(std::uint32_t level, std::string_view symbol, std::int32_t uid, std::string_view text);
-  void AddError(ErrorLevel level, std::string_view symbol, std::int32_t uid, std::string_view text);
+  void AddError(std::uint32_t level, std::string_view symbol, Uid uid, std::string_view text);
+  void AddError(ErrorLevel level, std::string_view symbol, Uid uid, std::string_view text);
 
   /// Appends a record about a place in the file that is being read.
   void AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line);
 
   /// The way of the element checks: a warning, and one more in `ExpressionWarningCount`.
-  void ReportElementError(std::string_view symbol, std::int32_t uid, std::string_view text);
+  void ReportElementError(std::string_view symbol, Uid uid, std::string_view text);
 
   /// Empties the list and the level counters; `ExpressionWarningCount` stays.
   void ClearErrors();
@@ -68,7 +73,7 @@ class ErrorRegistry final {
   std::size_t GetErrorCount(std::uint32_t level) const;
 
   /// Copies a record's fields; false, with the outputs untouched, when there is no such index.
-  bool GetError(std::size_t index, std::uint32_t& level, std::string& symbol, std::int32_t& uid,
+  bool GetError(std::size_t index, std::uint32_t& level, std::string& symbol, Uid& uid,
                 std::string& text) const;
 
   /// The long form, for message boxes. False, with "invalid error number!", when there is no such index.
@@ -78,7 +83,7 @@ class ErrorRegistry final {
   std::string JoinErrors() const;
 
   /// The short form, for lists: symbol, identity (-1 for none) and "word: text".
-  void GetErrorForList(std::size_t index, std::string& symbol, std::int32_t& uid, std::string& text) const;
+  void GetErrorForList(std::size_t index, std::string& symbol, Uid& uid, std::string& text) const;
 
   const std::vector<ErrorRecord>& Records() const { return records; }
 

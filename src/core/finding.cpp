@@ -15,7 +15,7 @@ const SymbolRecord* FindRecord(const Records& records, Matches matches) {
 }
 
 bool IsMovement(const CEL_Element& element) {
-  return element.Kind() == kind::kHorizontalVector || element.Kind() == kind::kVerticalEquation;
+  return element.Kind() == ElementKind::HorizontalVector || element.Kind() == ElementKind::VerticalEquation;
 }
 
 }  // namespace
@@ -25,7 +25,7 @@ const SymbolRecord* TemplateCore::FindRecordBySequence(std::uint32_t sequence) c
   return sequence >= 1 && sequence <= symbolTable.size() ? &symbolTable[sequence - 1] : nullptr;
 }
 
-const SymbolRecord* TemplateCore::FindRecordByUid(std::uint32_t uid) const {
+const SymbolRecord* TemplateCore::FindRecordByUid(Uid uid) const {
   return FindRecord(symbolTable, [uid](const SymbolRecord& record) { return record.uid == uid; });
 }
 
@@ -56,9 +56,9 @@ std::string TemplateCore::RecordSymbol(const SymbolRecord& record) const {
   return symbol;
 }
 
-CEL_Element* TemplateCore::GetElement(std::uint32_t uid, std::int32_t kindFilter) const {
+CEL_Element* TemplateCore::GetElement(Uid uid, ElementKind kindFilter) const {
   if (const SymbolRecord* record = FindRecordByUid(uid)) {
-    const bool fits = kindFilter <= 0 || record->element->Kind() == kindFilter;
+    const bool fits = kindFilter == ElementKind::None || record->element->Kind() == kindFilter;
     return fits ? record->element : nullptr;
   }
   for (const auto& specie : species) {
@@ -94,39 +94,39 @@ bool TemplateCore::SymbolExists(std::string_view symbol) const {
   return FindSymbol(symbol, sequence);
 }
 
-bool TemplateCore::GetSymbolOfUid(std::uint32_t uid, std::string& symbol) const {
+bool TemplateCore::GetSymbolOfUid(Uid uid, std::string& symbol) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   symbol = RecordSymbol(*record);
   return true;
 }
 
-bool TemplateCore::GetSequenceOfUid(std::uint32_t uid, std::uint32_t& sequence) const {
+bool TemplateCore::GetSequenceOfUid(Uid uid, std::uint32_t& sequence) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   sequence = record->sequence;
   return true;
 }
 
-bool TemplateCore::IsSymbolTakenByOther(std::uint32_t uid, std::string_view symbol) const {
+bool TemplateCore::IsSymbolTakenByOther(Uid uid, std::string_view symbol) const {
   return FindRecord(symbolTable, [this, uid, symbol](const SymbolRecord& record) {
            return record.uid != uid && RecordSymbol(record) == symbol;
          }) != nullptr;
 }
 
-bool TemplateCore::IsReferenced(std::uint32_t uid) const {
+bool TemplateCore::IsReferenced(Uid uid) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   return record != nullptr && !record->referencedByUids.empty();
 }
 
-bool TemplateCore::GetReferrerUids(std::uint32_t uid, std::vector<std::uint32_t>& uids) const {
+bool TemplateCore::GetReferrerUids(Uid uid, std::vector<Uid>& uids) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   uids = record->referencedByUids;
   return true;
 }
 
-bool TemplateCore::GetReferrerSymbols(std::uint32_t uid, std::vector<std::string>& symbols) const {
+bool TemplateCore::GetReferrerSymbols(Uid uid, std::vector<std::string>& symbols) const {
   symbols.clear();
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
@@ -148,18 +148,18 @@ std::vector<std::string> TemplateCore::ReferrerSymbols(const SymbolRecord& recor
 }
 
 bool TemplateCore::FindElementBySymbol(std::string_view symbol, std::int32_t& id,
-                                       std::int32_t& elementKind) const {
+                                       ElementKind& elementKind) const {
   const CEL_Element* found = nullptr;
   ForEachNamedElement([symbol, &found](const CEL_Element& element) {
     if (found == nullptr && element.symbol.Text() == symbol) found = &element;
   });
-  elementKind = found == nullptr ? kind::kUnknown : found->Kind();
+  elementKind = found == nullptr ? ElementKind::Unknown : found->Kind();
   if (found == nullptr) return false;
   id = found->id.IntValue();
   return true;
 }
 
-CEL_Lagrange_Specie* TemplateCore::GetParentSpecie(std::uint32_t headUid) const {
+CEL_Lagrange_Specie* TemplateCore::GetParentSpecie(Uid headUid) const {
   for (const auto& specie : species) {
     for (const auto& head : specie->Heads()) {
       if (head->GetUid() == headUid) return specie.get();
@@ -184,7 +184,7 @@ std::vector<NamedNumber> TemplateCore::SpecieNames() const {
   return names;
 }
 
-std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<std::int32_t>& uids) const {
+std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<Uid>& uids) const {
   std::set<std::int32_t> numbers;
   if (uids.empty()) return numbers;
   const CEL_Element* previous = nullptr;
@@ -192,8 +192,7 @@ std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<std::in
     // The second record of a movement counts as its first.
     if (record.element == nullptr || record.element == previous) continue;
     previous = record.element;
-    if (uids.contains(record.element->MessageUid()))
-      numbers.insert(static_cast<std::int32_t>(record.sequence));
+    if (uids.contains(record.element->GetUid())) numbers.insert(static_cast<std::int32_t>(record.sequence));
   }
   return numbers;
 }

@@ -115,7 +115,7 @@ bool TemplateCore::Load(const std::string& path) {
     return true;
   } catch (const std::exception& failure) {
     // What was built so far stays; the reason must reach the user.
-    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, -1, std::string(failure.what()) + "\n");
+    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, kNoElement, std::string(failure.what()) + "\n");
     return false;
   }
 }
@@ -134,7 +134,7 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
   }
   keptTree.Clear();
   if (LoadKeyFileTree(path, keptTree) == 0) {
-    Errors().AddError(ErrorLevel::Warning, kNotKeptSymbol, -1, TreeFailureText(path));
+    Errors().AddError(ErrorLevel::Warning, kNotKeptSymbol, kNoElement, TreeFailureText(path));
   }
   return true;
 }
@@ -164,7 +164,7 @@ void TemplateCore::ReadMisc(KvfNode target, int& status) {
 }
 
 template <class AddElement>
-void TemplateCore::ReadCollection(KvfNode target, std::string_view name, std::int32_t listKind, int& status,
+void TemplateCore::ReadCollection(KvfNode target, std::string_view name, ElementKind listKind, int& status,
                                   AddElement add) {
   const KvfNode list = kvfSectionByNameNum(target, name, 1);
   if (list == nullptr) return;
@@ -178,17 +178,17 @@ void TemplateCore::ReadCollection(KvfNode target, std::string_view name, std::in
 }
 
 void TemplateCore::ReadCollections(KvfNode target, int& status) {
-  ReadCollection(target, section::kStateVariables, kind::kStateVariableList, status,
+  ReadCollection(target, section::kStateVariables, ElementKind::StateVariableList, status,
                  [this]() -> CEL_Element& { return AddStateVariable(); });
-  ReadCollection(target, section::kConstants, kind::kConstantList, status,
+  ReadCollection(target, section::kConstants, ElementKind::ConstantList, status,
                  [this]() -> CEL_Element& { return AddConstant(); });
-  ReadCollection(target, section::kForcings, kind::kForcingList, status,
+  ReadCollection(target, section::kForcings, ElementKind::ForcingList, status,
                  [this]() -> CEL_Element& { return AddForcing(); });
-  ReadCollection(target, section::kAuxiliaryVariables, kind::kAuxiliaryList, status,
+  ReadCollection(target, section::kAuxiliaryVariables, ElementKind::AuxiliaryList, status,
                  [this]() -> CEL_Element& { return AddAuxiliary(); });
-  ReadCollection(target, section::kProcesses, kind::kProcessList, status,
+  ReadCollection(target, section::kProcesses, ElementKind::ProcessList, status,
                  [this]() -> CEL_Element& { return AddProcess(); });
-  ReadCollection(target, section::kDerivedOutputs, kind::kDerivedOutputList, status,
+  ReadCollection(target, section::kDerivedOutputs, ElementKind::DerivedOutputList, status,
                  [this]() -> CEL_Element& { return AddDerivedOutput(); });
   // The file holds no symbol for these: their place gives it.
   for (std::size_t place = 0; place < derivedOutputs.size(); ++place) {

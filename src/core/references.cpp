@@ -22,16 +22,16 @@ namespace {
 constexpr std::string_view kLostName = "unkown";
 constexpr std::string_view kUnresolvedName = "unknown";
 
-bool HoldsExpression(std::int32_t elementKind) {
+bool HoldsExpression(ElementKind elementKind) {
   switch (elementKind) {
-    case kind::kStateVariable:
-    case kind::kAuxiliary:
-    case kind::kProcess:
-    case kind::kDerivedOutput:
-    case kind::kSpecieStateVariable:
-    case kind::kArithmeticExpression:
-    case kind::kHorizontalVector:
-    case kind::kVerticalEquation:
+    case ElementKind::StateVariable:
+    case ElementKind::Auxiliary:
+    case ElementKind::Process:
+    case ElementKind::DerivedOutput:
+    case ElementKind::SpecieStateVariable:
+    case ElementKind::ArithmeticExpression:
+    case ElementKind::HorizontalVector:
+    case ElementKind::VerticalEquation:
       return true;
     default:
       return false;
@@ -55,7 +55,7 @@ class SymbolIndex final {
   /// Where the name of the next symbol is to be appended.
   std::string& NextName() { return names; }
   /// Adds the symbol whose name was appended last. Of equal names the first one counts.
-  void AddNext(std::uint32_t uid) {
+  void AddNext(Uid uid) {
     ends.push_back(names.size());
     uids.push_back(uid);
     const auto sequence = static_cast<std::uint32_t>(ends.size() - 1);
@@ -66,7 +66,7 @@ class SymbolIndex final {
 
   /// The sequence number of the symbol of that name; 0 when there is none.
   std::uint32_t Find(std::string_view name) const { return slots[SlotOf(name)].sequence; }
-  std::uint32_t UidOf(std::uint32_t sequence) const { return uids[sequence]; }
+  Uid UidOf(std::uint32_t sequence) const { return uids[sequence]; }
 
  private:
   struct Slot {
@@ -93,8 +93,8 @@ class SymbolIndex final {
   }
 
   std::string names;
-  std::vector<std::size_t> ends{0};    // of the names, by sequence number
-  std::vector<std::uint32_t> uids{0};  // by sequence number
+  std::vector<std::size_t> ends{0};  // of the names, by sequence number
+  std::vector<Uid> uids{Uid::None};  // by sequence number
   std::vector<Slot> slots;
 };
 
@@ -123,8 +123,8 @@ void TemplateCore::ExtractReferences() {
 }
 
 void TemplateCore::ExtractRecordReferences(SymbolRecord& record, ReferenceLookup& lookup) {
-  const std::int32_t elementKind = record.element->Kind();
-  if (elementKind == kind::kSpatialFunction) {
+  const ElementKind elementKind = record.element->Kind();
+  if (elementKind == ElementKind::SpatialFunction) {
     const auto& function = static_cast<const CEL_Lagrange_Spatial_Function&>(*record.element);
     if (function.variableId.IntValue() >= 1) Refer(record, function.VariableName(), lookup);
     return;
@@ -154,7 +154,7 @@ bool TemplateCore::CountsAsDefined(std::string_view name) const {
                      [name](const auto& function) { return function->publicName.Text() == name; });
 }
 
-void TemplateCore::NoteUndefined(std::string_view name, std::uint32_t uid, ReferenceLookup& lookup) {
+void TemplateCore::NoteUndefined(std::string_view name, Uid uid, ReferenceLookup& lookup) {
   const auto known = lookup.undefined.find(name);
   if (known == lookup.undefined.end()) {
     if (CountsAsDefined(name)) return;
@@ -176,7 +176,7 @@ void TemplateCore::NoteUndefined(std::string_view name, std::uint32_t uid, Refer
 void TemplateCore::BuildReverseReferences() {
   // The uses are sorted by the symbol used in lists of plain numbers before they go to the records: in a
   // large template a step from record to record is dear.
-  std::vector<std::uint32_t> uids(1, 0);
+  std::vector<Uid> uids(1, Uid::None);
   std::vector<std::size_t> ends(symbolTable.size() + 2, 0);  // of a symbol's uses in the list, by sequence
   for (const SymbolRecord& user : symbolTable) {
     uids.push_back(user.uid);
@@ -193,7 +193,7 @@ void TemplateCore::BuildReverseReferences() {
     used.referencedBy.assign(use, end);
     for (; use != end; ++use) {
       // The two records of a movement share an identity and stand side by side.
-      const std::uint32_t uid = uids[*use];
+      const Uid uid = uids[*use];
       if (used.referencedByUids.empty() || used.referencedByUids.back() != uid) {
         used.referencedByUids.push_back(uid);
       }
@@ -239,7 +239,7 @@ void TemplateCore::ResolveNamesToReferences() {
   });
 }
 
-bool TemplateCore::CheckElementOrder(std::uint32_t uid) const {
+bool TemplateCore::CheckElementOrder(Uid uid) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   return record == nullptr || CheckRecordOrder(*record);
 }
@@ -250,15 +250,15 @@ bool TemplateCore::CheckRecordOrder(const SymbolRecord& record) const {
   for (const std::uint32_t sequence : record.references) {
     const CEL_Element& used = *Record(sequence).element;
     std::string text;
-    if (user.Kind() == kind::kStateVariable) {
-      if (used.Kind() == kind::kProcess) continue;
+    if (user.Kind() == ElementKind::StateVariable) {
+      if (used.Kind() == ElementKind::Process) continue;
       text = "The symbol '" + used.symbol.Text() + "' is not a process!";
     } else {
       if (sequence <= static_cast<std::uint32_t>(user.id.IntValue())) continue;
       text = "The symbol '" + used.symbol.Text() + "' can not be used as it is declared after '" +
              RecordSymbol(record) + "'!";
     }
-    Errors().AddError(ErrorLevel::Critical, RecordSymbol(record), user.MessageUid(), text);
+    Errors().AddError(ErrorLevel::Critical, RecordSymbol(record), user.GetUid(), text);
     good = false;
   }
   return good;
@@ -268,10 +268,10 @@ bool TemplateCore::CheckDeclarationOrder() const {
   bool good = true;
   for (const SymbolRecord& record : symbolTable) {
     switch (record.element->Kind()) {
-      case kind::kStateVariable:
-      case kind::kAuxiliary:
-      case kind::kProcess:
-      case kind::kDerivedOutput:
+      case ElementKind::StateVariable:
+      case ElementKind::Auxiliary:
+      case ElementKind::Process:
+      case ElementKind::DerivedOutput:
         good = CheckRecordOrder(record) && good;
         break;
       default:

@@ -97,13 +97,13 @@ void TemplateCore::RewriteUsers(const SymbolRecord& renamed, std::string_view ol
     // A movement has two records, side by side; its first one rewrites both expressions.
     if (std::exchange(previous, user.element) == user.element) continue;
     switch (user.element->Kind()) {
-      case kind::kHorizontalVector: {
+      case ElementKind::HorizontalVector: {
         auto& vector = static_cast<CEL_Lagrange_Horizontal_Vector&>(*user.element);
         rewrite(vector.direction);
         rewrite(vector.speed);
         break;
       }
-      case kind::kVerticalEquation:
+      case ElementKind::VerticalEquation:
         rewrite(static_cast<CEL_Lagrange_Vertical_Equation&>(*user.element).speed);
         break;
       default:

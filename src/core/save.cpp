@@ -36,7 +36,7 @@ class Image final {
 };
 
 void ReportFailure(std::string_view reason) {
-  Errors().AddError(ErrorLevel::Critical, kSaveSymbol, -1, reason);
+  Errors().AddError(ErrorLevel::Critical, kSaveSymbol, kNoElement, reason);
 }
 
 /// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
@@ -211,19 +211,22 @@ bool TemplateCore::WriteSections(KvfHandle file) {
 
 void TemplateCore::WriteCollections(KvfHandle file, int& status) {
   const auto write = [this, file, &status](const auto& elements, std::string_view name,
-                                           std::string_view prefix, std::int32_t headKind) {
+                                           std::string_view prefix, ElementKind headKind) {
     kvfAddSection(file, name);
     ListHead(headKind).Write(file, status);
     WriteElements(elements, prefix, file, status);
     kvfEndSection(file);
   };
-  write(stateVariables, section::kStateVariables, section::kStateVariablePrefix, kind::kStateVariableList);
-  write(constants, section::kConstants, section::kConstantPrefix, kind::kConstantList);
-  write(forcings, section::kForcings, section::kForcingPrefix, kind::kForcingList);
+  write(stateVariables, section::kStateVariables, section::kStateVariablePrefix,
+        ElementKind::StateVariableList);
+  write(constants, section::kConstants, section::kConstantPrefix, ElementKind::ConstantList);
+  write(forcings, section::kForcings, section::kForcingPrefix, ElementKind::ForcingList);
   // The texts of the auxiliaries' head are those of the constants: files have always been written so.
-  write(auxiliaries, section::kAuxiliaryVariables, section::kAuxiliaryVariablePrefix, kind::kConstantList);
-  write(processes, section::kProcesses, section::kProcessPrefix, kind::kProcessList);
-  write(derivedOutputs, section::kDerivedOutputs, section::kDerivedOutputPrefix, kind::kDerivedOutputList);
+  write(auxiliaries, section::kAuxiliaryVariables, section::kAuxiliaryVariablePrefix,
+        ElementKind::ConstantList);
+  write(processes, section::kProcesses, section::kProcessPrefix, ElementKind::ProcessList);
+  write(derivedOutputs, section::kDerivedOutputs, section::kDerivedOutputPrefix,
+        ElementKind::DerivedOutputList);
 }
 
 void TemplateCore::WriteEquations(KvfHandle file, int& status) {

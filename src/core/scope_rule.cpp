@@ -53,19 +53,20 @@ constexpr std::string_view kInvalidScope = " has invalid scope and/or spatial va
 
 /// The text of a violation of the process rule, empty when the use is allowed.
 std::string_view ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
-  const std::int32_t userKind = user.element->Kind();
-  const std::int32_t usedKind = used.element->Kind();
-  if (userKind == kind::kStateVariable) return usedKind == kind::kProcess ? std::string_view() : kNoProcess;
-  if (userKind != kind::kAuxiliary && userKind != kind::kProcess) return {};
+  const ElementKind userKind = user.element->Kind();
+  const ElementKind usedKind = used.element->Kind();
+  if (userKind == ElementKind::StateVariable)
+    return usedKind == ElementKind::Process ? std::string_view() : kNoProcess;
+  if (userKind != ElementKind::Auxiliary && userKind != ElementKind::Process) return {};
   switch (usedKind) {
-    case kind::kConstant:
-    case kind::kForcing:
-    case kind::kAuxiliary:
+    case ElementKind::Constant:
+    case ElementKind::Forcing:
+    case ElementKind::Auxiliary:
       return used.spatial <= user.spatial ? std::string_view() : kInvalidScope;
-    case kind::kProcess:
-      if (userKind == kind::kAuxiliary) return {};
+    case ElementKind::Process:
+      if (userKind == ElementKind::Auxiliary) return {};
       return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
-    case kind::kStateVariable:
+    case ElementKind::StateVariable:
       return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
     default:
       return {};
@@ -100,11 +101,11 @@ std::int32_t SpatialFromScope(std::int32_t scope) {
 bool TemplateCore::CheckScopeRule() const {
   bool good = true;
   for (const SymbolRecord& user : symbolTable) {
-    if (user.element->Kind() >= kind::kSpecie) continue;
+    if (user.element->Kind() >= ElementKind::Specie) continue;
     for (const std::uint32_t sequence : user.references) {
       const SymbolRecord& used = Record(sequence);
       if (!ViolatesScopeRule(user, used)) continue;
-      Errors().ReportElementError(user.element->symbol.Text(), user.element->MessageUid(),
+      Errors().ReportElementError(user.element->symbol.Text(), user.element->GetUid(),
                                   "'" + RecordSymbol(used) + "' has invalid scope and/or spatial variation");
       good = false;
     }
@@ -119,7 +120,7 @@ bool TemplateCore::CheckProcessRule() const {
       const SymbolRecord& used = Record(sequence);
       const std::string_view violation = ProcessRuleViolation(user, used);
       if (violation.empty()) continue;
-      Errors().ReportElementError(user.element->symbol.Text(), user.element->MessageUid(),
+      Errors().ReportElementError(user.element->symbol.Text(), user.element->GetUid(),
                                   RecordSymbol(used) + std::string(violation));
       good = false;
     }

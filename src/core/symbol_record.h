@@ -5,6 +5,8 @@
 #include <string>
 #include <vector>
 
+#include "platform/uid.h"
+
 namespace tessal {
 
 class CEL_Element;
@@ -23,10 +25,10 @@ struct SymbolRecord {
   /// by identity. Each entry stands once, in the order of first use.
   std::vector<std::uint32_t> references;
   std::vector<std::uint32_t> referencedBy;
-  std::vector<std::uint32_t> referenceUids;
-  std::vector<std::uint32_t> referencedByUids;
+  std::vector<Uid> referenceUids;
+  std::vector<Uid> referencedByUids;
   CEL_Element* element = nullptr;
-  std::uint32_t uid = 0;  ///< the element's identity
+  Uid uid = Uid::None;  ///< the element's identity
 };
 
 /// A name that expressions use and nobody has defined.
@@ -34,7 +36,7 @@ struct UndefinedSymbol {
   bool asked = false;  ///< the user has been asked about it
   bool stale = false;  ///< not met yet in the rebuild under way
   std::string symbol;
-  std::vector<std::uint32_t> usedBy;  ///< identities of the users, each once, in first-seen order
+  std::vector<Uid> usedBy;  ///< identities of the users, each once, in first-seen order
 };
 
 }  // namespace tessal

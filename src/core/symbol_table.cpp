@@ -61,10 +61,8 @@ SymbolRecord& TemplateCore::AppendRecord(CEL_Element& element, std::int32_t inde
   record.index = index;
   record.specieIndex = specieIndex;
   record.text = text;
-  for (auto* list :
-       {&record.references, &record.referencedBy, &record.referenceUids, &record.referencedByUids}) {
-    list->clear();
-  }
+  for (auto* list : {&record.references, &record.referencedBy}) list->clear();
+  for (auto* list : {&record.referenceUids, &record.referencedByUids}) list->clear();
   record.element = &element;
   record.uid = element.GetUid();
   element.id.SetInt(static_cast<std::int32_t>(record.sequence));

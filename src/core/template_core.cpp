@@ -16,8 +16,8 @@ constexpr std::array<std::string_view, TemplateCore::kListHeadCount> kListSymbol
 TemplateCore::TemplateCore() {
   InitCatalogues();
   for (std::size_t place = 0; place < listHeads.size(); ++place) {
-    listHeads[place] = std::make_unique<CEL_ListHead>(
-        kind::kStateVariableList + static_cast<std::int32_t>(place), kListSymbols[place]);
+    listHeads[place] =
+        std::make_unique<CEL_ListHead>(KindAfter(ElementKind::StateVariableList, place), kListSymbols[place]);
     Adopt(*listHeads[place], root);
   }
   root.SetOwner(this);
@@ -68,8 +68,8 @@ std::int32_t TemplateCore::GetDocumentRevision() const {
   return hasMisc ? misc.documentRevision.IntValue() : 0;
 }
 
-CEL_ListHead& TemplateCore::ListHead(std::int32_t listKind) const {
-  const auto place = static_cast<std::size_t>(listKind - kind::kStateVariableList);
+CEL_ListHead& TemplateCore::ListHead(ElementKind listKind) const {
+  const auto place = static_cast<std::size_t>(NumberOf(listKind) - NumberOf(ElementKind::StateVariableList));
   if (place >= listHeads.size()) throw SubscriptFailure();
   return *listHeads[place];
 }

@@ -82,7 +82,8 @@ class TemplateCore final : public ElementOwner {
   CEL_ListHead& Root() { return root; }
   const CEL_ListHead& Root() const { return root; }
   /// The list head of a kind from 22 to 27.
-  CEL_ListHead& ListHead(std::int32_t listKind) const;
+  CEL_ListHead& ListHead(ElementKind listKind) const;
+  const std::array<std::unique_ptr<CEL_ListHead>, kListHeadCount>& ListHeads() const { return listHeads; }
 
   const std::vector<SymbolRecord>& SymbolTable() const { return symbolTable; }
   const std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() const { return undefinedSymbols; }
@@ -103,27 +104,27 @@ class TemplateCore final : public ElementOwner {
   // Finding. Nothing, or false with the outputs untouched, when there is none.
   const SymbolRecord* FindRecordBySequence(std::uint32_t sequence) const;
   /// The first record of the element: a horizontal movement's is that of its direction.
-  const SymbolRecord* FindRecordByUid(std::uint32_t uid) const;
+  const SymbolRecord* FindRecordByUid(Uid uid) const;
   /// The same for an element of this template that is at hand: without a search, behind a rebuild.
   const SymbolRecord* RecordOfElement(const CEL_Element& element) const;
   /// The element with this identity: one with a record, a list head of a particle class, or a user function.
-  /// A kind above 0 must be that of an element with a record.
-  CEL_Element* GetElement(std::uint32_t uid, std::int32_t kindFilter = 0) const;
+  /// A kind other than None must be that of an element with a record.
+  CEL_Element* GetElement(Uid uid, ElementKind kindFilter = ElementKind::None) const;
   CEL_Element* GetElementBySequence(std::uint32_t sequence) const;
   bool FindSymbol(std::string_view symbol, std::uint32_t& sequence) const;
   bool SymbolExists(std::string_view symbol) const override;
-  bool GetSymbolOfUid(std::uint32_t uid, std::string& symbol) const;
-  bool GetSequenceOfUid(std::uint32_t uid, std::uint32_t& sequence) const;
-  bool IsSymbolTakenByOther(std::uint32_t uid, std::string_view symbol) const override;
-  bool IsReferenced(std::uint32_t uid) const;
-  bool GetReferrerUids(std::uint32_t uid, std::vector<std::uint32_t>& uids) const;
-  bool GetReferrerSymbols(std::uint32_t uid, std::vector<std::string>& symbols) const;
+  bool GetSymbolOfUid(Uid uid, std::string& symbol) const;
+  bool GetSequenceOfUid(Uid uid, std::uint32_t& sequence) const;
+  bool IsSymbolTakenByOther(Uid uid, std::string_view symbol) const override;
+  bool IsReferenced(Uid uid) const;
+  bool GetReferrerUids(Uid uid, std::vector<Uid>& uids) const;
+  bool GetReferrerSymbols(Uid uid, std::vector<std::string>& symbols) const;
   /// The symbols of those who use the record's element, each user once.
   std::vector<std::string> ReferrerSymbols(const SymbolRecord& record) const;
   /// Finds a collection element (no movement, no class) by its symbol; the kind is 20 when there is none.
-  bool FindElementBySymbol(std::string_view symbol, std::int32_t& id, std::int32_t& elementKind) const;
+  bool FindElementBySymbol(std::string_view symbol, std::int32_t& id, ElementKind& elementKind) const;
   /// The class that one of its list heads belongs to.
-  CEL_Lagrange_Specie* GetParentSpecie(std::uint32_t headUid) const;
+  CEL_Lagrange_Specie* GetParentSpecie(Uid headUid) const;
   /// The symbol of a record: the element's, composed with the class's for movements.
   std::string RecordSymbol(const SymbolRecord& record) const;
 
@@ -135,17 +136,17 @@ class TemplateCore final : public ElementOwner {
   CEL_Process& AddProcess();
   CEL_Derived_Output& AddDerivedOutput();
   CEL_Lagrange_Specie& AddSpecie();
-  bool CanDelete(std::uint32_t uid) const;
+  bool CanDelete(Uid uid) const;
   /// Deletes an element that nobody uses. One that is refused has left its visibility groups all the same.
-  bool DeleteElement(std::uint32_t uid);
+  bool DeleteElement(Uid uid);
   /// Whether a move keeps every use behind its definition. Only auxiliaries, processes and arithmetic
   /// expressions can be refused.
-  bool CanMove(std::uint32_t uid, std::uint32_t targetUid) const;
+  bool CanMove(Uid uid, Uid targetUid) const;
   /// Moves an element next to a sibling of its own kind and class.
-  bool MoveElement(std::uint32_t uid, std::uint32_t targetUid, bool before);
+  bool MoveElement(Uid uid, Uid targetUid, bool before);
   /// Moves a new element ahead of its users, when one of them is of its own kind. The predecessor is the
   /// identity of the element now before it, or 0.
-  bool MoveBeforeFirstUser(std::uint32_t uid, std::uint32_t& predecessor);
+  bool MoveBeforeFirstUser(Uid uid, Uid& predecessor);
 
   // Creating and renaming.
   /// Makes an element with the request's symbol and default texts, ahead of its users. Turns change
@@ -162,7 +163,7 @@ class TemplateCore final : public ElementOwner {
   void RebuildSymbolTable() override;
   /// Adds what it finds to the error registry; true when nothing was found.
   bool ValidateTemplate();
-  bool CheckElementOrder(std::uint32_t uid) const;
+  bool CheckElementOrder(Uid uid) const;
   bool CheckDeclarationOrder() const;
   bool CheckScopeRule() const;
   bool CheckProcessRule() const;
@@ -191,7 +192,7 @@ class TemplateCore final : public ElementOwner {
   // What elements ask of their template.
   std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const override;
   std::vector<NamedNumber> SpecieNames() const override;
-  std::set<std::int32_t> ItemsToRecordNumbers(const std::set<std::int32_t>& uids) const override;
+  std::set<std::int32_t> ItemsToRecordNumbers(const std::set<Uid>& uids) const override;
   void RefreshSearchFunctionChoices() override;
 
   /// Loads a file in the place of the present template. False when it could not be read; the registry then
@@ -205,7 +206,7 @@ class TemplateCore final : public ElementOwner {
   struct ReferenceLookup;
 
   template <class Element>
-  Element& AddTo(Sequence<Element>& sequence, std::int32_t listKind, std::string_view prefix);
+  Element& AddTo(Sequence<Element>& sequence, ElementKind listKind, std::string_view prefix);
   template <class Visitor>
   void ForEachNamedElement(Visitor visit) const;
   /// Each element with a record, once.
@@ -225,7 +226,7 @@ class TemplateCore final : public ElementOwner {
   template <class Visitor>
   void ForEachSearchFunction(Visitor visit) const;
   bool MoveRecordElement(const SymbolRecord& record, std::size_t target);
-  std::uint32_t UidAt(const SymbolRecord& sibling, std::size_t place);
+  Uid UidAt(const SymbolRecord& sibling, std::size_t place);
   void LeaveVisibilityGroups(CEL_Element& element);
 
   void AppendRecordSymbol(const SymbolRecord& record, std::string& text) const;
@@ -254,7 +255,7 @@ class TemplateCore final : public ElementOwner {
   void ExtractReferences();
   void ExtractRecordReferences(SymbolRecord& record, ReferenceLookup& lookup);
   void Refer(SymbolRecord& record, std::string_view name, ReferenceLookup& lookup);
-  void NoteUndefined(std::string_view name, std::uint32_t uid, ReferenceLookup& lookup);
+  void NoteUndefined(std::string_view name, Uid uid, ReferenceLookup& lookup);
   bool CountsAsDefined(std::string_view name) const;
   void BuildReverseReferences();
   void ClassifyArithmeticExpressions();
@@ -266,7 +267,7 @@ class TemplateCore final : public ElementOwner {
   void ReadMisc(KvfNode target, int& status);
   void ReadCollections(KvfNode target, int& status);
   template <class AddElement>
-  void ReadCollection(KvfNode target, std::string_view name, std::int32_t listKind, int& status,
+  void ReadCollection(KvfNode target, std::string_view name, ElementKind listKind, int& status,
                       AddElement add);
   void ReadEquations(KvfNode target, int& status);
   void ReadSpecies(KvfNode target, int& status);
@@ -308,7 +309,7 @@ class TemplateCore final : public ElementOwner {
   std::uint32_t groupCounter = 0;
   std::string templateFileName;
   std::string saveFileName;
-  CEL_ListHead root{kind::kRoot, "Tessal Setup"};
+  CEL_ListHead root{ElementKind::Root, "Tessal Setup"};
   std::vector<SymbolRecord> symbolTable;
   std::size_t recordCount = 0;  ///< records that the rebuild under way has made
   std::vector<std::unique_ptr<UndefinedSymbol>> undefinedSymbols;

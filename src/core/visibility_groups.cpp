@@ -11,17 +11,17 @@ void TemplateCore::ApplyVisibilityGroups() {
   for (std::size_t group = 0; group < groups.size(); ++group) {
     auto& levels = groups[group].levels;
     for (std::size_t level = 0; level < levels.size(); ++level) {
-      std::set<std::int32_t> uids;
-      for (const std::int32_t number : levels[level].items) {
+      std::set<Uid>& uids = levels[level].items;
+      for (const std::int32_t number : levels[level].records) {
         const SymbolRecord* record =
             number < 1 ? nullptr : FindRecordBySequence(static_cast<std::uint32_t>(number));
         if (record == nullptr) continue;
         // Both records of a movement stand for one member.
-        if (!uids.insert(record->element->MessageUid()).second) continue;
+        if (!uids.insert(record->element->GetUid()).second) continue;
         record->element->SetVisibility(static_cast<std::int32_t>(group + 1),
                                        static_cast<std::int32_t>(level + 1));
       }
-      levels[level].items = std::move(uids);
+      levels[level].records.clear();
     }
   }
 }
@@ -37,7 +37,7 @@ void TemplateCore::ForEachRecordElement(Visitor visit) const {
 
 void TemplateCore::LeaveVisibilityGroups(CEL_Element& element) {
   for (VisibilityGroup& group : misc.Visibilities().groups) {
-    for (VisibilityLevel& level : group.levels) level.items.erase(element.MessageUid());
+    for (VisibilityLevel& level : group.levels) level.items.erase(element.GetUid());
   }
   const auto memberships = element.Visibility();
   for (const auto& [group, level] : memberships) element.RemoveVisibility(group, level);
@@ -97,7 +97,7 @@ std::int32_t TemplateCore::CreateLevel(std::int32_t group) {
   if (!HasGroup(group)) return 0;
   auto& levels = Group(group).levels;
   const std::size_t number = levels.size() + 1;
-  levels.push_back({"Level_" + std::to_string(number), "", {}});
+  levels.push_back({"Level_" + std::to_string(number), "", {}, {}});
   flags.modified = true;
   return static_cast<std::int32_t>(number);
 }
@@ -116,7 +116,7 @@ void TemplateCore::DeleteLevel(std::int32_t group, std::int32_t level) {
 void TemplateCore::AddItemToLevel(std::int32_t group, std::int32_t level, std::uint32_t sequence) {
   CEL_Element* element = GetElementBySequence(sequence);
   if (element == nullptr || !HasLevel(group, level)) return;
-  if (!Level(group, level).items.insert(element->MessageUid()).second) return;
+  if (!Level(group, level).items.insert(element->GetUid()).second) return;
   element->SetVisibility(group, level);
   flags.modified = true;
 }
@@ -124,7 +124,7 @@ void TemplateCore::AddItemToLevel(std::int32_t group, std::int32_t level, std::u
 void TemplateCore::RemoveItemFromLevel(std::int32_t group, std::int32_t level, std::uint32_t sequence) {
   CEL_Element* element = GetElementBySequence(sequence);
   if (element == nullptr || !HasLevel(group, level)) return;
-  if (Level(group, level).items.erase(element->MessageUid()) == 0) return;
+  if (Level(group, level).items.erase(element->GetUid()) == 0) return;
   element->RemoveVisibility(group, level);
   flags.modified = true;
 }
@@ -140,7 +140,7 @@ void TemplateCore::CollectItems(std::int32_t group, std::int32_t level, std::vec
   }
   if (!HasGroup(group)) return;
   const auto& levels = Group(group).levels;
-  std::set<std::int32_t> uids;
+  std::set<Uid> uids;
   const auto collect = [&uids](const VisibilityLevel& from) {
     uids.insert(from.items.begin(), from.items.end());
   };

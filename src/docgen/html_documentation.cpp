@@ -232,7 +232,7 @@ class PageWriter final {
   std::string AnchorOf(const CEL_Element& element, const std::vector<ElementField>& fields) const {
     if (const ElementField* symbol = FindField(fields, "Symbol")) return symbol->text;
     const bool isMovement =
-        element.Kind() == kind::kHorizontalVector || element.Kind() == kind::kVerticalEquation;
+        element.Kind() == ElementKind::HorizontalVector || element.Kind() == ElementKind::VerticalEquation;
     const SymbolRecord* record = isMovement ? core.RecordOfElement(element) : nullptr;
     return record == nullptr ? std::string() : core.RecordSymbol(*record);
   }
@@ -266,7 +266,7 @@ class PageWriter final {
     Line("<td>");
     if (field->kind == FieldKind::Expression) {
       const bool isDerivative =
-          element.Kind() == kind::kStateVariable || element.Kind() == kind::kSpecieStateVariable;
+          element.Kind() == ElementKind::StateVariable || element.Kind() == ElementKind::SpecieStateVariable;
       Line(ExpressionToMathML(field->text, symbol, isDerivative));
     } else {
       Line(FieldText(*field));

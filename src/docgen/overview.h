@@ -9,6 +9,8 @@
 #include <string_view>
 #include <vector>
 
+#include "platform/uid.h"
+
 namespace tessal {
 
 class TemplateCore;
@@ -34,7 +36,7 @@ struct OverviewRow {
   /// In the order of the columns. The number counts from 1 and is "-" for movements, which do not count; the
   /// expression is the default value of an input and the summary of a search function.
   std::array<std::string, kOverviewColumnCount> cells;
-  std::uint32_t uid = 0;  ///< the element that the row tells of
+  Uid uid = Uid::None;  ///< the element that the row tells of
 };
 
 std::vector<OverviewRow> BuildOverview(const TemplateCore& core);

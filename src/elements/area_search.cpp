@@ -90,7 +90,7 @@ std::vector<CEL_Choice> FirstLookForChoices() {
 
 CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view caption)
     : CEL_Element(caption) {
-  SetKind(kind::kSpatialFunction);
+  SetKind(ElementKind::SpatialFunction);
   Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
                &framework, &property, &math, &lookFor});
   ListenTo({&variableId, &lookFor, &purpose, &framework});
@@ -159,7 +159,7 @@ void CEL_Lagrange_Spatial_Function::OfferSpecies(const std::vector<NamedNumber>&
 bool CEL_Lagrange_Spatial_Function::Check() {
   bool good = CheckTextContent(*this);
   const auto report = [this, &good](std::string_view text) {
-    Errors().ReportElementError(symbol.Text(), MessageUid(), text);
+    Errors().ReportElementError(symbol.Text(), GetUid(), text);
     good = false;
   };
   const bool lagrange = framework.Text() == kLagrange;

@@ -12,9 +12,9 @@ namespace tessal {
 
 namespace {
 
-std::uint32_t& NextElementUid() {
-  static std::uint32_t uid = 0;
-  return uid;
+std::int32_t& UidCounter() {
+  static std::int32_t last = 0;
+  return last;
 }
 
 constexpr std::string_view kUserDefined = "User defined";
@@ -68,7 +68,7 @@ void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
 }  // namespace
 
 CEL_Element::CEL_Element(bool withSymbol, bool withId, bool withDescription)
-    : hasDescription(withDescription), hasSymbol(withSymbol), hasId(withId), uid(++NextElementUid()) {
+    : hasDescription(withDescription), hasSymbol(withSymbol), hasId(withId), uid(Uid{++UidCounter()}) {
   OfferUnitTypes(kUserDefinedType);
   unqUnit.SetChoices(UserDefinedUnitChoices());
   unqUnit.SelectIndex(0);
@@ -78,7 +78,7 @@ CEL_Element::CEL_Element(std::string_view caption) : CEL_Element(true, true, tru
   symbol.SetText(caption);
 }
 
-CEL_ListHead::CEL_ListHead(std::int32_t kindNumber, std::string_view caption)
+CEL_ListHead::CEL_ListHead(ElementKind kindNumber, std::string_view caption)
     : CEL_Element(false, false, true) {
   SetKind(kindNumber);
   symbol.SetText(caption);
@@ -149,13 +149,8 @@ void CEL_Element::MarkModified() {
   if (modifiedFlag != nullptr) *modifiedFlag = true;
 }
 
-std::uint32_t CEL_Element::GetUid() const {
-  if (uid == 0) uid = ++NextElementUid();
-  return uid;
-}
-
 void ResetElementUids() {
-  NextElementUid() = 0;
+  UidCounter() = 0;
 }
 
 void CEL_Element::Read(KvfNode section, int& status) {

@@ -15,6 +15,7 @@
 #include "elements/element_kind.h"
 #include "elements/property.h"
 #include "platform/kvf2004.h"
+#include "platform/uid.h"
 
 namespace tessal {
 
@@ -71,11 +72,9 @@ class CEL_Element : public PropertyListener {
   void ClearTexts();
 
   /// The identity: never 0, never reused, not stored, the same through renames and moves.
-  std::uint32_t GetUid() const;
-  /// The identity as messages and views carry it.
-  std::int32_t MessageUid() const { return static_cast<std::int32_t>(GetUid()); }
+  Uid GetUid() const { return uid; }
 
-  std::int32_t Kind() const { return elementKind; }
+  ElementKind Kind() const { return elementKind; }
   std::string_view KindText() const { return tessal::KindText(elementKind); }
 
   /// The element's place in the tree: a list head, or the root.
@@ -122,7 +121,7 @@ class CEL_Element : public PropertyListener {
     CEL_Property* property;
   };
 
-  void SetKind(std::int32_t kindNumber) { elementKind = kindNumber; }
+  void SetKind(ElementKind kindNumber) { elementKind = kindNumber; }
   /// A list head's kind, unit data and flags are set by who builds it.
   void SetUnitMode(UnitMode mode) { unitMode = mode; }
   void SetFileFlags(bool withSymbol, bool withId, bool withDescription);
@@ -157,8 +156,8 @@ class CEL_Element : public PropertyListener {
   bool hasId;
   bool loaded = false;
   bool* modifiedFlag = nullptr;
-  mutable std::uint32_t uid = 0;
-  std::int32_t elementKind = kind::kNone;
+  Uid uid;
+  ElementKind elementKind = ElementKind::None;
   UnitMode unitMode = UnitMode::None;
   int sourceLine = 0;
   CEL_Element* listHeader = nullptr;
@@ -171,7 +170,7 @@ class CEL_Element : public PropertyListener {
 /// A list head or the root: an element that carries the descriptive texts of a collection.
 class CEL_ListHead final : public CEL_Element {
  public:
-  CEL_ListHead(std::int32_t kindNumber, std::string_view caption);
+  CEL_ListHead(ElementKind kindNumber, std::string_view caption);
 };
 
 /// A field that holds a property's value, with the allowed texts of a property that has choices.

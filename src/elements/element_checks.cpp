@@ -15,7 +15,7 @@ namespace tessal {
 namespace {
 
 void Report(const CEL_Element& element, std::string_view text) {
-  Errors().ReportElementError(element.symbol.Text(), element.MessageUid(), text);
+  Errors().ReportElementError(element.symbol.Text(), element.GetUid(), text);
 }
 
 }  // namespace
@@ -69,7 +69,7 @@ bool CompileExpression(const CEL_Element& element, std::string_view caption, con
                           text) != 0) {
     return true;
   }
-  Errors().ReportElementError(caption, element.MessageUid(), text);
+  Errors().ReportElementError(caption, element.GetUid(), text);
   return false;
 }
 

@@ -47,9 +47,9 @@ constexpr std::array<std::string_view, 35> kKindTexts = {
 
 }  // namespace
 
-std::string_view KindText(std::int32_t kind) {
+std::string_view KindText(ElementKind kind) {
   const auto index = static_cast<std::size_t>(kind);
-  return kind >= 0 && index < kKindTexts.size() ? kKindTexts[index] : kKindTexts[kind::kUnknown];
+  return index < kKindTexts.size() ? kKindTexts[index] : KindText(ElementKind::Unknown);
 }
 
 }  // namespace tessal

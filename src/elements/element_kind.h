@@ -1,50 +1,61 @@
 // What an element is: the numbers that the symbol table, the tree and the change hints share.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
 namespace tessal {
 
-namespace kind {
-inline constexpr std::int32_t kNone = 0;
-inline constexpr std::int32_t kStateVariable = 1;
-inline constexpr std::int32_t kConstant = 2;
-inline constexpr std::int32_t kForcing = 3;
-inline constexpr std::int32_t kAuxiliary = 4;
-inline constexpr std::int32_t kProcess = 5;
-inline constexpr std::int32_t kDerivedOutput = 6;
-inline constexpr std::int32_t kSpecie = 7;
-inline constexpr std::int32_t kSpecieStateVariable = 8;
-inline constexpr std::int32_t kSpecieConstant = 9;
-inline constexpr std::int32_t kSpecieForcing = 10;
-inline constexpr std::int32_t kSpatialFunction = 11;
-inline constexpr std::int32_t kArithmeticExpression = 12;
-inline constexpr std::int32_t kHorizontalVector = 13;
-inline constexpr std::int32_t kVerticalEquation = 14;
-inline constexpr std::int32_t kMiscellaneous = 15;
-inline constexpr std::int32_t kExternalFunction = 16;
-inline constexpr std::int32_t kVisibility = 17;
-inline constexpr std::int32_t kVisibilityGroup = 18;
-inline constexpr std::int32_t kVisibilityGroups = 19;
-inline constexpr std::int32_t kUnknown = 20;
-inline constexpr std::int32_t kRoot = 21;
-inline constexpr std::int32_t kStateVariableList = 22;
-inline constexpr std::int32_t kConstantList = 23;
-inline constexpr std::int32_t kForcingList = 24;
-inline constexpr std::int32_t kAuxiliaryList = 25;
-inline constexpr std::int32_t kProcessList = 26;
-inline constexpr std::int32_t kDerivedOutputList = 27;
-inline constexpr std::int32_t kSpecieStateVariableList = 28;
-inline constexpr std::int32_t kSpecieConstantList = 29;
-inline constexpr std::int32_t kSpecieForcingList = 30;
-inline constexpr std::int32_t kSpatialFunctionList = 31;
-inline constexpr std::int32_t kArithmeticExpressionList = 32;
-inline constexpr std::int32_t kHorizontalVectorList = 33;
-inline constexpr std::int32_t kVerticalEquationList = 34;
-}  // namespace kind
+enum class ElementKind : std::int32_t {
+  None = 0,
+  StateVariable = 1,
+  Constant = 2,
+  Forcing = 3,
+  Auxiliary = 4,
+  Process = 5,
+  DerivedOutput = 6,
+  Specie = 7,
+  SpecieStateVariable = 8,
+  SpecieConstant = 9,
+  SpecieForcing = 10,
+  SpatialFunction = 11,
+  ArithmeticExpression = 12,
+  HorizontalVector = 13,
+  VerticalEquation = 14,
+  Miscellaneous = 15,
+  ExternalFunction = 16,
+  Visibility = 17,
+  VisibilityGroup = 18,
+  VisibilityGroups = 19,
+  Unknown = 20,
+  Root = 21,
+  StateVariableList = 22,
+  ConstantList = 23,
+  ForcingList = 24,
+  AuxiliaryList = 25,
+  ProcessList = 26,
+  DerivedOutputList = 27,
+  SpecieStateVariableList = 28,
+  SpecieConstantList = 29,
+  SpecieForcingList = 30,
+  SpatialFunctionList = 31,
+  ArithmeticExpressionList = 32,
+  HorizontalVectorList = 33,
+  VerticalEquationList = 34,
+};
+
+/// The number of a kind, as listings print it.
+constexpr std::int32_t NumberOf(ElementKind kind) {
+  return static_cast<std::int32_t>(kind);
+}
+
+/// The kind a number of places after another.
+constexpr ElementKind KindAfter(ElementKind first, std::size_t place) {
+  return static_cast<ElementKind>(NumberOf(first) + static_cast<std::int32_t>(place));
+}
 
 /// The text that lists and messages use; "unknown" for a number without a row.
-std::string_view KindText(std::int32_t kind);
+std::string_view KindText(ElementKind kind);
 
 }  // namespace tessal

@@ -8,6 +8,8 @@
 #include <string_view>
 #include <vector>
 
+#include "platform/uid.h"
+
 namespace tessal {
 
 class CEL_Element;
@@ -29,7 +31,7 @@ class ElementOwner {
   virtual bool SymbolExists(std::string_view symbol) const = 0;
 
   /// Whether an element other than the one with this identity has this symbol.
-  virtual bool IsSymbolTakenByOther(std::uint32_t uid, std::string_view symbol) const = 0;
+  virtual bool IsSymbolTakenByOther(Uid uid, std::string_view symbol) const = 0;
 
   /// The elements that the element's expression uses, in the order of their first use. For an element with
   /// two expressions, those of the first record.
@@ -40,7 +42,7 @@ class ElementOwner {
 
   /// The numbers of the symbol records of elements, given by their identities; an identity without a record
   /// is left out.
-  virtual std::set<std::int32_t> ItemsToRecordNumbers(const std::set<std::int32_t>& uids) const = 0;
+  virtual std::set<std::int32_t> ItemsToRecordNumbers(const std::set<Uid>& uids) const = 0;
 
   /// Fills the choice lists of all search functions from the present classes and their values.
   virtual void RefreshSearchFunctionChoices() = 0;

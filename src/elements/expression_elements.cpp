@@ -55,7 +55,7 @@ constexpr std::array<PropertyRow, 5> kDerivedOutputRows = {{
 
 }  // namespace
 
-CEL_ExpressionElement::CEL_ExpressionElement(std::int32_t kindNumber, std::string_view caption)
+CEL_ExpressionElement::CEL_ExpressionElement(ElementKind kindNumber, std::string_view caption)
     : CEL_Element(caption) {
   SetKind(kindNumber);
   SetUnitMode(UnitMode::Both);
@@ -87,19 +87,19 @@ void CEL_ExpressionElement::OnPropertyChanged(CEL_Property& changed) {
 }
 
 CEL_Auxilliary_Variable::CEL_Auxilliary_Variable(std::string_view caption)
-    : CEL_ExpressionElement(kind::kAuxiliary, caption) {
+    : CEL_ExpressionElement(ElementKind::Auxiliary, caption) {
   Bind(kAuxiliaryRows, {&output, &scope, &spatialVariation, &unit, &expression});
   ListenTo({&symbol, &spatialVariation, &expression});
 }
 
-CEL_Process::CEL_Process(std::string_view caption) : CEL_ExpressionElement(kind::kProcess, caption) {
+CEL_Process::CEL_Process(std::string_view caption) : CEL_ExpressionElement(ElementKind::Process, caption) {
   Bind(kProcessRows,
        {&output, &processType, &scope, &spatialVariation, &unit, &expression, &controlId, &controlValue});
   ListenTo({&symbol, &scope, &spatialVariation, &expression});
 }
 
 CEL_Derived_Output::CEL_Derived_Output(std::string_view caption)
-    : CEL_ExpressionElement(kind::kDerivedOutput, caption) {
+    : CEL_ExpressionElement(ElementKind::DerivedOutput, caption) {
   SetFileFlags(false, true, true);
   Bind(kDerivedOutputRows, {&scope, &spatialVariation, &unit, &format, &expression});
   ListenTo({&spatialVariation, &expression});

@@ -23,7 +23,7 @@ class CEL_ExpressionElement : public CEL_Element {
   CEL_Property expression{ValueType::Expression};
 
  protected:
-  CEL_ExpressionElement(std::int32_t kindNumber, std::string_view caption);
+  CEL_ExpressionElement(ElementKind kindNumber, std::string_view caption);
 
  private:
   ExpressionNode tree;

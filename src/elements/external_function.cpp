@@ -42,7 +42,7 @@ constexpr std::array<PropertyRow, 5> kRows = {{
 }  // namespace
 
 CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Element(caption) {
-  SetKind(kind::kExternalFunction);
+  SetKind(ElementKind::ExternalFunction);
   Bind(kRows, {&publicName, &parameters, &usedAs, &dll, &entryPoint});
   ListenTo({&publicName, &parameters, &usedAs});
   claim.Claim(publicName.Text());

@@ -13,8 +13,8 @@ namespace tessal {
 
 namespace {
 
-constexpr InputKind kConstantKind{kind::kConstant, 1, ConstantBuiltinIds};
-constexpr InputKind kForcingKind{kind::kForcing, 2, ForcingBuiltinIds};
+constexpr InputKind kConstantKind{ElementKind::Constant, 1, ConstantBuiltinIds};
+constexpr InputKind kForcingKind{ElementKind::Forcing, 2, ForcingBuiltinIds};
 
 constexpr std::string_view kUserDefined = "User defined";
 constexpr std::int32_t kNoBuiltin = -1;
@@ -54,7 +54,7 @@ ChoiceList BuiltinChoices(const InputKind& input, bool withDeprecated, std::int3
 const ChoiceList& UsualBuiltinChoices(const InputKind& input) {
   static const ChoiceList kConstants = BuiltinChoices(kConstantKind, false, kNoBuiltin);
   static const ChoiceList kForcings = BuiltinChoices(kForcingKind, false, kNoBuiltin);
-  return input.kind == kind::kConstant ? kConstants : kForcings;
+  return input.kind == ElementKind::Constant ? kConstants : kForcings;
 }
 
 }  // namespace
@@ -102,7 +102,7 @@ bool CEL_Input::Check() {
   const bool named = CheckSymbolForm(*this);
   const bool worded = CheckTextContent(*this);
   const bool current = !IsDeprecatedBuiltin(builtInId.IntValue());
-  if (!current) Errors().ReportElementError(symbol.Text(), MessageUid(), message::kDeprecatedBuiltin);
+  if (!current) Errors().ReportElementError(symbol.Text(), GetUid(), message::kDeprecatedBuiltin);
   return inRange && ordered && named && worded && current;
 }
 

@@ -9,7 +9,7 @@ namespace tessal {
 
 /// What tells the twins apart.
 struct InputKind {
-  std::int32_t kind;
+  ElementKind kind;
   std::int32_t builtinKind;  ///< the kind of the catalogue rows that it may be bound to
   const std::vector<std::int32_t>& (*builtinIds)();
 };

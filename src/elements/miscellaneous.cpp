@@ -56,7 +56,7 @@ constexpr std::array<PropertyRow, 11> kRows = {{
 }  // namespace
 
 CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
-  SetKind(kind::kMiscellaneous);
+  SetKind(ElementKind::Miscellaneous);
   Bind(kRows, {&tessalVersion, &parserVersion, &documentRevision, &randSeed, &debugLevel, &debugLog,
                &randomParticleDir, &buildSpatialTree, &checksum, &optimise, &trigonometrics});
   CEL_Miscanellous::Reset();

@@ -52,7 +52,7 @@ class CEL_Miscanellous final : public CEL_Element {
   void SetAbsentValues(KvfNode section);
 
   bool* templateModified = nullptr;
-  CEL_ListHead functionHead{kind::kExternalFunction, ""};
+  CEL_ListHead functionHead{ElementKind::ExternalFunction, ""};
   std::vector<std::unique_ptr<CEL_ExternalFunction>> functions;
   CEL_Visibility visibilities;
 };

@@ -128,8 +128,7 @@ void NoteWriteResult(int result, std::string_view key, CEL_Element& element, int
   text += key;
   text += ": ";
   text += WriteFailureReason(result);
-  Errors().AddError(ErrorLevel::Critical, element.symbol.Text(), static_cast<std::int32_t>(element.GetUid()),
-                    text);
+  Errors().AddError(ErrorLevel::Critical, element.symbol.Text(), element.GetUid(), text);
 }
 
 void WriteText(std::string_view text, KvfHandle file, std::string_view key, CEL_Element& element,

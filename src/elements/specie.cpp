@@ -85,7 +85,7 @@ std::string NotOfThisClass(std::string_view what, const CEL_Element& used, const
 /// What a state variable's equation may use: the arithmetic expressions of its class.
 std::optional<ReferenceFinding> FindEquationFault(const CEL_Element& used,
                                                   const CEL_Lagrange_Specie& specie) {
-  if (used.Kind() != kind::kArithmeticExpression) {
+  if (used.Kind() != ElementKind::ArithmeticExpression) {
     return ReferenceFinding{"The symbol'" + used.symbol.Text() +
                             "' is not a process of the current current specie " + specie.symbol.Text()};
   }
@@ -98,22 +98,22 @@ std::optional<ReferenceFinding> FindEquationFault(const CEL_Element& used,
 std::optional<ReferenceFinding> FindExpressionFault(const CEL_Element& used,
                                                     const CEL_Lagrange_Specie& specie) {
   switch (used.Kind()) {
-    case kind::kStateVariable:
-    case kind::kConstant:
-    case kind::kForcing:
+    case ElementKind::StateVariable:
+    case ElementKind::Constant:
+    case ElementKind::Forcing:
       return std::nullopt;
-    case kind::kSpecieStateVariable:
+    case ElementKind::SpecieStateVariable:
       if (specie.Owns(used)) return std::nullopt;
       return ReferenceFinding{
           NotOfThisClass("state variable", used, specie) + " (only allowed if interaction!)",
           ErrorLevel::Warning};
-    case kind::kSpecieConstant:
+    case ElementKind::SpecieConstant:
       if (specie.Owns(used)) return std::nullopt;
       return ReferenceFinding{NotOfThisClass("constant", used, specie)};
-    case kind::kSpatialFunction:
+    case ElementKind::SpatialFunction:
       if (specie.Owns(used)) return std::nullopt;
       return ReferenceFinding{NotOfThisClass("spatial function", used, specie)};
-    case kind::kArithmeticExpression:
+    case ElementKind::ArithmeticExpression:
       if (specie.Owns(used)) return std::nullopt;
       return ReferenceFinding{NotOfThisClass("expression", used, specie)};
     default:
@@ -125,17 +125,17 @@ std::optional<ReferenceFinding> FindExpressionFault(const CEL_Element& used,
 /// Whether an element is declared behind its user. A class that is not behind this one is known already.
 bool IsDeclaredAfter(const CEL_Element& used, const CEL_Element& user, const CEL_Lagrange_Specie& specie) {
   if (used.id.IntValue() <= user.id.IntValue()) return false;
-  if (used.Kind() != kind::kSpecie) return true;
+  if (used.Kind() != ElementKind::Specie) return true;
   return static_cast<const CEL_Lagrange_Specie&>(used).Index() > specie.Index();
 }
 
 }  // namespace
 
 CEL_Lagrange_Specie::CEL_Lagrange_Specie(std::string_view caption) : CEL_Element(caption) {
-  SetKind(kind::kSpecie);
+  SetKind(ElementKind::Specie);
   SetFileFlags(false, false, false);
   for (std::size_t place = 0; place < heads.size(); ++place) {
-    const std::int32_t listKind = kind::kSpecieStateVariableList + static_cast<std::int32_t>(place);
+    const ElementKind listKind = KindAfter(ElementKind::SpecieStateVariableList, place);
     heads[place] = std::make_unique<CEL_ListHead>(listKind, tessal::KindText(listKind));
     heads[place]->SetParent(this);
   }
@@ -145,8 +145,9 @@ CEL_Lagrange_Specie::CEL_Lagrange_Specie(std::string_view caption) : CEL_Element
   SetLoaded(true);
 }
 
-CEL_ListHead& CEL_Lagrange_Specie::Head(std::int32_t listKind) const {
-  const auto place = static_cast<std::size_t>(listKind - kind::kSpecieStateVariableList);
+CEL_ListHead& CEL_Lagrange_Specie::Head(ElementKind listKind) const {
+  const auto place =
+      static_cast<std::size_t>(NumberOf(listKind) - NumberOf(ElementKind::SpecieStateVariableList));
   if (place >= heads.size()) throw SubscriptFailure();
   return *heads[place];
 }
@@ -164,7 +165,7 @@ void CEL_Lagrange_Specie::DropMembers() {
   arithmeticExpressions.clear();
   horizontalVectors.clear();
   verticalEquation = std::make_unique<CEL_Lagrange_Vertical_Equation>("Downward Velocity");
-  Adopt(*verticalEquation, kind::kVerticalEquationList);
+  Adopt(*verticalEquation, ElementKind::VerticalEquationList);
 }
 
 void CEL_Lagrange_Specie::Reset() {
@@ -176,14 +177,14 @@ void CEL_Lagrange_Specie::Reset() {
 }
 
 template <class Member>
-void CEL_Lagrange_Specie::Adopt(Member& member, std::int32_t listKind) {
+void CEL_Lagrange_Specie::Adopt(Member& member, ElementKind listKind) {
   member.SetListHeader(&Head(listKind));
   member.SetOwner(Owner());
   member.SetModifiedFlag(templateModified);
 }
 
 template <class Member>
-Member& CEL_Lagrange_Specie::Append(Sequence<Member>& members, std::int32_t listKind, std::string_view word) {
+Member& CEL_Lagrange_Specie::Append(Sequence<Member>& members, ElementKind listKind, std::string_view word) {
   members.push_back(std::make_unique<Member>(UnusedSymbol(word, members.size() + 1)));
   Adopt(*members.back(), listKind);
   return *members.back();
@@ -199,25 +200,26 @@ std::string CEL_Lagrange_Specie::UnusedSymbol(std::string_view word, std::size_t
 }
 
 CEL_Lagrange_StateVariable& CEL_Lagrange_Specie::AddStateVariable() {
-  auto& member = Append(stateVariables, kind::kSpecieStateVariableList, "StateVariable_");
+  auto& member = Append(stateVariables, ElementKind::SpecieStateVariableList, "StateVariable_");
   member.specie.SetInt(index);
   return member;
 }
 
 CEL_Lagrange_Constant& CEL_Lagrange_Specie::AddConstant() {
-  return Append(constants, kind::kSpecieConstantList, "Constant_");
+  return Append(constants, ElementKind::SpecieConstantList, "Constant_");
 }
 
 CEL_Lagrange_Forcing& CEL_Lagrange_Specie::AddForcing() {
-  return Append(forcings, kind::kSpecieForcingList, "Forcing_");
+  return Append(forcings, ElementKind::SpecieForcingList, "Forcing_");
 }
 
 CEL_Lagrange_Spatial_Function& CEL_Lagrange_Specie::AddSpatialFunction() {
-  return Append(spatialFunctions, kind::kSpatialFunctionList, "Search_Function_");
+  return Append(spatialFunctions, ElementKind::SpatialFunctionList, "Search_Function_");
 }
 
 CEL_Lagrange_Arithmetical_Expression& CEL_Lagrange_Specie::AddArithmeticExpression() {
-  auto& member = Append(arithmeticExpressions, kind::kArithmeticExpressionList, "Arithmetic_Expression_");
+  auto& member =
+      Append(arithmeticExpressions, ElementKind::ArithmeticExpressionList, "Arithmetic_Expression_");
   member.specie.SetInt(index);
   return member;
 }
@@ -230,7 +232,7 @@ CEL_Lagrange_Horizontal_Vector& CEL_Lagrange_Specie::AddHorizontalVector() {
     ++number;
   }
   horizontalVectors.push_back(std::make_unique<CEL_Lagrange_Horizontal_Vector>(caption()));
-  Adopt(*horizontalVectors.back(), kind::kHorizontalVectorList);
+  Adopt(*horizontalVectors.back(), ElementKind::HorizontalVectorList);
   return *horizontalVectors.back();
 }
 
@@ -278,15 +280,15 @@ void CEL_Lagrange_Specie::Read(KvfNode section, int& status) {
   ReadProperty(documentation, section, key::kDocumentation, status);
   ReadOwn(section, status);
 
-  ReadList(section, section::kStateVariables, &Head(kind::kSpecieStateVariableList), status,
+  ReadList(section, section::kStateVariables, &Head(ElementKind::SpecieStateVariableList), status,
            [this]() -> CEL_Element& { return AddStateVariable(); });
-  ReadList(section, section::kConstants, &Head(kind::kSpecieConstantList), status,
+  ReadList(section, section::kConstants, &Head(ElementKind::SpecieConstantList), status,
            [this]() -> CEL_Element& { return AddConstant(); });
-  ReadList(section, section::kForcings, &Head(kind::kSpecieForcingList), status,
+  ReadList(section, section::kForcings, &Head(ElementKind::SpecieForcingList), status,
            [this]() -> CEL_Element& { return AddForcing(); });
-  ReadList(section, section::kSpatialFunctions, &Head(kind::kSpatialFunctionList), status,
+  ReadList(section, section::kSpatialFunctions, &Head(ElementKind::SpatialFunctionList), status,
            [this]() -> CEL_Element& { return AddSpatialFunction(); });
-  ReadList(section, section::kArithmeticalExpressions, &Head(kind::kArithmeticExpressionList), status,
+  ReadList(section, section::kArithmeticalExpressions, &Head(ElementKind::ArithmeticExpressionList), status,
            [this]() -> CEL_Element& { return AddArithmeticExpression(); });
   ReadEquations(section, status);
   ReadList(section, section::kHorizontalVectors, nullptr, status,
@@ -313,15 +315,15 @@ void CEL_Lagrange_Specie::Write(KvfHandle file, int& status) {
   WriteOwn(file, status);
 
   WriteList(stateVariables, section::kStateVariables, section::kStateVariablePrefix,
-            &Head(kind::kSpecieStateVariableList), file, status);
-  WriteList(constants, section::kConstants, section::kConstantPrefix, &Head(kind::kSpecieConstantList), file,
-            status);
-  WriteList(forcings, section::kForcings, section::kForcingPrefix, &Head(kind::kSpecieForcingList), file,
-            status);
+            &Head(ElementKind::SpecieStateVariableList), file, status);
+  WriteList(constants, section::kConstants, section::kConstantPrefix, &Head(ElementKind::SpecieConstantList),
+            file, status);
+  WriteList(forcings, section::kForcings, section::kForcingPrefix, &Head(ElementKind::SpecieForcingList),
+            file, status);
   WriteList(spatialFunctions, section::kSpatialFunctions, section::kSpatialFunctionPrefix,
-            &Head(kind::kSpatialFunctionList), file, status);
+            &Head(ElementKind::SpatialFunctionList), file, status);
   WriteList(arithmeticExpressions, section::kArithmeticalExpressions, section::kArithmeticalExpressionPrefix,
-            &Head(kind::kArithmeticExpressionList), file, status);
+            &Head(ElementKind::ArithmeticExpressionList), file, status);
   WriteEquations(file, status);
   WriteList(horizontalVectors, section::kHorizontalVectors, section::kHorizontalVectorPrefix, nullptr, file,
             status);
@@ -379,7 +381,7 @@ bool CEL_Lagrange_Specie::Check() {
 
 bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const {
   if (Owner() == nullptr) return true;
-  const bool isEquation = member.Kind() == kind::kSpecieStateVariable;
+  const bool isEquation = member.Kind() == ElementKind::SpecieStateVariable;
   bool good = true;
   for (const CEL_Element* used : Owner()->ReferencedElements(member)) {
     auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
@@ -389,7 +391,7 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
                                  "' can not be used as it is declared after '" + member.symbol.Text() + "'!"};
     }
     if (!finding) continue;
-    Errors().AddError(finding->level, member.symbol.Text(), member.MessageUid(), finding->text);
+    Errors().AddError(finding->level, member.symbol.Text(), member.GetUid(), finding->text);
     good = false;
   }
   return good;
@@ -397,7 +399,7 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
 
 void CEL_Lagrange_Specie::OnPropertyChanged(CEL_Property& changed) {
   if (&changed == &description && description.Text().find('!') != std::string::npos) {
-    Errors().ReportElementError(symbol.Text(), MessageUid(), message::kIllegalText);
+    Errors().ReportElementError(symbol.Text(), GetUid(), message::kIllegalText);
   }
   if (&changed != &symbol) return;
   std::string_view fault = message::kNoError;
@@ -412,7 +414,7 @@ void CEL_Lagrange_Specie::OnPropertyChanged(CEL_Property& changed) {
       const NotificationsOff silent;  // going back is no new change to judge
       symbol.SetText(symbol.PrevText());
     }
-    Errors().ReportElementError(refused, MessageUid(), refused + std::string(fault));
+    Errors().ReportElementError(refused, GetUid(), refused + std::string(fault));
     return;
   }
   ParseExpression();

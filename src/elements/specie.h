@@ -48,7 +48,7 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   CEL_Lagrange_Horizontal_Vector& AddHorizontalVector();
 
   /// The list heads, in the order of the kinds 28 to 34.
-  CEL_ListHead& Head(std::int32_t listKind) const;
+  CEL_ListHead& Head(ElementKind listKind) const;
   const std::array<std::unique_ptr<CEL_ListHead>, kListCount>& Heads() const { return heads; }
   /// Whether an element is a member of this class, or the class itself (as the target of an interaction).
   bool Owns(const CEL_Element& element) const;
@@ -68,9 +68,9 @@ class CEL_Lagrange_Specie final : public CEL_Element {
 
  private:
   template <class Member>
-  Member& Append(Sequence<Member>& members, std::int32_t listKind, std::string_view word);
+  Member& Append(Sequence<Member>& members, ElementKind listKind, std::string_view word);
   template <class Member>
-  void Adopt(Member& member, std::int32_t listKind);
+  void Adopt(Member& member, ElementKind listKind);
   std::string UnusedSymbol(std::string_view word, std::size_t number) const;
 
   void DropMembers();

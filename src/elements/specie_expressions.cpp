@@ -46,7 +46,7 @@ constexpr std::array<PropertyRow, 1> kVerticalRows = {{
 
 CEL_Lagrange_Arithmetical_Expression::CEL_Lagrange_Arithmetical_Expression(std::string_view caption)
     : CEL_Element(caption) {
-  SetKind(kind::kArithmeticExpression);
+  SetKind(ElementKind::ArithmeticExpression);
   SetUnitMode(UnitMode::Both);
   Bind(kExpressionRows, {&expressionType, &specie, &output, &spatialVariation, &unit, &expression});
   ListenTo({&symbol, &unit, &expression});
@@ -74,7 +74,7 @@ void CEL_Lagrange_Arithmetical_Expression::Classify(bool isProcess) {
 
 CEL_Lagrange_Horizontal_Vector::CEL_Lagrange_Horizontal_Vector(std::string_view caption)
     : CEL_Element(caption) {
-  SetKind(kind::kHorizontalVector);
+  SetKind(ElementKind::HorizontalVector);
   SetFileFlags(false, false, false);
   Bind(kHorizontalRows, {&speed, &direction});
   ListenTo({&speed, &direction});
@@ -104,7 +104,7 @@ int CEL_Lagrange_Horizontal_Vector::SetFields(const std::vector<ElementField>& f
 
 CEL_Lagrange_Vertical_Equation::CEL_Lagrange_Vertical_Equation(std::string_view caption)
     : CEL_Element(caption) {
-  SetKind(kind::kVerticalEquation);
+  SetKind(ElementKind::VerticalEquation);
   SetFileFlags(false, false, false);
   Bind(kVerticalRows, {&speed});
   ListenTo({&speed});

@@ -86,7 +86,7 @@ void CEL_SpecieValue::OnPropertyChanged(CEL_Property& changed) {
 }
 
 CEL_Lagrange_StateVariable::CEL_Lagrange_StateVariable(std::string_view caption) : CEL_SpecieValue(caption) {
-  SetKind(kind::kSpecieStateVariable);
+  SetKind(ElementKind::SpecieStateVariable);
   SetUnitMode(UnitMode::Both);
   Bind(kStateVariableRows, {&specie, &unit, &defaultValue, &minValue, &maxValue, &equation});
   OfferParticleUnits("Mass");
@@ -120,7 +120,7 @@ void CEL_Lagrange_StateVariable::WriteEquation(KvfHandle file, int& status) {
 }
 
 CEL_Lagrange_Constant::CEL_Lagrange_Constant(std::string_view caption) : CEL_SpecieValue(caption) {
-  SetKind(kind::kSpecieConstant);
+  SetKind(ElementKind::SpecieConstant);
   SetUnitMode(UnitMode::Both);
   Bind(kConstantRows, {&spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
   OfferParticleUnits(kUserDefined);
@@ -135,7 +135,7 @@ bool CEL_Lagrange_Constant::Check() {
 }
 
 CEL_Lagrange_Forcing::CEL_Lagrange_Forcing(std::string_view caption) : CEL_SpecieValue(caption) {
-  SetKind(kind::kSpecieForcing);
+  SetKind(ElementKind::SpecieForcing);
   Bind(kForcingRows, {&spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
 }
 

@@ -45,7 +45,7 @@ constexpr std::array<PropertyRow, 7> kRows = {{
 }  // namespace
 
 CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(caption) {
-  SetKind(kind::kStateVariable);
+  SetKind(ElementKind::StateVariable);
   SetUnitMode(UnitMode::Both);
   unqType.SetChoices(UnitTypeChoices());
   Bind(kRows, {&scope, &transport, &unit, &defaultValue, &minValue, &maxValue, &equation});

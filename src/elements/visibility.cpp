@@ -8,12 +8,12 @@ namespace tessal {
 
 namespace {
 
-void ReadItems(KvfNode section, std::set<std::int32_t>& items) {
+void ReadItems(KvfNode section, std::set<std::int32_t>& records) {
   const KvfNode keyword = kvfKeywordByNameNum(section, key::kItems, 1);
   const int count = keyword == nullptr ? 0 : kvfGetNoParams(keyword);
   for (int number = 1; number <= count; ++number) {
     std::int32_t item = 0;
-    if (kvfGetInt(kvfParamByNum(keyword, number), item) == kKvfOk) items.insert(item);
+    if (kvfGetInt(kvfParamByNum(keyword, number), item) == kKvfOk) records.insert(item);
   }
 }
 
@@ -22,7 +22,7 @@ VisibilityLevel ReadLevel(KvfNode section, int& status) {
   ReadText(level.name, section, key::kLevel, status);
   ReadText(level.description, section, key::kDescription, status);
   std::int32_t count = 0;
-  if (ReadInteger(count, section, key::kItemCount, status) && count > 0) ReadItems(section, level.items);
+  if (ReadInteger(count, section, key::kItemCount, status) && count > 0) ReadItems(section, level.records);
   return level;
 }
 
@@ -48,7 +48,7 @@ std::string Numbered(std::string_view prefix, std::size_t number) {
 }  // namespace
 
 CEL_Visibility::CEL_Visibility() : CEL_Element("Visibility Group Definitions") {
-  SetKind(kind::kVisibility);
+  SetKind(ElementKind::Visibility);
   SetFileFlags(false, false, true);
 }
 

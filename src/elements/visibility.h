@@ -13,9 +13,9 @@ namespace tessal {
 struct VisibilityLevel {
   std::string name;
   std::string description;
-  /// Identities of elements. Only while a file is read, and until the template has its symbol table, these
-  /// are the numbers of symbol records that the file holds.
-  std::set<std::int32_t> items;
+  std::set<Uid> items;  ///< the identities of its elements
+  /// The numbers of symbol records that a file holds in their place; none after the template has its table.
+  std::set<std::int32_t> records;
 };
 
 struct VisibilityGroup {

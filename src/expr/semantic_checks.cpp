@@ -66,8 +66,7 @@ bool ReadsAsNumber(std::string_view text) {
 /// One check of one expression.
 class FunctionCheck final {
  public:
-  FunctionCheck(std::string_view checkedSymbol, std::uint32_t checkedUid)
-      : symbol(checkedSymbol), uid(checkedUid) {}
+  FunctionCheck(std::string_view checkedSymbol, Uid checkedUid) : symbol(checkedSymbol), uid(checkedUid) {}
 
   void Walk(const ExpressionNode& root) {
     root.WalkPostOrder(
@@ -80,9 +79,7 @@ class FunctionCheck final {
   bool IsBalanced() const { return callDepth < 1; }
   const std::string& LastCall() const { return lastCall; }
 
-  void Report(std::string_view text) {
-    Errors().ReportElementError(symbol, static_cast<std::int32_t>(uid), text);
-  }
+  void Report(std::string_view text) { Errors().ReportElementError(symbol, uid, text); }
 
  private:
   void Visit(std::int32_t kind, const std::string& text) {
@@ -114,7 +111,7 @@ class FunctionCheck final {
   }
 
   std::string_view symbol;
-  std::uint32_t uid;
+  Uid uid;
   std::int32_t arguments = 0;
   std::int32_t callDepth = 0;
   std::string lastCall;
@@ -122,7 +119,7 @@ class FunctionCheck final {
 
 }  // namespace
 
-int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression) {
+int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression) {
   FunctionCheck check(symbol, uid);
   ExpressionNode root;
   std::int32_t line = 0;

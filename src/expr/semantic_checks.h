@@ -5,11 +5,13 @@
 #include <cstdint>
 #include <string_view>
 
+#include "platform/uid.h"
+
 namespace tessal {
 
 /// Parses and checks an expression; each finding goes to the error registry under the symbol and identity.
 /// 0 when it does not parse, else 1, also with findings.
-int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression);
+int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression);
 
 /// The words of the tables, exactly.
 bool IsPropertyName(std::string_view text);

@@ -234,8 +234,8 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   return cell;
 }
 
-void CElementForm::JumpTo(std::uint32_t uid) {
-  const NumberHint argument(static_cast<std::int32_t>(uid));
+void CElementForm::JumpTo(Uid uid) {
+  const NumberHint argument(NumberOf(uid));
   Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 

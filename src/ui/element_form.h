@@ -46,7 +46,7 @@ struct FormField {
 
 /// A form: its class, its dialog and help numbers and its fields, in the order in which they are loaded.
 struct FormTable {
-  std::int32_t kind;
+  ElementKind kind;
   int dialog;
   int help;
   std::span<const FormField> fields;
@@ -98,7 +98,7 @@ class CElementForm : public CRightPaneBase {
   void Show(Control& control, CEL_Element& element);
   static void FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property, bool enabled);
   std::string ReferrerText(const CEL_Element& element) const;
-  void JumpTo(std::uint32_t uid);
+  void JumpTo(Uid uid);
   static bool IsEdited(const Control& control);
   static bool StoreText(const QString& text, CEL_Property& property);
   static bool StoreNumber(const QString& text, CEL_Property& property);

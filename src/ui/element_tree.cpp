@@ -24,8 +24,8 @@ class ElementItem final : public QTreeWidgetItem {
 }  // namespace
 
 std::string ElementCaption(const CEL_Element& element) {
-  if (element.Kind() == kind::kDerivedOutput) return element.description.Text();
-  if (element.Kind() == kind::kExternalFunction) {
+  if (element.Kind() == ElementKind::DerivedOutput) return element.description.Text();
+  if (element.Kind() == ElementKind::ExternalFunction) {
     return "User function '" + static_cast<const CEL_ExternalFunction&>(element).publicName.Text() + "'";
   }
   return element.symbol.Text();
@@ -49,7 +49,7 @@ CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
   return static_cast<ElementItem&>(item).data;
 }
 
-QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, std::int32_t kind, std::int32_t id,
+QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                                       const std::string& caption) {
   auto* item = MakeChild<ElementItem>();
   item->data.kind = kind;
@@ -60,7 +60,7 @@ QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, std::i
 }
 
 template <class Elements>
-void CElementTree::InsertFolder(std::int32_t kind, std::int32_t id, const Elements& elements) {
+void CElementTree::InsertFolder(ElementKind kind, Uid id, const Elements& elements) {
   QTreeWidgetItem* folder =
       Insert(*RootItem(), RootItem()->childCount(), kind, id, std::string(KindText(kind)));
   for (const auto& element : elements) InsertElement(*folder, *element, folder->childCount());
@@ -74,18 +74,18 @@ void CElementTree::Build(TemplateCore& core) {
   root->data.id = folder_id::kRoot;
   root->setText(0, strings::kSetup);
   addTopLevelItem(root);
-  InsertFolder(kind::kStateVariableList, folder_id::kStateVariables, core.StateVariables());
-  InsertFolder(kind::kConstantList, folder_id::kConstants, core.Constants());
-  InsertFolder(kind::kForcingList, folder_id::kForcings, core.Forcings());
-  InsertFolder(kind::kAuxiliaryList, folder_id::kAuxiliaries, core.Auxiliaries());
-  InsertFolder(kind::kProcessList, folder_id::kProcesses, core.Processes());
-  InsertFolder(kind::kDerivedOutputList, folder_id::kDerivedOutputs, core.DerivedOutputs());
+  InsertFolder(ElementKind::StateVariableList, folder_id::kStateVariables, core.StateVariables());
+  InsertFolder(ElementKind::ConstantList, folder_id::kConstants, core.Constants());
+  InsertFolder(ElementKind::ForcingList, folder_id::kForcings, core.Forcings());
+  InsertFolder(ElementKind::AuxiliaryList, folder_id::kAuxiliaries, core.Auxiliaries());
+  InsertFolder(ElementKind::ProcessList, folder_id::kProcesses, core.Processes());
+  InsertFolder(ElementKind::DerivedOutputList, folder_id::kDerivedOutputs, core.DerivedOutputs());
   if (core.GetMisc() != nullptr) ShowMisc(core);
   if (core.GetSpecieCount() > 0) ShowParticles(core);
   root->setExpanded(true);
 }
 
-QTreeWidgetItem* CElementTree::FindById(std::int32_t id) const {
+QTreeWidgetItem* CElementTree::FindById(Uid id) const {
   if (RootItem() == nullptr) return nullptr;
   for (QTreeWidgetItemIterator item(RootItem()); *item != nullptr; ++item) {
     if (DataOf(**item).id == id) return *item;
@@ -94,24 +94,25 @@ QTreeWidgetItem* CElementTree::FindById(std::int32_t id) const {
 }
 
 QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_Element& element, int place) {
-  return Insert(folder, place, element.Kind(), element.MessageUid(), ElementCaption(element));
+  return Insert(folder, place, element.Kind(), element.GetUid(), ElementCaption(element));
 }
 
 QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie) {
   QTreeWidgetItem* branch = InsertElement(folder, specie, folder.childCount());
-  const auto addFolder = [this, branch, &specie](std::int32_t listKind, const auto& members) {
+  const auto addFolder = [this, branch, &specie](ElementKind listKind, const auto& members) {
     const CEL_Element& head = specie.Head(listKind);
     QTreeWidgetItem* list =
-        Insert(*branch, branch->childCount(), listKind, head.MessageUid(), head.symbol.Text());
+        Insert(*branch, branch->childCount(), listKind, head.GetUid(), head.symbol.Text());
     for (const auto& member : members) InsertElement(*list, *member, list->childCount());
   };
   // The forcings of a class are kept out on purpose.
-  addFolder(kind::kSpecieStateVariableList, specie.stateVariables);
-  addFolder(kind::kSpecieConstantList, specie.constants);
-  addFolder(kind::kSpatialFunctionList, specie.spatialFunctions);
-  addFolder(kind::kArithmeticExpressionList, specie.arithmeticExpressions);
-  addFolder(kind::kHorizontalVectorList, specie.horizontalVectors);
-  addFolder(kind::kVerticalEquationList, std::vector<const CEL_Element*>{specie.verticalEquation.get()});
+  addFolder(ElementKind::SpecieStateVariableList, specie.stateVariables);
+  addFolder(ElementKind::SpecieConstantList, specie.constants);
+  addFolder(ElementKind::SpatialFunctionList, specie.spatialFunctions);
+  addFolder(ElementKind::ArithmeticExpressionList, specie.arithmeticExpressions);
+  addFolder(ElementKind::HorizontalVectorList, specie.horizontalVectors);
+  addFolder(ElementKind::VerticalEquationList,
+            std::vector<const CEL_Element*>{specie.verticalEquation.get()});
   return branch;
 }
 
@@ -121,27 +122,27 @@ void CElementTree::ShowMisc(TemplateCore& core) {
   QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses);
   const int place = particles == nullptr ? RootItem()->childCount() : RootItem()->indexOfChild(particles);
   QTreeWidgetItem* settings =
-      Insert(*RootItem(), place, kind::kMiscellaneous, folder_id::kMiscellaneous, "Miscellaneous");
+      Insert(*RootItem(), place, ElementKind::Miscellaneous, folder_id::kMiscellaneous, "Miscellaneous");
   const auto& functions = core.GetMisc()->ExternalFunctions();
   if (!functions.empty()) {
     QTreeWidgetItem* list =
         Insert(*settings, 0, node_kind::kPluginFunctions, folder_id::kPluginFunctions, "Plug-in Functions");
     for (const auto& function : functions) InsertElement(*list, *function, list->childCount());
   }
-  Insert(*settings, settings->childCount(), kind::kVisibilityGroups, folder_id::kVisibilityGroups,
+  Insert(*settings, settings->childCount(), ElementKind::VisibilityGroups, folder_id::kVisibilityGroups,
          "Visibility Groups");
   for (const VisibilityGroup& group : core.GetMisc()->Visibilities().groups) AddGroup(group.name);
 }
 
 void CElementTree::ShowParticles(TemplateCore& core) {
   if (FindById(folder_id::kParticleClasses) != nullptr) return;
-  QTreeWidgetItem* folder = Insert(*RootItem(), RootItem()->childCount(), kind::kSpecie,
+  QTreeWidgetItem* folder = Insert(*RootItem(), RootItem()->childCount(), ElementKind::Specie,
                                    folder_id::kParticleClasses, "Particle Classes");
   for (const auto& specie : core.Species()) InsertSpecie(*folder, *specie);
   folder->setExpanded(true);
 }
 
-void CElementTree::RemoveBranch(std::int32_t folderId) {
+void CElementTree::RemoveBranch(Uid folderId) {
   QTreeWidgetItem* branch = FindById(folderId);
   if (branch == nullptr) return;
   for (const QTreeWidgetItem* item = currentItem(); item != nullptr; item = item->parent()) {
@@ -160,7 +161,7 @@ void CElementTree::AddGroup(const std::string& name) {
   QTreeWidgetItem* folder = FindById(folder_id::kVisibilityGroups);
   if (folder == nullptr) return;
   QTreeWidgetItem* item =
-      Insert(*folder, folder->childCount(), kind::kVisibilityGroup, folder_id::kVisibilityGroup, name);
+      Insert(*folder, folder->childCount(), ElementKind::VisibilityGroup, folder_id::kVisibilityGroup, name);
   groupItems.push_back(item);
   DataOf(*item).groupIndex = static_cast<std::int32_t>(groupItems.size());
 }

@@ -26,7 +26,7 @@ class CElementTree final : public QTreeWidget {
   static CItemData& DataOf(QTreeWidgetItem& item);
 
   /// The first node with this id, depth first; none when there is none.
-  QTreeWidgetItem* FindById(std::int32_t id) const;
+  QTreeWidgetItem* FindById(Uid id) const;
   QTreeWidgetItem* RootItem() const { return topLevelItem(0); }
   /// The nodes of the visibility groups, in group order.
   const std::vector<QTreeWidgetItem*>& GroupItems() const { return groupItems; }
@@ -37,7 +37,7 @@ class CElementTree final : public QTreeWidget {
   QTreeWidgetItem* InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie);
   void ShowMisc(TemplateCore& core);
   void ShowParticles(TemplateCore& core);
-  void RemoveBranch(std::int32_t folderId);
+  void RemoveBranch(Uid folderId);
   /// Removes a node and what stands behind it; the root stays.
   static void RemoveNode(QTreeWidgetItem& item);
   void AddGroup(const std::string& name);
@@ -47,10 +47,10 @@ class CElementTree final : public QTreeWidget {
   void MoveNode(QTreeWidgetItem& item, int step);
 
  private:
-  QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, std::int32_t kind, std::int32_t id,
+  QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                           const std::string& caption);
   template <class Elements>
-  void InsertFolder(std::int32_t kind, std::int32_t id, const Elements& elements);
+  void InsertFolder(ElementKind kind, Uid id, const Elements& elements);
 
   std::vector<QTreeWidgetItem*> groupItems;
 };

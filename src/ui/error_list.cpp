@@ -30,7 +30,7 @@ CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
   setAccessibleName(strings::kMessages);
   // A choice makes the list anew: where a click also activates, the second signal finds its row gone.
   const auto choose = [this](const QTreeWidgetItem* row) {
-    if (row != nullptr) emit ElementChosen(row->data(0, kUidRole).toInt());
+    if (row != nullptr) emit ElementChosen(Uid{row->data(0, kUidRole).toInt()});
   };
   connect(this, &QTreeWidget::itemClicked, this, choose);
   connect(this, &QTreeWidget::itemActivated, this, choose);
@@ -43,17 +43,17 @@ std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
   std::size_t place = 0;
   for (const auto& undefined : core.UndefinedSymbols()) {
     const QString message = strings::kUndefinedSymbol + ToScreen(undefined->symbol);
-    for (const std::uint32_t user : undefined->usedBy) {
+    for (const Uid user : undefined->usedBy) {
       const CEL_Element* element = core.GetElement(user);
       const QString caption = element == nullptr ? QString() : ToScreen(ElementCaption(*element));
       rows.insert(rows.begin() + static_cast<std::ptrdiff_t>(std::min(place, rows.size())),
-                  {caption, message, static_cast<std::int32_t>(user)});
+                  {caption, message, user});
     }
     ++place;
   }
   std::string symbol;
   std::string text;
-  std::int32_t uid = 0;
+  Uid uid = Uid::None;
   for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
     Errors().GetErrorForList(index, symbol, uid, text);
     rows.push_back({symbol.empty() ? strings::kGeneric : ToScreen(symbol), ToScreen(text).trimmed(), uid});
@@ -76,7 +76,7 @@ void CErrorList::RefreshErrorList(TemplateCore& core) {
   QTreeWidgetItem* reselected = nullptr;
   for (const Row& row : rows) {
     auto* item = MakeChild<QTreeWidgetItem>(QStringList{row.item, row.message});
-    item->setData(0, kUidRole, row.uid);
+    item->setData(0, kUidRole, NumberOf(row.uid));
     item->setToolTip(1, row.message.toHtmlEscaped());
     items.append(item);
     const bool isSelected = selected != nullptr && row.item == selectedItem && row.message == selectedMessage;

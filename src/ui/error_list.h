@@ -2,8 +2,9 @@
 #pragma once
 
 #include <QTreeWidget>
-#include <cstdint>
 #include <vector>
+
+#include "platform/uid.h"
 
 namespace tessal {
 
@@ -20,13 +21,13 @@ class CErrorList final : public QTreeWidget {
 
  signals:
   /// A row was clicked or entered; -1 for one that belongs to no element.
-  void ElementChosen(std::int32_t uid);
+  void ElementChosen(Uid uid);
 
  private:
   struct Row {
     QString item;
     QString message;
-    std::int32_t uid;
+    Uid uid;
   };
 
   static std::vector<Row> CollectRows(const TemplateCore& core);

@@ -15,19 +15,19 @@ namespace tessal {
 namespace {
 
 struct KindColour {
-  std::int32_t kind;
+  ElementKind kind;
   QRgb colour;
 };
 
 // Constants, inputs, intermediate values and rates have a colour each; everything else is blue.
 constexpr std::array<KindColour, 7> kKindColours = {{
-    {kind::kConstant, qRgb(230, 0, 230)},
-    {kind::kSpecieConstant, qRgb(230, 0, 230)},
-    {kind::kForcing, qRgb(230, 115, 0)},
-    {kind::kSpatialFunction, qRgb(230, 115, 0)},
-    {kind::kAuxiliary, qRgb(0, 230, 0)},
-    {kind::kArithmeticExpression, qRgb(0, 230, 0)},
-    {kind::kProcess, qRgb(0, 115, 230)},
+    {ElementKind::Constant, qRgb(230, 0, 230)},
+    {ElementKind::SpecieConstant, qRgb(230, 0, 230)},
+    {ElementKind::Forcing, qRgb(230, 115, 0)},
+    {ElementKind::SpatialFunction, qRgb(230, 115, 0)},
+    {ElementKind::Auxiliary, qRgb(0, 230, 0)},
+    {ElementKind::ArithmeticExpression, qRgb(0, 230, 0)},
+    {ElementKind::Process, qRgb(0, 115, 230)},
 }};
 constexpr QRgb kOtherElement = qRgb(0, 0, 255);
 constexpr QRgb kCallable = qRgb(0, 155, 0);
@@ -55,7 +55,7 @@ bool IsCallable(const std::string& name) {
 
 TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
   std::int32_t id = 0;
-  std::int32_t elementKind = 0;
+  ElementKind elementKind = ElementKind::None;
   if (core.FindElementBySymbol(name, id, elementKind)) {
     const auto row =
         std::find_if(kKindColours.begin(), kKindColours.end(),

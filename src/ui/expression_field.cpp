@@ -104,11 +104,11 @@ QString CAutoRichEditCtrl::ParserMessage() const {
   return parsed != 0 ? QString() : ToScreen(message).trimmed();
 }
 
-std::uint32_t CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
+Uid CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
   return ElementNamed(anchorAt(point));
 }
 
-std::uint32_t CAutoRichEditCtrl::LinkAtCaret() const {
+Uid CAutoRichEditCtrl::LinkAtCaret() const {
   QTextCursor caret = textCursor();
   const QString before = caret.charFormat().anchorHref();
   caret.movePosition(QTextCursor::NextCharacter);
@@ -116,16 +116,16 @@ std::uint32_t CAutoRichEditCtrl::LinkAtCaret() const {
   return ElementNamed(behind.isEmpty() ? before : behind);
 }
 
-std::uint32_t CAutoRichEditCtrl::ElementNamed(const QString& name) const {
-  if (name.isEmpty()) return 0;
+Uid CAutoRichEditCtrl::ElementNamed(const QString& name) const {
+  if (name.isEmpty()) return Uid::None;
   std::int32_t id = 0;
-  std::int32_t elementKind = 0;
-  if (!core.FindElementBySymbol(FromScreen(name, content), id, elementKind)) return 0;
+  ElementKind elementKind = ElementKind::None;
+  if (!core.FindElementBySymbol(FromScreen(name, content), id, elementKind)) return Uid::None;
   const CEL_Element* element = core.GetElementBySequence(static_cast<std::uint32_t>(id));
-  return element == nullptr ? 0 : element->GetUid();
+  return element == nullptr ? Uid::None : element->GetUid();
 }
 
-QString CAutoRichEditCtrl::TipOf(std::uint32_t uid) const {
+QString CAutoRichEditCtrl::TipOf(Uid uid) const {
   const CEL_Element* element = core.GetElement(uid);
   if (element == nullptr) return {};
   return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.Text());
@@ -134,8 +134,8 @@ QString CAutoRichEditCtrl::TipOf(std::uint32_t uid) const {
 bool CAutoRichEditCtrl::event(QEvent* happened) {
   if (happened->type() != QEvent::ToolTip) return CPlainTextField::event(happened);
   const auto* help = static_cast<QHelpEvent*>(happened);
-  const std::uint32_t uid = LinkAt(viewport()->mapFrom(this, help->pos()));
-  if (uid == 0) {
+  const Uid uid = LinkAt(viewport()->mapFrom(this, help->pos()));
+  if (uid == Uid::None) {
     QToolTip::hideText();
   } else {
     QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
@@ -150,8 +150,8 @@ void CAutoRichEditCtrl::mouseMoveEvent(QMouseEvent* move) {
 
 void CAutoRichEditCtrl::contextMenuEvent(QContextMenuEvent* request) {
   const bool byKey = request->reason() == QContextMenuEvent::Keyboard;
-  const std::uint32_t uid = byKey ? LinkAtCaret() : LinkAt(viewport()->mapFromGlobal(request->globalPos()));
-  if (uid != 0) {
+  const Uid uid = byKey ? LinkAtCaret() : LinkAt(viewport()->mapFromGlobal(request->globalPos()));
+  if (uid != Uid::None) {
     emit LinkActivated(uid);
     return;
   }

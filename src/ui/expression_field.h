@@ -2,9 +2,9 @@
 // read-only twin lists the elements that use an element.
 #pragma once
 
-#include <cstdint>
 #include <string>
 
+#include "platform/uid.h"
 #include "ui/plain_text_field.h"
 
 namespace tessal {
@@ -24,13 +24,13 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   QString ParserMessage() const;
 
   /// The identity of the element whose link lies at a point of the viewport, 0 for none.
-  std::uint32_t LinkAt(const QPoint& point) const;
+  Uid LinkAt(const QPoint& point) const;
   /// What is shown while the pointer rests on an element's link: its kind and its description.
-  QString TipOf(std::uint32_t uid) const;
+  QString TipOf(Uid uid) const;
 
  signals:
   /// A link was clicked with the right button, or the menu was asked for while the caret stood on it.
-  void LinkActivated(std::uint32_t uid);
+  void LinkActivated(Uid uid);
 
  protected:
   bool event(QEvent* happened) override;
@@ -40,9 +40,9 @@ class CAutoRichEditCtrl final : public CPlainTextField {
 
  private:
   void Colour();
-  std::uint32_t LinkAtCaret() const;
+  Uid LinkAtCaret() const;
   /// The identity of the element with a symbol, 0 for none.
-  std::uint32_t ElementNamed(const QString& name) const;
+  Uid ElementNamed(const QString& name) const;
 
   const TemplateCore& core;
   std::string content;

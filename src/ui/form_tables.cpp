@@ -135,13 +135,13 @@ constexpr FormField kMiscFields[] = {
     {1060, "Angle Unit", SortedChoice, Of<&CEL_Miscanellous::trigonometrics>},
 };
 
-constexpr FormTable kStateVariableForm{kind::kStateVariable, 675, 100, kStateVariableFields};
-constexpr FormTable kConstantForm{kind::kConstant, 653, 102, kInputFields};
-constexpr FormTable kForcingForm{kind::kForcing, 660, 106, kInputFields};
-constexpr FormTable kAuxiliaryForm{kind::kAuxiliary, 652, 101, kAuxiliaryFields};
-constexpr FormTable kProcessForm{kind::kProcess, 667, 119, kProcessFields};
-constexpr FormTable kDerivedOutputForm{kind::kDerivedOutput, 655, 120, kDerivedOutputFields};
-constexpr FormTable kMiscForm{kind::kMiscellaneous, 665, 110, kMiscFields};
+constexpr FormTable kStateVariableForm{ElementKind::StateVariable, 675, 100, kStateVariableFields};
+constexpr FormTable kConstantForm{ElementKind::Constant, 653, 102, kInputFields};
+constexpr FormTable kForcingForm{ElementKind::Forcing, 660, 106, kInputFields};
+constexpr FormTable kAuxiliaryForm{ElementKind::Auxiliary, 652, 101, kAuxiliaryFields};
+constexpr FormTable kProcessForm{ElementKind::Process, 667, 119, kProcessFields};
+constexpr FormTable kDerivedOutputForm{ElementKind::DerivedOutput, 655, 120, kDerivedOutputFields};
+constexpr FormTable kMiscForm{ElementKind::Miscellaneous, 665, 110, kMiscFields};
 
 template <class Form>
 std::unique_ptr<CRightPaneBase> Make(const FormContext& context, QWidget* parent) {
@@ -149,18 +149,18 @@ std::unique_ptr<CRightPaneBase> Make(const FormContext& context, QWidget* parent
 }
 
 struct FormRow {
-  std::int32_t kind;
+  ElementKind kind;
   std::unique_ptr<CRightPaneBase> (*make)(const FormContext& context, QWidget* parent);
 };
 
 constexpr std::array<FormRow, 7> kForms = {{
-    {kind::kStateVariable, Make<CStateVariableView>},
-    {kind::kConstant, Make<CConstantView>},
-    {kind::kForcing, Make<CForcingView>},
-    {kind::kAuxiliary, Make<CAuxilarieView>},
-    {kind::kProcess, Make<CProcessView>},
-    {kind::kDerivedOutput, Make<CDerviedView>},
-    {kind::kMiscellaneous, Make<CMiscView>},
+    {ElementKind::StateVariable, Make<CStateVariableView>},
+    {ElementKind::Constant, Make<CConstantView>},
+    {ElementKind::Forcing, Make<CForcingView>},
+    {ElementKind::Auxiliary, Make<CAuxilarieView>},
+    {ElementKind::Process, Make<CProcessView>},
+    {ElementKind::DerivedOutput, Make<CDerviedView>},
+    {ElementKind::Miscellaneous, Make<CMiscView>},
 }};
 
 }  // namespace
@@ -216,7 +216,7 @@ CNoView::CNoView(const FormContext& context, QWidget* parent) : CRightPaneBase(c
 
 std::unique_ptr<CRightPaneBase> MakeForm(const FormContext& context, QWidget* parent) {
   for (const FormRow& row : kForms) {
-    const bool isElement = context.item.id > 0 || context.item.kind == kind::kMiscellaneous;
+    const bool isElement = IsElement(context.item.id) || context.item.kind == ElementKind::Miscellaneous;
     if (isElement && row.kind == context.item.kind) return row.make(context, parent);
   }
   return std::make_unique<CNoView>(context, parent);

@@ -5,7 +5,7 @@
 
 namespace tessal {
 
-void CNavigationHistory::Add(std::int32_t id, const std::string& caption) {
+void CNavigationHistory::Add(Uid id, const std::string& caption) {
   const bool hasPresent = position >= 0 && position < static_cast<std::ptrdiff_t>(entries.size());
   const auto before = hasPresent ? std::next(entries.begin(), position) : entries.begin();
   const auto entered = entries.insert(before, {id, caption});
@@ -18,18 +18,18 @@ void CNavigationHistory::Add(std::int32_t id, const std::string& caption) {
   position = present == entries.end() ? -1 : std::distance(entries.begin(), present);
 }
 
-std::int32_t CNavigationHistory::Back() {
+Uid CNavigationHistory::Back() {
   if (CanGoBack()) ++position;
   return IdAtPosition();
 }
 
-std::int32_t CNavigationHistory::Forward() {
+Uid CNavigationHistory::Forward() {
   if (CanGoForward()) --position;
   return IdAtPosition();
 }
 
-std::int32_t CNavigationHistory::IdAtPosition() const {
-  if (position < 0 || position >= static_cast<std::ptrdiff_t>(entries.size())) return 0;
+Uid CNavigationHistory::IdAtPosition() const {
+  if (position < 0 || position >= static_cast<std::ptrdiff_t>(entries.size())) return Uid::None;
   return std::next(entries.begin(), position)->id;
 }
 

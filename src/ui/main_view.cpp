@@ -175,7 +175,7 @@ void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHi
       number != 0 ? tree->ShowParticles(Core()) : tree->RemoveBranch(folder_id::kParticleClasses);
       break;
     case hint::kSelectElement:
-      SelectById(number);
+      SelectById(Uid{number});
       break;
     case hint::kCommit:
       Commit();
@@ -184,11 +184,11 @@ void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHi
       if (const auto* request = dynamic_cast<const CreateHint*>(argument)) CreateElement(request->request);
       break;
     case hint::kDeleteItem:
-      if (QTreeWidgetItem* item = tree->FindById(number)) DeleteNode(*item);
+      if (QTreeWidgetItem* item = tree->FindById(Uid{number})) DeleteNode(*item);
       break;
     case hint::kMoveUp:
     case hint::kMoveDown:
-      if (QTreeWidgetItem* item = tree->FindById(number))
+      if (QTreeWidgetItem* item = tree->FindById(Uid{number}))
         tree->MoveNode(*item, hintNumber == hint::kMoveUp ? -1 : 1);
       break;
     case hint::kAddGroup: {
@@ -264,8 +264,8 @@ void CMainView::Commit() {
 void CMainView::RefreshCaption(QTreeWidgetItem* item) {
   if (item == nullptr) return;
   const CItemData& node = CElementTree::DataOf(*item);
-  const CEL_Element* element = node.id > 0 ? Core().GetElement(static_cast<std::uint32_t>(node.id)) : nullptr;
-  const bool isFolder = node.kind >= kind::kRoot;
+  const CEL_Element* element = IsElement(node.id) ? Core().GetElement(node.id) : nullptr;
+  const bool isFolder = node.kind >= ElementKind::Root;
   if (element != nullptr && !isFolder) {
     const QString caption = ToScreen(MarkedCaption(*element));
     if (!caption.isEmpty()) item->setText(0, caption);
@@ -281,7 +281,7 @@ void CMainView::ShowHelp() {
   dialogs.ShowHelp(this, kFirstHelpTopic + HelpNumber());
 }
 
-void CMainView::SelectById(std::int32_t id) {
+void CMainView::SelectById(Uid id) {
   QTreeWidgetItem* item = tree->FindById(id);
   if (item == nullptr) return;
   tree->setCurrentItem(item);
@@ -314,33 +314,33 @@ void CMainView::FillHistoryMenu() {
 }
 
 QTreeWidgetItem* CMainView::FolderFor(const CreateRequest& request) const {
-  const auto elementKind = static_cast<std::int32_t>(request.kind);
-  if (const std::int32_t folder = FolderOfKind(elementKind); folder != 0) return tree->FindById(folder);
+  const ElementKind elementKind = request.kind;
+  if (const Uid folder = FolderOfKind(elementKind); folder != Uid::None) return tree->FindById(folder);
   return tree->FindById(request.ownerId);
 }
 
-std::uint32_t CMainView::CreateElement(const CreateRequest& request) {
-  const auto elementKind = static_cast<std::int32_t>(request.kind);
-  if (elementKind == kind::kVisibilityGroup || elementKind == kind::kVisibilityGroups) {
+Uid CMainView::CreateElement(const CreateRequest& request) {
+  const ElementKind elementKind = request.kind;
+  if (elementKind == ElementKind::VisibilityGroup || elementKind == ElementKind::VisibilityGroups) {
     SetNotifyChanges(false);
     document.UpdateAllViews(nullptr, hint::kAddGroup);
     const NumberHint last(static_cast<std::int32_t>(tree->GroupItems().size()) - 1);
     document.UpdateAllViews(nullptr, hint::kSelectGroup, &last);
-    return 0;
+    return Uid::None;
   }
   const CreatedElement created = Core().CreateElement(request);
-  if (created.uid != 0) InsertCreated(request, created);
+  if (created.uid != Uid::None) InsertCreated(request, created);
   return created.uid;
 }
 
 void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement& created) {
   const CEL_Element* element = Core().GetElement(created.uid);
-  if (request.kind == static_cast<std::uint32_t>(kind::kSpecie)) tree->ShowParticles(Core());
+  if (request.kind == ElementKind::Specie) tree->ShowParticles(Core());
   QTreeWidgetItem* folder = FolderFor(request);
   if (element == nullptr || folder == nullptr) return;
   // A folder that was made only now holds the element already.
-  QTreeWidgetItem* item = tree->FindById(element->MessageUid());
-  if (item == nullptr && element->Kind() == kind::kSpecie) {
+  QTreeWidgetItem* item = tree->FindById(element->GetUid());
+  if (item == nullptr && element->Kind() == ElementKind::Specie) {
     item = tree->InsertSpecie(*folder, static_cast<const CEL_Lagrange_Specie&>(*element));
   } else if (item == nullptr) {
     item = tree->InsertElement(*folder, *element, PlaceOf(created, *folder));
@@ -350,8 +350,8 @@ void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement
 
 int CMainView::PlaceOf(const CreatedElement& created, const QTreeWidgetItem& folder) const {
   if (!created.placed) return folder.childCount();
-  if (created.predecessor == 0) return 0;
-  QTreeWidgetItem* before = tree->FindById(static_cast<std::int32_t>(created.predecessor));
+  if (created.predecessor == Uid::None) return 0;
+  QTreeWidgetItem* before = tree->FindById(created.predecessor);
   return before == nullptr ? 0 : folder.indexOfChild(before) + 1;
 }
 
@@ -360,7 +360,7 @@ void CMainView::OpenContextMenu(const QPoint& point) {
   if (item == nullptr) return;
   const CItemData node = CElementTree::DataOf(*item);
   const NodeCommands commands = CommandsOfNode(node, Core());
-  if (commands.kindToCreate == 0) return;
+  if (commands.kindToCreate == ElementKind::None) return;
   QMenu menu(this);
   QAction* create = menu.addAction(strings::kCreateNew, this, [this, node] { CreateFromMenu(node); });
   create->setEnabled(commands.canCreate);
@@ -375,10 +375,10 @@ void CMainView::OpenContextMenu(const QPoint& point) {
 void CMainView::CreateFromMenu(const CItemData& clicked) {
   const NodeCommands commands = CommandsOfNode(clicked, Core());
   CreateRequest request;
-  request.kind = static_cast<std::uint32_t>(commands.kindToCreate);
+  request.kind = commands.kindToCreate;
   request.ownerId = commands.ownerId;
-  const std::uint32_t uid = CreateElement(request);
-  if (uid != 0) SelectById(static_cast<std::int32_t>(uid));
+  const Uid uid = CreateElement(request);
+  if (uid != Uid::None) SelectById(uid);
   errorList->RefreshErrorList(Core());
   MarkDocument();
 }
@@ -394,17 +394,16 @@ void CMainView::DeleteNode(QTreeWidgetItem& item) {
   CElementTree::RemoveNode(item);
 }
 
-void CMainView::DeleteFromMenu(std::int32_t id, std::int32_t groupIndex) {
+void CMainView::DeleteFromMenu(Uid id, std::int32_t groupIndex) {
   if (groupIndex > 0) {
     DeleteGroup(groupIndex - 1);
   } else {
     // A form with something unwritten may use the element by now.
     Commit();
-    const auto uid = static_cast<std::uint32_t>(id);
     QTreeWidgetItem* item = tree->FindById(id);
-    if (item == nullptr || !Core().CanDelete(uid)) return;
+    if (item == nullptr || !Core().CanDelete(id)) return;
     DeleteNode(*item);
-    Core().DeleteElement(uid);
+    Core().DeleteElement(id);
   }
   errorList->RefreshErrorList(Core());
   MarkDocument();

@@ -52,9 +52,9 @@ class CMainView final : public QWidget, public CView {
   QMenu& HistoryMenu() const { return *historyMenu; }
 
   /// Selects the node with this id and makes it visible; nothing happens when there is none.
-  void SelectById(std::int32_t id);
-  /// Makes an element and its node; its identity, 0 when nothing was made.
-  std::uint32_t CreateElement(const CreateRequest& request);
+  void SelectById(Uid id);
+  /// Makes an element and its node; its identity, none when nothing was made.
+  Uid CreateElement(const CreateRequest& request);
 
  protected:
   bool eventFilter(QObject* watched, QEvent* happened) override;
@@ -80,7 +80,7 @@ class CMainView final : public QWidget, public CView {
 
   void OpenContextMenu(const QPoint& point);
   void CreateFromMenu(const CItemData& clicked);
-  void DeleteFromMenu(std::int32_t id, std::int32_t groupIndex);
+  void DeleteFromMenu(Uid id, std::int32_t groupIndex);
   void DeleteNode(QTreeWidgetItem& item);
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;

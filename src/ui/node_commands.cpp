@@ -17,71 +17,79 @@ constexpr int kOtherHelp = 107;
 enum class OwnerRule { Folder, ListHead, Node };
 
 struct CommandRow {
-  std::int32_t nodeKind;
-  std::int32_t kindToCreate;
+  ElementKind nodeKind;
+  ElementKind kindToCreate;
   OwnerRule owner;
-  std::int32_t folder;
+  Uid folder;
   bool offersDelete;
 };
 
 constexpr std::array<CommandRow, 29> kCommands = {{
-    {kind::kStateVariable, kind::kStateVariable, OwnerRule::ListHead, 0, true},
-    {kind::kConstant, kind::kConstant, OwnerRule::Folder, folder_id::kConstants, true},
-    {kind::kForcing, kind::kForcing, OwnerRule::Folder, folder_id::kForcings, true},
-    {kind::kAuxiliary, kind::kAuxiliary, OwnerRule::Folder, folder_id::kAuxiliaries, true},
-    {kind::kProcess, kind::kProcess, OwnerRule::ListHead, 0, true},
-    {kind::kDerivedOutput, kind::kDerivedOutput, OwnerRule::Folder, folder_id::kDerivedOutputs, true},
-    {kind::kSpecie, kind::kSpecie, OwnerRule::Folder, folder_id::kParticleClasses, true},
-    {kind::kSpecieStateVariable, kind::kSpecieStateVariable, OwnerRule::ListHead, 0, true},
-    {kind::kSpecieConstant, kind::kSpecieConstant, OwnerRule::ListHead, 0, true},
-    {kind::kSpecieForcing, kind::kSpecieForcing, OwnerRule::ListHead, 0, true},
-    {kind::kSpatialFunction, kind::kSpatialFunction, OwnerRule::ListHead, 0, true},
-    {kind::kArithmeticExpression, kind::kArithmeticExpression, OwnerRule::ListHead, 0, true},
-    {kind::kHorizontalVector, kind::kHorizontalVector, OwnerRule::ListHead, 0, true},
-    {kind::kExternalFunction, kind::kExternalFunction, OwnerRule::Folder, folder_id::kPluginFunctions, true},
-    {kind::kVisibilityGroup, kind::kVisibilityGroup, OwnerRule::Folder, folder_id::kVisibilityGroup, true},
-    {kind::kVisibilityGroups, kind::kVisibilityGroups, OwnerRule::Folder, folder_id::kVisibilityGroups,
+    {ElementKind::StateVariable, ElementKind::StateVariable, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::Constant, ElementKind::Constant, OwnerRule::Folder, folder_id::kConstants, true},
+    {ElementKind::Forcing, ElementKind::Forcing, OwnerRule::Folder, folder_id::kForcings, true},
+    {ElementKind::Auxiliary, ElementKind::Auxiliary, OwnerRule::Folder, folder_id::kAuxiliaries, true},
+    {ElementKind::Process, ElementKind::Process, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::DerivedOutput, ElementKind::DerivedOutput, OwnerRule::Folder, folder_id::kDerivedOutputs,
+     true},
+    {ElementKind::Specie, ElementKind::Specie, OwnerRule::Folder, folder_id::kParticleClasses, true},
+    {ElementKind::SpecieStateVariable, ElementKind::SpecieStateVariable, OwnerRule::ListHead, Uid::None,
+     true},
+    {ElementKind::SpecieConstant, ElementKind::SpecieConstant, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::SpecieForcing, ElementKind::SpecieForcing, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::SpatialFunction, ElementKind::SpatialFunction, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::ArithmeticExpression, ElementKind::ArithmeticExpression, OwnerRule::ListHead, Uid::None,
+     true},
+    {ElementKind::HorizontalVector, ElementKind::HorizontalVector, OwnerRule::ListHead, Uid::None, true},
+    {ElementKind::ExternalFunction, ElementKind::ExternalFunction, OwnerRule::Folder,
+     folder_id::kPluginFunctions, true},
+    {ElementKind::VisibilityGroup, ElementKind::VisibilityGroup, OwnerRule::Folder,
+     folder_id::kVisibilityGroup, true},
+    {ElementKind::VisibilityGroups, ElementKind::VisibilityGroups, OwnerRule::Folder,
+     folder_id::kVisibilityGroups, false},
+    {ElementKind::StateVariableList, ElementKind::StateVariable, OwnerRule::Node, Uid::None, false},
+    {ElementKind::ConstantList, ElementKind::Constant, OwnerRule::Folder, folder_id::kConstants, false},
+    {ElementKind::ForcingList, ElementKind::Forcing, OwnerRule::Folder, folder_id::kForcings, false},
+    {ElementKind::AuxiliaryList, ElementKind::Auxiliary, OwnerRule::Folder, folder_id::kAuxiliaries, false},
+    {ElementKind::ProcessList, ElementKind::Process, OwnerRule::Node, Uid::None, false},
+    {ElementKind::DerivedOutputList, ElementKind::DerivedOutput, OwnerRule::Folder,
+     folder_id::kDerivedOutputs, false},
+    {ElementKind::SpecieStateVariableList, ElementKind::SpecieStateVariable, OwnerRule::Node, Uid::None,
      false},
-    {kind::kStateVariableList, kind::kStateVariable, OwnerRule::Node, 0, false},
-    {kind::kConstantList, kind::kConstant, OwnerRule::Folder, folder_id::kConstants, false},
-    {kind::kForcingList, kind::kForcing, OwnerRule::Folder, folder_id::kForcings, false},
-    {kind::kAuxiliaryList, kind::kAuxiliary, OwnerRule::Folder, folder_id::kAuxiliaries, false},
-    {kind::kProcessList, kind::kProcess, OwnerRule::Node, 0, false},
-    {kind::kDerivedOutputList, kind::kDerivedOutput, OwnerRule::Folder, folder_id::kDerivedOutputs, false},
-    {kind::kSpecieStateVariableList, kind::kSpecieStateVariable, OwnerRule::Node, 0, false},
-    {kind::kSpecieConstantList, kind::kSpecieConstant, OwnerRule::Node, 0, false},
-    {kind::kSpecieForcingList, kind::kSpecieForcing, OwnerRule::Node, 0, false},
-    {kind::kSpatialFunctionList, kind::kSpatialFunction, OwnerRule::Node, 0, false},
-    {kind::kArithmeticExpressionList, kind::kArithmeticExpression, OwnerRule::Node, 0, false},
-    {kind::kHorizontalVectorList, kind::kHorizontalVector, OwnerRule::Node, 0, false},
+    {ElementKind::SpecieConstantList, ElementKind::SpecieConstant, OwnerRule::Node, Uid::None, false},
+    {ElementKind::SpecieForcingList, ElementKind::SpecieForcing, OwnerRule::Node, Uid::None, false},
+    {ElementKind::SpatialFunctionList, ElementKind::SpatialFunction, OwnerRule::Node, Uid::None, false},
+    {ElementKind::ArithmeticExpressionList, ElementKind::ArithmeticExpression, OwnerRule::Node, Uid::None,
+     false},
+    {ElementKind::HorizontalVectorList, ElementKind::HorizontalVector, OwnerRule::Node, Uid::None, false},
     // The end of the table.
-    {node_kind::kRoot, 0, OwnerRule::Node, 0, false},
+    {node_kind::kRoot, ElementKind::None, OwnerRule::Node, Uid::None, false},
 }};
 
 struct HelpRow {
-  std::int32_t elementKind;
-  std::int32_t listKind;
+  ElementKind elementKind;
+  ElementKind listKind;
   int help;
 };
 
 constexpr std::array<HelpRow, 13> kHelp = {{
-    {kind::kStateVariable, kind::kStateVariableList, 100},
-    {kind::kConstant, kind::kConstantList, 102},
-    {kind::kForcing, kind::kForcingList, 106},
-    {kind::kAuxiliary, kind::kAuxiliaryList, 101},
-    {kind::kProcess, kind::kProcessList, 119},
-    {kind::kDerivedOutput, kind::kDerivedOutputList, 120},
-    {kind::kSpecie, kind::kSpecie, 114},
-    {kind::kSpecieStateVariable, kind::kSpecieStateVariableList, 116},
-    {kind::kSpecieConstant, kind::kSpecieConstantList, 113},
-    {kind::kSpatialFunction, kind::kSpatialFunctionList, 115},
-    {kind::kArithmeticExpression, kind::kArithmeticExpressionList, 112},
-    {kind::kHorizontalVector, kind::kHorizontalVectorList, 117},
-    {kind::kVerticalEquation, kind::kVerticalEquationList, 118},
+    {ElementKind::StateVariable, ElementKind::StateVariableList, 100},
+    {ElementKind::Constant, ElementKind::ConstantList, 102},
+    {ElementKind::Forcing, ElementKind::ForcingList, 106},
+    {ElementKind::Auxiliary, ElementKind::AuxiliaryList, 101},
+    {ElementKind::Process, ElementKind::ProcessList, 119},
+    {ElementKind::DerivedOutput, ElementKind::DerivedOutputList, 120},
+    {ElementKind::Specie, ElementKind::Specie, 114},
+    {ElementKind::SpecieStateVariable, ElementKind::SpecieStateVariableList, 116},
+    {ElementKind::SpecieConstant, ElementKind::SpecieConstantList, 113},
+    {ElementKind::SpatialFunction, ElementKind::SpatialFunctionList, 115},
+    {ElementKind::ArithmeticExpression, ElementKind::ArithmeticExpressionList, 112},
+    {ElementKind::HorizontalVector, ElementKind::HorizontalVectorList, 117},
+    {ElementKind::VerticalEquation, ElementKind::VerticalEquationList, 118},
 }};
 constexpr int kMiscellaneousHelp = 110;
 
-std::int32_t OwnerOf(const CItemData& node, const CommandRow& row, const TemplateCore& core) {
+Uid OwnerOf(const CItemData& node, const CommandRow& row, const TemplateCore& core) {
   switch (row.owner) {
     case OwnerRule::Folder:
       return row.folder;
@@ -90,13 +98,13 @@ std::int32_t OwnerOf(const CItemData& node, const CommandRow& row, const Templat
     case OwnerRule::ListHead:
       break;
   }
-  const CEL_Element* element = core.GetElement(static_cast<std::uint32_t>(node.id));
-  return element == nullptr || element->Parent() == nullptr ? 0 : element->Parent()->MessageUid();
+  const CEL_Element* element = core.GetElement(node.id);
+  return element == nullptr || element->Parent() == nullptr ? Uid::None : element->Parent()->GetUid();
 }
 
 /// Whether the class that owns a list may have one more horizontal movement.
-bool HasRoomForVector(std::int32_t ownerId, const TemplateCore& core) {
-  const CEL_Lagrange_Specie* specie = core.GetParentSpecie(static_cast<std::uint32_t>(ownerId));
+bool HasRoomForVector(Uid ownerId, const TemplateCore& core) {
+  const CEL_Lagrange_Specie* specie = core.GetParentSpecie(ownerId);
   return specie != nullptr && specie->horizontalVectors.size() < kMostHorizontalVectors;
 }
 
@@ -107,45 +115,45 @@ NodeCommands CommandsOfNode(const CItemData& node, const TemplateCore& core) {
   const auto row = std::find_if(kCommands.begin(), kCommands.end(), [&node](const CommandRow& candidate) {
     return candidate.nodeKind == node.kind;
   });
-  if (row == kCommands.end() || row->kindToCreate == 0) return commands;
+  if (row == kCommands.end() || row->kindToCreate == ElementKind::None) return commands;
   commands.kindToCreate = row->kindToCreate;
   commands.ownerId = OwnerOf(node, *row, core);
   commands.canCreate =
-      row->kindToCreate != kind::kExternalFunction &&
-      (row->kindToCreate != kind::kHorizontalVector || HasRoomForVector(commands.ownerId, core));
-  const bool isFolder = node.kind == kind::kSpecie && node.id == folder_id::kParticleClasses;
+      row->kindToCreate != ElementKind::ExternalFunction &&
+      (row->kindToCreate != ElementKind::HorizontalVector || HasRoomForVector(commands.ownerId, core));
+  const bool isFolder = node.kind == ElementKind::Specie && node.id == folder_id::kParticleClasses;
   commands.offersDelete = row->offersDelete && !isFolder;
-  commands.canDelete = node.kind == kind::kVisibilityGroup ||
-                       (node.id > 0 && core.CanDelete(static_cast<std::uint32_t>(node.id)));
+  commands.canDelete =
+      node.kind == ElementKind::VisibilityGroup || (IsElement(node.id) && core.CanDelete(node.id));
   return commands;
 }
 
-int HelpNumberOfKind(std::int32_t nodeKind) {
-  if (nodeKind == kind::kMiscellaneous) return kMiscellaneousHelp;
+int HelpNumberOfKind(ElementKind nodeKind) {
+  if (nodeKind == ElementKind::Miscellaneous) return kMiscellaneousHelp;
   const auto row = std::find_if(kHelp.begin(), kHelp.end(), [nodeKind](const HelpRow& candidate) {
     return candidate.elementKind == nodeKind || candidate.listKind == nodeKind;
   });
   return row == kHelp.end() ? kOtherHelp : row->help;
 }
 
-std::int32_t FolderOfKind(std::int32_t elementKind) {
+Uid FolderOfKind(ElementKind elementKind) {
   switch (elementKind) {
-    case kind::kStateVariable:
+    case ElementKind::StateVariable:
       return folder_id::kStateVariables;
-    case kind::kConstant:
+    case ElementKind::Constant:
       return folder_id::kConstants;
-    case kind::kForcing:
+    case ElementKind::Forcing:
       return folder_id::kForcings;
-    case kind::kAuxiliary:
+    case ElementKind::Auxiliary:
       return folder_id::kAuxiliaries;
-    case kind::kProcess:
+    case ElementKind::Process:
       return folder_id::kProcesses;
-    case kind::kDerivedOutput:
+    case ElementKind::DerivedOutput:
       return folder_id::kDerivedOutputs;
-    case kind::kSpecie:
+    case ElementKind::Specie:
       return folder_id::kParticleClasses;
     default:
-      return 0;
+      return Uid::None;
   }
 }
 

@@ -1,7 +1,8 @@
 // What can be done with a node of the tree, by its kind.
 #pragma once
 
-#include <cstdint>
+#include "elements/element_kind.h"
+#include "platform/uid.h"
 
 namespace tessal {
 
@@ -9,8 +10,8 @@ struct CItemData;
 class TemplateCore;
 
 struct NodeCommands {
-  std::int32_t kindToCreate = 0;  ///< 0: the node has no menu
-  std::int32_t ownerId = 0;       ///< the second field of the request
+  ElementKind kindToCreate = ElementKind::None;  ///< None: the node has no menu
+  Uid ownerId = Uid::None;                       ///< the second field of the request
   bool canCreate = false;
   bool offersDelete = false;
   bool canDelete = false;
@@ -19,9 +20,9 @@ struct NodeCommands {
 NodeCommands CommandsOfNode(const CItemData& node, const TemplateCore& core);
 
 /// The number of the help topic for nodes of a kind.
-int HelpNumberOfKind(std::int32_t nodeKind);
+int HelpNumberOfKind(ElementKind nodeKind);
 
-/// The id of the folder that holds the elements of a kind from 1 to 7; 0 for any other kind.
-std::int32_t FolderOfKind(std::int32_t elementKind);
+/// The id of the folder that holds the elements of a kind from 1 to 7; none for any other kind.
+Uid FolderOfKind(ElementKind elementKind);
 
 }  // namespace tessal

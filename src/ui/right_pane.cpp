@@ -50,7 +50,7 @@ TemplateCore& CRightPaneBase::Core() const {
 
 CEL_Element* CRightPaneBase::Element() const {
   if (where.item.id == folder_id::kMiscellaneous) return Core().GetMisc();
-  return where.item.id < 1 ? nullptr : Core().GetElement(static_cast<std::uint32_t>(where.item.id));
+  return IsElement(where.item.id) ? Core().GetElement(where.item.id) : nullptr;
 }
 
 void CRightPaneBase::Load() {

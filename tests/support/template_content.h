@@ -15,14 +15,14 @@ namespace tessal::test {
 /// counts the saves.
 inline bool IsInNoFile(const CEL_Element& element, const std::string& field) {
   switch (element.Kind()) {
-    case kind::kDerivedOutput:
+    case ElementKind::DerivedOutput:
       return field == "Symbol";
-    case kind::kSpecieForcing:
+    case ElementKind::SpecieForcing:
       return field.starts_with("UNQ ") || field == "Spatial Variation";
-    case kind::kSpatialFunction:
-    case kind::kExternalFunction:
+    case ElementKind::SpatialFunction:
+    case ElementKind::ExternalFunction:
       return field.starts_with("UNQ ");
-    case kind::kMiscellaneous:
+    case ElementKind::Miscellaneous:
       return field.starts_with("UNQ ") || field == "Symbol" || field == "ID" || field == "Revision";
     default:
       return false;
@@ -50,12 +50,13 @@ inline std::string FieldsOf(const CEL_Element& element) {
 /// place.
 inline std::string HeadsContent(const TemplateCore& core) {
   std::string text = TextsOf(core.Root());
-  for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
-    if (list != kind::kAuxiliaryList) text += TextsOf(core.ListHead(list));
+  for (const auto& head : core.ListHeads()) {
+    if (head->Kind() != ElementKind::AuxiliaryList) text += TextsOf(*head);
   }
   for (const auto& specie : core.Species()) {
-    for (std::int32_t list = kind::kSpecieStateVariableList; list <= kind::kArithmeticExpressionList; ++list)
-      text += TextsOf(specie->Head(list));
+    for (const auto& head : specie->Heads()) {
+      if (head->Kind() < ElementKind::HorizontalVectorList) text += TextsOf(*head);
+    }
   }
   return text;
 }
