@@ -71,9 +71,9 @@ class FunctionCheck final {
 
   void Walk(const ExpressionNode& root) {
     root.WalkPostOrder(
-        nullptr, [this](std::int32_t kind, const std::string& text, std::int32_t) { Visit(kind, text); },
-        [this](std::int32_t kind, const std::string&, std::int32_t) {
-          if (kind == NODE_CALL) --callDepth;
+        nullptr, [this](NodeKind kind, const std::string& text, std::int32_t) { Visit(kind, text); },
+        [this](NodeKind kind, const std::string&, std::int32_t) {
+          if (kind == NodeKind::Call) --callDepth;
         });
   }
 
@@ -85,13 +85,13 @@ class FunctionCheck final {
   }
 
  private:
-  void Visit(std::int32_t kind, const std::string& text) {
-    if (kind == NODE_ARGUMENT) {
+  void Visit(NodeKind kind, const std::string& text) {
+    if (kind == NodeKind::Argument) {
       // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
       ++arguments;
-    } else if (kind == NODE_PROPERTY) {
+    } else if (kind == NodeKind::Property) {
       if (!IsPropertyName(text)) Report("Unknown property ['" + text + "'] !");
-    } else if (kind == NODE_CALL) {
+    } else if (kind == NodeKind::Call) {
       CheckCall(text);
       ++callDepth;
       lastCall = text;
@@ -122,20 +122,21 @@ class FunctionCheck final {
 
 }  // namespace
 
-int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression) {
+bool CheckFunctions(std::string_view symbol, std::uint32_t uid, const ParsedExpression& parsed) {
   FunctionCheck check(symbol, uid);
-  ExpressionNode root;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
-  const int parsed = ParseExpressionText(std::string(expression), root, line, position, message);
-  if (parsed == 0) check.Report(message);
-  check.Walk(root);
-  if (!check.IsBalanced()) {
-    check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
-    return 0;
+  const ExpressionNode* tree = parsed.Tree();
+  if (tree == nullptr) {
+    check.Report(parsed.Failure()->message);
+    return false;
   }
-  return parsed;
+  check.Walk(*tree);
+  if (check.IsBalanced()) return true;
+  check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
+  return false;
+}
+
+int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::string_view expression) {
+  return CheckFunctions(symbol, uid, ParseExpression(expression)) ? 1 : 0;
 }
 
 bool IsPropertyName(std::string_view text) {

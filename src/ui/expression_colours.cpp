@@ -70,13 +70,13 @@ TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
 }  // namespace
 
 TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
-  const std::int32_t code = expressionToken.code;
-  if (code == token::kIdentifier) return StyleOfName(expressionToken.text, core);
-  if (code >= token::kIntNum && code <= token::kScientificNum) return Style(kNumber, true, true, false);
-  const bool isOperator = code >= token::kAddOpPlus && code <= token::kMulOpDivide;
-  const bool isBracket = code >= token::kLeftBracket && code <= token::kRightCurly;
+  const TokenCode code = expressionToken.code;
+  if (code == TokenCode::Identifier) return StyleOfName(expressionToken.text, core);
+  if (code >= TokenCode::IntNum && code <= TokenCode::ScientificNum) return Style(kNumber, true, true, false);
+  const bool isOperator = code >= TokenCode::AddOpPlus && code <= TokenCode::MulOpDivide;
+  const bool isBracket = code >= TokenCode::LeftBracket && code <= TokenCode::RightCurly;
   if (isOperator || isBracket) return Style(kOperator, true, false, false);
-  if (code >= token::kIf && code <= token::kElse) return Style(kConditional, true, true, false);
+  if (code >= TokenCode::If && code <= TokenCode::Else) return Style(kConditional, true, true, false);
   return {};
 }
 
