@@ -8,6 +8,7 @@
 
 #include "expr/expression_node.h"
 #include "expr/parser.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -65,13 +66,6 @@ constexpr std::string_view kRowValue = "</mtext></mtd><mtd columnalign=\"left\">
 
 /// The signs of the direct modifications, in the order of their kinds.
 constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
-
-std::string UpperCase(std::string text) {
-  for (char& character : text) {
-    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
-  }
-  return text;
-}
 
 const FunctionMarkUp* FindMarkUp(std::string_view upperName) {
   const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(),

@@ -10,6 +10,7 @@
 #include "expr/function_catalogue.h"
 #include "expr/parser.h"
 #include "expr/user_function_names.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -27,22 +28,6 @@ constexpr std::array<std::string_view, 3> kConditionalWords = {"IF", "THEN", "EL
 template <class Words>
 bool Holds(const Words& words, std::string_view text) {
   return std::find(words.begin(), words.end(), text) != words.end();
-}
-
-bool IsLetter(char character) {
-  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
-}
-
-bool IsDigit(char character) {
-  return character >= '0' && character <= '9';
-}
-
-std::string UpperCase(std::string_view text) {
-  std::string upper(text);
-  for (char& character : upper) {
-    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
-  }
-  return upper;
 }
 
 /// Whether a text as a whole converts to a number by the rules of the "C" locale. The conversion of the empty
@@ -152,10 +137,8 @@ bool IsConditionalWord(std::string_view text) {
 }
 
 bool IsValidSymbolSpelling(std::string_view text) {
-  if (text.empty() || !IsLetter(text.front())) return false;
-  return std::all_of(text.begin(), text.end(), [](char character) {
-    return IsLetter(character) || IsDigit(character) || character == '_';
-  });
+  return !text.empty() && IsAsciiLetter(text.front()) &&
+         std::all_of(text.begin(), text.end(), IsWordCharacter);
 }
 
 bool IsValidSymbol(std::string_view text) {

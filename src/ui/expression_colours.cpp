@@ -9,6 +9,7 @@
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -39,13 +40,6 @@ constexpr QRgb kConditional = qRgb(64, 64, 64);
 
 TokenStyle Style(QRgb colour, bool bold, bool italic, bool link) {
   return {true, QColor(colour), bold, italic, link};
-}
-
-std::string UpperCase(std::string text) {
-  std::transform(text.begin(), text.end(), text.begin(), [](char letter) {
-    return letter >= 'a' && letter <= 'z' ? static_cast<char>(letter - 'a' + 'A') : letter;
-  });
-  return text;
 }
 
 bool IsCallable(const std::string& name) {
