@@ -1,6 +1,7 @@
 // Any text scans, parses, is checked and walked without harm, and the answers agree with each other.
 #include <cstdint>
 #include <cstdlib>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -31,7 +32,7 @@ void CheckTokens(const std::string& text) {
     end = listed.lastOffset;
     const auto length = static_cast<std::size_t>(listed.lastOffset - listed.firstOffset + 1);
     Require(text.compare(static_cast<std::size_t>(listed.firstOffset), length, listed.text) == 0);
-    if (listed.code == token::kIdentifier) ++names;
+    if (listed.code == TokenCode::Identifier) ++names;
   }
   std::vector<std::string_view> identifiers;
   ResetExpressionScanner();
@@ -40,26 +41,31 @@ void CheckTokens(const std::string& text) {
 }
 
 void CheckParse(const std::string& text) {
-  ExpressionNode tree;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
   ResetExpressionScanner();
-  const int parsed = ParseExpressionText(text, tree, line, position, message);
+  std::optional<ParsedExpression> held;
+  const ParsedExpression first = ParseOnce(held, text);
+  const ScannerStart left = ExpressionScannerStart();
   ResetExpressionScanner();
-  ExpressionNode again;
-  std::string sameMessage;
-  Require(ParseExpressionText(text, again, line, position, sameMessage) == parsed && message == sameMessage);
-  Require(parsed == 1 || message.starts_with("Line "));
+  const ParsedExpression& used = ParseOnce(held, text);
+  Require(ExpressionScannerStart() == left && left == used.left);
+  Require((used.Tree() == nullptr) == (first.Tree() == nullptr));
+  if (const ParseFailure* failure = first.Failure()) {
+    ResetExpressionScanner();
+    const ParsedExpression again = ParseExpression(text);
+    Require(again.Failure() != nullptr && again.Failure()->message == failure->message);
+    Require(failure->message.starts_with("Line "));
+    return;
+  }
+  const ExpressionNode& tree = *first.Tree();
   const ExpressionNode copy(tree);
   int nodes = 0;
   int copied = 0;
   tree.WalkInOrder(
-      nullptr, [&nodes](std::int32_t, const std::string&, std::int32_t) { ++nodes; }, nullptr);
+      nullptr, [&nodes](NodeKind, const std::string&, std::int32_t) { ++nodes; }, nullptr);
   copy.WalkPostOrder(
-      nullptr, [&copied](std::int32_t, const std::string&, std::int32_t) { ++copied; }, nullptr);
+      nullptr, [&copied](NodeKind, const std::string&, std::int32_t) { ++copied; }, nullptr);
   Require(nodes == copied);
-  if (parsed == 1) RewriteExpressionText(copy);
+  RewriteExpressionText(copy);
 }
 
 }  // namespace

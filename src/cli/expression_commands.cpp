@@ -61,24 +61,25 @@ ExitCode Ask(const ExpressionCall& call, const Question& question) {
 /// Parses, and lets the operation make the text of a tree. The failure is the parser's message, or nothing.
 Answer WithTree(const std::string& expression, bool tellFailure,
                 const std::function<std::string(const ExpressionNode&)>& textOf) {
-  ExpressionNode tree;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
-  if (ParseExpressionText(expression, tree, line, position, message) == 0) {
-    return {tellFailure ? message : std::string(), kContentFault};
+  const ParsedExpression parsed = ParseExpression(expression);
+  if (const ParseFailure* failure = parsed.Failure()) {
+    return {tellFailure ? failure->message : std::string(), kContentFault};
   }
-  return {textOf(tree), kFine};
+  return {textOf(*parsed.Tree()), kFine};
 }
 
 /// A token outside the table carries the code of the last one in it; its text tells the two apart.
 std::string_view NameOf(const ExpressionToken& listed) {
-  const bool isOther = listed.code == token::kExceedanceFrequency && listed.text != "EXCEEDANCE_FREQUENCY";
+  const bool isOther = listed.code == TokenCode::ExceedanceFrequency && listed.text != "EXCEEDANCE_FREQUENCY";
   return isOther ? "-" : TokenName(listed.code);
 }
 
+std::string CodeText(const ExpressionToken& listed) {
+  return std::to_string(static_cast<std::int32_t>(listed.code));
+}
+
 std::string TokenRow(const ExpressionToken& listed) {
-  std::string row = std::to_string(listed.code) + '\t';
+  std::string row = CodeText(listed) + '\t';
   row += NameOf(listed);
   for (const std::int32_t number :
        {listed.firstColumn, listed.lastColumn, listed.firstOffset, listed.lastOffset}) {
@@ -102,7 +103,7 @@ Answer TokenLine(const std::string& expression) {
   Answer answer;
   for (const ExpressionToken& listed : tokens) {
     if (!answer.text.empty()) answer.text += ' ';
-    answer.text += std::to_string(listed.code) + ":" + listed.text;
+    answer.text += CodeText(listed) + ":" + listed.text;
   }
   if (!clean) answer.text += " !";
   answer.exitCode = clean ? kFine : kContentFault;

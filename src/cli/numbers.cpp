@@ -1,13 +1,14 @@
 #include "cli/numbers.h"
 
 #include <algorithm>
-#include <array>
 #include <charconv>
 #include <cmath>
 #include <limits>
 #include <locale>
 #include <sstream>
 #include <system_error>
+
+#include "platform/number_text.h"
 
 namespace tessal::cli {
 
@@ -37,10 +38,7 @@ std::optional<double> NumberOf(std::string_view text) {
 
 std::string NumberText(double value) {
   // The sign of a NaN says nothing.
-  if (std::isnan(value)) return "nan";
-  std::array<char, 32> buffer{};
-  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
-  return {buffer.data(), result.ptr};
+  return std::isnan(value) ? "nan" : ShortestNumberText(value);
 }
 
 std::optional<std::vector<double>> NumbersOf(const std::vector<std::string>& texts) {

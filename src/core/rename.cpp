@@ -5,14 +5,11 @@
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
 namespace {
-
-bool IsLetter(char character) {
-  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
-}
 
 /// Rewrites an expression in its stored form, between quotes: the word rule knows the opening one.
 std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
@@ -44,10 +41,10 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
     // of a stored expression. It is looked at as the text stands behind the replacements so far.
     const std::size_t hitInResult = result.size() + (hit - copied);
     const char left = hit > copied ? text[hit - 1] : (result.empty() ? '\0' : result.back());
-    const bool boundLeft = hitInResult > 1 && IsLetter(left);
-    const bool boundRight = end < text.size() && IsLetter(text[end]);
+    const bool boundLeft = hitInResult > 1 && IsAsciiLetter(left);
+    const bool boundRight = end < text.size() && IsAsciiLetter(text[end]);
     if (boundLeft || boundRight) {
-      while (end < text.size() && IsLetter(text[end])) ++end;
+      while (end < text.size() && IsAsciiLetter(text[end])) ++end;
       position = end;
       continue;
     }

@@ -1,6 +1,5 @@
 // Saving a template: written through the key-file library into a temporary file beside the target, joined
 // with the top-level sections that only the kept tree knows, and put in the target's place in one step.
-#include <algorithm>
 #include <cstdio>
 #include <exception>
 #include <locale>
@@ -10,6 +9,7 @@
 #include "core/template_core.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
+#include "platform/ascii.h"
 #include "platform/file_replacement.h"
 
 namespace tessal {
@@ -53,14 +53,6 @@ std::string WithTypeLine(const std::string& text) {
   result.append(text, lineStart);
   result += "\r\n";
   return result;
-}
-
-bool EqualIgnoringCase(std::string_view left, std::string_view right) {
-  const auto upper = [](char character) {
-    return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
-  };
-  return std::equal(left.begin(), left.end(), right.begin(), right.end(),
-                    [&upper](char one, char other) { return upper(one) == upper(other); });
 }
 
 /// The settings that a save under a new name stamps, so that one that fails can put them back.

@@ -1,25 +1,11 @@
 // The structural pass over a template: it numbers the elements and makes the flat symbol table anew. It holds
 // nothing between runs and reports nothing.
-#include <array>
-#include <charconv>
 
 #include "core/scope_rule.h"
 #include "core/template_core.h"
+#include "platform/number_text.h"
 
 namespace tessal {
-
-namespace {
-
-/// A number as a stream with its default settings prints it: six significant digits.
-std::string StreamText(double value) {
-  constexpr int kStreamPrecision = 6;
-  std::array<char, 32> buffer{};
-  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
-                                    std::chars_format::general, kStreamPrecision);
-  return {buffer.data(), result.ptr};
-}
-
-}  // namespace
 
 void TemplateCore::RebuildSymbolTable() {
   if (!flags.rebuildEnabled) return;
@@ -86,7 +72,7 @@ void TemplateCore::NumberTemplateElements() {
   const auto appendInputs = [&appendVarying](const auto& inputs) {
     std::int32_t place = 0;
     for (const auto& element : inputs) {
-      appendVarying(*element, place++, StreamText(element->defaultValue.RealValue()));
+      appendVarying(*element, place++, SixDigitNumberText(element->defaultValue.RealValue()));
     }
   };
   const auto appendExpressions = [&appendVarying](const auto& elements) {
@@ -108,7 +94,7 @@ void TemplateCore::NumberParticleElements() {
     }
   };
   const auto valueText = [](const CEL_SpecieValue& member) {
-    return StreamText(member.defaultValue.RealValue());
+    return SixDigitNumberText(member.defaultValue.RealValue());
   };
   for (std::size_t place = 0; place < species.size(); ++place) {
     const CEL_Lagrange_Specie& specie = *species[place];

@@ -8,6 +8,7 @@
 
 #include "expr/expression_node.h"
 #include "expr/parser.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -17,6 +18,16 @@ constexpr std::string_view kStart =
     "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>"
     "<math display=\"block\" align=\"left\" xmlns=\"http://www.w3.org/1998/Math/MathML\"><mrow>";
 constexpr std::string_view kEnd = "</mrow></math>\n";
+
+/// What encloses the symbol on the left side of the equation.
+struct LeftSide {
+  std::string_view before;
+  std::string_view after;
+};
+
+constexpr LeftSide kValue{"<mi>", "</mi><mo>=</mo>"};
+constexpr LeftSide kDerivative{"<mfrac><mrow><mi>d</mi><mi>",
+                               "</mi></mrow><mrow><mi>dt</mi></mrow></mfrac><mo>=</mo>"};
 
 constexpr std::string_view kFence = "<mfenced separators=\"\">";
 constexpr std::string_view kFenceEnd = "</mfenced>";
@@ -56,17 +67,14 @@ constexpr std::string_view kRowValue = "</mtext></mtd><mtd columnalign=\"left\">
 /// The signs of the direct modifications, in the order of their kinds.
 constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
 
-std::string UpperCase(std::string text) {
-  for (char& character : text) {
-    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
-  }
-  return text;
-}
-
 const FunctionMarkUp* FindMarkUp(std::string_view upperName) {
   const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(),
                                 [upperName](const FunctionMarkUp& row) { return row.name == upperName; });
   return hit == kFunctions.end() ? nullptr : &*hit;
+}
+
+std::string_view DirectSign(NodeKind kind) {
+  return kDirectSigns.at(static_cast<std::size_t>(kind) - static_cast<std::size_t>(NodeKind::DirectAssign));
 }
 
 bool IsSum(const std::string& text) {
@@ -78,34 +86,34 @@ class MathMLWriter final {
  public:
   explicit MathMLWriter(std::string& output) : buffer(output) {}
 
-  void OnEnter(std::int32_t kind, const std::string& text) {
+  void OnEnter(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_CALL:
+      case NodeKind::Call:
         EnterCall(UpperCase(text));
         break;
-      case NODE_ARITHMETIC:
+      case NodeKind::Arithmetic:
         EnterArithmetic(text);
         break;
-      case NODE_COMPARISON:
+      case NodeKind::Comparison:
         buffer += kFence;
         break;
-      case NODE_CONDITIONAL:
+      case NodeKind::Conditional:
         EnterConditional(text);
         break;
-      case NODE_DIRECT_ASSIGN:
-      case NODE_DIRECT_PLUS:
-      case NODE_DIRECT_MINUS:
-      case NODE_DIRECT_MULTIPLY:
-      case NODE_DIRECT_DIVIDE:
+      case NodeKind::DirectAssign:
+      case NodeKind::DirectPlus:
+      case NodeKind::DirectMinus:
+      case NodeKind::DirectMultiply:
+      case NodeKind::DirectDivide:
         Element("mi", text);
         buffer += "<mtext mathvariant=\"bold-italic\" mathcolor=\"green\">";
-        buffer += kDirectSigns.at(static_cast<std::size_t>(kind - NODE_DIRECT_ASSIGN));
+        buffer += DirectSign(kind);
         buffer += "</mtext>";
         break;
-      case NODE_ARGUMENT:
+      case NodeKind::Argument:
         if (listDepth++ == 0) buffer += "<mrow>";
         break;
-      case NODE_NEGATE:
+      case NodeKind::Negate:
         buffer += "<mo>-</mo>";
         break;
       default:
@@ -113,25 +121,25 @@ class MathMLWriter final {
     }
   }
 
-  void OnBetween(std::int32_t kind, const std::string& text) {
+  void OnBetween(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_IDENTIFIER:
+      case NodeKind::Identifier:
         Element("mi", text);
         break;
-      case NODE_NUMBER:
+      case NodeKind::Number:
         Element("mn", text);
         break;
-      case NODE_ARITHMETIC:
+      case NodeKind::Arithmetic:
         if (text == "/") {
           buffer += "</mrow><mrow>";
         } else {
           Element("mo", text);
         }
         break;
-      case NODE_COMPARISON:
+      case NodeKind::Comparison:
         WriteRelation(text);
         break;
-      case NODE_PROPERTY:
+      case NodeKind::Property:
         buffer += "<mtext>[" + text + "]</mtext>";
         break;
       default:
@@ -139,21 +147,21 @@ class MathMLWriter final {
     }
   }
 
-  void OnLeave(std::int32_t kind, const std::string& text) {
+  void OnLeave(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_CALL:
+      case NodeKind::Call:
         LeaveCall(UpperCase(text));
         break;
-      case NODE_ARITHMETIC:
+      case NodeKind::Arithmetic:
         LeaveArithmetic(text);
         break;
-      case NODE_COMPARISON:
+      case NodeKind::Comparison:
         buffer += kFenceEnd;
         break;
-      case NODE_CONDITIONAL:
+      case NodeKind::Conditional:
         if (text == "IF") buffer += "</mtd></mtr></mtable> </mfenced> ";
         break;
-      case NODE_ARGUMENT:
+      case NodeKind::Argument:
         // The end of one argument is the beginning of the next.
         buffer += "</mrow>";
         if (--listDepth >= 1) buffer += "<mrow>";
@@ -247,26 +255,25 @@ class MathMLWriter final {
 
 }  // namespace
 
-std::string ExpressionToMathML(const std::string& expression, const std::string& symbol, bool isDerivative) {
-  ExpressionNode tree;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
-  if (ParseExpressionText(expression, tree, line, position, message) == 0) return {};
+std::string TreeToMathML(const ExpressionNode& tree, std::string_view symbol, bool isDerivative) {
   std::string buffer(kStart);
-  if (isDerivative) {
-    buffer +=
-        "<mfrac><mrow><mi>d</mi><mi>" + symbol + "</mi></mrow><mrow><mi>dt</mi></mrow></mfrac><mo>=</mo>";
-  } else {
-    buffer += "<mi>" + symbol + "</mi><mo>=</mo>";
-  }
+  const LeftSide& side = isDerivative ? kDerivative : kValue;
+  buffer += side.before;
+  buffer += symbol;
+  buffer += side.after;
   MathMLWriter writer(buffer);
   tree.WalkInOrder(
-      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnEnter(kind, text); },
-      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnBetween(kind, text); },
-      [&writer](std::int32_t kind, const std::string& text, std::int32_t) { writer.OnLeave(kind, text); });
+      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnEnter(kind, text); },
+      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnBetween(kind, text); },
+      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnLeave(kind, text); });
   buffer += kEnd;
   return buffer;
+}
+
+std::string ExpressionToMathML(const std::string& expression, const std::string& symbol, bool isDerivative) {
+  const ParsedExpression parsed = ParseExpression(expression);
+  const ExpressionNode* tree = parsed.Tree();
+  return tree == nullptr ? std::string() : TreeToMathML(*tree, symbol, isDerivative);
 }
 
 }  // namespace tessal

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <string>
+#include <utility>
 
 #include "core/error_registry.h"
 #include "elements/element.h"
@@ -62,15 +63,13 @@ bool CheckExpression(const CEL_Element& element, const CEL_Property& expression)
 
 bool CompileExpression(const CEL_Element& element, std::string_view caption, const CEL_Property& expression,
                        ExpressionNode& tree) {
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string text;
-  if (ParseExpressionText(std::string(StripExpressionQuotes(expression.Text())), tree, line, position,
-                          text) != 0) {
-    return true;
+  ParsedExpression parsed = ParseExpression(StripExpressionQuotes(expression.Text()));
+  if (const ParseFailure* failure = parsed.Failure()) {
+    Errors().ReportElementError(caption, element.GetUid(), failure->message);
+    return false;
   }
-  Errors().ReportElementError(caption, element.GetUid(), text);
-  return false;
+  tree = std::move(std::get<ExpressionNode>(parsed.result));
+  return true;
 }
 
 }  // namespace tessal

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "elements/property.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -14,7 +15,7 @@ std::string FieldText(const ElementField& field) {
     case FieldKind::Integer:
       return std::to_string(field.intValue);
     case FieldKind::Real:
-      return RealText(field.realValue);
+      return PlainNumberText(field.realValue);
     case FieldKind::Boolean:
       return field.boolValue ? "True/Yes" : "False/No";
     case FieldKind::Invalid:

@@ -1,10 +1,9 @@
 #include "elements/property.h"
 
 #include <algorithm>
-#include <array>
-#include <charconv>
-#include <cmath>
 #include <utility>
+
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -54,18 +53,6 @@ void SetNotifyChanges(bool on) {
   NotificationSwitch() = on;
 }
 
-std::string RealText(double value) {
-  // The shortest form on its own would make 1e-04 of 0.0001 and 1e+05 of 100000.
-  constexpr double kSmallestPlain = 1e-4;
-  constexpr double kLargestPlain = 1e15;
-  const double size = std::abs(value);
-  const bool plain = size == 0.0 || (size >= kSmallestPlain && size < kLargestPlain);
-  std::array<char, 32> buffer{};
-  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
-                                    plain ? std::chars_format::fixed : std::chars_format::scientific);
-  return {buffer.data(), result.ptr};
-}
-
 bool CEL_Property::SetInt(std::int32_t value) {
   if (type != ValueType::Integer) return false;
   if (value == intValue) return true;
@@ -102,7 +89,7 @@ bool CEL_Property::SetText(std::string_view value) {
 std::string CEL_Property::TextOf() const {
   switch (type) {
     case ValueType::Real:
-      return RealText(realValue);
+      return PlainNumberText(realValue);
     case ValueType::Integer:
       return std::to_string(intValue);
     case ValueType::Boolean:

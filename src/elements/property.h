@@ -79,10 +79,6 @@ class NotificationsOff final {
   bool wereOn;
 };
 
-/// A real with the fewest digits that read back to the same value, with an exponent only where the number is
-/// very small (below 0.0001) or very large (1e15 and more).
-std::string RealText(double value);
-
 class CEL_Property final {
  public:
   explicit CEL_Property(ValueType valueType) : type(valueType) {}

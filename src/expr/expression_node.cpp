@@ -31,7 +31,7 @@ ExpressionNode& ExpressionNode::operator=(ExpressionNode&& other) noexcept {
 }
 
 void ExpressionNode::TakeFrom(ExpressionNode& other) noexcept {
-  kind = std::exchange(other.kind, NODE_UNKNOWN);
+  kind = std::exchange(other.kind, NodeKind::Unknown);
   text = std::move(other.text);
   children = std::move(other.children);
   other.text.clear();
@@ -62,19 +62,19 @@ void ExpressionNode::Release() {
     if (!node) continue;
     for (auto& child : node->children) pending.push_back(std::move(child));
     node->children.clear();
-    node->kind = NODE_UNKNOWN;
+    node->kind = NodeKind::Unknown;
   }
 }
 
 void ExpressionNode::CopyHead(const ExpressionNode& source) {
-  kind = source.kind <= kHighestKind ? source.kind : NODE_UNKNOWN;
+  kind = source.kind <= kHighestKind ? source.kind : NodeKind::Unknown;
   text = source.kind <= kHighestKind ? source.text : std::string();
   children.resize(source.kind <= kHighestKind ? source.children.size() : 0);
 }
 
 void ExpressionNode::DeepCopy(const ExpressionNode* source) {
   Release();
-  kind = NODE_UNKNOWN;
+  kind = NodeKind::Unknown;
   text.clear();
   if (source == nullptr) return;
   std::vector<std::pair<const ExpressionNode*, ExpressionNode*>> pending;

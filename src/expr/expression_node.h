@@ -11,39 +11,40 @@
 
 namespace tessal {
 
-enum NodeKind : std::int32_t {
-  NODE_UNKNOWN = 0,
-  NODE_IDENTIFIER = 2,
-  NODE_NUMBER = 3,
-  NODE_CALL = 4,
-  NODE_ARITHMETIC = 5,
-  NODE_COMPARISON = 6,
-  NODE_CONDITIONAL = 7,
-  NODE_DIRECT_ASSIGN = 8,
-  NODE_DIRECT_PLUS = 9,
-  NODE_DIRECT_MINUS = 10,
-  NODE_DIRECT_MULTIPLY = 11,
-  NODE_DIRECT_DIVIDE = 12,
-  NODE_PROPERTY = 13,
-  NODE_ARGUMENT = 14,
-  NODE_INTERACTION = 15,
-  NODE_TARGET = 16,
-  NODE_MODLISTS = 17,
-  NODE_MODLIST = 18,
-  NODE_MODFIELD = 19,
-  NODE_NEGATE = 21,
-  NODE_EXCEEDANCE = 22
+/// The numbers are part of what a tree shows as JSON.
+enum class NodeKind : std::int32_t {
+  Unknown = 0,
+  Identifier = 2,
+  Number = 3,
+  Call = 4,
+  Arithmetic = 5,
+  Comparison = 6,
+  Conditional = 7,
+  DirectAssign = 8,
+  DirectPlus = 9,
+  DirectMinus = 10,
+  DirectMultiply = 11,
+  DirectDivide = 12,
+  Property = 13,
+  Argument = 14,
+  Interaction = 15,
+  Target = 16,
+  Modlists = 17,
+  Modlist = 18,
+  Modfield = 19,
+  Negate = 21,
+  Exceedance = 22
 };
 
 class ExpressionNode final {
  public:
   /// What a walk calls: the node's kind, its text and its depth.
-  using Callback = std::function<void(std::int32_t kind, const std::string& text, std::int32_t depth)>;
+  using Callback = std::function<void(NodeKind kind, const std::string& text, std::int32_t depth)>;
 
   ExpressionNode() : text("unknown") {}
-  ExpressionNode(std::int32_t nodeKind, std::string nodeText) : kind(nodeKind), text(std::move(nodeText)) {}
+  ExpressionNode(NodeKind nodeKind, std::string nodeText) : kind(nodeKind), text(std::move(nodeText)) {}
   /// A node with empty slots for children.
-  ExpressionNode(std::int32_t nodeKind, std::string nodeText, std::int32_t childCount)
+  ExpressionNode(NodeKind nodeKind, std::string nodeText, std::int32_t childCount)
       : kind(nodeKind), text(std::move(nodeText)), children(static_cast<std::size_t>(childCount)) {}
   ExpressionNode(const ExpressionNode& other) { DeepCopy(&other); }
   ExpressionNode(ExpressionNode&& other) noexcept { TakeFrom(other); }
@@ -53,7 +54,7 @@ class ExpressionNode final {
     if (!children.empty()) Release();
   }
 
-  std::int32_t Kind() const { return kind; }
+  NodeKind Kind() const { return kind; }
   const std::string& Text() const { return text; }
   std::int32_t ChildCount() const { return static_cast<std::int32_t>(children.size()); }
   /// The child in a slot from 1; none for an empty slot or one beyond the count.
@@ -77,12 +78,12 @@ class ExpressionNode final {
                    std::int32_t depth = 0) const;
 
  private:
-  static constexpr std::int32_t kHighestKind = NODE_EXCEEDANCE;
+  static constexpr NodeKind kHighestKind = NodeKind::Exceedance;
 
   void TakeFrom(ExpressionNode& other) noexcept;
   void CopyHead(const ExpressionNode& source);
 
-  std::int32_t kind = NODE_UNKNOWN;
+  NodeKind kind = NodeKind::Unknown;
   std::string text;
   std::vector<std::unique_ptr<ExpressionNode>> children;
   ExpressionNode* parent = nullptr;

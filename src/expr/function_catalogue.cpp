@@ -6,6 +6,7 @@
 #include "expr/carbonate/options.h"
 #include "expr/evaluators.h"
 #include "expr/numeric/data_slots.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -268,16 +269,6 @@ constexpr std::array<DeprecatedRow, 9> kDeprecated = {
     {{21, 1}, {22, 1}, {43, 1}, {44, 4}, {45, 4}, {46, 4}, {47, 4}, {48, 4}, {49, 4}}};
 
 constexpr std::string_view kOptionFile = "TESSALpH.set";
-
-char UpperLetter(char character) {
-  return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
-}
-
-std::string UpperCase(std::string_view text) {
-  std::string upper(text);
-  std::transform(upper.begin(), upper.end(), upper.begin(), UpperLetter);
-  return upper;
-}
 
 CatalogueFunction MakeFunction(const FunctionRow& row) {
   CatalogueFunction function;

@@ -96,9 +96,9 @@ new_expression:
   ;
 
 constant:
-    INT_NUM                               { $$ = state.Leaf(tessal::NODE_NUMBER, $1); }
-  | FLOAT_NUM                             { $$ = state.Leaf(tessal::NODE_NUMBER, $1); }
-  | SCIENTIFIC_NUM                        { $$ = state.Leaf(tessal::NODE_NUMBER, $1); }
+    INT_NUM                               { $$ = state.Leaf(tessal::NodeKind::Number, $1); }
+  | FLOAT_NUM                             { $$ = state.Leaf(tessal::NodeKind::Number, $1); }
+  | SCIENTIFIC_NUM                        { $$ = state.Leaf(tessal::NodeKind::Number, $1); }
   ;
 
 rid_value:
@@ -106,18 +106,18 @@ rid_value:
   ;
 
 simple_expression:
-    IDENTIFIER                            { $$ = state.Leaf(tessal::NODE_IDENTIFIER, $1); }
+    IDENTIFIER                            { $$ = state.Leaf(tessal::NodeKind::Identifier, $1); }
   | constant
   | LEFT_BRACKET expression RIGHT_BRACKET { $$ = $2; }
   | abm_property
-  | ADD_OP_MINUS expression %prec U_MINUS { $$ = state.Node(tessal::NODE_NEGATE, "negate", {$2}); }
+  | ADD_OP_MINUS expression %prec U_MINUS { $$ = state.Node(tessal::NodeKind::Negate, "negate", {$2}); }
   | ADD_OP_PLUS expression %prec U_PLUS   { $$ = $2; }
   | rid_value
   ;
 
 argument_list:
-    expression                            { $$ = state.Node(tessal::NODE_ARGUMENT, "Argument", {$1}); }
-  | argument_list COMMA expression        { $$ = state.Node(tessal::NODE_ARGUMENT, "Argument", {$1, $3}); }
+    expression                            { $$ = state.Node(tessal::NodeKind::Argument, "Argument", {$1}); }
+  | argument_list COMMA expression        { $$ = state.Node(tessal::NodeKind::Argument, "Argument", {$1, $3}); }
   ;
 
 expression:
@@ -126,22 +126,22 @@ expression:
   | abm_interaction
   | function_call
   | simple_expression
-  | expression ADD_OP_PLUS expression     { $$ = state.Node(tessal::NODE_ARITHMETIC, "+", {$1, $3}); }
-  | expression ADD_OP_MINUS expression    { $$ = state.Node(tessal::NODE_ARITHMETIC, "-", {$1, $3}); }
-  | expression MUL_OP_MULTIPLY expression { $$ = state.Node(tessal::NODE_ARITHMETIC, "*", {$1, $3}); }
-  | expression MUL_OP_DIVIDE expression   { $$ = state.Node(tessal::NODE_ARITHMETIC, "/", {$1, $3}); }
+  | expression ADD_OP_PLUS expression     { $$ = state.Node(tessal::NodeKind::Arithmetic, "+", {$1, $3}); }
+  | expression ADD_OP_MINUS expression    { $$ = state.Node(tessal::NodeKind::Arithmetic, "-", {$1, $3}); }
+  | expression MUL_OP_MULTIPLY expression { $$ = state.Node(tessal::NodeKind::Arithmetic, "*", {$1, $3}); }
+  | expression MUL_OP_DIVIDE expression   { $$ = state.Node(tessal::NodeKind::Arithmetic, "/", {$1, $3}); }
   | exceedance_frequency_call
   ;
 
 exceedance_frequency_call:
     EXCEEDANCE_FREQUENCY LEFT_BRACKET cond_expression RIGHT_BRACKET
-                                          { $$ = state.Node(tessal::NODE_EXCEEDANCE, "Exceedance_Frequency", {$3}); }
+                                          { $$ = state.Node(tessal::NodeKind::Exceedance, "Exceedance_Frequency", {$3}); }
   ;
 
 function_call:
-    IDENTIFIER LEFT_BRACKET RIGHT_BRACKET { $$ = state.Leaf(tessal::NODE_CALL, $1); }
+    IDENTIFIER LEFT_BRACKET RIGHT_BRACKET { $$ = state.Leaf(tessal::NodeKind::Call, $1); }
   | IDENTIFIER LEFT_BRACKET argument_list RIGHT_BRACKET
-                                          { $$ = state.Named(tessal::NODE_CALL, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Call, $1, {$3}); }
   ;
 
 matched_statement:
@@ -152,13 +152,13 @@ matched_statement:
   ;
 
 cond_expression:
-    expression EQUAL expression           { $$ = state.Node(tessal::NODE_COMPARISON, "==", {$1, $3}); }
-  | expression NOT_EQUAL expression       { $$ = state.Node(tessal::NODE_COMPARISON, "!=", {$1, $3}); }
-  | expression BIGGER expression          { $$ = state.Node(tessal::NODE_COMPARISON, ">", {$1, $3}); }
-  | expression SMALLER expression         { $$ = state.Node(tessal::NODE_COMPARISON, "<", {$1, $3}); }
-  | expression BIGGER_OR_EQUAL expression { $$ = state.Node(tessal::NODE_COMPARISON, ">=", {$1, $3}); }
+    expression EQUAL expression           { $$ = state.Node(tessal::NodeKind::Comparison, "==", {$1, $3}); }
+  | expression NOT_EQUAL expression       { $$ = state.Node(tessal::NodeKind::Comparison, "!=", {$1, $3}); }
+  | expression BIGGER expression          { $$ = state.Node(tessal::NodeKind::Comparison, ">", {$1, $3}); }
+  | expression SMALLER expression         { $$ = state.Node(tessal::NodeKind::Comparison, "<", {$1, $3}); }
+  | expression BIGGER_OR_EQUAL expression { $$ = state.Node(tessal::NodeKind::Comparison, ">=", {$1, $3}); }
   | expression SMALLER_OR_EQUAL expression
-                                          { $$ = state.Node(tessal::NODE_COMPARISON, "<=", {$1, $3}); }
+                                          { $$ = state.Node(tessal::NodeKind::Comparison, "<=", {$1, $3}); }
   | LEFT_BRACKET boolean_OR_expression RIGHT_BRACKET
                                           { $$ = $2; }
   ;
@@ -181,34 +181,34 @@ boolean_AND_expression:
   ;
 
 direct_modification:
-    IDENTIFIER DIRECT_ASSIGN expression   { $$ = state.Named(tessal::NODE_DIRECT_ASSIGN, $1, {$3}); }
-  | IDENTIFIER DIRECT_PLUS expression     { $$ = state.Named(tessal::NODE_DIRECT_PLUS, $1, {$3}); }
-  | IDENTIFIER DIRECT_MINUS expression    { $$ = state.Named(tessal::NODE_DIRECT_MINUS, $1, {$3}); }
-  | IDENTIFIER DIRECT_MULTIPLY expression { $$ = state.Named(tessal::NODE_DIRECT_MULTIPLY, $1, {$3}); }
-  | IDENTIFIER DIRECT_DIVIDE expression   { $$ = state.Named(tessal::NODE_DIRECT_DIVIDE, $1, {$3}); }
+    IDENTIFIER DIRECT_ASSIGN expression   { $$ = state.Named(tessal::NodeKind::DirectAssign, $1, {$3}); }
+  | IDENTIFIER DIRECT_PLUS expression     { $$ = state.Named(tessal::NodeKind::DirectPlus, $1, {$3}); }
+  | IDENTIFIER DIRECT_MINUS expression    { $$ = state.Named(tessal::NodeKind::DirectMinus, $1, {$3}); }
+  | IDENTIFIER DIRECT_MULTIPLY expression { $$ = state.Named(tessal::NodeKind::DirectMultiply, $1, {$3}); }
+  | IDENTIFIER DIRECT_DIVIDE expression   { $$ = state.Named(tessal::NodeKind::DirectDivide, $1, {$3}); }
   ;
 
 abm_interaction:
     IDENTIFIER LEFT_CURLY interaction_target COMMA interaction_modlists RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NODE_INTERACTION, $1, {$3, $5}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3, $5}); }
   | IDENTIFIER LEFT_CURLY interaction_target RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NODE_INTERACTION, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3}); }
   | IDENTIFIER LEFT_CURLY interaction_target COMMA RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NODE_INTERACTION, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3}); }
   ;
 
 interaction_target:
     LEFT_BRACKET IDENTIFIER COMMA expression RIGHT_BRACKET
-        { $$ = state.Node(tessal::NODE_TARGET, "Target", {state.Leaf(tessal::NODE_IDENTIFIER, $2), $4}); }
+        { $$ = state.Node(tessal::NodeKind::Target, "Target", {state.Leaf(tessal::NodeKind::Identifier, $2), $4}); }
   | LEFT_BRACKET INT_NUM COMMA expression RIGHT_BRACKET
-        { $$ = state.Node(tessal::NODE_TARGET, "Target ID", {state.Leaf(tessal::NODE_NUMBER, $2), $4}); }
+        { $$ = state.Node(tessal::NodeKind::Target, "Target ID", {state.Leaf(tessal::NodeKind::Number, $2), $4}); }
   ;
 
 interaction_modlists:
     interaction_modlist
   | interaction_modlists COMMA interaction_modlist
-                                          { $$ = state.Node(tessal::NODE_MODLISTS, "Modlist", {$1, $3}); }
-  | LEFT_BRACKET RIGHT_BRACKET            { $$ = state.Node(tessal::NODE_MODLISTS, "empty", {}); }
+                                          { $$ = state.Node(tessal::NodeKind::Modlists, "Modlist", {$1, $3}); }
+  | LEFT_BRACKET RIGHT_BRACKET            { $$ = state.Node(tessal::NodeKind::Modlists, "empty", {}); }
   ;
 
 interaction_modlist:
@@ -217,13 +217,13 @@ interaction_modlist:
   ;
 
 mod_target:
-    IDENTIFIER                            { $$ = state.Leaf(tessal::NODE_IDENTIFIER, $1); }
-  | INT_NUM                               { $$ = state.Leaf(tessal::NODE_NUMBER, $1); }
+    IDENTIFIER                            { $$ = state.Leaf(tessal::NodeKind::Identifier, $1); }
+  | INT_NUM                               { $$ = state.Leaf(tessal::NodeKind::Number, $1); }
   | abm_property
   ;
 
 abm_property:
-    LEFT_SQUARE IDENTIFIER RIGHT_SQUARE   { $$ = state.Leaf(tessal::NODE_PROPERTY, $2); }
+    LEFT_SQUARE IDENTIFIER RIGHT_SQUARE   { $$ = state.Leaf(tessal::NodeKind::Property, $2); }
   ;
 
 %%

@@ -8,13 +8,13 @@ void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& ident
   identifiers.clear();
   bool clean = true;
   ExpressionScan scan(text);
-  while (const std::int32_t code = scan.Next()) {
-    if (code == token::kIdentifier) {
+  for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {
+    if (code == TokenCode::Identifier) {
       const std::size_t length = scan.Lexeme().size();
       identifiers.push_back(text.substr(scan.Consumed() - length, length));
     }
     // To the end all the same: the start state of the next scan depends on it.
-    clean = clean && code >= token::kIdentifier && code <= token::kRvalId;
+    clean = clean && IsPlainToken(code);
   }
   if (!clean) identifiers.clear();
 }

@@ -23,15 +23,15 @@ bool IsAdditive(const std::string& operatorText) {
 /// One rewriting. Brackets surround each additive chain at a level; a product or a call opens a new level.
 class Rewriter final {
  public:
-  void Before(std::int32_t kind, const std::string& text) {
+  void Before(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_CALL:
+      case NodeKind::Call:
         output += text + "(";
         savedArguments.push_back(arguments);
         savedBrackets.push_back(brackets);
         arguments = brackets = 0;
         break;
-      case NODE_ARITHMETIC:
+      case NodeKind::Arithmetic:
         if (!IsAdditive(text)) {
           savedBrackets.push_back(brackets);
           brackets = 0;
@@ -39,16 +39,16 @@ class Rewriter final {
           output += '(';
         }
         break;
-      case NODE_CONDITIONAL:
+      case NodeKind::Conditional:
         output += text == "IF" ? "IF((" : text == "THEN" ? ")," : ",";
         break;
-      case NODE_ARGUMENT:
+      case NodeKind::Argument:
         ++arguments;
         break;
-      case NODE_INTERACTION:
+      case NodeKind::Interaction:
         output += "_ABMInteract_" + text + "(";
         break;
-      case NODE_NEGATE:
+      case NodeKind::Negate:
         output += '-';
         break;
       default:
@@ -56,24 +56,24 @@ class Rewriter final {
     }
   }
 
-  void Between(std::int32_t kind, const std::string& text) {
+  void Between(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_IDENTIFIER:
+      case NodeKind::Identifier:
         output += text;
         if (std::find(kTimeParts.begin(), kTimeParts.end(), text) != kTimeParts.end()) output += "()";
         break;
-      case NODE_NUMBER:
-      case NODE_ARITHMETIC:
-      case NODE_COMPARISON:
+      case NodeKind::Number:
+      case NodeKind::Arithmetic:
+      case NodeKind::Comparison:
       // The target of a direct modification stands behind its value, with nothing between them.
-      case NODE_DIRECT_ASSIGN:
-      case NODE_DIRECT_PLUS:
-      case NODE_DIRECT_MINUS:
-      case NODE_DIRECT_MULTIPLY:
-      case NODE_DIRECT_DIVIDE:
+      case NodeKind::DirectAssign:
+      case NodeKind::DirectPlus:
+      case NodeKind::DirectMinus:
+      case NodeKind::DirectMultiply:
+      case NodeKind::DirectDivide:
         output += text;
         break;
-      case NODE_PROPERTY:
+      case NodeKind::Property:
         output += "_GetProperty(" + text + ")";
         break;
       default:
@@ -81,27 +81,27 @@ class Rewriter final {
     }
   }
 
-  void After(std::int32_t kind, const std::string& text) {
+  void After(NodeKind kind, const std::string& text) {
     switch (kind) {
-      case NODE_CALL:
+      case NodeKind::Call:
         output += ')';
         arguments = Take(savedArguments);
         brackets = Take(savedBrackets);
         break;
-      case NODE_ARITHMETIC:
+      case NodeKind::Arithmetic:
         if (!IsAdditive(text)) {
           brackets = Take(savedBrackets);
         } else if (brackets-- == 1) {
           output += ')';
         }
         break;
-      case NODE_CONDITIONAL:
+      case NodeKind::Conditional:
         if (text == "ELSE") output += ')';
         break;
-      case NODE_ARGUMENT:
+      case NodeKind::Argument:
         if (--arguments > 0) output += ',';
         break;
-      case NODE_INTERACTION:
+      case NodeKind::Interaction:
         output += ')';
         break;
       default:
@@ -130,9 +130,9 @@ class Rewriter final {
 std::string RewriteExpressionText(const ExpressionNode& tree) {
   Rewriter rewriter;
   tree.WalkInOrder(
-      [&rewriter](std::int32_t kind, const std::string& text, std::int32_t) { rewriter.Before(kind, text); },
-      [&rewriter](std::int32_t kind, const std::string& text, std::int32_t) { rewriter.Between(kind, text); },
-      [&rewriter](std::int32_t kind, const std::string& text, std::int32_t) { rewriter.After(kind, text); });
+      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.Before(kind, text); },
+      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.Between(kind, text); },
+      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.After(kind, text); });
   return std::move(rewriter.Output());
 }
 

@@ -14,8 +14,8 @@ std::string TextOf(LexemeSpan lexeme) {
   return {lexeme.start, lexeme.length};
 }
 
-bool HasLexeme(std::int32_t code) {
-  return code >= token::kIdentifier && code <= token::kScientificNum;
+bool HasLexeme(TokenCode code) {
+  return code >= TokenCode::Identifier && code <= TokenCode::ScientificNum;
 }
 
 constexpr std::array<const char*, 6> kModlistFields = {"SV1", "SV2", "cpy12", "cpy21", "red1", "red2"};
@@ -23,10 +23,11 @@ constexpr std::array<const char*, 6> kModlistFields = {"SV1", "SV2", "cpy12", "c
 }  // namespace
 
 int ParseState::Pull(LexemeSpan& lexeme) {
-  const std::int32_t code = scan.Next();
+  const TokenCode token = scan.Next();
+  const int code = static_cast<int>(token);
   // A character with the high bit set is negative, and ends the input for the parser.
-  if (code > token::kEnd && code < token::kIdentifier) return UNDEFINED;
-  if (!HasLexeme(code)) return code;
+  if (token > TokenCode::End && token < TokenCode::Identifier) return UNDEFINED;
+  if (!HasLexeme(token)) return code;
   const std::size_t length = scan.Lexeme().size();
   if (length >= kLexemeBuffer) {
     tooLong = true;
@@ -53,7 +54,7 @@ NodeHandle ParseState::Leaf(NodeKind kind, LexemeSpan lexeme) {
 }
 
 NodeHandle ParseState::Number(const char* digits) {
-  return Put(std::make_unique<ExpressionNode>(NODE_NUMBER, digits));
+  return Put(std::make_unique<ExpressionNode>(NodeKind::Number, digits));
 }
 
 NodeHandle ParseState::Node(NodeKind kind, const char* nodeText, std::initializer_list<NodeHandle> children) {
@@ -68,17 +69,18 @@ NodeHandle ParseState::Named(NodeKind kind, LexemeSpan name, std::initializer_li
 }
 
 NodeHandle ParseState::RidValue(LexemeSpan name) {
-  return Node(NODE_CALL, "RID_VAL", {Node(NODE_ARGUMENT, "Argument", {Leaf(NODE_IDENTIFIER, name)})});
+  return Node(NodeKind::Call, "RID_VAL",
+              {Node(NodeKind::Argument, "Argument", {Leaf(NodeKind::Identifier, name)})});
 }
 
 NodeHandle ParseState::Conditional(NodeHandle condition, NodeHandle thenValue, NodeHandle elseValue) {
-  const NodeHandle elseNode = Node(NODE_CONDITIONAL, "ELSE", {elseValue});
-  const NodeHandle thenNode = Node(NODE_CONDITIONAL, "THEN", {thenValue, elseNode});
-  return Node(NODE_CONDITIONAL, "IF", {condition, thenNode});
+  const NodeHandle elseNode = Node(NodeKind::Conditional, "ELSE", {elseValue});
+  const NodeHandle thenNode = Node(NodeKind::Conditional, "THEN", {thenValue, elseNode});
+  return Node(NodeKind::Conditional, "IF", {condition, thenNode});
 }
 
 NodeHandle ParseState::IsTrue(NodeHandle conditional) {
-  return Node(NODE_COMPARISON, ">", {conditional, Number("0")});
+  return Node(NodeKind::Comparison, ">", {conditional, Number("0")});
 }
 
 NodeHandle ParseState::Not(NodeHandle condition) {
@@ -97,13 +99,13 @@ NodeHandle ParseState::Modlist(std::initializer_list<NodeHandle> fields) {
   // A chain from the last field to the first: each holds its value and the next one.
   std::size_t place = kModlistFields.size() - 1;
   const NodeHandle* value = fields.begin() + place;
-  NodeHandle chain = Node(NODE_MODFIELD, kModlistFields[place], {*value});
+  NodeHandle chain = Node(NodeKind::Modfield, kModlistFields[place], {*value});
   while (place > 0) {
     --place;
     --value;
-    chain = Node(NODE_MODFIELD, kModlistFields[place], {*value, chain});
+    chain = Node(NodeKind::Modfield, kModlistFields[place], {*value, chain});
   }
-  return Node(NODE_MODLIST, "Modlist", {chain});
+  return Node(NodeKind::Modlist, "Modlist", {chain});
 }
 
 }  // namespace tessal

@@ -1,22 +1,44 @@
 #include "expr/parser.h"
 
+#include <utility>
+
 #include "expr/parse_state.h"
 
 namespace tessal {
 
+ParsedExpression ParseExpression(std::string_view text) {
+  ParsedExpression parsed;
+  parsed.began = ExpressionScannerStart();
+  ParseState state(text);
+  if (tessal_expression_grammar_parse(state) == 0 && state.Root()) {
+    parsed.result = std::move(*state.Root());
+  } else {
+    parsed.result = ParseFailure{state.Message(), state.Line(), state.Position()};
+  }
+  parsed.left = ExpressionScannerStart();
+  return parsed;
+}
+
+const ParsedExpression& ParseOnce(std::optional<ParsedExpression>& held, std::string_view text) {
+  if (held && held->began == ExpressionScannerStart()) {
+    SetExpressionScannerStart(held->left);
+    return *held;
+  }
+  return held.emplace(ParseExpression(text));
+}
+
 int ParseExpressionText(const std::string& text, ExpressionNode& node, std::int32_t& line,
                         std::int32_t& position, std::string& message) {
-  line = -1;
-  position = -1;
-  message.clear();
-  ParseState state(text);
-  if (tessal_expression_grammar_parse(state) != 0 || !state.Root()) {
-    line = state.Line();
-    position = state.Position();
-    message = state.Message();
+  ParsedExpression parsed = ParseExpression(text);
+  if (const ParseFailure* failure = parsed.Failure()) {
+    line = failure->line;
+    position = failure->position;
+    message = failure->message;
     return 0;
   }
-  node = std::move(*state.Root());
+  node = std::move(std::get<ExpressionNode>(parsed.result));
+  line = -1;
+  position = -1;
   message = "no error";
   return 1;
 }

@@ -47,19 +47,12 @@ constexpr std::array<std::string_view, 36> kTokenNames = {"IDENTIFIER",
                                                           "U_PLUS",
                                                           "U_MINUS"};
 
-/// What a listed token outside the plain ones is shown as.
-constexpr std::int32_t kListedAsOther = token::kExceedanceFrequency;
-
-bool IsListed(std::int32_t code) {
-  return code >= token::kIdentifier && code <= token::kRvalId;
-}
-
-ExpressionToken MakeToken(const ExpressionScan& scan, std::int32_t code) {
+ExpressionToken MakeToken(const ExpressionScan& scan, TokenCode code) {
   const std::string_view lexeme = scan.Lexeme();
   const auto length = static_cast<std::int32_t>(lexeme.size());
   ExpressionToken listed;
   listed.text = lexeme;
-  listed.code = code;
+  listed.code = IsPlainToken(code) ? code : TokenCode::ExceedanceFrequency;
   listed.line = static_cast<std::int32_t>(scan.Lines());
   listed.lastOffset = static_cast<std::int32_t>(scan.Consumed()) - 1;
   listed.firstOffset = listed.lastOffset - length + 1;
@@ -75,9 +68,13 @@ ScanPosition& ScannerCounters() {
   return counters;
 }
 
-std::string_view TokenName(std::int32_t code) {
-  const auto place = static_cast<std::size_t>(code - token::kIdentifier);
-  return code >= token::kIdentifier && place < kTokenNames.size() ? kTokenNames[place] : "-";
+std::string_view TokenName(TokenCode code) {
+  if (code < TokenCode::Identifier || code > TokenCode::UMinus) return "-";
+  return kTokenNames[static_cast<std::size_t>(code) - static_cast<std::size_t>(TokenCode::Identifier)];
+}
+
+bool IsPlainToken(TokenCode code) {
+  return code >= TokenCode::Identifier && code <= TokenCode::RvalId;
 }
 
 ExpressionScan::ExpressionScan(std::string_view text) {
@@ -91,7 +88,7 @@ ExpressionScan::~ExpressionScan() {
   EndFlexScan();
 }
 
-std::int32_t ExpressionScan::Next() {
+TokenCode ExpressionScan::Next() {
   return NextFlexToken();
 }
 
@@ -115,9 +112,9 @@ bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& t
   tokens.clear();
   bool clean = true;
   ExpressionScan scan(text);
-  while (const std::int32_t code = scan.Next()) {
-    clean = clean && IsListed(code);
-    tokens.push_back(MakeToken(scan, IsListed(code) ? code : kListedAsOther));
+  for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {
+    clean = clean && IsPlainToken(code);
+    tokens.push_back(MakeToken(scan, code));
   }
   return clean;
 }
@@ -129,8 +126,16 @@ std::string_view StripExpressionQuotes(std::string_view stored) {
   return last == first ? stored.substr(first + 1) : stored.substr(first + 1, last - first - 1);
 }
 
+ScannerStart ExpressionScannerStart() {
+  return FlexStart();
+}
+
+void SetExpressionScannerStart(ScannerStart start) {
+  SetFlexStart(start);
+}
+
 void ResetExpressionScanner() {
-  ResetFlexState();
+  SetExpressionScannerStart(ScannerStart::Text);
 }
 
 }  // namespace tessal

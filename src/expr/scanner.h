@@ -11,53 +11,56 @@
 
 namespace tessal {
 
-/// Token codes. A character without a token of its own has its own value as a code.
-namespace token {
-inline constexpr std::int32_t kEnd = 0;
-inline constexpr std::int32_t kIdentifier = 258;
-inline constexpr std::int32_t kIntNum = 259;
-inline constexpr std::int32_t kFloatNum = 260;
-inline constexpr std::int32_t kScientificNum = 261;
-inline constexpr std::int32_t kAddOpPlus = 262;
-inline constexpr std::int32_t kAddOpMinus = 263;
-inline constexpr std::int32_t kMulOpMultiply = 264;
-inline constexpr std::int32_t kMulOpDivide = 265;
-inline constexpr std::int32_t kComma = 266;
-inline constexpr std::int32_t kLeftBracket = 267;
-inline constexpr std::int32_t kRightBracket = 268;
-inline constexpr std::int32_t kLeftSquare = 269;
-inline constexpr std::int32_t kRightSquare = 270;
-inline constexpr std::int32_t kLeftCurly = 271;
-inline constexpr std::int32_t kRightCurly = 272;
-inline constexpr std::int32_t kEqual = 273;
-inline constexpr std::int32_t kNotEqual = 274;
-inline constexpr std::int32_t kBigger = 275;
-inline constexpr std::int32_t kSmaller = 276;
-inline constexpr std::int32_t kBiggerOrEqual = 277;
-inline constexpr std::int32_t kSmallerOrEqual = 278;
-inline constexpr std::int32_t kIf = 279;
-inline constexpr std::int32_t kThen = 280;
-inline constexpr std::int32_t kElse = 281;
-inline constexpr std::int32_t kNotOp = 282;
-inline constexpr std::int32_t kAndOp = 283;
-inline constexpr std::int32_t kOrOp = 284;
-inline constexpr std::int32_t kDirectAssign = 285;
-inline constexpr std::int32_t kDirectPlus = 286;
-inline constexpr std::int32_t kDirectMinus = 287;
-inline constexpr std::int32_t kDirectMultiply = 288;
-inline constexpr std::int32_t kDirectDivide = 289;
-inline constexpr std::int32_t kRvalId = 290;
-inline constexpr std::int32_t kExceedanceFrequency = 291;
-inline constexpr std::int32_t kUPlus = 292;
-inline constexpr std::int32_t kUMinus = 293;
-}  // namespace token
+/// The kinds of token. A character without a kind of its own has its own (signed) value as a code.
+enum class TokenCode : std::int32_t {
+  End = 0,
+  Identifier = 258,
+  IntNum = 259,
+  FloatNum = 260,
+  ScientificNum = 261,
+  AddOpPlus = 262,
+  AddOpMinus = 263,
+  MulOpMultiply = 264,
+  MulOpDivide = 265,
+  Comma = 266,
+  LeftBracket = 267,
+  RightBracket = 268,
+  LeftSquare = 269,
+  RightSquare = 270,
+  LeftCurly = 271,
+  RightCurly = 272,
+  Equal = 273,
+  NotEqual = 274,
+  Bigger = 275,
+  Smaller = 276,
+  BiggerOrEqual = 277,
+  SmallerOrEqual = 278,
+  If = 279,
+  Then = 280,
+  Else = 281,
+  NotOp = 282,
+  AndOp = 283,
+  OrOp = 284,
+  DirectAssign = 285,
+  DirectPlus = 286,
+  DirectMinus = 287,
+  DirectMultiply = 288,
+  DirectDivide = 289,
+  RvalId = 290,
+  ExceedanceFrequency = 291,
+  UPlus = 292,
+  UMinus = 293,
+};
 
 /// The name of a token code ("IDENTIFIER"); "-" for a code outside the table.
-std::string_view TokenName(std::int32_t code);
+std::string_view TokenName(TokenCode code);
+
+/// Whether a code is one of the vocabulary's, `Identifier` to `RvalId`; all others spoil a list of tokens.
+bool IsPlainToken(TokenCode code);
 
 struct ExpressionToken {
-  std::string text;          ///< the lexeme as it stands
-  std::int32_t code;         ///< 258 to 290, or 291 for anything else
+  std::string text;          ///< the lexeme as written
+  TokenCode code;            ///< up to RvalId; ExceedanceFrequency for anything else
   std::int32_t line;         ///< line feeds before it, comments left out
   std::int32_t firstColumn;  ///< from 0, in its line
   std::int32_t lastColumn;
@@ -73,7 +76,14 @@ bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& t
 /// follows it, without one the whole text.
 std::string_view StripExpressionQuotes(std::string_view stored);
 
-/// Back to the normal start state, for tests and for looks at a text that must leave no trace.
+/// Where a scan begins: in plain text, or in the comment that an earlier text left open.
+enum class ScannerStart : std::uint8_t { Text, Comment };
+
+/// The start of the next scan, and its setting.
+ScannerStart ExpressionScannerStart();
+void SetExpressionScannerStart(ScannerStart start);
+
+/// Back to plain text, for tests and for looks at a text that must leave no trace.
 void ResetExpressionScanner();
 
 /// The scanner as the parser and the lists pull from it. One scan at a time.
@@ -85,8 +95,8 @@ class ExpressionScan final {
   ExpressionScan& operator=(const ExpressionScan&) = delete;
   ~ExpressionScan();
 
-  /// The code of the next token: 0 at the end, the (signed) character for one without a token.
-  std::int32_t Next();
+  /// The next token: `End` at the end, the (signed) character for one without a kind.
+  TokenCode Next();
   /// The present token's text; good until the next one is pulled.
   std::string_view Lexeme() const;
   /// Characters taken so far, the present token's included.

@@ -5,6 +5,8 @@
 #include <cstdint>
 #include <string_view>
 
+#include "expr/scanner.h"
+
 namespace tessal {
 
 /// Counted since the beginning of the scan.
@@ -18,8 +20,9 @@ ScanPosition& ScannerCounters();
 
 void BeginFlexScan(const char* text, std::size_t length);
 void EndFlexScan();
-std::int32_t NextFlexToken();
+TokenCode NextFlexToken();
 std::string_view FlexLexeme();
-void ResetFlexState();
+ScannerStart FlexStart();
+void SetFlexStart(ScannerStart start);
 
 }  // namespace tessal

@@ -10,6 +10,7 @@
 #include "expr/function_catalogue.h"
 #include "expr/parser.h"
 #include "expr/user_function_names.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -27,22 +28,6 @@ constexpr std::array<std::string_view, 3> kConditionalWords = {"IF", "THEN", "EL
 template <class Words>
 bool Holds(const Words& words, std::string_view text) {
   return std::find(words.begin(), words.end(), text) != words.end();
-}
-
-bool IsLetter(char character) {
-  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
-}
-
-bool IsDigit(char character) {
-  return character >= '0' && character <= '9';
-}
-
-std::string UpperCase(std::string_view text) {
-  std::string upper(text);
-  for (char& character : upper) {
-    if (character >= 'a' && character <= 'z') character = static_cast<char>(character - 'a' + 'A');
-  }
-  return upper;
 }
 
 /// Whether a text as a whole converts to a number by the rules of the "C" locale. The conversion of the empty
@@ -70,9 +55,9 @@ class FunctionCheck final {
 
   void Walk(const ExpressionNode& root) {
     root.WalkPostOrder(
-        nullptr, [this](std::int32_t kind, const std::string& text, std::int32_t) { Visit(kind, text); },
-        [this](std::int32_t kind, const std::string&, std::int32_t) {
-          if (kind == NODE_CALL) --callDepth;
+        nullptr, [this](NodeKind kind, const std::string& text, std::int32_t) { Visit(kind, text); },
+        [this](NodeKind kind, const std::string&, std::int32_t) {
+          if (kind == NodeKind::Call) --callDepth;
         });
   }
 
@@ -82,13 +67,13 @@ class FunctionCheck final {
   void Report(std::string_view text) { Errors().ReportElementError(symbol, uid, text); }
 
  private:
-  void Visit(std::int32_t kind, const std::string& text) {
-    if (kind == NODE_ARGUMENT) {
+  void Visit(NodeKind kind, const std::string& text) {
+    if (kind == NodeKind::Argument) {
       // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
       ++arguments;
-    } else if (kind == NODE_PROPERTY) {
+    } else if (kind == NodeKind::Property) {
       if (!IsPropertyName(text)) Report("Unknown property ['" + text + "'] !");
-    } else if (kind == NODE_CALL) {
+    } else if (kind == NodeKind::Call) {
       CheckCall(text);
       ++callDepth;
       lastCall = text;
@@ -119,20 +104,21 @@ class FunctionCheck final {
 
 }  // namespace
 
-int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression) {
+bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& parsed) {
   FunctionCheck check(symbol, uid);
-  ExpressionNode root;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
-  const int parsed = ParseExpressionText(std::string(expression), root, line, position, message);
-  if (parsed == 0) check.Report(message);
-  check.Walk(root);
-  if (!check.IsBalanced()) {
-    check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
-    return 0;
+  const ExpressionNode* tree = parsed.Tree();
+  if (tree == nullptr) {
+    check.Report(parsed.Failure()->message);
+    return false;
   }
-  return parsed;
+  check.Walk(*tree);
+  if (check.IsBalanced()) return true;
+  check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
+  return false;
+}
+
+int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression) {
+  return CheckFunctions(symbol, uid, ParseExpression(expression)) ? 1 : 0;
 }
 
 bool IsPropertyName(std::string_view text) {
@@ -148,10 +134,8 @@ bool IsConditionalWord(std::string_view text) {
 }
 
 bool IsValidSymbolSpelling(std::string_view text) {
-  if (text.empty() || !IsLetter(text.front())) return false;
-  return std::all_of(text.begin(), text.end(), [](char character) {
-    return IsLetter(character) || IsDigit(character) || character == '_';
-  });
+  return !text.empty() && IsAsciiLetter(text.front()) &&
+         std::all_of(text.begin(), text.end(), IsWordCharacter);
 }
 
 bool IsValidSymbol(std::string_view text) {

@@ -9,8 +9,13 @@
 
 namespace tessal {
 
-/// Parses and checks an expression; each finding goes to the error registry under the symbol and identity.
-/// 0 when it does not parse, else 1, also with findings.
+struct ParsedExpression;
+
+/// Checks a parsed expression. Each finding, the failure of a parse among them, goes to the error registry
+/// under the symbol and identity. False only when it did not parse.
+bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& parsed);
+
+/// Parses and checks an expression: 0 when it does not parse, else 1, also with findings.
 int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression);
 
 /// The words of the tables, exactly.

@@ -1,15 +1,15 @@
 #include "platform/kvf2004.h"
 
-#include <algorithm>
-#include <cctype>
 #include <cmath>
 #include <map>
 #include <memory>
 
+#include "platform/ascii.h"
 #include "platform/file_replacement.h"
 #include "platform/kvf_item.h"
 #include "platform/kvf_number.h"
 #include "platform/kvf_text.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -49,15 +49,9 @@ KvfHandle Keep(std::unique_ptr<KvfImage> image) {
   return handle;
 }
 
-bool SameName(std::string_view left, std::string_view right) {
-  return left.size() == right.size() &&
-         std::equal(left.begin(), left.end(), right.begin(),
-                    [](unsigned char a, unsigned char b) { return std::tolower(a) == std::tolower(b); });
-}
-
 KvfNode NthOfName(const std::vector<KvfItem*>& items, std::string_view name, int number) {
   for (const KvfItem* item : items) {
-    if (SameName(item->text, name) && --number == 0) return item;
+    if (EqualIgnoringCase(item->text, name) && --number == 0) return item;
   }
   return nullptr;
 }
@@ -248,7 +242,7 @@ int kvfAddInt(KvfHandle handle, std::int32_t value) {
 
 int kvfAddDouble(KvfHandle handle, double value) {
   if (!std::isfinite(value)) return Note(kKvfNotWritable);
-  return AddParameter(handle, KvfItem::Value::Real, KvfRealText(value));
+  return AddParameter(handle, KvfItem::Value::Real, ShortestNumberText(value));
 }
 
 int kvfAddString(KvfHandle handle, std::string_view value) {

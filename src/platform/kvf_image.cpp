@@ -1,9 +1,9 @@
 // Reading and writing the images of the key-file library. Reading is milder than the grammar of the item
 // tree: no line feed is needed at either end, and comments may stand anywhere a line may.
 #include <algorithm>
-#include <cctype>
 #include <utility>
 
+#include "platform/ascii.h"
 #include "platform/kvf_item.h"
 #include "platform/kvf_text.h"
 
@@ -18,23 +18,6 @@ constexpr std::string_view kHeader =
     "\n";
 constexpr std::size_t kBlanksPerLevel = 3;
 constexpr std::size_t kLongestNear = 40;
-
-bool IsDigit(char character) {
-  return character >= '0' && character <= '9';
-}
-
-bool IsWordCharacter(char character) {
-  return IsDigit(character) || (character >= 'a' && character <= 'z') ||
-         (character >= 'A' && character <= 'Z') || character == '_';
-}
-
-bool EqualsWord(std::string_view text, std::string_view word) {
-  return text.size() == word.size() &&
-         std::equal(text.begin(), text.end(), word.begin(), [](char left, char right) {
-           return std::tolower(static_cast<unsigned char>(left)) ==
-                  std::tolower(static_cast<unsigned char>(right));
-         });
-}
 
 /// Reads one text, item by item. Sections nest in a list of its own, not in calls.
 class ImageReader final {
@@ -105,7 +88,7 @@ class ImageReader final {
 
   std::string_view TakeWord() {
     const std::size_t start = place;
-    if (!AtEnd() && !IsDigit(text[place])) {
+    if (!AtEnd() && !IsAsciiDigit(text[place])) {
       while (!AtEnd() && IsWordCharacter(text[place])) ++place;
     }
     return text.substr(start, place - start);
@@ -134,7 +117,7 @@ class ImageReader final {
       ++place;
       return ReadValues(image.AddKeyword(*open.back(), word, itemLine)) && EndLine();
     }
-    if (!EqualsWord(word, "EndSect") || open.size() == 1) {
+    if (!EqualIgnoringCase(word, "EndSect") || open.size() == 1) {
       place = start;
       return false;
     }
@@ -155,10 +138,10 @@ class ImageReader final {
   bool ReadValue(KvfItem& keyword) {
     const char first = Peek();
     if (first == '\'' || first == '|') return ReadText(keyword, first);
-    if (IsDigit(first) || first == '+' || first == '-') return ReadNumber(keyword);
+    if (IsAsciiDigit(first) || first == '+' || first == '-') return ReadNumber(keyword);
     const std::size_t start = place;
     const std::string_view word = TakeWord();
-    if (!EqualsWord(word, "true") && !EqualsWord(word, "false")) {
+    if (!EqualIgnoringCase(word, "true") && !EqualIgnoringCase(word, "false")) {
       place = start;
       return false;
     }
@@ -196,13 +179,13 @@ class ImageReader final {
   }
 
   std::size_t SkipDigits(std::size_t from) const {
-    while (from < text.size() && IsDigit(text[from])) ++from;
+    while (from < text.size() && IsAsciiDigit(text[from])) ++from;
     return from;
   }
 
   bool ReadNumber(KvfItem& keyword) {
     const std::size_t start = place;
-    const std::size_t digits = start + (IsDigit(text[start]) ? 0 : 1);
+    const std::size_t digits = start + (IsAsciiDigit(text[start]) ? 0 : 1);
     std::size_t end = SkipDigits(digits);
     if (end == digits) return false;
     KvfItem::Value value = KvfItem::Value::Integer;

@@ -1,7 +1,6 @@
 #include "platform/kvf_number.h"
 
 #include <algorithm>
-#include <array>
 #include <charconv>
 #include <limits>
 #include <system_error>
@@ -47,12 +46,6 @@ double KvfReal(std::string_view text) {
   if (read.ec != std::errc::result_out_of_range) return value;
   const double limit = IsHuge(text) ? std::numeric_limits<double>::max() : 0.0;
   return negative ? -limit : limit;
-}
-
-std::string KvfRealText(double value) {
-  std::array<char, 32> buffer{};
-  const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
-  return {buffer.data(), written.ptr};
 }
 
 }  // namespace tessal

@@ -2,7 +2,6 @@
 #pragma once
 
 #include <cstdint>
-#include <string>
 #include <string_view>
 
 namespace tessal {
@@ -12,8 +11,5 @@ std::int32_t KvfInteger(std::string_view text);
 
 /// The real of a text of an optional sign, digits, and optionally a point, digits and an exponent.
 double KvfReal(std::string_view text);
-
-/// The shortest text that reads back to the same value; without a point for a whole number.
-std::string KvfRealText(double value);
 
 }  // namespace tessal

@@ -2,15 +2,13 @@
 
 #include <algorithm>
 
+#include "platform/ascii.h"
+
 namespace tessal {
 
 namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
-
-bool IsNameStart(char character) {
-  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') || character == '_';
-}
 
 }  // namespace
 
@@ -40,10 +38,8 @@ std::string KvfWritableText(std::string_view text) {
 }
 
 bool IsKvfName(std::string_view text) {
-  return !text.empty() && IsNameStart(text.front()) &&
-         std::all_of(text.begin(), text.end(), [](char character) {
-           return IsNameStart(character) || (character >= '0' && character <= '9');
-         });
+  return !text.empty() && !IsAsciiDigit(text.front()) &&
+         std::all_of(text.begin(), text.end(), IsWordCharacter);
 }
 
 }  // namespace tessal

@@ -9,6 +9,7 @@
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
+#include "platform/ascii.h"
 
 namespace tessal {
 
@@ -41,13 +42,6 @@ TokenStyle Style(QRgb colour, bool bold, bool italic, bool link) {
   return {true, QColor(colour), bold, italic, link};
 }
 
-std::string UpperCase(std::string text) {
-  std::transform(text.begin(), text.end(), text.begin(), [](char letter) {
-    return letter >= 'a' && letter <= 'z' ? static_cast<char>(letter - 'a' + 'A') : letter;
-  });
-  return text;
-}
-
 bool IsCallable(const std::string& name) {
   std::string upper = name;
   return IsFunctionName(upper) || IsUserFunctionName(name) || IsInteractionVerb(UpperCase(name));
@@ -70,13 +64,13 @@ TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
 }  // namespace
 
 TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
-  const std::int32_t code = expressionToken.code;
-  if (code == token::kIdentifier) return StyleOfName(expressionToken.text, core);
-  if (code >= token::kIntNum && code <= token::kScientificNum) return Style(kNumber, true, true, false);
-  const bool isOperator = code >= token::kAddOpPlus && code <= token::kMulOpDivide;
-  const bool isBracket = code >= token::kLeftBracket && code <= token::kRightCurly;
+  const TokenCode code = expressionToken.code;
+  if (code == TokenCode::Identifier) return StyleOfName(expressionToken.text, core);
+  if (code >= TokenCode::IntNum && code <= TokenCode::ScientificNum) return Style(kNumber, true, true, false);
+  const bool isOperator = code >= TokenCode::AddOpPlus && code <= TokenCode::MulOpDivide;
+  const bool isBracket = code >= TokenCode::LeftBracket && code <= TokenCode::RightCurly;
   if (isOperator || isBracket) return Style(kOperator, true, false, false);
-  if (code >= token::kIf && code <= token::kElse) return Style(kConditional, true, true, false);
+  if (code >= TokenCode::If && code <= TokenCode::Else) return Style(kConditional, true, true, false);
   return {};
 }
 

@@ -7,7 +7,6 @@
 #include <QToolTip>
 
 #include "core/template_core.h"
-#include "expr/expression_node.h"
 #include "expr/parser.h"
 #include "expr/scanner.h"
 #include "ui/expression_colours.h"
@@ -95,13 +94,10 @@ void CAutoRichEditCtrl::Colour() {
 }
 
 QString CAutoRichEditCtrl::ParserMessage() const {
-  ExpressionNode tree;
-  std::int32_t line = 0;
-  std::int32_t position = 0;
-  std::string message;
   const ScannerRest rest;
-  const int parsed = ParseExpressionText(FromScreen(ContentText(), content), tree, line, position, message);
-  return parsed != 0 ? QString() : ToScreen(message).trimmed();
+  const ParsedExpression parsed = ParseExpression(FromScreen(ContentText(), content));
+  const ParseFailure* failure = parsed.Failure();
+  return failure == nullptr ? QString() : ToScreen(failure->message).trimmed();
 }
 
 Uid CAutoRichEditCtrl::LinkAt(const QPoint& point) const {

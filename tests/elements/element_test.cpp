@@ -13,6 +13,7 @@
 #include "elements/specie.h"
 #include "elements/state_variable.h"
 #include "elements/visibility.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 namespace {
@@ -107,8 +108,8 @@ TEST(Elements, NumbersReadAsPeopleWriteThem) {
                                                  {123456789012345.6, "123456789012345.6"},
                                                  {-1.7976931348623157e308, "-1.7976931348623157e+308"}};
   for (const auto& [value, text] : rows) {
-    EXPECT_EQ(RealText(value), text);
-    EXPECT_EQ(std::strtod(RealText(value).c_str(), nullptr), value);
+    EXPECT_EQ(PlainNumberText(value), text);
+    EXPECT_EQ(std::strtod(PlainNumberText(value).c_str(), nullptr), value);
   }
 }
 

@@ -63,7 +63,7 @@ class ExpressionMaker final {
 }  // namespace
 
 std::string TreeText(const ExpressionNode& node) {
-  std::string text = "(" + std::to_string(node.Kind()) + " " + node.Text();
+  std::string text = "(" + std::to_string(static_cast<int>(node.Kind())) + " " + node.Text();
   for (std::int32_t slot = 1; slot <= node.ChildCount(); ++slot) text += " " + TreeText(*node.Child(slot));
   return text + ")";
 }

@@ -155,7 +155,7 @@ TEST_F(Parser, DeepNestingIsAMessageAndLongChainsParse) {
   int deepest = 0;
   copy.WalkInOrder(
       nullptr,
-      [&](std::int32_t, const std::string&, std::int32_t depth) {
+      [&](NodeKind, const std::string&, std::int32_t depth) {
         ++visits;
         deepest = std::max(deepest, static_cast<int>(depth));
       },

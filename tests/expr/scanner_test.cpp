@@ -20,7 +20,7 @@ std::string Scanned(const std::string& text) {
   std::string result;
   for (const ExpressionToken& listed : tokens) {
     if (!result.empty()) result += ' ';
-    result += std::to_string(listed.code) + ":" + listed.text;
+    result += std::to_string(static_cast<int>(listed.code)) + ":" + listed.text;
   }
   return clean ? result : result + " !";
 }

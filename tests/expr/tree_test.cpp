@@ -24,7 +24,7 @@ using Walk = void (ExpressionNode::*)(const ExpressionNode::Callback&, const Exp
 std::string Walked(const ExpressionNode& tree, Walk walk) {
   std::string calls;
   const auto note = [&calls](char sign) {
-    return [&calls, sign](std::int32_t, const std::string& text, std::int32_t depth) {
+    return [&calls, sign](NodeKind, const std::string& text, std::int32_t depth) {
       calls += sign + text + std::to_string(depth) + ' ';
     };
   };
@@ -55,10 +55,10 @@ TEST(Tree, CopiesAndMovesKeepParents) {
 }
 
 TEST(Tree, TakesChildrenInItsSlotsOnly) {
-  ExpressionNode node(NODE_ARITHMETIC, "+", 2);
-  node.SetChild(0, std::make_unique<ExpressionNode>(NODE_NUMBER, "0"));
-  node.SetChild(3, std::make_unique<ExpressionNode>(NODE_NUMBER, "3"));
-  node.SetChild(2, std::make_unique<ExpressionNode>(NODE_NUMBER, "2"));
+  ExpressionNode node(NodeKind::Arithmetic, "+", 2);
+  node.SetChild(0, std::make_unique<ExpressionNode>(NodeKind::Number, "0"));
+  node.SetChild(3, std::make_unique<ExpressionNode>(NodeKind::Number, "3"));
+  node.SetChild(2, std::make_unique<ExpressionNode>(NodeKind::Number, "2"));
   EXPECT_EQ(node.Child(1), nullptr);
   EXPECT_EQ(node.Child(2)->Text(), "2");
   node.Release();
@@ -66,12 +66,12 @@ TEST(Tree, TakesChildrenInItsSlotsOnly) {
 }
 
 TEST(Tree, CopiesNothingAndUnknownKindsAsUnknown) {
-  ExpressionNode node(NODE_NUMBER, "1");
+  ExpressionNode node(NodeKind::Number, "1");
   node.DeepCopy(nullptr);
-  EXPECT_EQ(node.Kind(), NODE_UNKNOWN);
+  EXPECT_EQ(node.Kind(), NodeKind::Unknown);
   EXPECT_EQ(node.Text(), "");
-  const ExpressionNode strange(23, "strange");
-  EXPECT_EQ(ExpressionNode(strange).Kind(), NODE_UNKNOWN);
+  const ExpressionNode strange(NodeKind{23}, "strange");
+  EXPECT_EQ(ExpressionNode(strange).Kind(), NodeKind::Unknown);
   EXPECT_EQ(ExpressionNode().Text(), "unknown");
 }
 

@@ -1,7 +1,6 @@
 #include "expr/carbonate/options.h"
 
 #include <array>
-#include <charconv>
 #include <cmath>
 #include <cstddef>
 #include <string_view>
@@ -9,6 +8,7 @@
 #include "expr/carbonate/option_tables.h"
 #include "expr/carbonate/settings.h"
 #include "expr/carbonate/settings_log.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -33,20 +33,14 @@ constexpr std::array<SpecieRow, 5> kSpecies{{
     {&PerSpecie::silicate, false, "TSi =", ""},
 }};
 
-/// The shortest text that reads back as the number, whatever the locale.
-std::string NumberText(double number) {
-  std::array<char, 32> text{};
-  const std::to_chars_result end = std::to_chars(text.data(), text.data() + text.size(), number);
-  return {text.data(), end.ptr};
-}
-
 void LogTotal(const SpecieRow& row, double total) {
   const std::string_view origin = row.comesFromSalinity && total < 0 ? " (from salinity)" : "";
-  CarbonateLog().WriteLine(std::string(row.totalLabel) + " " + NumberText(total) + std::string(origin));
+  CarbonateLog().WriteLine(std::string(row.totalLabel) + " " + ShortestNumberText(total) +
+                           std::string(origin));
 }
 
 void LogFactor(std::string_view label, double factor) {
-  if (!label.empty()) CarbonateLog().WriteLine(std::string(label) + " " + NumberText(factor));
+  if (!label.empty()) CarbonateLog().WriteLine(std::string(label) + " " + ShortestNumberText(factor));
 }
 
 std::size_t OptionInRange(double option, std::size_t options) {
