@@ -249,16 +249,14 @@ bool TemplateCore::CheckRecordOrder(const SymbolRecord& record) const {
   bool good = true;
   for (const std::uint32_t sequence : record.references) {
     const CEL_Element& used = *Record(sequence).element;
-    std::string text;
     if (user.Kind() == kind::kStateVariable) {
       if (used.Kind() == kind::kProcess) continue;
-      text = "The symbol '" + used.symbol.Text() + "' is not a process!";
+      Errors().Report(RecordSymbol(record), user.MessageUid(), {"not-a-process", {used.symbol.Text()}});
     } else {
       if (sequence <= static_cast<std::uint32_t>(user.id.IntValue())) continue;
-      text = "The symbol '" + used.symbol.Text() + "' can not be used as it is declared after '" +
-             RecordSymbol(record) + "'!";
+      const std::string symbol = RecordSymbol(record);
+      Errors().Report(symbol, user.MessageUid(), {"order-violated", {used.symbol.Text(), symbol}});
     }
-    Errors().AddError(ErrorLevel::Critical, RecordSymbol(record), user.MessageUid(), text);
     good = false;
   }
   return good;

@@ -80,8 +80,8 @@ class FunctionCheck final {
   bool IsBalanced() const { return callDepth < 1; }
   const std::string& LastCall() const { return lastCall; }
 
-  void Report(std::string_view text) {
-    Errors().ReportElementError(symbol, static_cast<std::int32_t>(uid), text);
+  void Report(const Finding& finding) {
+    Errors().ReportCheck(symbol, static_cast<std::int32_t>(uid), finding);
   }
 
  private:
@@ -90,7 +90,7 @@ class FunctionCheck final {
       // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
       ++arguments;
     } else if (kind == NODE_PROPERTY) {
-      if (!IsPropertyName(text)) Report("Unknown property ['" + text + "'] !");
+      if (!IsPropertyName(text)) Report({"unknown-property", {text}});
     } else if (kind == NODE_CALL) {
       CheckCall(text);
       ++callDepth;
@@ -102,14 +102,14 @@ class FunctionCheck final {
   void CheckCall(const std::string& name) {
     const CatalogueFunction* function = FindFunction(name);
     if (function == nullptr) {
-      if (!IsUserFunctionName(name)) Report("Unknown function '" + name + "' !");
+      if (!IsUserFunctionName(name)) Report({"unknown-function", {name}});
       return;
     }
     if (function->argumentCount != arguments) {
-      Report("Wrong number of arguments for function " + name + "(" + JoinedArguments(*function) + ")!");
+      Report({"argument-count", {name, JoinedArguments(*function)}});
     }
     if (IsDeprecatedFunction(function->id)) {
-      Report("The function " + name + " is deprecated and should not be used!");
+      Report({"deprecated-function", {name}});
     }
   }
 
@@ -129,10 +129,10 @@ int CheckFunctionsSpecified(std::string_view symbol, std::uint32_t uid, std::str
   std::int32_t position = 0;
   std::string message;
   const int parsed = ParseExpressionText(std::string(expression), root, line, position, message);
-  if (parsed == 0) check.Report(message);
+  if (parsed == 0) Errors().ReportElementError(symbol, static_cast<std::int32_t>(uid), message);
   check.Walk(root);
   if (!check.IsBalanced()) {
-    check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
+    check.Report({"call-incomplete", {check.LastCall()}});
     return 0;
   }
   return parsed;
