@@ -3,12 +3,14 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace tessal::cli {
 
 struct TemplateMessage {
   std::uint32_t level;
+  std::string_view code;
   std::string word;
   std::string symbol;
   std::int32_t uid;
@@ -36,7 +38,8 @@ struct TemplateMessages {
   bool IsClean() const { return errors.empty() && undefined.empty(); }
 };
 
-/// Loads a file as the editor does, and lists its messages from a level up.
+/// Loads a file as the editor does, and lists its messages from a level up. One that repeats another to the
+/// letter is left out.
 TemplateMessages CollectMessages(const std::string& file, int lowestLevel);
 
 /// Bytes as JSON can hold them.

@@ -49,7 +49,7 @@ inline constexpr MessageRow kMessages[] = {
         ErrorLevel::Fatal,
         "%1\n",
         "The load ended early for the reason that is given; the template is incomplete.",
-        "Five equations for four state variables end a load with: invalid vector<T> subscript",
+        "A file with five equations for four state variables.",
         "Remove what the reason and the other messages name, and load again; do not save over the file "
         "before.",
     },
@@ -185,7 +185,7 @@ inline constexpr MessageRow kMessages[] = {
         "Unknown function '%1' !",
         "The expression calls what is neither in the function catalogue nor a user function of the template.",
         "SINUS(x)",
-        "Correct the name, or declare the user function; `tessal functions` lists the catalogue.",
+        "Correct the name, or declare the user function; the command 'tessal functions' lists the catalogue.",
     },
     {
         "argument-count",
