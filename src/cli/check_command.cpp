@@ -2,6 +2,7 @@
 #include <nlohmann/json.hpp>
 
 #include "cli/commands.h"
+#include "cli/explanation.h"
 #include "cli/sarif.h"
 #include "cli/template_messages.h"
 
@@ -19,8 +20,8 @@ void PrintText(const TemplateMessages& messages) {
   }
   for (const UndefinedName& undefined : messages.undefined) {
     for (const UndefinedName::User& user : undefined.usedBy) {
-      PrintLine(messages.path + ": " + Coloured("Undefined", 0) + ": " + OnOneLine(user.symbol) +
-                ": Undefined symbol " + undefined.symbol);
+      PrintLine(messages.path + ": " + Coloured(kUndefinedWord, 0) + ": " + OnOneLine(user.symbol) + ": " +
+                Finding("undefined-symbol", {undefined.symbol}).text);
     }
   }
 }
@@ -30,6 +31,7 @@ Json ToJson(const TemplateMessages& messages) {
   for (const TemplateMessage& message : messages.errors) {
     errors.push_back({{"level", message.level},
                       {"word", message.word},
+                      {"code", message.code},
                       {"symbol", JsonText(message.symbol)},
                       {"uid", NumberOf(message.uid)},
                       {"kind", NumberOf(message.kind)},

@@ -12,6 +12,10 @@ enum class Format { Text, Json, Sarif };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
+/// What one message means, all messages as a list, and as a page.
+ExitCode RunExplain(const std::string& code);
+ExitCode RunExplainAll();
+ExitCode RunExplainPage();
 ExitCode RunSymbols(const std::string& file, Format format);
 /// With an empty output a plain save in place, else a save under that name.
 ExitCode RunSave(const std::string& file, const std::string& output);

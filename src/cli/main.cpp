@@ -31,6 +31,7 @@ struct CommandLine {
   bool onlyKeywords = false;
   bool force = false;
   bool mathJax = false;
+  bool asPage = false;
   Format format = Format::Text;
   int lowestLevel = 0;
   RenameCall rename;
@@ -63,6 +64,19 @@ int LevelIn(const std::string& text) {
   return level;
 }
 
+void AddExplain(CLI::App& app, CommandLine& line) {
+  CLI::App* explain = app.add_subcommand("explain", "says what the messages mean");
+  CLI::Option* code = explain->add_option("CODE", line.name, "the code of one message");
+  explain->add_flag("--markdown", line.asPage, "prints the page of all messages")->excludes(code);
+  explain->callback([&line, code] {
+    const bool asksForOne = code->count() > 0;
+    line.run = [&line, asksForOne] {
+      if (asksForOne) return RunExplain(line.name);
+      return line.asPage ? RunExplainPage() : RunExplainAll();
+    };
+  });
+}
+
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   CLI::App* check = AddCommand(app, line, "check", "lists the messages of templates",
                                [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
@@ -74,6 +88,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
           "--level", [&line](const std::string& text) { line.lowestLevel = LevelIn(ShownNumber(text)); },
           "hides messages below this level")
       ->type_name("LEVEL");
+
+  AddExplain(app, line);
 
   CLI::App* symbols = AddCommand(app, line, "symbols", "lists the symbol table of a template",
                                  [&line] { return RunSymbols(line.file, line.format); });

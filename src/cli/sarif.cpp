@@ -5,35 +5,28 @@
 #include <nlohmann/json.hpp>
 #include <string_view>
 
+#include "cli/explanation.h"
+
 namespace tessal::cli {
 
 namespace {
 
 using Json = nlohmann::ordered_json;
 
-/// A rule for each kind of message, by the word that people see.
-struct Rule {
-  std::uint32_t messageLevel;
-  const char* id;
-  const char* description;
-  const char* level;
-};
+/// The levels of the format, by those of messages.
+constexpr std::array<const char*, 5> kLevels = {"warning", "note", "warning", "error", "error"};
 
-constexpr std::uint32_t kUndefinedLevel = 0;
+const char* LevelOf(std::uint32_t messageLevel) {
+  return messageLevel < kLevels.size() ? kLevels[messageLevel] : "warning";
+}
 
-constexpr std::array<Rule, 5> kRules = {{
-    {kUndefinedLevel, "undefined-symbol", "An expression uses a name that nothing defines.", "warning"},
-    {1, "notice", "Something to know.", "note"},
-    {2, "warning", "A check of an element or of a rule found something wrong.", "warning"},
-    {3, "critical", "The order of declarations, a missing key, or a use across particle classes.", "error"},
-    {4, "fatal", "The file could not be loaded.", "error"},
-}};
-
-const Rule& RuleOf(std::uint32_t messageLevel) {
-  const auto hit = std::find_if(kRules.begin(), kRules.end(), [messageLevel](const Rule& rule) {
-    return rule.messageLevel == messageLevel;
-  });
-  return hit == kRules.end() ? kRules[2] : *hit;
+Json RuleOf(const MessageRow& row) {
+  const std::string meaning(row.meaning);
+  return {{"id", row.code},
+          {"shortDescription", {{"text", meaning}}},
+          {"fullDescription", {{"text", meaning + " " + std::string(row.remedy)}}},
+          {"help", {{"text", HelpText(row)}, {"markdown", HelpMarkdown(row)}}},
+          {"defaultConfiguration", {{"level", LevelOf(static_cast<std::uint32_t>(row.level))}}}};
 }
 
 /// A path as a reference of RFC 3986: everything but unreserved characters and the separator is encoded.
@@ -56,37 +49,39 @@ std::string UriOf(const std::string& path) {
   return uri;
 }
 
-Json ResultOf(const Rule& rule, const std::string& path, int line, const std::string& text) {
+Json ResultOf(std::string_view code, std::uint32_t level, const std::string& path, int line,
+              const std::string& text) {
   const Json location = {
       {"physicalLocation",
        {{"artifactLocation", {{"uri", UriOf(path)}}}, {"region", {{"startLine", std::max(line, 1)}}}}}};
-  return {{"ruleId", rule.id},
-          {"level", rule.level},
+  return {{"ruleId", code},
+          {"level", LevelOf(level)},
           {"message", {{"text", JsonText(text)}}},
           {"locations", Json::array({location})}};
+}
+
+void AddResults(Json& results, const TemplateMessages& file) {
+  for (const TemplateMessage& message : file.errors) {
+    const std::string symbol = message.symbol.empty() ? "generic" : message.symbol;
+    results.push_back(
+        ResultOf(message.code, message.level, file.path, message.line, symbol + ": " + message.text));
+  }
+  for (const UndefinedName& undefined : file.undefined) {
+    const Finding finding("undefined-symbol", {undefined.symbol});
+    for (const UndefinedName::User& user : undefined.usedBy) {
+      results.push_back(ResultOf(finding.message->code, static_cast<std::uint32_t>(finding.message->level),
+                                 file.path, user.line, user.symbol + ": " + finding.text));
+    }
+  }
 }
 
 }  // namespace
 
 std::string SarifText(const std::vector<TemplateMessages>& files) {
   Json rules = Json::array();
-  for (const Rule& rule : kRules) {
-    rules.push_back({{"id", rule.id}, {"shortDescription", {{"text", rule.description}}}});
-  }
+  for (const MessageRow& row : AllMessages()) rules.push_back(RuleOf(row));
   Json results = Json::array();
-  for (const TemplateMessages& file : files) {
-    for (const TemplateMessage& message : file.errors) {
-      const std::string symbol = message.symbol.empty() ? "generic" : message.symbol;
-      results.push_back(
-          ResultOf(RuleOf(message.level), file.path, message.line, symbol + ": " + message.text));
-    }
-    for (const UndefinedName& undefined : file.undefined) {
-      for (const UndefinedName::User& user : undefined.usedBy) {
-        results.push_back(ResultOf(RuleOf(kUndefinedLevel), file.path, user.line,
-                                   user.symbol + ": Undefined symbol " + undefined.symbol));
-      }
-    }
-  }
+  for (const TemplateMessages& file : files) AddResults(results, file);
   const Json driver = {{"name", "tessal"}, {"version", TESSAL_VERSION}, {"rules", rules}};
   const Json run = {{"tool", {{"driver", driver}}}, {"results", results}};
   const Json log = {{"$schema", "https://json.schemastore.org/sarif-2.1.0.json"},

@@ -1,5 +1,7 @@
 #include "cli/template_messages.h"
 
+#include <set>
+#include <tuple>
 #include <unordered_map>
 
 #include "cli/output.h"
@@ -50,6 +52,7 @@ class ElementIndex final {
 TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements) {
   TemplateMessage message;
   message.level = record.level;
+  message.code = record.code;
   message.word = LevelWord(record.level);
   message.symbol = record.symbol;
   message.uid = IsElement(record.uid) ? record.uid : kNoElement;
@@ -64,11 +67,13 @@ UndefinedName Describe(const UndefinedSymbol& undefined, const ElementIndex& ele
                        const TemplateCore& core) {
   UndefinedName name;
   name.symbol = undefined.symbol;
+  std::set<std::string> listed;
   for (const Uid uid : undefined.usedBy) {
     const SymbolRecord* record = elements.RecordOf(uid);
-    name.usedBy.push_back(
+    const UndefinedName::User user =
         record == nullptr ? UndefinedName::User{"unknown", 0}
-                          : UndefinedName::User{core.RecordSymbol(*record), record->element->SourceLine()});
+                          : UndefinedName::User{core.RecordSymbol(*record), record->element->SourceLine()};
+    if (listed.insert(user.symbol).second) name.usedBy.push_back(user);
   }
   return name;
 }
@@ -83,8 +88,12 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   TemplateCore core;
   messages.loaded = core.LoadWrapper(file);
   const ElementIndex elements(core);
+  std::set<std::tuple<std::uint32_t, std::string, std::string>> listed;
   for (const ErrorRecord& record : Errors().Records()) {
-    if (static_cast<int>(record.level) >= lowestLevel) messages.errors.push_back(Describe(record, elements));
+    if (static_cast<int>(record.level) < lowestLevel) continue;
+    TemplateMessage message = Describe(record, elements);
+    const bool isNew = listed.emplace(message.level, message.symbol, message.text).second;
+    if (isNew) messages.errors.push_back(std::move(message));
   }
   for (const auto& undefined : core.UndefinedSymbols()) {
     messages.undefined.push_back(Describe(*undefined, elements, core));

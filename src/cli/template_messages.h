@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "elements/element_kind.h"
@@ -12,6 +13,7 @@ namespace tessal::cli {
 
 struct TemplateMessage {
   std::uint32_t level;
+  std::string_view code;
   std::string word;
   std::string symbol;
   Uid uid;
@@ -39,7 +41,8 @@ struct TemplateMessages {
   bool IsClean() const { return errors.empty() && undefined.empty(); }
 };
 
-/// Loads a file as the editor does, and lists its messages from a level up.
+/// Loads a file as the editor does, and lists its messages from a level up. One that repeats another to the
+/// letter is left out.
 TemplateMessages CollectMessages(const std::string& file, int lowestLevel);
 
 /// Bytes as JSON can hold them.

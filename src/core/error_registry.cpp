@@ -4,26 +4,27 @@
 
 namespace tessal {
 
-namespace {
+void ErrorRegistry::Report(std::string_view symbol, Uid uid, const Finding& finding) {
+  Append({static_cast<std::uint32_t>(finding.message->level), std::string(symbol), uid, finding.text, 0,
+          finding.message->code});
+}
 
-constexpr std::array<std::string_view, 5> kLevelWords = {"", "Notice", "Warning", "Critical", "-FATAL-"};
+void ErrorRegistry::ReportInFile(std::string_view symbol, int line, const Finding& finding) {
+  Append({static_cast<std::uint32_t>(finding.message->level), std::string(symbol), kNoElement, finding.text,
+          line, finding.message->code});
+}
 
-}  // namespace
-
-std::string_view LevelWord(std::uint32_t level) {
-  return level < kLevelWords.size() ? kLevelWords[level] : kLevelWords[0];
+void ErrorRegistry::ReportCheck(std::string_view symbol, Uid uid, const Finding& finding) {
+  Report(symbol, uid, finding);
+  ++expressionWarningCount;
 }
 
 void ErrorRegistry::AddError(std::uint32_t level, std::string_view symbol, Uid uid, std::string_view text) {
-  Append({level, std::string(symbol), uid, std::string(text), 0});
+  Append({level, std::string(symbol), uid, std::string(text), 0, kOtherCode});
 }
 
 void ErrorRegistry::AddError(ErrorLevel level, std::string_view symbol, Uid uid, std::string_view text) {
   AddError(static_cast<std::uint32_t>(level), symbol, uid, text);
-}
-
-void ErrorRegistry::AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line) {
-  Append({static_cast<std::uint32_t>(level), std::string(symbol), kNoElement, std::string(text), line});
 }
 
 void ErrorRegistry::Append(ErrorRecord record) {

@@ -10,15 +10,13 @@
 #include <string_view>
 #include <vector>
 
+#include "core/messages.h"
 #include "platform/uid.h"
 
 namespace tessal {
 
 /// What a message without an element has in the place of an identity.
 inline constexpr Uid kNoElement{-1};
-
-/// How grave a message is. Only a fatal one changes the flow of control: it makes a load fail.
-enum class ErrorLevel : std::uint32_t { Notice = 1, Warning = 2, Critical = 3, Fatal = 4 };
 
 /// One message. `uid` is the identity of the element it speaks of, -1 for none. A message about the file
 /// itself, which has no element yet, knows its line (from 1; 0 for none).
@@ -28,42 +26,30 @@ struct ErrorRecord {
   Uid uid;
   std::string text;
   int line;
+  std::string_view code;  ///< of its row in the table of messages
 };
 
-/// The word of a level ("Warning"); empty for a number outside 1 to 4.
-std::string_view LevelWord(std::uint32_t level);
-
-/// Texts that several checks and change handlers share.
-namespace message {
-inline constexpr std::string_view kNoError = "No Error";
-inline constexpr std::string_view kBelowMinimum = "The (default) value is lower than the minimum!";
-inline constexpr std::string_view kAboveMaximum = "The (default) value is higher than the maximum!";
-inline constexpr std::string_view kOutsideRange = "The default value is not within minimum to maximum!";
-inline constexpr std::string_view kRangeReversed = "The minimum must be less equal maximum!";
-inline constexpr std::string_view kIllegalSymbol =
-    ", illegal symbol name (keyword or illegal characters used)";
-inline constexpr std::string_view kAlreadyDefined = ", already defined!";
-inline constexpr std::string_view kUnknownSymbol = "unknown symbol name used in expression";
-inline constexpr std::string_view kIllegalText =
-    "Decription, online help or documentation contain illegal characters ('!')";
-inline constexpr std::string_view kNoVariable = "No valid variable/property selected";
-inline constexpr std::string_view kNoSpecie = "No valid specie selected";
-inline constexpr std::string_view kNoMath = "Invalid math function";
-inline constexpr std::string_view kNoRadius = "Search radius must be larger than zero";
-inline constexpr std::string_view kDeprecatedBuiltin =
-    "The selected built-in ID is deprecated and should not be used for new templates";
-}  // namespace message
+/// The code of a record whose text was given from outside the table of messages.
+inline constexpr std::string_view kOtherCode = "other";
 
 class ErrorRegistry final {
  public:
+  /// Appends a finding about an element, under a symbol.
+  void Report(std::string_view symbol, Uid uid, const Finding& finding);
+
+  /// Appends a finding about a line of the file that is being read or written; 0 for no line.
+  void ReportInFile(std::string_view symbol, int line, const Finding& finding);
+
+  /// The way of the element checks: one more in `ExpressionWarningCount`, too.
+  void ReportCheck(std::string_view symbol, Uid uid, const Finding& finding);
+
+  // The same for texts that do not come from the table of messages.
+
   /// Appends a record and raises the counter of its level (a level outside 1 to 4 has no counter).
   void AddError(std::uint32_t level, std::string_view symbol, Uid uid, std::string_view text);
   void AddError(ErrorLevel level, std::string_view symbol, Uid uid, std::string_view text);
 
-  /// Appends a record about a place in the file that is being read.
-  void AddFileError(ErrorLevel level, std::string_view symbol, std::string_view text, int line);
-
-  /// The way of the element checks: a warning, and one more in `ExpressionWarningCount`.
+  /// A warning of an element check, and one more in `ExpressionWarningCount`.
   void ReportElementError(std::string_view symbol, Uid uid, std::string_view text);
 
   /// Empties the list and the level counters; `ExpressionWarningCount` stays.

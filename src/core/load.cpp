@@ -51,30 +51,29 @@ struct SyntaxError {
   std::string near;
 };
 
-std::string LoadErrorText(int error, const SyntaxError& syntax, const std::string& path) {
+/// Why the library loaded nothing.
+Finding LoadFailure(int error, const SyntaxError& syntax, const std::string& path) {
   switch (error) {
     case kKvfCannotOpen:
-      return "Can not open file " + path;
-    case kKvfCannotInitialiseStream:
-      return "Can not initalise iput stream";
+      return {"file-not-opened", {path}};
     case kKvfSyntaxError:
-      return "Synthax error near line " + std::to_string(syntax.line) + " position " +
-             std::to_string(syntax.position) + " : " + syntax.near;
+      return {"file-syntax", {std::to_string(syntax.line), std::to_string(syntax.position), syntax.near}};
+    case kKvfCannotInitialiseStream:
+      return {"load-failed", {"Can not initalise iput stream"}};
     case kKvfCannotInitialiseParser:
-      return "Can not initalise KVF parser!";
+      return {"load-failed", {"Can not initalise KVF parser!"}};
     case kKvfBadHandle:
-      return "Bad handle passed to function!";
+      return {"load-failed", {"Bad handle passed to function!"}};
     case kKvfBadNode:
-      return "Bad node passed to function!";
+      return {"load-failed", {"Bad node passed to function!"}};
     default:
-      return "unkown error occured!";
+      return {"load-failed", {"unkown error occured!"}};
   }
 }
 
 void ReportFailedLoad(const OpenFile& file, const std::string& path) {
   const SyntaxError syntax(file.Handle());
-  Errors().AddFileError(ErrorLevel::Fatal, kLoadSymbol, LoadErrorText(file.Error(), syntax, path) + "\n",
-                        syntax.line);
+  Errors().ReportInFile(kLoadSymbol, syntax.line, LoadFailure(file.Error(), syntax, path));
 }
 
 /// Why the item tree could not be read, in words for the modeller.
@@ -115,7 +114,7 @@ bool TemplateCore::Load(const std::string& path) {
     return true;
   } catch (const std::exception& failure) {
     // What was built so far stays; the reason must reach the user.
-    Errors().AddError(ErrorLevel::Fatal, kLoadSymbol, kNoElement, std::string(failure.what()) + "\n");
+    Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});
     return false;
   }
 }
@@ -134,7 +133,7 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
   }
   keptTree.Clear();
   if (LoadKeyFileTree(path, keptTree) == 0) {
-    Errors().AddError(ErrorLevel::Warning, kNotKeptSymbol, kNoElement, TreeFailureText(path));
+    Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(path)}});
   }
   return true;
 }
@@ -201,9 +200,7 @@ void TemplateCore::ReadEquations(KvfNode target, int& status) {
   if (equations == nullptr) return;
   const int count = kvfGetNoSections(equations);
   if (static_cast<std::size_t>(count) > stateVariables.size()) {
-    Errors().AddFileError(ErrorLevel::Critical, "",
-                          "STATE_VARIABLE_EQUATIONS has more sub-sections than there are state variables",
-                          kvfGetLine(equations));
+    Errors().ReportInFile("", kvfGetLine(equations), {"surplus-equations"});
   }
   for (int number = 1; number <= count; ++number) {
     GetStateVariable(static_cast<std::size_t>(number - 1))

@@ -249,16 +249,14 @@ bool TemplateCore::CheckRecordOrder(const SymbolRecord& record) const {
   bool good = true;
   for (const std::uint32_t sequence : record.references) {
     const CEL_Element& used = *Record(sequence).element;
-    std::string text;
     if (user.Kind() == ElementKind::StateVariable) {
       if (used.Kind() == ElementKind::Process) continue;
-      text = "The symbol '" + used.symbol.Text() + "' is not a process!";
+      Errors().Report(RecordSymbol(record), user.GetUid(), {"not-a-process", {used.symbol.Text()}});
     } else {
       if (sequence <= static_cast<std::uint32_t>(user.id.IntValue())) continue;
-      text = "The symbol '" + used.symbol.Text() + "' can not be used as it is declared after '" +
-             RecordSymbol(record) + "'!";
+      const std::string symbol = RecordSymbol(record);
+      Errors().Report(symbol, user.GetUid(), {"order-violated", {used.symbol.Text(), symbol}});
     }
-    Errors().AddError(ErrorLevel::Critical, RecordSymbol(record), user.GetUid(), text);
     good = false;
   }
   return good;

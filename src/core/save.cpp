@@ -36,7 +36,7 @@ class Image final {
 };
 
 void ReportFailure(std::string_view reason) {
-  Errors().AddError(ErrorLevel::Critical, kSaveSymbol, kNoElement, reason);
+  Errors().ReportInFile(kSaveSymbol, 0, {"save-failed", {reason}});
 }
 
 /// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line

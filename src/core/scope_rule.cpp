@@ -2,7 +2,7 @@
 
 #include <algorithm>
 #include <array>
-#include <string>
+#include <optional>
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
@@ -48,26 +48,25 @@ bool ViolatesScopeRule(const SymbolRecord& user, const SymbolRecord& used) {
   return user.spatial == spatial_code::kNone && used.spatial != spatial_code::kNone;
 }
 
-constexpr std::string_view kNoProcess = " is no process!";
-constexpr std::string_view kInvalidScope = " has invalid scope and/or spatial variation in expression of";
-
-/// The text of a violation of the process rule, empty when the use is allowed.
-std::string_view ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
+/// What a use violates of the process rule; nothing when it is allowed.
+std::optional<Message> ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
+  constexpr std::optional<Message> kAllowed;
+  constexpr Message kNoProcess = "no-process-by-rule";
+  constexpr Message kInvalidScope = "scope-violated-by-rule";
   const ElementKind userKind = user.element->Kind();
   const ElementKind usedKind = used.element->Kind();
-  if (userKind == ElementKind::StateVariable)
-    return usedKind == ElementKind::Process ? std::string_view() : kNoProcess;
+  if (userKind == ElementKind::StateVariable) return usedKind == ElementKind::Process ? kAllowed : kNoProcess;
   if (userKind != ElementKind::Auxiliary && userKind != ElementKind::Process) return {};
   switch (usedKind) {
     case ElementKind::Constant:
     case ElementKind::Forcing:
     case ElementKind::Auxiliary:
-      return used.spatial <= user.spatial ? std::string_view() : kInvalidScope;
+      return used.spatial <= user.spatial ? kAllowed : kInvalidScope;
     case ElementKind::Process:
       if (userKind == ElementKind::Auxiliary) return {};
-      return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
+      return used.scope != scope_code::kGlobal ? kAllowed : kInvalidScope;
     case ElementKind::StateVariable:
-      return used.scope != scope_code::kGlobal ? std::string_view() : kInvalidScope;
+      return used.scope != scope_code::kGlobal ? kAllowed : kInvalidScope;
     default:
       return {};
   }
@@ -105,8 +104,8 @@ bool TemplateCore::CheckScopeRule() const {
     for (const std::uint32_t sequence : user.references) {
       const SymbolRecord& used = Record(sequence);
       if (!ViolatesScopeRule(user, used)) continue;
-      Errors().ReportElementError(user.element->symbol.Text(), user.element->GetUid(),
-                                  "'" + RecordSymbol(used) + "' has invalid scope and/or spatial variation");
+      Errors().ReportCheck(user.element->symbol.Text(), user.element->GetUid(),
+                           {"scope-violated", {RecordSymbol(used)}});
       good = false;
     }
   }
@@ -118,10 +117,10 @@ bool TemplateCore::CheckProcessRule() const {
   for (const SymbolRecord& user : symbolTable) {
     for (const std::uint32_t sequence : user.references) {
       const SymbolRecord& used = Record(sequence);
-      const std::string_view violation = ProcessRuleViolation(user, used);
-      if (violation.empty()) continue;
-      Errors().ReportElementError(user.element->symbol.Text(), user.element->GetUid(),
-                                  RecordSymbol(used) + std::string(violation));
+      const std::optional<Message> violation = ProcessRuleViolation(user, used);
+      if (!violation) continue;
+      Errors().ReportCheck(user.element->symbol.Text(), user.element->GetUid(),
+                           {*violation, {RecordSymbol(used)}});
       good = false;
     }
   }

@@ -36,7 +36,7 @@ bool CheckSpecie(CEL_Lagrange_Specie& specie) {
 
 bool CheckRootText(const CEL_Element& root) {
   if (!HoldsIllegalText(root)) return true;
-  Errors().ReportElementError("Tessal Setup", root.GetUid(), message::kIllegalText);
+  Errors().ReportCheck("Tessal Setup", root.GetUid(), {"illegal-text"});
   return false;
 }
 

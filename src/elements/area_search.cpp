@@ -158,21 +158,21 @@ void CEL_Lagrange_Spatial_Function::OfferSpecies(const std::vector<NamedNumber>&
 
 bool CEL_Lagrange_Spatial_Function::Check() {
   bool good = CheckTextContent(*this);
-  const auto report = [this, &good](std::string_view text) {
-    Errors().ReportElementError(symbol.Text(), GetUid(), text);
+  const auto report = [this, &good](Message message) {
+    Errors().ReportCheck(symbol.Text(), GetUid(), {message});
     good = false;
   };
   const bool lagrange = framework.Text() == kLagrange;
   const std::int32_t sought = lookFor.IntValue();
   const std::int32_t variable = variableId.IntValue();
   const auto species = static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieNames().size());
-  if (lagrange && (sought < kAnyParticle || sought == 0 || sought > species)) report(message::kNoSpecie);
+  if (lagrange && (sought < kAnyParticle || sought == 0 || sought > species)) report("search-without-class");
   if (purpose.Text() != kOilspill) {
     const bool needsVariable = !lagrange || property.Text() == kNone;
-    if (variable > kLargestVariableId || (variable < 1 && needsVariable)) report(message::kNoVariable);
+    if (variable > kLargestVariableId || (variable < 1 && needsVariable)) report("search-without-variable");
   }
-  if (math.Text() == kNone) report(message::kNoMath);
-  if (!(radius.RealValue() > 0.0)) report(message::kNoRadius);
+  if (math.Text() == kNone) report("search-without-function");
+  if (!(radius.RealValue() > 0.0)) report("search-without-radius");
   return good;
 }
 

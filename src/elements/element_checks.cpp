@@ -15,8 +15,8 @@ namespace tessal {
 
 namespace {
 
-void Report(const CEL_Element& element, std::string_view text) {
-  Errors().ReportElementError(element.symbol.Text(), element.GetUid(), text);
+void Report(const CEL_Element& element, const Finding& finding) {
+  Errors().ReportCheck(element.symbol.Text(), element.GetUid(), finding);
 }
 
 }  // namespace
@@ -25,20 +25,20 @@ bool CheckDefaultInRange(const CEL_Element& element, const CEL_Property& minimum
                          const CEL_Property& maximum) {
   const bool below = minimum.RealValue() > value.RealValue();
   const bool above = value.RealValue() > maximum.RealValue();
-  if (below) Report(element, message::kBelowMinimum);
-  if (above) Report(element, message::kAboveMaximum);
+  if (below) Report(element, {"value-below-minimum"});
+  if (above) Report(element, {"value-above-maximum"});
   return !below && !above;
 }
 
 bool CheckRangeOrder(const CEL_Element& element, const CEL_Property& minimum, const CEL_Property& maximum) {
   if (minimum.RealValue() <= maximum.RealValue()) return true;
-  Report(element, message::kRangeReversed);
+  Report(element, {"range-reversed"});
   return false;
 }
 
 bool CheckSymbolForm(const CEL_Element& element) {
   if (IsValidSymbol(element.symbol.Text())) return true;
-  Report(element, element.symbol.Text() + std::string(message::kIllegalSymbol));
+  Report(element, {"illegal-symbol", {element.symbol.Text()}});
   return false;
 }
 
@@ -52,7 +52,7 @@ bool HoldsIllegalText(const CEL_Element& element) {
 
 bool CheckTextContent(const CEL_Element& element) {
   if (!HoldsIllegalText(element)) return true;
-  Report(element, message::kIllegalText);
+  Report(element, {"illegal-text"});
   return false;
 }
 

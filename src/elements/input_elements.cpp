@@ -102,7 +102,7 @@ bool CEL_Input::Check() {
   const bool named = CheckSymbolForm(*this);
   const bool worded = CheckTextContent(*this);
   const bool current = !IsDeprecatedBuiltin(builtInId.IntValue());
-  if (!current) Errors().ReportElementError(symbol.Text(), GetUid(), message::kDeprecatedBuiltin);
+  if (!current) Errors().ReportCheck(symbol.Text(), GetUid(), {"deprecated-builtin"});
   return inRange && ordered && named && worded && current;
 }
 

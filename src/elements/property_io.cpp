@@ -22,12 +22,9 @@ std::string& LastKeyErrorText() {
 
 void ReportMissing(KvfNode section, std::string_view key, int& status) {
   status = kStatusMissingKey;
-  std::string text = "could not find key ";
-  text += key;
-  text += " in ";
-  text += kvfGetNameGlb(section);
-  Errors().AddFileError(ErrorLevel::Critical, "", text, kvfGetLine(section));
-  LastKeyErrorText() = std::move(text);
+  const Finding finding("missing-key", {key, kvfGetNameGlb(section)});
+  Errors().ReportInFile("", kvfGetLine(section), finding);
+  LastKeyErrorText() = finding.text;
 }
 
 KvfNode FirstParameter(KvfNode section, std::string_view key) {
@@ -124,11 +121,8 @@ void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key,
 void NoteWriteResult(int result, std::string_view key, CEL_Element& element, int& status) {
   if (result == kKvfOk) return;
   status = result;
-  std::string text = "could not write key ";
-  text += key;
-  text += ": ";
-  text += WriteFailureReason(result);
-  Errors().AddError(ErrorLevel::Critical, element.symbol.Text(), element.GetUid(), text);
+  Errors().Report(element.symbol.Text(), element.GetUid(),
+                  {"key-not-written", {key, WriteFailureReason(result)}});
 }
 
 void WriteText(std::string_view text, KvfHandle file, std::string_view key, CEL_Element& element,

@@ -69,34 +69,22 @@ void WriteList(const Sequence<Member>& members, std::string_view name, std::stri
   kvfEndSection(file);
 }
 
-/// A finding about a symbol that a member's expression uses.
-struct ReferenceFinding {
-  std::string text;
-  ErrorLevel level = ErrorLevel::Critical;
-};
-
-std::string NotOfThisClass(std::string_view what, const CEL_Element& used, const CEL_Element& specie) {
-  std::string text = "The ";
-  text += what;
-  text += " '" + used.symbol.Text() + "' does not belong to current specie " + specie.symbol.Text();
-  return text;
+Finding NotOfThisClass(std::string_view what, const CEL_Element& used, const CEL_Element& specie) {
+  return {"foreign-member", {what, used.symbol.Text(), specie.symbol.Text()}};
 }
 
 /// What a state variable's equation may use: the arithmetic expressions of its class.
-std::optional<ReferenceFinding> FindEquationFault(const CEL_Element& used,
-                                                  const CEL_Lagrange_Specie& specie) {
+std::optional<Finding> FindEquationFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
   if (used.Kind() != ElementKind::ArithmeticExpression) {
-    return ReferenceFinding{"The symbol'" + used.symbol.Text() +
-                            "' is not a process of the current current specie " + specie.symbol.Text()};
+    return Finding("foreign-equation-term", {used.symbol.Text(), specie.symbol.Text()});
   }
   const auto& expression = static_cast<const CEL_Lagrange_Arithmetical_Expression&>(used);
   if (expression.specie.IntValue() == specie.Index()) return std::nullopt;
-  return ReferenceFinding{NotOfThisClass("expression", used, specie)};
+  return NotOfThisClass("expression", used, specie);
 }
 
 /// What other members may use: the template's inputs and state variables, and members of their own class.
-std::optional<ReferenceFinding> FindExpressionFault(const CEL_Element& used,
-                                                    const CEL_Lagrange_Specie& specie) {
+std::optional<Finding> FindExpressionFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
   switch (used.Kind()) {
     case ElementKind::StateVariable:
     case ElementKind::Constant:
@@ -104,21 +92,19 @@ std::optional<ReferenceFinding> FindExpressionFault(const CEL_Element& used,
       return std::nullopt;
     case ElementKind::SpecieStateVariable:
       if (specie.Owns(used)) return std::nullopt;
-      return ReferenceFinding{
-          NotOfThisClass("state variable", used, specie) + " (only allowed if interaction!)",
-          ErrorLevel::Warning};
+      return Finding("foreign-state-variable", {used.symbol.Text(), specie.symbol.Text()});
     case ElementKind::SpecieConstant:
       if (specie.Owns(used)) return std::nullopt;
-      return ReferenceFinding{NotOfThisClass("constant", used, specie)};
+      return NotOfThisClass("constant", used, specie);
     case ElementKind::SpatialFunction:
       if (specie.Owns(used)) return std::nullopt;
-      return ReferenceFinding{NotOfThisClass("spatial function", used, specie)};
+      return NotOfThisClass("spatial function", used, specie);
     case ElementKind::ArithmeticExpression:
       if (specie.Owns(used)) return std::nullopt;
-      return ReferenceFinding{NotOfThisClass("expression", used, specie)};
+      return NotOfThisClass("expression", used, specie);
     default:
       if (specie.Owns(used)) return std::nullopt;
-      return ReferenceFinding{NotOfThisClass("symbol", used, specie)};
+      return NotOfThisClass("symbol", used, specie);
   }
 }
 
@@ -387,11 +373,10 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
     auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
     // Equations use what they use regardless of order: state variables are integrated.
     if (!isEquation && IsDeclaredAfter(*used, member, *this)) {
-      finding = ReferenceFinding{"The symbol '" + used->symbol.Text() +
-                                 "' can not be used as it is declared after '" + member.symbol.Text() + "'!"};
+      finding = Finding("order-violated", {used->symbol.Text(), member.symbol.Text()});
     }
     if (!finding) continue;
-    Errors().AddError(finding->level, member.symbol.Text(), member.GetUid(), finding->text);
+    Errors().Report(member.symbol.Text(), member.GetUid(), *finding);
     good = false;
   }
   return good;
@@ -399,22 +384,22 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
 
 void CEL_Lagrange_Specie::OnPropertyChanged(CEL_Property& changed) {
   if (&changed == &description && description.Text().find('!') != std::string::npos) {
-    Errors().ReportElementError(symbol.Text(), GetUid(), message::kIllegalText);
+    Errors().ReportCheck(symbol.Text(), GetUid(), {"illegal-text"});
   }
   if (&changed != &symbol) return;
-  std::string_view fault = message::kNoError;
+  std::optional<Message> fault;
   if (!IsValidSymbol(symbol.Text())) {
-    fault = message::kIllegalSymbol;
+    fault = Message("illegal-symbol");
   } else if (Owner() != nullptr && Owner()->IsSymbolTakenByOther(GetUid(), symbol.Text())) {
-    fault = message::kAlreadyDefined;
+    fault = Message("symbol-taken");
   }
-  if (fault != message::kNoError) {
+  if (fault) {
     const std::string refused = symbol.Text();
     {
       const NotificationsOff silent;  // going back is no new change to judge
       symbol.SetText(symbol.PrevText());
     }
-    Errors().ReportElementError(refused, GetUid(), refused + std::string(fault));
+    Errors().ReportCheck(refused, GetUid(), {*fault, {refused}});
     return;
   }
   ParseExpression();

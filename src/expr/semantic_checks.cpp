@@ -64,7 +64,7 @@ class FunctionCheck final {
   bool IsBalanced() const { return callDepth < 1; }
   const std::string& LastCall() const { return lastCall; }
 
-  void Report(std::string_view text) { Errors().ReportElementError(symbol, uid, text); }
+  void Report(const Finding& finding) { Errors().ReportCheck(symbol, uid, finding); }
 
  private:
   void Visit(NodeKind kind, const std::string& text) {
@@ -72,7 +72,7 @@ class FunctionCheck final {
       // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
       ++arguments;
     } else if (kind == NodeKind::Property) {
-      if (!IsPropertyName(text)) Report("Unknown property ['" + text + "'] !");
+      if (!IsPropertyName(text)) Report({"unknown-property", {text}});
     } else if (kind == NodeKind::Call) {
       CheckCall(text);
       ++callDepth;
@@ -84,14 +84,14 @@ class FunctionCheck final {
   void CheckCall(const std::string& name) {
     const CatalogueFunction* function = FindFunction(name);
     if (function == nullptr) {
-      if (!IsUserFunctionName(name)) Report("Unknown function '" + name + "' !");
+      if (!IsUserFunctionName(name)) Report({"unknown-function", {name}});
       return;
     }
     if (function->argumentCount != arguments) {
-      Report("Wrong number of arguments for function " + name + "(" + JoinedArguments(*function) + ")!");
+      Report({"argument-count", {name, JoinedArguments(*function)}});
     }
     if (IsDeprecatedFunction(function->id)) {
-      Report("The function " + name + " is deprecated and should not be used!");
+      Report({"deprecated-function", {name}});
     }
   }
 
@@ -108,12 +108,12 @@ bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& pa
   FunctionCheck check(symbol, uid);
   const ExpressionNode* tree = parsed.Tree();
   if (tree == nullptr) {
-    check.Report(parsed.Failure()->message);
+    Errors().ReportElementError(symbol, uid, parsed.Failure()->message);
     return false;
   }
   check.Walk(*tree);
   if (check.IsBalanced()) return true;
-  check.Report("One or more functions (" + check.LastCall() + ") are not fully specified!");
+  check.Report({"call-incomplete", {check.LastCall()}});
   return false;
 }
 

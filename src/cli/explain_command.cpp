@@ -1,0 +1,31 @@
+// Says what the messages mean: one of them, all in a list, or all on a page.
+#include "cli/commands.h"
+#include "cli/explanation.h"
+
+namespace tessal::cli {
+
+ExitCode RunExplain(const std::string& code) {
+  const MessageRow* row = FindMessage(code);
+  if (row == nullptr) {
+    Complain("no message has the code '" + code + "'");
+    return kContentFault;
+  }
+  PrintLine(code + ": " + std::string(LevelWordOf(*row)) + ": " + std::string(TextOf(*row)));
+  PrintLine("Meaning: " + std::string(row->meaning));
+  PrintLine(HelpText(*row));
+  return kFine;
+}
+
+ExitCode RunExplainAll() {
+  for (const MessageRow& row : AllMessages()) {
+    PrintLine(std::string(row.code) + '\t' + std::string(LevelWordOf(row)) + '\t' + std::string(TextOf(row)));
+  }
+  return kFine;
+}
+
+ExitCode RunExplainPage() {
+  Print(MessagesPage());
+  return kFine;
+}
+
+}  // namespace tessal::cli

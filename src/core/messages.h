@@ -1,0 +1,57 @@
+// A message of the table, and a message with its values filled in. Whatever finds a fault names the row by
+// its code, and a code without a row does not compile:
+//
+//     Errors().Report(symbol, uid, {"order-violated", {used, user}});
+#pragma once
+
+#include <cstddef>
+#include <initializer_list>
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "core/message_table.h"
+
+namespace tessal {
+
+/// A row of the table of messages.
+class Message final {
+ public:
+  /// Looks the code up while compiling.
+  template <std::size_t kSize>
+  consteval Message(const char (&code)[kSize]) : row(RowOf({code, kSize - 1})) {}
+
+  const MessageRow* operator->() const { return row; }
+
+ private:
+  static consteval const MessageRow* RowOf(std::string_view code) {
+    for (const MessageRow& candidate : kMessages) {
+      if (candidate.code == code) return &candidate;
+    }
+    throw "no message has this code";
+  }
+
+  const MessageRow* row;
+};
+
+/// What a check found: a message, and its text with the values in their places.
+struct Finding {
+  /// As many values as the text of the row has places.
+  Finding(Message message, std::initializer_list<std::string_view> values = {});
+
+  Message message;
+  std::string text;
+};
+
+/// The rows of the table, in its order.
+inline std::span<const MessageRow> AllMessages() {
+  return kMessages;
+}
+
+/// The row of a code; none for a code outside the table.
+const MessageRow* FindMessage(std::string_view code);
+
+/// The word of a level ("Warning"); empty for a number outside 1 to 4.
+std::string_view LevelWord(std::uint32_t level);
+
+}  // namespace tessal
