@@ -21,7 +21,7 @@ using test::TemporaryFolder;
 
 TEST(Tool, AnswersCallsThatAreOffWithOneLineAndTwo) {
   const std::pair<std::vector<std::string>, const char*> rows[] = {
-      {{}, "subcommand"},
+      {{}, "a command is required"},
       {{"nonsense"}, "unknown command 'nonsense'"},
       {{"check"}, "FILE"},
       {{"check", "--nonsense", "x"}, "--nonsense"},
