@@ -23,7 +23,8 @@ const CLI::App& Called(const CLI::App& app) {
 }  // namespace
 
 std::string CallFault(const CLI::App& app, const CLI::ParseError& refusal) {
-  const std::vector<std::string> unknown = app.remaining(true);
+  std::vector<std::string> unknown = app.remaining(true);
+  std::erase(unknown, "--");
   const bool needsCommand = Called(app).get_require_subcommand_min() > 0;
   if (needsCommand && !unknown.empty() && !IsOption(unknown.front())) {
     return "unknown command '" + ShownNumber(unknown.front()) + "'";
