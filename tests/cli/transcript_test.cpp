@@ -87,6 +87,7 @@ TEST(FrontPage, ShowsWhatTheToolPrints) {
   for (const CaseCall& call : calls) {
     const ShellRun run = session.Run(call.words);
     std::string given = run.output + run.errors;
+    std::erase(given, '\r');
     std::string expected = call.expected;
     // Three points stand for the rest.
     if (expected.ends_with("\n...\n")) {
