@@ -1,4 +1,4 @@
-// The words that options take, and what each stands for: a new format is a row here.
+// The words that options take, and what each means: a new format is a row here.
 #pragma once
 
 #include <array>
@@ -36,7 +36,7 @@ inline constexpr std::array<Choice<int>, 4> kLevels = {{
     {"fatal", 4},
 }};
 
-/// What a word stands for; nothing for a word that is no choice.
+/// What a word means; nothing for a word that is no choice.
 template <class Value>
 std::optional<Value> ValueOf(Choices<Value> choices, std::string_view word) {
   for (const Choice<Value>& choice : choices) {

@@ -26,7 +26,7 @@ struct Answer {
 
 using Question = std::function<Answer(const std::string& expression)>;
 
-/// Several lines of one result stand on one line for batch use.
+/// Several lines of one result are one line for batch use.
 std::string OnOneLine(std::string_view text, char separator) {
   std::string line(WithoutLineFeed(text));
   std::replace(line.begin(), line.end(), '\n', separator);
@@ -59,19 +59,19 @@ ExitCode Ask(const ExpressionCall& call, const Question& question) {
 }
 
 /// Parses, and lets the operation make the text of a tree. The failure is the parser's message, or nothing.
-Answer WithTree(const std::string& expression, bool tellFailure,
+Answer WithTree(const std::string& expression, bool withMessage,
                 const std::function<std::string(const ExpressionNode&)>& textOf) {
   ExpressionNode tree;
   std::int32_t line = 0;
   std::int32_t position = 0;
   std::string message;
   if (ParseExpressionText(expression, tree, line, position, message) == 0) {
-    return {tellFailure ? message : std::string(), kContentFault};
+    return {withMessage ? message : std::string(), kContentFault};
   }
   return {textOf(tree), kFine};
 }
 
-/// A token outside the table carries the code of the last one in it; its text tells the two apart.
+/// A token outside the table carries the code of the last one in it; its text shows which of the two it is.
 std::string_view NameOf(const ExpressionToken& listed) {
   const bool isOther = listed.code == token::kExceedanceFrequency && listed.text != "EXCEEDANCE_FREQUENCY";
   return isOther ? "-" : TokenName(listed.code);

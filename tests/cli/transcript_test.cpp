@@ -89,7 +89,7 @@ TEST(FrontPage, ShowsWhatTheToolPrints) {
     std::string given = run.output + run.errors;
     std::erase(given, '\r');
     std::string expected = call.expected;
-    // Three points stand for the rest.
+    // Three points at the end mean the rest.
     if (expected.ends_with("\n...\n")) {
       expected.erase(expected.size() - 4);
       given.resize(std::min(given.size(), expected.size()));
