@@ -1,4 +1,4 @@
-// The commands of the tool. Each prints its result and tells how it ended.
+// The commands of the tool. Each prints its result and returns how it ended.
 #pragma once
 
 #include <string>
@@ -36,7 +36,7 @@ ExitCode RunTree(const std::string& file);
 ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,
                  bool onlyKeywords);
 
-// Expressions. The text "-" stands for standard input.
+// Expressions. The text "-" means standard input.
 struct ExpressionCall {
   std::string text;
   bool eachLine = false;  ///< standard input, one expression a line

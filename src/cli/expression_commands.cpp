@@ -26,7 +26,7 @@ struct Answer {
 
 using Question = std::function<Answer(const std::string& expression)>;
 
-/// Several lines of one result stand on one line for batch use.
+/// Several lines of one result are one line for batch use.
 std::string OnOneLine(std::string_view text, char separator) {
   std::string line(WithoutLineFeed(text));
   std::replace(line.begin(), line.end(), '\n', separator);
@@ -59,16 +59,16 @@ ExitCode Ask(const ExpressionCall& call, const Question& question) {
 }
 
 /// Parses, and lets the operation make the text of a tree. The failure is the parser's message, or nothing.
-Answer WithTree(const std::string& expression, bool tellFailure,
+Answer WithTree(const std::string& expression, bool withMessage,
                 const std::function<std::string(const ExpressionNode&)>& textOf) {
   const ParsedExpression parsed = ParseExpression(expression);
   if (const ParseFailure* failure = parsed.Failure()) {
-    return {tellFailure ? failure->message : std::string(), kContentFault};
+    return {withMessage ? failure->message : std::string(), kContentFault};
   }
   return {textOf(*parsed.Tree()), kFine};
 }
 
-/// A token outside the table carries the code of the last one in it; its text tells the two apart.
+/// A token outside the table carries the code of the last one in it; its text shows which of the two it is.
 std::string_view NameOf(const ExpressionToken& listed) {
   const bool isOther = listed.code == TokenCode::ExceedanceFrequency && listed.text != "EXCEEDANCE_FREQUENCY";
   return isOther ? "-" : TokenName(listed.code);

@@ -4,12 +4,15 @@
 #include <csignal>
 #include <exception>
 #include <functional>
-#include <map>
+#include <memory>
 #include <string>
 #include <system_error>
 #include <vector>
 
+#include "cli/call_faults.h"
+#include "cli/choices.h"
 #include "cli/commands.h"
+#include "cli/help_text.h"
 #include "cli/numbers.h"
 #include "cli/output.h"
 #include "expr/carbonate/options.h"
@@ -39,13 +42,15 @@ struct CommandLine {
   std::function<ExitCode()> run;
 };
 
-const std::map<std::string, Format> kCheckFormats = {
-    {"text", Format::Text}, {"json", Format::Json}, {"sarif", Format::Sarif}};
-const std::map<std::string, Format> kTableFormats = {{"text", Format::Text}, {"json", Format::Json}};
+/// The parts of the tool, as its help lists them.
+constexpr const char* kTemplates = "Templates";
+constexpr const char* kKeyFiles = "Key files";
+constexpr const char* kExpressions = "Expressions";
+constexpr const char* kCatalogues = "Catalogues";
 
-CLI::App* AddCommand(CLI::App& parent, CommandLine& line, const char* name, const char* description,
-                     std::function<ExitCode()> run) {
-  CLI::App* command = parent.add_subcommand(name, description);
+CLI::App* AddCommand(CLI::App& parent, CommandLine& line, const char* group, const char* name,
+                     const char* description, std::function<ExitCode()> run) {
+  CLI::App* command = parent.add_subcommand(name, description)->group(group);
   command->callback([&line, run = std::move(run)] { line.run = run; });
   return command;
 }
@@ -54,18 +59,37 @@ CLI::Option* AddFile(CLI::App& command, std::string& file) {
   return command.add_option("FILE", file, "a template file")->required();
 }
 
-/// The level that a text names. Read here, as the option parser does not know the hidden negative numbers.
+CLI::Option* AddOutput(CLI::App& command, std::string& output, const char* description) {
+  return command.add_option("--output", output, description)->type_name("OUT");
+}
+
+CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
+  const auto read = [&line, formats](const std::string& word) {
+    const std::optional<Format> format = ValueOf(formats, word);
+    if (!format) {
+      throw CLI::ValidationError("--format", "'" + ShownNumber(word) + "' is none of " + WordsOf(formats));
+    }
+    line.format = *format;
+  };
+  return command.add_option_function<std::string>("--format", read, WordsOf(formats))->type_name("FORMAT");
+}
+
+/// The level that a word or a number names. Numbers are read here, as the option parser does not know those
+/// that are hidden from it.
 int LevelIn(const std::string& text) {
+  constexpr Choices<int> kWords = kLevels;
+  if (const std::optional<int> level = ValueOf(kWords, CLI::ignore_case(text))) return *level;
   int level = 0;
   const auto read = std::from_chars(text.data(), text.data() + text.size(), level);
   if (read.ec != std::errc() || read.ptr != text.data() + text.size()) {
-    throw CLI::ConversionError(text, "--level");
+    throw CLI::ValidationError("--level", "'" + text + "' is no whole number and none of " + WordsOf(kWords));
   }
   return level;
 }
 
 void AddExplain(CLI::App& app, CommandLine& line) {
   CLI::App* explain = app.add_subcommand("explain", "says what the messages mean");
+  explain->group(kTemplates);
   CLI::Option* code = explain->add_option("CODE", line.name, "the code of one message");
   explain->add_flag("--markdown", line.asPage, "prints the page of all messages")->excludes(code);
   explain->callback([&line, code] {
@@ -77,71 +101,74 @@ void AddExplain(CLI::App& app, CommandLine& line) {
   });
 }
 
-void AddTemplateCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* check = AddCommand(app, line, "check", "lists the messages of templates",
+void AddCheck(CLI::App& app, CommandLine& line) {
+  CLI::App* check = AddCommand(app, line, kTemplates, "check", "lists the messages of templates",
                                [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
   check->add_option("FILE", line.files, "template files")->required();
-  check->add_option("--format", line.format, "text, json or sarif")
-      ->transform(CLI::CheckedTransformer(kCheckFormats));
+  AddFormat(*check, line, kCheckFormats);
   check
       ->add_option_function<std::string>(
           "--level", [&line](const std::string& text) { line.lowestLevel = LevelIn(ShownNumber(text)); },
-          "hides messages below this level")
+          "hides messages below it: " + WordsOf(Choices<int>(kLevels)) + ", or 1 to 4")
       ->type_name("LEVEL");
+}
 
+void AddTemplateCommands(CLI::App& app, CommandLine& line) {
+  AddCheck(app, line);
   AddExplain(app, line);
 
-  CLI::App* symbols = AddCommand(app, line, "symbols", "lists the symbol table of a template",
+  CLI::App* symbols = AddCommand(app, line, kTemplates, "symbols", "lists the symbol table of a template",
                                  [&line] { return RunSymbols(line.file, line.format); });
   AddFile(*symbols, line.file);
-  symbols->add_option("--format", line.format, "text or json")
-      ->transform(CLI::CheckedTransformer(kTableFormats));
+  AddFormat(*symbols, line, kTableFormats);
 
-  CLI::App* save = AddCommand(app, line, "save", "loads a template and saves it",
+  CLI::App* save = AddCommand(app, line, kTemplates, "save", "loads a template and saves it",
                               [&line] { return RunSave(line.file, line.output); });
   AddFile(*save, line.file);
-  save->add_option("--output", line.output, "saves under this name");
+  AddOutput(*save, line.output, "saves under this name, not in place");
 
-  CLI::App* create = AddCommand(app, line, "new", "saves an empty template",
+  CLI::App* create = AddCommand(app, line, kTemplates, "new", "saves an empty template",
                                 [&line] { return RunNew(line.file, line.force); });
   create->add_option("OUT", line.file, "the new file")->required();
   create->add_flag("--force", line.force, "replaces an existing file");
 
-  CLI::App* rename = AddCommand(app, line, "rename", "renames a symbol with all its uses",
+  CLI::App* rename = AddCommand(app, line, kTemplates, "rename", "renames a symbol with all its uses",
                                 [&line] { return RunRename(line.rename); });
   AddFile(*rename, line.rename.file);
   rename->add_option("OLD", line.rename.oldSymbol, "the symbol to rename")->required();
   rename->add_option("NEW", line.rename.newSymbol, "its new name")->required();
   rename->add_flag("--only-symbol", line.rename.onlySymbol, "leaves the uses as they are");
-  rename->add_option("--output", line.rename.output, "saves under this name");
+  AddOutput(*rename, line.rename.output, "saves under this name, not in place");
 
-  CLI::App* overview = AddCommand(app, line, "overview", "prints the overview table",
+  CLI::App* overview = AddCommand(app, line, kTemplates, "overview", "prints the overview table",
                                   [&line] { return RunOverview(line.file); });
   AddFile(*overview, line.file);
 
-  CLI::App* html = AddCommand(app, line, "html", "writes the HTML documentation",
+  CLI::App* html = AddCommand(app, line, kTemplates, "html", "writes the HTML documentation",
                               [&line] { return RunHtml(line.file, line.mathJax, line.output); });
   AddFile(*html, line.file);
   html->add_flag("--mathjax", line.mathJax, "has MathJax render the equations");
-  html->add_option("--output", line.output, "the page to write");
+  AddOutput(*html, line.output, "the page to write; without it HTML_doc beside the template takes it");
 }
 
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* tree = AddCommand(app, line, "tree", "prints a key file as its item tree",
+  CLI::App* tree = AddCommand(app, line, kKeyFiles, "tree", "prints a key file as its item tree",
                               [&line] { return RunTree(line.file); });
   tree->add_option("FILE", line.file, "a key file")->required();
 
-  CLI::App* diff = AddCommand(app, line, "diff", "compares two key files", [&line] {
+  CLI::App* diff = AddCommand(app, line, kKeyFiles, "diff", "compares two key files", [&line] {
     return RunDiff(line.file, line.otherFile, line.ignored, line.onlyKeywords);
   });
   diff->add_option("A", line.file, "a key file")->required();
   diff->add_option("B", line.otherFile, "another")->required();
-  diff->add_option("--ignore", line.ignored, "leaves out names that match")->allow_extra_args(false);
-  diff->add_flag("--keywords-only", line.onlyKeywords, "lists keywords only");
+  diff->add_option("--ignore", line.ignored, "leaves out names that match; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("REGEX");
+  diff->add_flag("--keywords-only", line.onlyKeywords, "lists differing keywords, not differing sections");
 }
 
 void AddExpressionCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* expressions = app.add_subcommand("expr", "looks at one expression");
+  CLI::App* expressions = app.add_subcommand("expr", "looks at one expression")->group(kExpressions);
   expressions->require_subcommand(1);
   struct Row {
     const char* name;
@@ -157,46 +184,46 @@ void AddExpressionCommands(CLI::App& app, CommandLine& line) {
       {"identifiers", "lists the identifiers", RunIdentifiers},
   };
   for (const Row& row : rows) {
-    CLI::App* command = AddCommand(*expressions, line, row.name, row.description,
+    CLI::App* command = AddCommand(*expressions, line, "Commands", row.name, row.description,
                                    [&line, run = row.run] { return run(line.expression); });
     CLI::Option* text =
         command->add_option("EXPR", line.expression.text, "an expression, or - for standard input");
     CLI::Option* lines = command->add_flag("--lines", line.expression.eachLine,
-                                           "each line of standard input is an expression");
+                                           "takes each line of standard input as an expression");
     text->excludes(lines);
-    command->parse_complete_callback([&line, command, text] {
-      // An unknown option is told as such, not as a missing expression.
-      if (line.expression.eachLine || text->count() > 0 || command->remaining_size() > 0) return;
-      throw CLI::RequiredError("EXPR");
+    command->parse_complete_callback([&line, text] {
+      if (!line.expression.eachLine && text->count() == 0) throw CLI::RequiredError("EXPR");
     });
     if (row.run == RunMathml) {
-      command->add_option("--symbol", line.expression.symbol, "the left side");
+      command->add_option("--symbol", line.expression.symbol, "the left side")->type_name("SYMBOL");
       command->add_flag("--derivative", line.expression.isDerivative, "the left side is a time derivative");
     }
   }
 }
 
 void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* functions = app.add_subcommand("functions", "lists the function catalogue");
+  CLI::App* functions = app.add_subcommand("functions", "lists the function catalogue")->group(kCatalogues);
   const CLI::Option* one = functions->add_option("NAME", line.name, "one function");
   functions->callback([&line, one] {
     // An empty name is a name too, and no function's.
     const bool asksForOne = one->count() > 0;
     line.run = [&line, asksForOne] { return asksForOne ? RunFunction(line.name) : RunFunctions(); };
   });
-  AddCommand(app, line, "builtins", "lists the built-in variables", [] { return RunBuiltins(); });
+  AddCommand(app, line, kCatalogues, "builtins", "lists the built-in variables",
+             [] { return RunBuiltins(); });
 
-  CLI::App* eval = AddCommand(app, line, "eval", "computes a plain function",
+  CLI::App* eval = AddCommand(app, line, kCatalogues, "eval", "computes a plain function",
                               [&line] { return RunEval(line.name, line.values); });
   eval->add_option("NAME", line.name, "the function")->required();
   eval->add_option("VALUE", line.values, "its values");
 
-  CLI::App* call = AddCommand(app, line, "call", "computes any function of the catalogue",
+  CLI::App* call = AddCommand(app, line, kCatalogues, "call", "computes any function of the catalogue",
                               [&line] { return RunCall(line.name, line.values, line.settings); });
   call->add_option("NAME", line.name, "the function")->required();
   call->add_option("VALUE", line.values, "its values");
-  call->add_option("--set", line.settings, "a function to call first: NAME=VALUE,VALUE...")
-      ->allow_extra_args(false);
+  call->add_option("--set", line.settings, "a function to call before; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=VALUE,VALUE...");
 }
 
 /// CLI11 parses a reversed list, without the program's name. Numbers are hidden from it, and shown again to
@@ -218,18 +245,11 @@ void ShowNumbers(CommandLine& line) {
   }
 }
 
-/// The argument that stands where a command is awaited and is none; nothing when that is not what is wrong.
-const char* UnknownCommand(const CLI::App& app, int count, char** arguments) {
-  const CLI::App* called = &app;
-  int place = 1;
-  for (; !called->get_subcommands().empty(); ++place) called = called->get_subcommands().front();
-  const bool awaitsCommand = called->get_require_subcommand_min() > 0;
-  return awaitsCommand && place < count && *arguments[place] != '-' ? arguments[place] : nullptr;
-}
-
 int RunTool(int count, char** arguments) {
   CLI::App app{"Reads, checks, documents and saves templates of aquatic process models.", "tessal"};
-  app.set_version_flag("--version", std::string("tessal ") + TESSAL_VERSION);
+  app.formatter(std::make_shared<HelpText>());
+  app.set_help_flag("-h,--help", "prints this help");
+  app.set_version_flag("--version", std::string("tessal ") + TESSAL_VERSION, "prints the version");
   app.require_subcommand(1);
   CommandLine line;
   AddTemplateCommands(app, line);
@@ -240,9 +260,7 @@ int RunTool(int count, char** arguments) {
     app.parse(ArgumentsForParser(count, arguments));
   } catch (const CLI::ParseError& stop) {
     if (stop.get_exit_code() == 0) return app.exit(stop);
-    const char* unknown = UnknownCommand(app, count, arguments);
-    Complain(unknown != nullptr ? "unknown command '" + std::string(unknown) + "'"
-                                : ShownNumber(stop.what()));
+    Complain(CallFault(app, stop));
     return kCallFault;
   }
   ShowNumbers(line);

@@ -14,7 +14,7 @@ namespace tessal::cli {
 
 namespace {
 
-/// Stands before a hidden argument, and before one that begins with it itself.
+/// Comes before a hidden argument, and before one that begins with it itself.
 constexpr char kHidden = '\x01';
 
 /// A number that no double holds, which `std::from_chars` refuses: infinite, or 0 and its neighbours.

@@ -13,7 +13,7 @@ enum ExitCode : int {
   kCallFault = 2      ///< a wrong call, or a file that cannot be read or written
 };
 
-/// Keeps the graver of two.
+/// The worse of two.
 ExitCode Worse(ExitCode left, ExitCode right);
 
 /// Adds to the result. It is written when the command has ended, or when much has come together.
@@ -33,10 +33,10 @@ std::string ReadStandardInput();
 /// Whether the result goes to a terminal that wants colour.
 bool WantsColour();
 
-/// The word in the colour of its gravity (1 to 4), where colour is wanted.
+/// The word in the colour of its severity (1 to 4), where colour is wanted.
 std::string Coloured(std::string_view word, unsigned level);
 
-/// A text that stands on one line: control characters, line feeds and tabs among them, become blanks.
+/// A text made to fit on one line: control characters, line feeds and tabs among them, become blanks.
 std::string OnOneLine(std::string_view text);
 
 /// A text without its trailing line feed.

@@ -22,7 +22,7 @@ void ComplainWithMessages(std::string_view what, const std::string& file) {
 bool LoadOrComplain(TemplateCore& core, const std::string& file) {
   const bool loaded = core.LoadWrapper(file);
   if (!loaded) ComplainWithMessages("failed to load file", file);
-  // From here on changes reach what hangs on them, as in an editor.
+  // From here on changes reach what depends on them, as in an editor.
   SetNotifyChanges(true);
   return loaded;
 }

@@ -20,7 +20,7 @@ namespace {
 constexpr std::string_view kScriptAddress = TESSAL_MATHJAX_SCRIPT;
 constexpr std::string_view kProjectAddress = TESSAL_MATHJAX_PROJECT;
 
-// The slash ahead of the public identifier has always stood there.
+// The slash before the public identifier has always been there.
 constexpr std::string_view kDoctype =
     "<!DOCTYPE HTML PUBLIC /\"-//W3C//DTD HTML 4.01 Transitional//EN\" "
     "\"http://www.w3.org/TR/html4/loose.dtd\">";
@@ -32,7 +32,7 @@ constexpr std::array<std::string_view, 13> kMiscKeys = {
     "Debug level",          "Debug log",          "Inital random particle dir",
     "Build spatial tree"};
 
-// The last key stands twice: an element that has it shows the row twice.
+// The last key is there twice: an element that has it shows the row twice.
 constexpr std::array<std::string_view, 23> kElementKeys = {"ID",
                                                            "Description",
                                                            "Documentation",

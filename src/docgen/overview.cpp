@@ -10,7 +10,7 @@ namespace tessal {
 
 namespace {
 
-/// The name behind a search function's reference by number.
+/// The name that a search function refers to by number.
 std::string NameOfReference(const TemplateCore& core, std::int32_t reference, const std::string& otherwise) {
   if (reference < 1) return otherwise;
   const CEL_Element* element = core.GetElementBySequence(static_cast<std::uint32_t>(reference));
@@ -117,7 +117,7 @@ Cells TextTitles() {
   return titles;
 }
 
-/// Each column is one wider than its longest text; tabs part them.
+/// Each column is one wider than its longest text; tabs separate them.
 void AppendRow(const Cells& cells, const Widths& longest, std::string& text) {
   for (std::size_t column = 0; column < cells.size(); ++column) {
     if (column > 0) text += '\t';
@@ -136,7 +136,7 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core) {
 
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows) {
   std::string text = "Template " + core.TemplateFileName() + "\r\n";
-  // No line end follows the revision: the header row begins behind it.
+  // No line end follows the revision: the header row begins right after it.
   if (core.GetMisc() != nullptr && core.GetDocumentRevision() > 0) {
     text += "\nRevision " + std::to_string(core.GetDocumentRevision());
   }

@@ -36,14 +36,13 @@ struct OverviewRow {
   /// In the order of the columns. The number counts from 1 and is "-" for movements, which do not count; the
   /// expression is the default value of an input and the summary of a search function.
   std::array<std::string, kOverviewColumnCount> cells;
-  Uid uid = Uid::None;  ///< the element that the row tells of
+  Uid uid = Uid::None;  ///< the element that the row describes
 };
 
 std::vector<OverviewRow> BuildOverview(const TemplateCore& core);
 
-/// The rows as aligned text, with the template's file name and, above 0, its revision ahead of them. Rows end
-/// in carriage return and line feed. Widths go by the rows alone: a longer title pushes its own row out of
-/// line.
+/// The rows as aligned text, after the template's file name and, above 0, its revision. Rows end in carriage
+/// return and line feed. Widths go by the rows alone: a longer title pushes its own row out of line.
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows);
 
 }  // namespace tessal

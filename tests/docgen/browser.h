@@ -13,7 +13,7 @@ std::optional<std::string> FindBrowser();
 struct BrowserRun {
   bool started = false;  ///< whether a document came back
   int exitCode = -1;
-  std::string document;  ///< as it stands after its scripts have run
+  std::string document;  ///< after its scripts have run
 };
 
 /// Opens the page, with a profile of its own that goes when the run ends, and waits no longer than two

@@ -34,73 +34,6 @@ constexpr const char* kConstructs[] = {
     "-a*[YPOS]",
 };
 
-// What must hold of the layout. Each complaint names the expression by the text of its block.
-constexpr const char* kLayoutScript = R"js(<script>
-const complaints = [];
-function box(node) { return node.getBoundingClientRect(); }
-function expect(holds, what, node) {
-  if (!holds) complaints.push(what + ' in "' + node.closest('math').textContent + '"');
-}
-const blocks = document.querySelectorAll('math');
-for (const math of blocks) {
-  const own = box(math);
-  expect(math.textContent.trim() !== '' && own.width > 0 && own.height > 0, 'nothing shown', math);
-  expect(own.left - box(math.parentElement).left < 5, 'not at the left', math);
-}
-const fences = document.querySelectorAll('mfenced');
-for (const fence of fences) {
-  const own = box(fence);
-  const style = getComputedStyle(fence);
-  const brace = fence.getAttribute('open') === '{';
-  expect(own.width > 0 && own.height > 0, 'no fence', fence);
-  expect(parseFloat(style.borderLeftWidth) >= (brace ? 5 : 0.5), 'no opening fence', fence);
-  expect(brace || parseFloat(style.borderRightWidth) >= 0.5, 'no closing fence', fence);
-  for (const part of fence.children) {
-    const inner = box(part);
-    expect(inner.left - own.left >= 2 && (brace || own.right - inner.right >= 2), 'a narrow fence', fence);
-    expect(own.top <= inner.top + 1 && own.bottom >= inner.bottom - 1, 'a low fence', fence);
-  }
-}
-const operands = 'mi, mn, mrow, mfrac, mfenced, mtext';
-function gap(left, right) { return box(right).left - box(left).right; }
-for (const argument of document.querySelectorAll('mfenced:not([separators]) > mrow:not(:last-child)')) {
-  const room = box(argument).right - box(argument.lastElementChild).right;
-  expect(room >= 6 && getComputedStyle(argument).backgroundImage !== 'none', 'no comma', argument);
-}
-for (const row of document.querySelectorAll('math > mrow, mtd, mfenced[separators]')) {
-  for (const part of row.children) {
-    const next = part.nextElementSibling;
-    if (!next || !part.matches(operands) || !next.matches('mi, mn, mfrac')) continue;
-    expect(gap(part, next) >= 3, 'members of an interaction run together', part);
-  }
-}
-for (const sign of document.querySelectorAll('mi + mtext[mathcolor=green]')) {
-  expect(gap(sign.previousElementSibling, sign) >= 2, 'a modification sticks to its target', sign);
-}
-for (const letter of document.querySelectorAll('mfrac mi, mfrac mn')) {
-  const whole = parseFloat(getComputedStyle(letter.closest('math')).fontSize);
-  expect(parseFloat(getComputedStyle(letter).fontSize) >= 0.49 * whole, 'too small', letter);
-}
-const report = document.createElement('pre');
-report.id = 'report';
-report.textContent = 'blocks ' + blocks.length + ' fences ' + fences.length + ' complaints ' +
-  complaints.length + '\n' + complaints.slice(0, 200).join('\n') + '\nend of report';
-document.body.append(report);
-</script>)js";
-
-// MathJax puts a frame of its own in the place of each block.
-constexpr const char* kMathJaxScript = R"js(<script>
-MathJax.Hub.Queue(() => {
-  const frames = [...document.querySelectorAll('.MathJax')];
-  const shown = frames.filter(frame => frame.getBoundingClientRect().width > 0).length;
-  const report = document.createElement('pre');
-  report.id = 'report';
-  report.textContent = 'frames ' + shown + ' errors ' +
-    document.querySelectorAll('.MathJax_Error, .merror').length + '\nend of report';
-  document.body.append(report);
-});
-</script>)js";
-
 std::size_t CountOf(const std::string& text, const std::string& part) {
   std::size_t count = 0;
   for (std::size_t place = text.find(part); place != std::string::npos; place = text.find(part, place + 1))
@@ -108,16 +41,12 @@ std::size_t CountOf(const std::string& text, const std::string& part) {
   return count;
 }
 
-std::string Page(const TemplateCore& core, bool mathJax) {
-  return HtmlDocumentation(core, mathJax, std::tm{});
-}
-
 std::string PageOfConstructs(bool mathJax) {
   TemplateCore core;
   for (const char* expression : kConstructs) core.AddAuxiliary().expression.SetText(expression);
   core.AddStateVariable().equation.SetText("a+b/c");
   core.RebuildSymbolTable();
-  return Page(core, mathJax);
+  return HtmlDocumentation(core, mathJax, {});
 }
 
 class PageInBrowser : public testing::Test {
@@ -128,10 +57,12 @@ class PageInBrowser : public testing::Test {
     browser = *found;
   }
 
-  /// What the script reports at the end of the page. Nothing, with the test marked as skipped, where the
-  /// browser gives no document back at all; a document without a report is a failure.
-  std::string Report(const std::string& page, const char* script) const {
-    const BrowserRun run = RunBrowser(browser, folder.Write("page.html", page + script));
+  /// What a script of this folder, run at the end of the page, reports. Nothing, with the test marked as
+  /// skipped, where the browser gives no document back at all; a document without a report is a failure.
+  std::string Report(const std::string& page, const std::string& script) const {
+    const std::string text = test::ReadFile(TESSAL_SOURCE_DIR "/tests/docgen/" + script);
+    const BrowserRun run =
+        RunBrowser(browser, folder.Write("page.html", page + "<script>\n" + text + "</script>"));
     if (!run.started) {
       Skip(run.exitCode);
       return {};
@@ -152,7 +83,7 @@ class PageInBrowser : public testing::Test {
   }
 
   void ExpectGoodLayout(const std::string& page) const {
-    const std::string report = Report(page, kLayoutScript);
+    const std::string report = Report(page, "layout.js");
     if (IsSkipped()) return;
     const std::string counts = "blocks " + std::to_string(CountOf(page, "<math ")) + " fences " +
                                std::to_string(CountOf(page, "<mfenced")) + " complaints 0\n";
@@ -171,20 +102,20 @@ TEST_F(PageInBrowser, WithoutTheStyleBlockFencesAreMissed) {
   // The check itself must be able to fail.
   std::string page = PageOfConstructs(false);
   page.erase(page.find("<style>"), page.find("</style>") - page.find("<style>"));
-  const std::string report = Report(page, kLayoutScript);
+  const std::string report = Report(page, "layout.js");
   if (IsSkipped()) return;
   EXPECT_NE(report.find("no opening fence"), std::string::npos) << report;
   EXPECT_NE(report.find("no comma"), std::string::npos) << report;
 }
 
 TEST_F(PageInBrowser, TheExamplesShow) {
-  // One behind the other in one document: browsers go on behind the end of a page.
+  // One after the other in one document: browsers go on after the end of a page.
   std::string pages;
   for (const auto& entry : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/examples")) {
     if (entry.path().extension() != ".tessal") continue;
     TemplateCore core;
     ASSERT_TRUE(core.LoadWrapper(entry.path().string())) << entry.path();
-    pages += Page(core, false);
+    pages += HtmlDocumentation(core, false, {});
   }
   ExpectGoodLayout(pages);
 }
@@ -200,7 +131,7 @@ TEST_F(PageInBrowser, MathJaxShowsEveryBlock) {
     place += source.size();
     page.replace(place, page.find("MathJax.js", place) - place, "file:///usr/share/javascript/mathjax/");
   }
-  const std::string report = Report(page, kMathJaxScript);
+  const std::string report = Report(page, "mathjax.js");
   if (IsSkipped()) return;
   EXPECT_EQ(report, "frames " + std::to_string(CountOf(page, "<math ")) + " errors 0");
 }

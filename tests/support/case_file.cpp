@@ -15,6 +15,7 @@ namespace {
 
 constexpr std::string_view kTitle = "== ";
 constexpr std::string_view kPrompt = "> ";
+constexpr std::string_view kShellPrompt = "$ ";
 constexpr std::string_view kNoLineEnd = "\\c";
 
 std::string PathOf(std::string_view file) {
@@ -52,7 +53,9 @@ std::string Escaped(std::string_view line) {
     }
   }
   if (shown.back() == ' ') shown.replace(shown.size() - 1, 1, "\\s");
-  if (shown.front() == '>' || shown.front() == '=') shown.insert(0, 1, '\\');
+  if (shown.front() == '>' || shown.front() == '=' || shown.starts_with(kShellPrompt)) {
+    shown.insert(0, 1, '\\');
+  }
   return shown;
 }
 
@@ -91,8 +94,9 @@ CaseFile ReadCases(std::string_view file) {
       read.cases.push_back({line.substr(kTitle.size()), "", {}, number});
     } else if (read.cases.empty()) {
       read.remarks += line + "\n";
-    } else if (line.starts_with(kPrompt)) {
-      read.cases.back().calls.push_back({line.substr(kPrompt.size()), "", number});
+    } else if (line.starts_with(kPrompt) || line.starts_with(kShellPrompt)) {
+      const std::string prompt = line.substr(0, kPrompt.size());
+      read.cases.back().calls.push_back({prompt, line.substr(prompt.size()), "", number});
     } else if (!line.empty()) {
       Case& last = read.cases.back();
       std::string& text = last.calls.empty() ? last.input : last.calls.back().expected;
@@ -115,7 +119,7 @@ std::string TextOf(const CaseFile& file) {
     text += (text.empty() || text.ends_with("\n\n") ? "" : "\n") + std::string(kTitle) + each.title + "\n";
     if (!each.input.empty()) text += ShownText(each.input + "\n");
     for (const CaseCall& call : each.calls) {
-      text += std::string(kPrompt) + call.words + "\n" + ShownText(call.expected);
+      text += call.prompt + call.words + "\n" + ShownText(call.expected);
     }
   }
   return text;
@@ -146,10 +150,10 @@ void RunCases(std::string_view file, const std::function<Answer(const Case&)>& b
     for (CaseCall& call : each.calls) {
       std::string given = answer(call);
       if (!Blessing() && given != call.expected) {
-        ADD_FAILURE_AT(PathOf(file).c_str(), call.line)
-            << each.title << "\n> " << call.words << "\nexpected:\n"
-            << ShownText(call.expected) << "given:\n"
-            << ShownText(given);
+        ADD_FAILURE_AT(PathOf(file).c_str(), call.line) << each.title << "\n"
+                                                        << call.prompt << call.words << "\nexpected:\n"
+                                                        << ShownText(call.expected) << "given:\n"
+                                                        << ShownText(given);
       }
       call.expected = std::move(given);
     }

@@ -11,10 +11,12 @@
 //     what the call gives, line by line
 //     > another call
 //
+// Where a call is a command line, the prompt is that of a shell, `$ `.
+//
 // Empty lines only separate. In input and output a backslash begins what a line cannot show: `\\`, `\t`,
 // `\r`, `\xHH`,
-// `\s` for a blank at a line's end, `\>` and `\=` at its start; a lone backslash is an empty line, and `\c`
-// ends a text that has no line feed at its end.
+// `\s` for a blank at a line's end, `\>`, `\=` and `\$` at its start; a lone backslash is an empty line, and
+// `\c` ends a text that has no line feed at its end.
 #pragma once
 
 #include <functional>
@@ -25,6 +27,7 @@
 namespace tessal::test {
 
 struct CaseCall {
+  std::string prompt;
   std::string words;     ///< what follows the prompt
   std::string expected;  ///< with its line ends
   int line = 0;          ///< of the prompt in the file, from 1

@@ -1,0 +1,59 @@
+// The words that options take, and what each means: a new format is a row here.
+#pragma once
+
+#include <array>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "cli/commands.h"
+
+namespace tessal::cli {
+
+template <class Value>
+struct Choice {
+  std::string_view word;
+  Value value;
+};
+
+template <class Value>
+using Choices = std::span<const Choice<Value>>;
+
+inline constexpr std::array<Choice<Format>, 3> kCheckFormats = {{
+    {"text", Format::Text},
+    {"json", Format::Json},
+    {"sarif", Format::Sarif},
+}};
+/// What a table is printed in.
+inline constexpr Choices<Format> kTableFormats = Choices<Format>(kCheckFormats).first<2>();
+
+/// Severities, by their words in small letters.
+inline constexpr std::array<Choice<int>, 4> kLevels = {{
+    {"notice", 1},
+    {"warning", 2},
+    {"critical", 3},
+    {"fatal", 4},
+}};
+
+/// What a word means; nothing for a word that is no choice.
+template <class Value>
+std::optional<Value> ValueOf(Choices<Value> choices, std::string_view word) {
+  for (const Choice<Value>& choice : choices) {
+    if (choice.word == word) return choice.value;
+  }
+  return std::nullopt;
+}
+
+/// All words, for help and messages: "text, json, sarif".
+template <class Value>
+std::string WordsOf(Choices<Value> choices) {
+  std::string words;
+  for (const Choice<Value>& choice : choices) {
+    if (!words.empty()) words += ", ";
+    words += choice.word;
+  }
+  return words;
+}
+
+}  // namespace tessal::cli

@@ -1,0 +1,102 @@
+// The tool as people see it: shell sessions in files of cases, and the blocks of the project's front page.
+//
+// The input of a case gives files: `--- NAME`, and what is in it. After a command comes what it printed;
+// lines of standard error begin with `2> `, and an exit code other than 0 ends it, as `[1]`.
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <sstream>
+#include <vector>
+
+#include "cli/shell_session.h"
+#include "support/case_file.h"
+
+namespace tessal::test {
+namespace {
+
+void WriteFiles(const ShellSession& session, const std::string& input) {
+  const std::string mark = "--- ";
+  std::string name;
+  std::string content;
+  std::istringstream lines(input + "\n" + mark);
+  for (std::string line; std::getline(lines, line);) {
+    if (!line.starts_with(mark)) {
+      content += line + "\n";
+      continue;
+    }
+    if (!name.empty()) session.Write(name, content);
+    name = line.substr(mark.size());
+    content.clear();
+  }
+}
+
+std::string Transcript(const ShellRun& run) {
+  std::string shown = run.output;
+  std::istringstream errors(run.errors);
+  for (std::string line; std::getline(errors, line);) shown += "2> " + line + "\n";
+  if (run.exitCode == 0) return shown;
+  if (!shown.empty() && shown.back() != '\n') shown += '\n';
+  return shown + "[" + std::to_string(run.exitCode) + "]\n";
+}
+
+std::vector<std::string> TranscriptFiles() {
+  std::vector<std::string> names;
+  for (const auto& entry : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/tests/cli/cases")) {
+    names.push_back(entry.path().stem().string());
+  }
+  return names;
+}
+
+class Transcripts : public testing::TestWithParam<std::string> {};
+
+TEST_P(Transcripts, AreWhatTheToolPrints) {
+  RunCases("cli/cases/" + GetParam() + ".txt", [](const Case& each) -> Answer {
+    const auto session = std::make_shared<ShellSession>();
+    WriteFiles(*session, each.input);
+    return [session](const CaseCall& call) { return Transcript(session->Run(call.words)); };
+  });
+}
+
+INSTANTIATE_TEST_SUITE_P(Tool, Transcripts, testing::ValuesIn(TranscriptFiles()),
+                         [](const auto& file) { return file.param; });
+
+/// The sessions of a page: indented blocks that begin with a prompt.
+std::vector<CaseCall> CallsOn(const std::string& page) {
+  const std::string indent = "    ";
+  std::vector<CaseCall> calls;
+  std::istringstream lines(page);
+  bool isSession = false;
+  for (std::string line; std::getline(lines, line);) {
+    const bool isBlock = line.starts_with(indent);
+    const std::string text = isBlock ? line.substr(indent.size()) : "";
+    const bool isCall = text.starts_with("$ ");
+    isSession = isBlock && (isSession || isCall);
+    if (isCall) {
+      calls.push_back({"$ ", text.substr(2), "", 0});
+    } else if (isSession) {
+      calls.back().expected += text + "\n";
+    }
+  }
+  return calls;
+}
+
+TEST(FrontPage, ShowsWhatTheToolPrints) {
+  const ShellSession session;
+  const std::vector<CaseCall> calls = CallsOn(ReadFile(TESSAL_SOURCE_DIR "/README.md"));
+  EXPECT_GE(calls.size(), 5U);
+  for (const CaseCall& call : calls) {
+    const ShellRun run = session.Run(call.words);
+    std::string given = run.output + run.errors;
+    std::erase(given, '\r');
+    std::string expected = call.expected;
+    // Three points at the end mean the rest.
+    if (expected.ends_with("\n...\n")) {
+      expected.erase(expected.size() - 4);
+      given.resize(std::min(given.size(), expected.size()));
+    }
+    EXPECT_EQ(given, expected) << call.words;
+  }
+}
+
+}  // namespace
+}  // namespace tessal::test
