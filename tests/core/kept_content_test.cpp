@@ -59,17 +59,5 @@ TEST(KeptContent, NothingOfOneFileGetsIntoTheNext) {
   EXPECT_EQ(CountOf(ReadFile(full.Path() + ".copy"), "leak"), 0U);
 }
 
-TEST(KeptContent, ASaveUnderANewNameThatFailsLeavesTheSettings) {
-  LoadedTemplate loaded(TemplateText().Misc("DOCUMENT_REVISION = 7\nOPTIMISE = 'NO'\n").Text());
-  EXPECT_FALSE(loaded->SaveWrapper("/nowhere/at/all.tessal"));
-  EXPECT_EQ(loaded->GetDocumentRevision(), 7);
-  EXPECT_EQ(loaded->GetMisc()->tessalVersion.RealValue(), 2017001 * 0.001);
-  EXPECT_FALSE(loaded->GetMisc()->optimise.BoolValue());
-  EXPECT_EQ(loaded->SaveFileName(), loaded.Path());
-  LoadedTemplate without(TemplateText().Text());
-  EXPECT_FALSE(without->SaveWrapper("/nowhere/at/all.tessal"));
-  EXPECT_EQ(without->GetMisc(), nullptr);
-}
-
 }  // namespace
 }  // namespace tessal

@@ -44,7 +44,10 @@ std::string LoadedTemplate::Undefined() const {
 std::string Messages() {
   std::string text;
   for (const ErrorRecord& record : Errors().Records()) {
-    text += std::to_string(record.level) + " " + record.symbol + ": " + record.text + "\n";
+    text += std::to_string(record.level) + " " + record.symbol + ": " + record.text;
+    if (record.text.ends_with('\n')) text.pop_back();
+    if (record.line > 0) text += " (line " + std::to_string(record.line) + ")";
+    text += "\n";
   }
   return text;
 }

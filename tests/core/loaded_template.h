@@ -33,7 +33,7 @@ class LoadedTemplate final {
   bool loaded;
 };
 
-/// The registry's messages as "level symbol: text", one a line.
+/// The registry's messages, one a line: level, symbol, text, and line of the file where there is one.
 std::string Messages();
 
 }  // namespace tessal::test

@@ -5,95 +5,13 @@
 #include <cstdlib>
 
 #include "core/error_registry.h"
-#include "elements/area_search.h"
 #include "elements/expression_elements.h"
-#include "elements/external_function.h"
 #include "elements/input_elements.h"
-#include "elements/miscellaneous.h"
-#include "elements/specie.h"
+#include "elements/specie_values.h"
 #include "elements/state_variable.h"
-#include "elements/visibility.h"
-#include "platform/number_text.h"
 
 namespace tessal {
 namespace {
-
-std::string Labels(const CEL_Element& element) {
-  std::vector<ElementField> fields;
-  element.GetFields(fields);
-  std::string labels;
-  for (const ElementField& field : fields) labels += field.name + "|";
-  return labels;
-}
-
-constexpr const char* kBase = "Caption|Symbol|ID|Description|Documentation|Online help|UNQ Type|UNQ Unit|";
-
-TEST(Elements, ListTheirFieldsInOrder) {
-  const std::string base = kBase;
-  EXPECT_EQ(Labels(CEL_StateVariable("S")),
-            base + "Scope|Transport|Unit|Default Value|Min Value|Max Value|Equation|");
-  EXPECT_EQ(
-      Labels(CEL_Constant("c")),
-      base + "Is user specified|Build in ID|Scope|Spatial Variation|Unit|Default Value|Min Value|Max Value|");
-  EXPECT_EQ(Labels(CEL_Forcing("f")), Labels(CEL_Constant("c")));
-  EXPECT_EQ(Labels(CEL_Lagrange_Constant("c")),
-            base + "Spatial Variation|Unit|Default Value|Min Value|Max Value|");
-  EXPECT_EQ(Labels(CEL_Lagrange_Forcing("f")), Labels(CEL_Lagrange_Constant("c")));
-  EXPECT_EQ(Labels(CEL_Lagrange_Arithmetical_Expression("a")),
-            base + "Expression type|Specie|Output|Spatial Variation|Unit|Expression|");
-  EXPECT_EQ(Labels(CEL_ExternalFunction("x")), base + "Public Name|Parameter Count|Used as|DLL|Entry Point|");
-  EXPECT_EQ(Labels(CEL_Visibility()), "");
-  EXPECT_EQ(Labels(CEL_ListHead(kind::kRoot, "r")), base.substr(base.find('|') + 1));
-  EXPECT_EQ(Labels(CEL_Auxilliary_Variable("a")), base + "Output|Scope|Spatial Variation|Unit|Expression|");
-  EXPECT_EQ(Labels(CEL_Process("p")),
-            base +
-                "Output|Process type|Scope|Spatial Variation|Unit|Expression|Control "
-                "ID|Control Value|");
-  EXPECT_EQ(Labels(CEL_Derived_Output("d")), base + "Scope|Spatial Variation|Unit|Format|Expression|");
-  EXPECT_EQ(
-      Labels(CEL_Miscanellous()),
-      base +
-          "Tessal version|Parser version|Randseed|Debug level|Debug log|Inital random particle dir|Build "
-          "spatial tree|Checksum|Optimise expressions|Trigonometric unit|Revision|");
-  EXPECT_EQ(
-      Labels(CEL_Lagrange_Specie("A")),
-      "Caption|Name|Description|Documentation|Online help|Scope|Transport|Projection time|Field of view|");
-  EXPECT_EQ(Labels(CEL_Lagrange_Horizontal_Vector("h")), "Caption|Speed|Direction|");
-  EXPECT_EQ(Labels(CEL_Lagrange_Vertical_Equation("v")), "Caption|Speed|");
-  EXPECT_EQ(Labels(CEL_Lagrange_StateVariable("s")),
-            base + "Specie|Unit|Default Value|Min Value|Max Value|Equation|");
-  EXPECT_EQ(Labels(CEL_Lagrange_Spatial_Function("f")),
-            base +
-                "Function_ID|Variable ID|Specie ID|Radius|Dimension|Spatial "
-                "Variation|Purpose|Framework|Property|Math|Lookfor|");
-}
-
-TEST(Elements, TellTheirFieldsAsText) {
-  CEL_Process process("p");
-  process.controlValue.SetReal(0.0001);
-  process.expression.SetText("1 +");
-  std::vector<ElementField> fields;
-  process.GetFields(fields);
-  const std::pair<const char*, const char*> rows[] = {{"Caption", "Process"},
-                                                      {"Symbol", "p"},
-                                                      {"UNQ Type", "999"},
-                                                      {"Output", "True/Yes"},
-                                                      {"Control ID", "-1"},
-                                                      {"Control Value", "0.0001"},
-                                                      {"Spatial Variation", "HORISONTAL_AND_VERTICAL"},
-                                                      {"Expression", "1 +"}};
-  for (const auto& [name, text] : rows) {
-    const ElementField* field = FindField(fields, name);
-    ASSERT_NE(field, nullptr) << name;
-    EXPECT_EQ(FieldText(*field), text) << name;
-  }
-  EXPECT_EQ(FindField(fields, "Expression")->kind, FieldKind::Expression);
-  EXPECT_EQ(FindField(fields, "Scope")->choiceTexts, (std::vector<std::string>{"WS", "WC", "WB", "SED"}));
-  EXPECT_EQ(FindField(fields, "Spatial Variation")->choiceTexts,
-            (std::vector<std::string>{"NONE", "HORIZONTAL", "HORIZONTAL_AND_VERTICAL"}));
-  EXPECT_TRUE(FindField(fields, "Unit")->choiceTexts.empty());
-  EXPECT_EQ(FieldText(ElementField()), "invalid");
-}
 
 TEST(Elements, NumbersReadAsPeopleWriteThem) {
   const std::pair<double, const char*> rows[] = {{0.0, "0"},
@@ -128,26 +46,6 @@ TEST(Elements, SetTheFieldsTheyKnowAndCountThem) {
   CEL_StateVariable variable("S");
   EXPECT_EQ(variable.SetFields({expression, equation}), 1);
   EXPECT_EQ(variable.equation.Text(), "1+1");
-}
-
-TEST(Elements, StartWithTheirDefaults) {
-  const CEL_StateVariable variable("S");
-  EXPECT_EQ(
-      variable.scope.Text() + variable.transport.Text() + variable.unit.Text() + variable.equation.Text(),
-      "WCADVECTION_DISPERSIONundefined0");
-  EXPECT_EQ(variable.maxValue.RealValue(), 100.0);
-  EXPECT_EQ(variable.unqType.IntValue(), 999);
-  const CEL_Constant constant("c");
-  EXPECT_EQ(constant.builtInId.IntValue(), -1);
-  EXPECT_TRUE(constant.isUserSpecified.BoolValue());
-  EXPECT_EQ(constant.scope.Text() + constant.spatialVariation.Text(), "NOT_SPECIFIEDNONE");
-  EXPECT_EQ(CEL_Process("p").controlValue.RealValue(), 0.8);
-  EXPECT_EQ(CEL_Derived_Output("d").format.Text(), "INSTANTANEOUS");
-  EXPECT_EQ(CEL_Lagrange_Constant("c").maxValue.RealValue(), 10.0);
-  EXPECT_EQ(CEL_Lagrange_Forcing("f").minValue.RealValue(), 1e-35);
-  const CEL_Miscanellous misc;
-  EXPECT_EQ(misc.trigonometrics.Text(), "Degree");
-  EXPECT_TRUE(misc.optimise.BoolValue());
 }
 
 TEST(Elements, UnitTypesFixTheirUnits) {
@@ -211,57 +109,6 @@ TEST(Elements, CheckTheirRanges) {
     EXPECT_EQ(check(CEL_Lagrange_StateVariable("s")), row.ofParticle) << row.value;
     EXPECT_EQ(check(CEL_Lagrange_Forcing("f")), 0U) << "unchecked";
   }
-}
-
-TEST(AreaSearch, ChoicesFollowFrameworkAndPurpose) {
-  SetNotifyChanges(true);
-  CEL_Lagrange_Spatial_Function search("s");
-  EXPECT_TRUE(search.math.HasChoice("MIN_ABSOLUTE"));
-  EXPECT_FALSE(search.purpose.HasChoice("PARTICLE"));
-  search.variableId.SetInt(5);
-  search.framework.SetText("LAGRANGE");
-  EXPECT_EQ(search.variableId.IntValue(), -1);
-  search.purpose.SetText("MAGNITUDE");
-  EXPECT_TRUE(search.math.HasChoice("SUM_NORM"));
-  search.math.SetText("SUM_NORM");
-  search.purpose.SetText("PARTICLE");
-  EXPECT_EQ(search.math.Text(), "NONE") << "gives way to the first choice";
-  search.framework.SetText("EULER");
-  EXPECT_EQ(search.purpose.Text(), "DIRECTION");
-  search.purpose.SetText("OILSPILL");
-  EXPECT_TRUE(search.purpose.HasChoice("Oilspill(deprecated)"));
-  EXPECT_EQ(search.purpose.Text(), "OILSPILL");
-  SetNotifyChanges(false);
-}
-
-TEST(AreaSearch, ChecksWhatItNeeds) {
-  CEL_Lagrange_Spatial_Function search("s");
-  const auto findings = [&search] {
-    Errors().Reset();
-    search.Check();
-    std::string texts;
-    for (const ErrorRecord& record : Errors().Records()) texts += record.text + "|";
-    return texts;
-  };
-  const std::string variable = "No valid variable/property selected|";
-  const std::string math = "Invalid math function|";
-  const std::string radius = "Search radius must be larger than zero|";
-  EXPECT_EQ(findings(), variable + math + radius);
-  search.purpose.SetText("OILSPILL");
-  EXPECT_EQ(findings(), math + radius);
-  search.purpose.SetText("DIRECTION");
-  search.math.SetText("MIN");
-  search.radius.SetReal(1e-9);
-  search.variableId.SetInt(1'000'000);
-  EXPECT_EQ(findings(), variable);
-  search.framework.SetText("LAGRANGE");
-  search.variableId.SetInt(-1);
-  search.property.SetText("AGE");
-  EXPECT_EQ(findings(), "");
-  search.lookFor.SetInt(0);
-  EXPECT_EQ(findings(), "No valid specie selected|");
-  search.lookFor.SetInt(-2);
-  EXPECT_EQ(findings(), "");
 }
 
 }  // namespace

@@ -1,0 +1,59 @@
+// Scripts over one template: each call does one thing through the front of the template core, and answers in
+// text. Elements are named by their symbols, never by their identities.
+#pragma once
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "core/template_core.h"
+#include "support/case_file.h"
+#include "support/temporary_folder.h"
+
+namespace tessal::test {
+
+class TemplateScript final {
+ public:
+  /// Writes the case's template beside the script: lines for TemplateFromNotation, `from examples/NAME`, or
+  /// the text of a key file, which begins with an empty line. Without input the template is a new one.
+  explicit TemplateScript(const Case& script);
+  TemplateScript(const TemplateScript&) = delete;
+  TemplateScript& operator=(const TemplateScript&) = delete;
+  ~TemplateScript();
+
+  std::string Answer(const CaseCall& call);
+
+ private:
+  using Words = std::vector<std::string>;
+  using Operation = std::function<std::string(TemplateScript&, const Words&)>;
+  static const std::map<std::string, Operation>& Operations();
+
+  /// The element of a name: a symbol, `setup`, `settings`, `list KIND`, `function N`, or `CLASS list KIND`.
+  CEL_Element& Element(const std::string& name);
+  /// Does what changes the template, with the mark of a change taken off first; says whether it came back.
+  std::string Change(const std::function<std::string()>& change);
+
+  std::string Load(const std::string& path);
+  std::string Table() const;
+  std::string Undefined() const;
+  std::string Fields(const std::string& name);
+  std::string Set(const std::string& name, const std::string& field, const std::string& value);
+  std::string Create(const Words& words);
+  std::string Offer(const Words& words);
+  std::string Groups();
+  std::string Items(const Words& words);
+  std::string Lookups(const std::string& name);
+  std::string Shortened(std::string text) const;
+  std::string SymbolOf(std::uint32_t uid) const;
+  std::uint32_t UidOf(const std::string& name) { return Element(name).GetUid(); }
+  std::uint32_t SequenceOf(const std::string& name) const;
+
+  TemporaryFolder folder;
+  std::string path;
+  TemplateCore core;
+};
+
+}  // namespace tessal::test
