@@ -4,8 +4,12 @@
 
 #include <QApplication>
 #include <QInputMethodEvent>
+#include <QLabel>
+#include <QMenu>
 #include <QTest>
+#include <QTimer>
 #include <QTreeWidgetItemIterator>
+#include <stdexcept>
 
 #include "ui/text_bytes.h"
 
@@ -68,7 +72,7 @@ TemplateText SmallModel() {
 
 Editor::Editor(const std::string& templateText)
     : path(folder.Write("model.tessal", templateText)), document(std::make_unique<CTessalDoc>(user)) {
-  if (!document->OnOpenDocument(path)) return;
+  if (!document->OnOpenDocument(path)) throw std::runtime_error("the template does not open");
   document->SetPathName(path);
   view = std::make_unique<CMainView>(*document, user);
   document->AddView(*view);
@@ -88,10 +92,12 @@ Editor::~Editor() {
 
 QTreeWidgetItem* Editor::Node(const QString& caption) {
   for (QTreeWidgetItemIterator item(&Tree()); *item != nullptr; ++item) {
-    if ((*item)->text(0) == caption) return *item;
+    QString place;
+    for (const QTreeWidgetItem* part = *item; part != nullptr; part = part->parent())
+      place.prepend(u'/' + part->text(0));
+    if (place.endsWith(u'/' + caption)) return *item;
   }
-  ADD_FAILURE() << "no node " << caption.toStdString();
-  return Tree().RootItem();
+  throw std::runtime_error("no node " + caption.toStdString());
 }
 
 void Editor::Select(const QString& caption) {
@@ -107,15 +113,21 @@ QStringList Editor::Children(const QString& caption) {
   return captions;
 }
 
-QString Editor::Text(int number) {
-  auto& control = Field<QWidget>(number);
-  if (const auto* line = qobject_cast<QLineEdit*>(&control)) return line->text();
-  if (const auto* combo = qobject_cast<QComboBox*>(&control)) return combo->currentText();
-  return qobject_cast<CPlainTextField*>(&control)->ContentText();
+QWidget& Editor::Labelled(const QString& label) {
+  for (QWidget* control : view->Form()->findChildren<QWidget*>()) {
+    if (control->accessibleName() == label) return *control;
+  }
+  throw std::runtime_error("no control " + label.toStdString());
 }
 
-void Editor::Type(int number, const QString& text) {
-  auto& control = Field<QWidget>(number);
+QString Editor::TextOf(const QWidget& control) {
+  if (const auto* field = qobject_cast<const CPlainTextField*>(&control)) return field->ContentText();
+  const auto* combo = qobject_cast<const QComboBox*>(&control);
+  return combo != nullptr ? combo->currentText() : control.property("text").toString();
+}
+
+void Editor::Type(const QString& label, const QString& text) {
+  QWidget& control = Labelled(label);
   control.setFocus();
   QTest::keyClick(&control, Qt::Key_A, Qt::ControlModifier);
   QTest::keyClick(&control, Qt::Key_Delete);
@@ -125,27 +137,34 @@ void Editor::Type(int number, const QString& text) {
   QApplication::sendEvent(&control, &typed);
 }
 
-void Editor::Enter(int number, const QString& text) {
-  Type(number, text);
-  LeaveField();
-}
-
-void Editor::LeaveField() {
-  Tree().setFocus();
-}
-
-void Editor::Choose(int number, const QString& caption) {
-  auto& combo = Field<QComboBox>(number);
+void Editor::Choose(const QString& label, const QString& caption) {
+  auto& combo = Field<QComboBox>(label);
   const int entry = combo.findText(caption);
-  ASSERT_GE(entry, 0) << caption.toStdString();
+  if (entry < 0) throw std::runtime_error("no choice " + caption.toStdString());
   combo.setCurrentIndex(entry);
   emit combo.activated(entry);
 }
 
-QStringList Editor::Offered(int number) {
+QStringList Editor::Offered(const QComboBox& combo) {
   QStringList captions;
-  const auto& combo = Field<QComboBox>(number);
   for (int entry = 0; entry < combo.count(); ++entry) captions.append(combo.itemText(entry));
+  return captions;
+}
+
+QStringList Editor::UseMenu(const QString& caption, const QString& entry) {
+  QStringList captions;
+  Tree().scrollToItem(Node(caption));
+  QTimer::singleShot(0, &Tree(), [&captions, &entry] {
+    auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    if (menu == nullptr) return;
+    for (QAction* action : menu->actions()) {
+      captions.append(action->text() + (action->isEnabled() ? "" : " (grey)"));
+      if (action->text() == entry) action->trigger();
+    }
+    menu->close();
+  });
+  emit Tree().customContextMenuRequested(Tree().visualItemRect(Node(caption)).center());
+  QCoreApplication::processEvents();
   return captions;
 }
 

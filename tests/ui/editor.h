@@ -55,12 +55,12 @@ TemplateText SmallModel();
 
 class Editor final {
  public:
+  /// Opens a template; one that does not open throws.
   explicit Editor(const std::string& templateText);
   Editor(const Editor&) = delete;
   Editor& operator=(const Editor&) = delete;
   ~Editor();
 
-  bool IsOpen() const { return view != nullptr; }
   TemplateCore& Core() { return document->Core(); }
   CTessalDoc& Document() { return *document; }
   CMainView& View() { return *view; }
@@ -68,7 +68,7 @@ class Editor final {
   ScriptedUser& User() { return user; }
   const std::string& Path() const { return path; }
 
-  /// The first node with this caption.
+  /// The first node with this caption, or with the captions of a path such as "Fish/Constants".
   QTreeWidgetItem* Node(const QString& caption);
   void Select(const QString& caption);
   QString Selected() { return Tree().currentItem()->text(0); }
@@ -76,24 +76,29 @@ class Editor final {
   /// The captions of a node's children.
   QStringList Children(const QString& caption);
 
-  /// A control of the open form by its number.
-  template <class Control>
-  Control& Field(int number) {
-    return *view->Form()->findChild<Control*>(QString::number(number));
+  /// A control of the open form by its label.
+  template <class Control = QWidget>
+  Control& Field(const QString& label) {
+    return dynamic_cast<Control&>(Labelled(label));
   }
-  QString Text(int number);
-  /// Types over what stands in a field; the focus stays there.
-  void Type(int number, const QString& text);
-  /// Types, and leaves the field.
-  void Enter(int number, const QString& text);
-  void LeaveField();
-  void Choose(int number, const QString& caption);
-  QStringList Offered(int number);
+  /// What a control shows.
+  static QString TextOf(const QWidget& control);
+  QString Text(const QString& label) { return TextOf(Labelled(label)); }
+  /// Types over what a field holds; the focus stays there.
+  void Type(const QString& label, const QString& text);
+  void LeaveField() { Tree().setFocus(); }
+  void Choose(const QString& label, const QString& caption);
+  static QStringList Offered(const QComboBox& combo);
+
+  /// Opens a node's menu, chooses the entry with a caption, if there is one, and gives the captions of all.
+  QStringList UseMenu(const QString& caption, const QString& entry);
 
   /// The rows of the error list as "item: message".
   QStringList Rows();
 
  private:
+  QWidget& Labelled(const QString& label);
+
   TemporaryFolder folder;
   std::string path;
   ScriptedUser user;

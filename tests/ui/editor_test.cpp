@@ -1,0 +1,168 @@
+// What no line of a file of cases can say: enormous texts, colours, dialogs that wait, and a system that
+// opens documents.
+#include <gtest/gtest.h>
+
+#include <QClipboard>
+#include <QMimeData>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QTest>
+#include <QTimer>
+#include <filesystem>
+
+#include "ui/auto_create_dialog.h"
+#include "ui/documentation_link.h"
+#include "ui/editor.h"
+#include "ui/expression_colours.h"
+#include "ui/expression_editor_dialog.h"
+
+namespace tessal {
+namespace {
+
+using test::Editor;
+using test::SmallModel;
+
+void Paste(QWidget& field, const QString& plain) {
+  auto mime = std::make_unique<QMimeData>();
+  mime->setText(plain);
+  mime->setHtml("<b>rich</b>");
+  QApplication::clipboard()->setMimeData(mime.release());
+  field.setFocus();
+  QTest::keyClick(&field, Qt::Key_A, Qt::ControlModifier);
+  QTest::keyClick(&field, Qt::Key_V, Qt::ControlModifier);
+}
+
+TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
+  Editor editor(SmallModel().Text());
+  CEL_Auxilliary_Variable& auxiliary = editor.Core().GetAuxiliary(0);
+  const QString enormous(1 << 20, u'1');
+  editor.Select("a");
+  for (const char* label : {"Online help", "Description", "Expression"}) Paste(editor.Field(label), enormous);
+  editor.View().OnCommit();
+  for (const CEL_Property* text : {&auxiliary.onlineHelp, &auxiliary.description, &auxiliary.expression}) {
+    EXPECT_EQ(text->Text(), std::string(4096, '1'));
+  }
+  Paste(editor.Field("Description"), QStringLiteral("two\nlines") + QChar(u'\0') + u'!');
+  Paste(editor.Field("Expression"), QStringLiteral("k\n + f"));
+  editor.View().OnCommit();
+  EXPECT_EQ(auxiliary.description.Text(), "two\nlines!");
+  EXPECT_EQ(auxiliary.expression.Text(), "k\n + f");
+  // A full field takes nothing more, wherever it is typed.
+  Paste(editor.Field("Description"), enormous);
+  auto& full = editor.Field<CPlainTextField>("Description");
+  full.moveCursor(QTextCursor::Start);
+  QTest::keyClicks(&full, "22");
+  EXPECT_EQ(full.ContentText(), QString(4096, u'1'));
+}
+
+TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
+  const std::string longText(5000, 'x');
+  Editor editor(SmallModel()
+                    .Constant("long")
+                    .With("DESCRIPTION", "|" + longText + "|")
+                    .With("ONLINE_HELP", "|" + longText + "|")
+                    .Text());
+  editor.Select("long");
+  editor.Type("Unit", "kg");
+  editor.LeaveField();
+  const CEL_Constant& constant = editor.Core().GetConstant(1);
+  EXPECT_EQ(constant.unit.Text(), "kg");
+  EXPECT_EQ(constant.description.Text(), longText);
+  EXPECT_EQ(constant.onlineHelp.Text(), longText);
+}
+
+TEST(Colours, StayReadableOnADarkGround) {
+  const QColor dark(30, 30, 30);
+  for (const QRgb given :
+       {qRgb(0, 0, 255), qRgb(0, 0, 0), qRgb(64, 64, 64), qRgb(0, 155, 0), qRgb(255, 0, 0)}) {
+    EXPECT_EQ(ReadableColour(QColor(given), Qt::white), QColor(given)) << "unchanged on a light ground";
+    EXPECT_GE(ReadableColour(QColor(given), dark).lightness(), 150);
+  }
+}
+
+TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
+  struct Row {
+    const char* button;
+    int chosen;
+  };
+  for (const Row& row : {Row{"OK", 6}, Row{"Skip", -1}, Row{"", -1}}) {
+    CAutoCreateDlg dialog("rate", 486, nullptr);
+    dialog.Radios()[6]->click();
+    for (QPushButton* button : dialog.findChildren<QPushButton*>()) {
+      if (button->text().remove(u'&') == row.button) button->click();
+    }
+    if (*row.button == '\0') dialog.accept();
+    EXPECT_EQ(dialog.ChosenIndex(), row.chosen) << row.button;
+  }
+}
+
+TEST(ExpressionEditor, IsAShellThatChangesNothing) {
+  Editor editor(SmallModel().Text());
+  editor.Select("a");
+  int pressed = 0;
+  QTimer::singleShot(0, &editor.View(), [&pressed] {
+    auto* dialog = qobject_cast<CExpressionEditorDlg*>(QApplication::activeModalWidget());
+    ASSERT_NE(dialog, nullptr);
+    for (QPushButton* key : dialog->findChildren<QPushButton*>()) {
+      if (key->objectName().isEmpty()) continue;
+      key->click();
+      ++pressed;
+    }
+    dialog->accept();
+  });
+  QTest::mouseClick(&editor.Field("Expression Editor"), Qt::LeftButton);
+  EXPECT_EQ(pressed, 33);
+  EXPECT_EQ(editor.Text("Expression"), "k*f");
+}
+
+TEST(History, KeepsThirtyNodesNewestFirst) {
+  CNavigationHistory history;
+  EXPECT_EQ(history.Back(), 0) << "an empty list finds nothing";
+  EXPECT_EQ(history.Position(), -1);
+  for (std::int32_t id = 1; id <= 31; ++id) history.Add(id, std::to_string(id));
+  EXPECT_EQ(history.Entries().size(), 30U);
+  EXPECT_EQ(history.Entries().front().id, 31);
+  EXPECT_EQ(history.Entries().back().id, 2) << "the oldest went";
+  for (int step = 0; step < 40; ++step) history.Back();
+  EXPECT_EQ(history.Position(), 29);
+  history.Add(99, "99");
+  EXPECT_EQ(history.Entries().back().id, 99) << "entered before the present one, which made it the 31st";
+}
+
+TEST(Documentation, IsLookedForInThreePlaces) {
+  test::ScriptedUser user;
+  const test::TemporaryFolder root;
+  std::filesystem::create_directories(root.Path() / "Corvane/Manuals/CORVANE");
+  root.Write("Corvane/Manuals/CORVANE/there.pdf", "x");
+  qputenv("TESSAL_INSTALL_ROOT", root.Path().string().c_str());
+  const QString manual = QString::fromStdString(root.File("Corvane/Manuals/CORVANE/there.pdf"));
+  const QString address = "http://manuals.example/2017/General/known.pdf";
+  user.openable = {"here.pdf", manual, address};
+  struct Row {
+    const char* text;
+    const char* manuals;
+    QStringList tried;
+    const char* failure;
+  };
+  const Row rows[] = {
+      {"", "", {}, ""},
+      {"here.pdf", "", {"open here.pdf"}, ""},
+      {"there.pdf", "", {"open there.pdf", "open " + manual}, ""},
+      {"gone.pdf", "", {"open gone.pdf"}, "Failed to open\ngone.pdf\n\nReturn code -100 (0xff9c)"},
+      {"docs/known.pdf", "http://manuals.example", {"open docs/known.pdf", "open " + address}, ""},
+      {"docs\\gone.pdf",
+       "http://manuals.example",
+       {"open docs\\gone.pdf", "open http://manuals.example/2017/General/gone.pdf"},
+       "Failed to open\ndocs\\gone.pdf\n\nReturn code 2 (0x0002)"},
+  };
+  for (const Row& row : rows) {
+    qputenv("TESSAL_MANUALS_URI", row.manuals);
+    EXPECT_EQ(OpenDocumentationFile(row.text, user), row.failure);
+    EXPECT_EQ(user.TakeLog(), row.tried) << row.text;
+  }
+  qunsetenv("TESSAL_MANUALS_URI");
+  qunsetenv("TESSAL_INSTALL_ROOT");
+}
+
+}  // namespace
+}  // namespace tessal

@@ -1,0 +1,355 @@
+#include "ui/script.h"
+
+#include <gtest/gtest.h>
+
+#include <QAction>
+#include <QApplication>
+#include <QContextMenuEvent>
+#include <QMenu>
+#include <QPushButton>
+#include <QTest>
+#include <QTextBlock>
+#include <QToolBar>
+#include <algorithm>
+#include <sstream>
+
+#include "core/error_registry.h"
+#include "ui/create_hint.h"
+#include "ui/text_bytes.h"
+
+namespace tessal::test {
+
+namespace {
+
+constexpr const char* kSmallModel = "state S p\nconstant k 1\nforcing f\nauxiliary a k*f\nprocess p a*S";
+
+/// The word at the start of a text; the text loses it and the blank after it.
+std::string TakeWord(std::string& text) {
+  const std::size_t end = std::min(text.find(' '), text.size());
+  std::string word = text.substr(0, end);
+  text.erase(0, end + 1);
+  return word;
+}
+
+/// What follows a call's verb: "Description: Rate" has two parts.
+struct Words {
+  explicit Words(const std::string& text)
+      : all(text),
+        first(ToScreen(text.substr(0, text.find(": ")))),
+        second(ToScreen(first.size() == static_cast<qsizetype>(ToScreen(text).size())
+                            ? ""
+                            : text.substr(text.find(": ") + 2))) {}
+  int Number() const { return first.toInt(); }
+
+  std::string all;
+  QString first;
+  QString second;
+};
+
+std::string Lines(const QStringList& lines) {
+  return lines.isEmpty() ? "none\n" : lines.join(u'\n').toStdString() + "\n";
+}
+
+void Hint(Editor& editor, int number, const UpdateHint& argument) {
+  editor.Document().UpdateAllViews(nullptr, number, &argument);
+}
+
+/// "9: k2" is a hint about a node, "13: 2" about a number.
+void SendHint(Editor& editor, const Words& words) {
+  bool isNumber = false;
+  const std::int32_t number = words.second.toInt(&isNumber);
+  const bool isNode = !isNumber && !words.second.isEmpty();
+  Hint(editor, words.Number(), NumberHint(isNode ? editor.IdOf(words.second) : number));
+}
+
+/// "9 in Constants: rate": the hint to create an element of a kind.
+void Create(Editor& editor, const Words& words) {
+  CreateRequest request;
+  const QStringList kindAndOwner = words.first.split(QStringLiteral(" in "));
+  request.kind = kindAndOwner[0].toUInt();
+  if (kindAndOwner.size() > 1) request.ownerId = editor.IdOf(kindAndOwner[1]);
+  request.symbol = words.second.toStdString();
+  Hint(editor, hint::kCreateElement, CreateHint(request));
+}
+
+std::string History(Editor& editor) {
+  std::string text;
+  emit editor.View().HistoryMenu().aboutToShow();
+  for (const QAction* entry : editor.View().HistoryMenu().actions()) {
+    text += (entry->isChecked() ? "* " : "  ") + entry->text().toStdString() + "\n";
+  }
+  for (const QAction* action : editor.View().findChild<QToolBar*>()->actions()) {
+    if (action->isEnabled()) text += action->text().toStdString() + "|";
+  }
+  return text + "\n";
+}
+
+/// "Expression: 2" is the point of a field at a place in its text.
+std::pair<CAutoRichEditCtrl&, QPoint> PointIn(Editor& editor, const Words& words) {
+  auto& field = editor.Field<CAutoRichEditCtrl>(words.first);
+  QTextCursor cursor(field.document());
+  cursor.setPosition(words.second.toInt());
+  return {field, field.cursorRect(cursor).center() + QPoint(2, 0)};
+}
+
+void RightClick(Editor& editor, const Words& words) {
+  const auto [field, point] = PointIn(editor, words);
+  QContextMenuEvent click(QContextMenuEvent::Mouse, point, field.viewport()->mapToGlobal(point));
+  QApplication::sendEvent(field.viewport(), &click);
+}
+
+void UseMenuKey(Editor& editor, const Words& words) {
+  QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
+  QApplication::sendEvent(editor.Field<CAutoRichEditCtrl>(words.first).viewport(), &byKey);
+}
+
+/// The parts of an expression that look alike, each with its looks.
+std::string Colours(Editor& editor, const Words& words) {
+  auto& field = editor.Field<CAutoRichEditCtrl>("Expression");
+  field.SetColouredText(ToScreen(words.all).replace("\\n", "\n").toStdString());
+  std::string text;
+  for (auto block = field.document()->begin(); block.isValid(); block = block.next()) {
+    for (auto part = block.begin(); !part.atEnd(); ++part) {
+      const QTextCharFormat looks = part.fragment().charFormat();
+      text += part.fragment().text().toStdString();
+      if (looks.hasProperty(QTextFormat::ForegroundBrush)) {
+        text += " " + looks.foreground().color().name().toStdString();
+      }
+      if (looks.fontWeight() == QFont::Bold) text += " bold";
+      if (looks.fontItalic()) text += " italic";
+      if (looks.isAnchor() && looks.fontUnderline()) text += " link";
+      text += "\n";
+    }
+  }
+  return text + (field.textCursor().position() == 0 ? "" : "the caret is elsewhere\n");
+}
+
+/// Presses Tab as often as asked, and names what has the focus after each.
+std::string PressTab(Editor& /*editor*/, const Words& words) {
+  std::string text;
+  for (int left = words.Number(); left > 0; --left) {
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+    text += QApplication::focusWidget()->accessibleName().toStdString() + "\n";
+  }
+  return text;
+}
+
+void ClickError(Editor& editor, const Words& words) {
+  CErrorList& list = editor.View().ErrorList();
+  const QRect row = list.visualItemRect(list.topLevelItem(words.Number()));
+  QTest::mouseClick(list.viewport(), Qt::LeftButton, {}, row.center());
+}
+
+void EnterError(Editor& editor, const Words& words) {
+  CErrorList& list = editor.View().ErrorList();
+  list.setFocus();
+  list.setCurrentItem(list.topLevelItem(words.Number()));
+  QTest::keyClick(&list, Qt::Key_Return);
+}
+
+void Revisit(Editor& editor, const Words& words) {
+  emit editor.View().HistoryMenu().aboutToShow();
+  editor.View().HistoryMenu().actions().at(words.Number())->trigger();
+}
+
+std::string Save(Editor& editor, const Words& words) {
+  return editor.Document().OnSaveDocument(editor.Path() + words.all) ? "saved\n" : "not saved\n";
+}
+
+const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActions = {
+    {"select", [](Editor& editor, const Words& words) { editor.Select(words.first); }},
+    {"type", [](Editor& editor, const Words& words) { editor.Type(words.first, words.second); }},
+    {"enter",
+     [](Editor& editor, const Words& words) {
+       editor.Type(words.first, words.second);
+       editor.LeaveField();
+     }},
+    // Without the keys of a user: the focus stays where it is.
+    {"set",
+     [](Editor& editor, const Words& words) { editor.Field<QLineEdit>(words.first).setText(words.second); }},
+    {"choose", [](Editor& editor, const Words& words) { editor.Choose(words.first, words.second); }},
+    {"focus", [](Editor& editor, const Words& words) { editor.Field(words.first).setFocus(); }},
+    {"leave", [](Editor& editor, const Words& /*words*/) { editor.LeaveField(); }},
+    {"press", [](Editor& editor,
+                 const Words& words) { QTest::mouseClick(&editor.Field(words.first), Qt::LeftButton); }},
+    {"key",
+     [](Editor& /*editor*/, const Words& words) {
+       QTest::keyClick(QApplication::focusWidget(), QKeySequence(words.first)[0].key());
+     }},
+    {"commit", [](Editor& editor, const Words& /*words*/) { editor.View().OnCommit(); }},
+    {"answer",
+     [](Editor& editor, const Words& words) {
+       for (const char letter : words.all) editor.User().answers.push_back(letter == 'y');
+     }},
+    {"pick", [](Editor& editor, const Words& words) { editor.User().choices.push_back(words.Number()); }},
+    {"browse", [](Editor& editor, const Words& words) { editor.User().documentationFile = words.first; }},
+    {"hint", SendHint},
+    {"create", Create},
+    {"rename-group",
+     [](Editor& editor, const Words& words) {
+       Hint(editor, hint::kRenameGroup, RenameGroupHint(words.Number(), words.second.toStdString()));
+     }},
+    {"use-menu", [](Editor& editor, const Words& words) { editor.UseMenu(words.first, words.second); }},
+    {"click-error", ClickError},
+    {"enter-error", EnterError},
+    {"follow-error",
+     [](Editor& editor, const Words& words) {
+       emit editor.View().ErrorList().ElementChosen(words.Number());
+     }},
+    {"go",
+     [](Editor& editor, const Words& words) {
+       editor.View().findChild<QToolBar*>()->actions().at(words.first == "back" ? 0 : 1)->trigger();
+     }},
+    {"revisit", Revisit},
+    {"right-click", RightClick},
+    {"menu-key", UseMenuKey},
+};
+
+const std::map<std::string, std::string (*)(Editor& editor, const Words& words)> kLooks = {
+    {"children", [](Editor& editor, const Words& words) { return Lines(editor.Children(words.first)); }},
+    {"menu", [](Editor& editor, const Words& words) { return Lines(editor.UseMenu(words.first, "")); }},
+    {"rows", [](Editor& editor, const Words& /*words*/) { return Lines(editor.Rows()); }},
+    {"offered",
+     [](Editor& editor, const Words& words) {
+       return Lines(Editor::Offered(editor.Field<QComboBox>(words.first)));
+     }},
+    {"tip",
+     [](Editor& editor, const Words& words) {
+       const auto [field, point] = PointIn(editor, words);
+       return field.TipOf(field.LinkAt(point)).toStdString() + "\n";
+     }},
+    {"history", [](Editor& editor, const Words& /*words*/) { return History(editor); }},
+    {"colours", Colours},
+    {"tabs", PressTab},
+    {"save", Save},
+};
+
+/// The lines that went and those that came, each side in its order: the longest common part stays unsaid.
+std::string Changes(const std::vector<std::string>& before, const std::vector<std::string>& after) {
+  const std::size_t rows = before.size();
+  const std::size_t columns = after.size();
+  std::vector<std::vector<int>> common(rows + 1, std::vector<int>(columns + 1, 0));
+  for (std::size_t row = rows; row-- > 0;) {
+    for (std::size_t column = columns; column-- > 0;) {
+      common[row][column] = before[row] == after[column]
+                                ? common[row + 1][column + 1] + 1
+                                : std::max(common[row + 1][column], common[row][column + 1]);
+    }
+  }
+  std::string text;
+  std::size_t row = 0;
+  std::size_t column = 0;
+  while (row < rows || column < columns) {
+    if (row < rows && column < columns && before[row] == after[column]) {
+      ++row;
+      ++column;
+    } else if (column == columns || (row < rows && common[row + 1][column] >= common[row][column + 1])) {
+      text += "- " + before[row++] + "\n";
+    } else {
+      text += "+ " + after[column++] + "\n";
+    }
+  }
+  return text;
+}
+
+void AppendNodes(const QTreeWidgetItem& item, const std::string& path, std::vector<std::string>& state) {
+  for (int place = 0; place < item.childCount(); ++place) {
+    const QTreeWidgetItem& child = *item.child(place);
+    const std::string caption = path + child.text(0).toStdString();
+    const std::int32_t group = CElementTree::DataOf(*item.child(place)).groupIndex;
+    state.push_back("node " + caption + (group == 0 ? "" : " #" + std::to_string(group)));
+    AppendNodes(child, caption + "/", state);
+  }
+}
+
+}  // namespace
+
+std::string ModelText(std::string lines) {
+  constexpr std::string_view kSmall = "small";
+  if (lines.starts_with(kSmall)) lines.replace(0, kSmall.size(), kSmallModel);
+  using Words = std::vector<std::string>;
+  static const std::map<std::string, void (*)(TemplateText&, const Words&)> kLines = {
+      {"state", [](TemplateText& text, const Words& words) { text.StateVariable(words.at(1), words.at(2)); }},
+      {"constant", [](TemplateText& text, const Words& words) { text.Constant(words.at(1), words.at(2)); }},
+      {"forcing", [](TemplateText& text, const Words& words) { text.Forcing(words.at(1)); }},
+      {"auxiliary", [](TemplateText& text, const Words& words) { text.Auxiliary(words.at(1), words.at(2)); }},
+      {"process", [](TemplateText& text, const Words& words) { text.Process(words.at(1), words.at(2)); }},
+      {"output", [](TemplateText& text, const Words& words) { text.DerivedOutput(words.at(1)); }},
+      {"class",
+       [](TemplateText& text, const Words& words) {
+         text.Specie(words.at(1), words.at(2), {{words.at(2), words.at(3)}});
+       }},
+      {"with", [](TemplateText& text, const Words& words) { text.With(words.at(1), words.at(2)); }},
+      {"without", [](TemplateText& text, const Words& words) { text.Without(words.at(1)); }},
+      {"settings",
+       [](TemplateText& text, const Words& words) {
+         text.Misc(words.size() < 2 ? "" : words[1] + " = " + words.at(2) + "\n");
+       }},
+  };
+  TemplateText text;
+  std::istringstream input(lines);
+  for (std::string line; std::getline(input, line);) {
+    Words words;
+    while (!line.empty()) words.push_back(TakeWord(line));
+    kLines.at(words.at(0))(text, words);
+  }
+  return text.Text();
+}
+
+Script::Script(const std::string& model)
+    : editor(std::make_unique<Editor>(ModelText(model))), former(Look()) {}
+
+std::string Script::Answer(const CaseCall& call) {
+  std::string rest = call.words;
+  const std::string verb = TakeWord(rest);
+  const Words words(rest);
+  std::string answer;
+  try {
+    if (const auto look = kLooks.find(verb); look != kLooks.end()) {
+      answer = look->second(*editor, words);
+    } else {
+      kActions.at(verb)(*editor, words);
+    }
+  } catch (const std::exception& problem) {
+    ADD_FAILURE() << call.words << ": " << problem.what();
+  }
+  QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+  for (const QString& line : editor->User().TakeLog()) answer += line.toStdString() + "\n";
+  const State present = Look();
+  answer += Changes(former.lines, present.lines);
+  // Another node's form is another form.
+  if (present.node == former.node) answer += Changes(former.form, present.form);
+  former = present;
+  return answer;
+}
+
+Script::State Script::Look() {
+  State state;
+  state.node = CElementTree::DataOf(*editor->Tree().currentItem()).id;
+  state.lines = {editor->Document().Title(), "selected " + editor->Selected().toStdString()};
+  if (!NotifyChanges()) state.lines.emplace_back("listeners are off");
+  AppendNodes(*editor->Tree().RootItem(), "", state.lines);
+  for (const QString& row : editor->Rows()) state.lines.push_back("error " + row.toStdString());
+  AppendTemplate(state.lines);
+  for (const QWidget* field : editor->View().Form()->findChildren<QWidget*>()) {
+    if (field->accessibleName().isEmpty() || qobject_cast<const QPushButton*>(field)) continue;
+    state.form.push_back("[" + field->accessibleName().toStdString() + "] " +
+                         Editor::TextOf(*field).toStdString() + (field->isEnabled() ? "" : " (locked)"));
+  }
+  return state;
+}
+
+void Script::AppendTemplate(std::vector<std::string>& state) {
+  std::vector<const CEL_Element*> elements;
+  for (const SymbolRecord& record : editor->Core().SymbolTable()) elements.push_back(record.element);
+  if (editor->Core().GetMisc() != nullptr) elements.push_back(editor->Core().GetMisc());
+  for (const CEL_Element* element : elements) {
+    const std::string& name = names.try_emplace(element->GetUid(), element->symbol.Text()).first->second;
+    std::vector<ElementField> fields;
+    element->GetFields(fields);
+    for (const ElementField& field : fields)
+      state.push_back(name + "." + field.name + " = " + FieldText(field));
+  }
+}
+
+}  // namespace tessal::test
