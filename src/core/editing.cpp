@@ -2,34 +2,13 @@
 #include <algorithm>
 #include <type_traits>
 
+#include "core/search_functions.h"
 #include "core/template_core.h"
+#include "core/visibility_groups.h"
 
 namespace tessal {
 
 namespace {
-
-/// Moves the element at `from` so that it stands where the one at `target` stands, which makes room.
-template <class Element>
-bool MoveWithin(Sequence<Element>& sequence, std::size_t from, std::size_t target) {
-  if (from >= sequence.size()) return false;
-  target = std::min(target, sequence.size());
-  const auto begin = sequence.begin();
-  const auto source = begin + static_cast<std::ptrdiff_t>(from);
-  const auto place = begin + static_cast<std::ptrdiff_t>(target);
-  if (place <= source) {
-    std::rotate(place, source, source + 1);
-  } else {
-    std::rotate(source, source + 1, place);
-  }
-  return true;
-}
-
-template <class Element>
-bool EraseFrom(Sequence<Element>& sequence, std::size_t index) {
-  if (index >= sequence.size()) return false;
-  sequence.erase(sequence.begin() + static_cast<std::ptrdiff_t>(index));
-  return true;
-}
 
 bool IsParticleKind(ElementKind elementKind) {
   return elementKind >= ElementKind::SpecieStateVariable;
@@ -41,113 +20,87 @@ bool IsOrdered(ElementKind elementKind) {
          elementKind == ElementKind::ArithmeticExpression;
 }
 
-/// Calls the operation with the class's sequence of members of the kind; false for a kind without one.
+/// Whether two records are of one sequence.
+bool AreSiblings(const SymbolRecord& one, const SymbolRecord& other) {
+  const ElementKind elementKind = one.element->Kind();
+  if (elementKind != other.element->Kind()) return false;
+  return !IsParticleKind(elementKind) || one.specieIndex == other.specieIndex;
+}
+
+/// Calls the operation with the sequence that holds the record's element; false for a kind without one.
 template <class Operation>
-bool WithMemberSequence(CEL_Lagrange_Specie& specie, ElementKind elementKind, Operation operation) {
-  switch (elementKind) {
-    case ElementKind::SpecieStateVariable:
-      return operation(specie.stateVariables);
-    case ElementKind::SpecieConstant:
-      return operation(specie.constants);
-    case ElementKind::SpecieForcing:
-      return operation(specie.forcings);
-    case ElementKind::SpatialFunction:
-      return operation(specie.spatialFunctions);
-    case ElementKind::ArithmeticExpression:
-      return operation(specie.arithmeticExpressions);
-    case ElementKind::HorizontalVector:
-      return operation(specie.horizontalVectors);
-    default:
-      return false;
+bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operation operation) {
+  const ElementKind elementKind = record.element->Kind();
+  if (!IsParticleKind(elementKind)) {
+    return WithCollection(
+        elementKind, [&collections, &operation](const auto& row) { operation(collections.*row.elements); });
   }
+  CEL_Lagrange_Specie& specie = At(collections.species, static_cast<std::size_t>(record.specieIndex));
+  return WithMemberList(elementKind,
+                        [&specie, &operation](const auto& list) { operation(specie.*list.members); });
+}
+
+std::string UnusedSymbol(const TemplateCore& core, std::string_view prefix, std::size_t number) {
+  std::string symbol = std::string(prefix) + std::to_string(number);
+  while (core.SymbolExists(symbol)) symbol = std::string(prefix) + std::to_string(++number);
+  return symbol;
 }
 
 }  // namespace
 
-template <class Operation>
-bool TemplateCore::WithSequenceOf(const SymbolRecord& record, Operation operation) {
-  const ElementKind elementKind = record.element->Kind();
-  if (IsParticleKind(elementKind)) {
-    return WithMemberSequence(At(species, static_cast<std::size_t>(record.specieIndex)), elementKind,
-                              operation);
-  }
-  switch (elementKind) {
-    case ElementKind::StateVariable:
-      return operation(stateVariables);
-    case ElementKind::Constant:
-      return operation(constants);
-    case ElementKind::Forcing:
-      return operation(forcings);
-    case ElementKind::Auxiliary:
-      return operation(auxiliaries);
-    case ElementKind::Process:
-      return operation(processes);
-    case ElementKind::DerivedOutput:
-      return operation(derivedOutputs);
-    case ElementKind::Specie:
-      return operation(species);
-    default:
-      return false;
-  }
-}
-
-std::string TemplateCore::MakeUniqueSymbol(std::string_view prefix, std::size_t number) const {
-  std::string symbol = std::string(prefix) + std::to_string(number);
-  while (SymbolExists(symbol)) symbol = std::string(prefix) + std::to_string(++number);
-  return symbol;
-}
-
-void TemplateCore::FinishAdding() {
-  if (flags.rebuildEnabled) RebuildSymbolTable();
-  flags.modified = true;
-}
-
 template <class Element>
-Element& TemplateCore::AddTo(Sequence<Element>& sequence, ElementKind listKind, std::string_view prefix) {
-  auto element = std::make_unique<Element>(MakeUniqueSymbol(prefix, sequence.size() + 1));
-  Adopt(*element, ListHead(listKind));
-  element->documentation.SetText(root.documentation.Text());
-  if constexpr (std::is_base_of_v<CEL_Input, Element>) {
-    element->RebuildBuiltInChoices(flags.showAllBuiltIns);
+Element& TemplateCore::Add(const Collection<Element>& row) {
+  auto& elements = state.collections.*row.elements;
+  auto element = std::make_unique<Element>(UnusedSymbol(*this, row.symbolPrefix, elements.size() + 1));
+  if constexpr (std::is_same_v<Element, CEL_Lagrange_Specie>) {
+    element->SetIndex(static_cast<std::int32_t>(elements.size() + 1));
+    Adopt(*element, state.root);
+    element->AddMember(ElementKind::HorizontalVector);
+  } else {
+    Adopt(*element, ListHead(row.listKind));
   }
-  sequence.push_back(std::move(element));
-  FinishAdding();
-  return *sequence.back();
+  element->documentation.SetText(state.root.documentation.Text());
+  if constexpr (std::is_base_of_v<CEL_Input, Element>) {
+    element->RebuildBuiltInChoices(state.flags.showAllBuiltIns);
+  }
+  elements.push_back(std::move(element));
+  RebuildSymbolTable();
+  state.flags.modified = true;
+  return *elements.back();
+}
+
+CEL_Element* TemplateCore::AddElement(ElementKind kind) {
+  CEL_Element* added = nullptr;
+  WithCollection(kind, [this, &added](const auto& row) { added = &Add(row); });
+  return added;
 }
 
 CEL_StateVariable& TemplateCore::AddStateVariable() {
-  return AddTo(stateVariables, ElementKind::StateVariableList, "StateVariable_");
+  return static_cast<CEL_StateVariable&>(*AddElement(ElementKind::StateVariable));
 }
 
 CEL_Constant& TemplateCore::AddConstant() {
-  return AddTo(constants, ElementKind::ConstantList, "Constant_");
+  return static_cast<CEL_Constant&>(*AddElement(ElementKind::Constant));
 }
 
 CEL_Forcing& TemplateCore::AddForcing() {
-  return AddTo(forcings, ElementKind::ForcingList, "Forcing_");
+  return static_cast<CEL_Forcing&>(*AddElement(ElementKind::Forcing));
 }
 
 CEL_Auxilliary_Variable& TemplateCore::AddAuxiliary() {
-  return AddTo(auxiliaries, ElementKind::AuxiliaryList, "Auxiliary_");
+  return static_cast<CEL_Auxilliary_Variable&>(*AddElement(ElementKind::Auxiliary));
 }
 
 CEL_Process& TemplateCore::AddProcess() {
-  return AddTo(processes, ElementKind::ProcessList, "Process_");
+  return static_cast<CEL_Process&>(*AddElement(ElementKind::Process));
 }
 
 CEL_Derived_Output& TemplateCore::AddDerivedOutput() {
-  return AddTo(derivedOutputs, ElementKind::DerivedOutputList, "Derived Output ");
+  return static_cast<CEL_Derived_Output&>(*AddElement(ElementKind::DerivedOutput));
 }
 
 CEL_Lagrange_Specie& TemplateCore::AddSpecie() {
-  auto specie = std::make_unique<CEL_Lagrange_Specie>(MakeUniqueSymbol("Specie_", species.size() + 1));
-  specie->SetIndex(static_cast<std::int32_t>(species.size() + 1));
-  Adopt(*specie, root);
-  specie->AddHorizontalVector();
-  specie->documentation.SetText(root.documentation.Text());
-  species.push_back(std::move(specie));
-  FinishAdding();
-  return *species.back();
+  return static_cast<CEL_Lagrange_Specie&>(*AddElement(ElementKind::Specie));
 }
 
 bool TemplateCore::CanDelete(Uid uid) const {
@@ -155,11 +108,9 @@ bool TemplateCore::CanDelete(Uid uid) const {
   if (record == nullptr) return false;
   switch (record->element->Kind()) {
     case ElementKind::HorizontalVector:
-      return At(species, static_cast<std::size_t>(record->specieIndex)).horizontalVectors.size() > 1;
+      return At(Species(), static_cast<std::size_t>(record->specieIndex)).horizontalVectors.size() > 1;
     case ElementKind::VerticalEquation:
       return false;
-    case ElementKind::ExternalFunction:
-      return true;
     default:
       return record->referencedBy.empty();
   }
@@ -169,27 +120,28 @@ bool TemplateCore::DeleteElement(Uid uid) {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
   // First, so that an element whose deletion is refused has left its groups all the same.
-  if (hasMisc) LeaveVisibilityGroups(*record->element);
+  if (state.hasMisc) VisibilityGroups(state).Leave(*record->element);
   const ElementKind elementKind = record->element->Kind();
-  if (!record->referencedBy.empty() || !EraseRecordElement(*record)) return false;
+  if (!record->referencedBy.empty() || !EraseElement(*record)) return false;
   RebuildSymbolTable();
   // With a search function the need for a spatial tree may go.
-  if (elementKind == ElementKind::SpatialFunction || elementKind == ElementKind::Specie)
+  if (elementKind == ElementKind::SpatialFunction || elementKind == ElementKind::Specie) {
     RefreshSearchFunctionChoices();
-  flags.modified = true;
+  }
+  state.flags.modified = true;
   return true;
 }
 
-bool TemplateCore::EraseRecordElement(const SymbolRecord& record) {
-  if (record.element->Kind() == ElementKind::HorizontalVector &&
-      At(species, static_cast<std::size_t>(record.specieIndex)).horizontalVectors.size() < 2) {
-    return false;
-  }
+bool TemplateCore::EraseElement(const SymbolRecord& record) {
   const auto index = static_cast<std::size_t>(record.index);
-  const bool isSpecie = record.element->Kind() == ElementKind::Specie;
-  if (isSpecie) ForgetSpecie(At(species, index).Index());
-  const bool erased = WithSequenceOf(record, [index](auto& sequence) { return EraseFrom(sequence, index); });
-  if (isSpecie) NumberSpecies();
+  const ElementKind elementKind = record.element->Kind();
+  // A class keeps its last horizontal movement.
+  if (elementKind == ElementKind::HorizontalVector && !CanDelete(record.uid)) return false;
+  if (elementKind == ElementKind::Specie) ForgetSpecie(Elements(), At(Species(), index).Index());
+  const bool erased = WithSequenceOf(state.collections, record, [index](auto& sequence) {
+    sequence.erase(sequence.begin() + static_cast<std::ptrdiff_t>(index));
+  });
+  if (elementKind == ElementKind::Specie) NumberSpecies(Elements());
   return erased;
 }
 
@@ -197,21 +149,16 @@ bool TemplateCore::CanMove(Uid uid, Uid targetUid) const {
   const SymbolRecord* moved = FindRecordByUid(uid);
   const SymbolRecord* target = FindRecordByUid(targetUid);
   if (moved == nullptr || target == nullptr) return true;
-  const ElementKind elementKind = moved->element->Kind();
-  if (elementKind != target->element->Kind()) return true;
-  if (IsParticleKind(elementKind) && moved->specieIndex != target->specieIndex) return true;
-  if (!IsOrdered(elementKind)) return true;
-  const auto staysAhead = [target](std::uint32_t used) { return used < target->sequence; };
-  if (!std::all_of(moved->references.begin(), moved->references.end(), staysAhead)) return false;
+  if (!AreSiblings(*moved, *target) || !IsOrdered(moved->element->Kind())) return true;
+  const auto staysBefore = [target](std::uint32_t used) { return used < target->sequence; };
+  if (!std::all_of(moved->references.begin(), moved->references.end(), staysBefore)) return false;
   return std::all_of(
       moved->referencedBy.begin(), moved->referencedBy.end(), [this, target](std::uint32_t user) {
-        const SymbolRecord* record = FindRecordBySequence(user);
-        if (record == nullptr) return false;
-        const ElementKind userKind = record->element->Kind();
+        const ElementKind userKind = state.table.Used(user).element->Kind();
         // Equations use what they use regardless of order.
-        if (userKind == ElementKind::StateVariable || userKind == ElementKind::SpecieStateVariable)
-          return true;
-        return user > target->sequence;
+        const bool isEquation =
+            userKind == ElementKind::StateVariable || userKind == ElementKind::SpecieStateVariable;
+        return isEquation || user > target->sequence;
       });
 }
 
@@ -219,23 +166,27 @@ bool TemplateCore::MoveElement(Uid uid, Uid targetUid, bool before) {
   if (!CanMove(uid, targetUid)) return false;
   const SymbolRecord* moved = FindRecordByUid(uid);
   const SymbolRecord* target = FindRecordByUid(targetUid);
-  if (moved == nullptr || target == nullptr) return false;
-  const ElementKind elementKind = moved->element->Kind();
-  const bool siblings = elementKind == target->element->Kind() &&
-                        (!IsParticleKind(elementKind) || moved->specieIndex == target->specieIndex);
-  if (!siblings) return false;
-  if (!MoveRecordElement(*moved, static_cast<std::size_t>(target->index) + (before ? 0 : 1))) return false;
-  flags.modified = true;
+  if (moved == nullptr || target == nullptr || !AreSiblings(*moved, *target)) return false;
+  if (moved->element->Kind() == ElementKind::VerticalEquation) return false;
+  MoveWithin(*moved, static_cast<std::size_t>(target->index) + (before ? 0 : 1));
+  state.flags.modified = true;
   RebuildSymbolTable();
   return true;
 }
 
-bool TemplateCore::MoveRecordElement(const SymbolRecord& record, std::size_t target) {
+/// Moves the record's element so that it is where the one at `target` is, which makes room.
+void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t target) {
   const auto from = static_cast<std::size_t>(record.index);
-  const bool moved =
-      WithSequenceOf(record, [from, target](auto& sequence) { return MoveWithin(sequence, from, target); });
-  if (record.element->Kind() == ElementKind::Specie) NumberSpecies();
-  return moved;
+  WithSequenceOf(state.collections, record, [from, target](auto& sequence) {
+    const auto source = sequence.begin() + static_cast<std::ptrdiff_t>(from);
+    const auto place = sequence.begin() + static_cast<std::ptrdiff_t>(std::min(target, sequence.size()));
+    if (place <= source) {
+      std::rotate(place, source, source + 1);
+    } else {
+      std::rotate(source, source + 1, place);
+    }
+  });
+  if (record.element->Kind() == ElementKind::Specie) NumberSpecies(Elements());
 }
 
 bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
@@ -243,32 +194,25 @@ bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr || record->referencedByUids.empty()) return false;
   const ElementKind elementKind = record->element->Kind();
-  const bool hasUserOfKind = std::any_of(
-      record->referencedBy.begin(), record->referencedBy.end(), [this, elementKind](std::uint32_t user) {
-        const SymbolRecord* candidate = FindRecordBySequence(user);
-        return candidate != nullptr && candidate->element->Kind() == elementKind;
-      });
+  const bool hasUserOfKind = std::any_of(record->referencedBy.begin(), record->referencedBy.end(),
+                                         [this, elementKind](std::uint32_t user) {
+                                           return state.table.Used(user).element->Kind() == elementKind;
+                                         });
   if (!hasUserOfKind) return false;
   // The last user decides the place, whatever its kind; the user of the same kind is only the condition.
   const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());
-  const bool moves = elementKind == ElementKind::StateVariable || IsOrdered(elementKind);
-  if (moves && last != nullptr) {
-    // A place behind the element's own leaves it where it is.
+  if (elementKind == ElementKind::StateVariable || IsOrdered(elementKind)) {
+    // A place after the element's own leaves it where it is.
     const auto place = static_cast<std::size_t>(std::min(last->index, record->index));
-    MoveRecordElement(*record, place);
-    if (place > 0) predecessor = UidAt(*record, place - 1);
+    MoveWithin(*record, place);
+    if (place > 0) {
+      WithSequenceOf(state.collections, *record, [place, &predecessor](const auto& sequence) {
+        predecessor = At(sequence, place - 1).GetUid();
+      });
+    }
   }
   RebuildSymbolTable();
   return true;
-}
-
-Uid TemplateCore::UidAt(const SymbolRecord& sibling, std::size_t place) {
-  Uid uid = Uid::None;
-  WithSequenceOf(sibling, [place, &uid](auto& sequence) {
-    uid = At(sequence, place).GetUid();
-    return true;
-  });
-  return uid;
 }
 
 }  // namespace tessal

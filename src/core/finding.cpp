@@ -1,72 +1,21 @@
-// Looking elements and symbols up. The sizes are those of hand-written templates: the searches are linear,
-// and no index is kept between rebuilds.
+// Looking elements and symbols up. The searches are linear, see the symbol table.
 #include <algorithm>
 
 #include "core/template_core.h"
 
 namespace tessal {
 
-namespace {
-
-template <class Records, class Matches>
-const SymbolRecord* FindRecord(const Records& records, Matches matches) {
-  const auto hit = std::find_if(records.begin(), records.end(), matches);
-  return hit == records.end() ? nullptr : &*hit;
-}
-
-bool IsMovement(const CEL_Element& element) {
-  return element.Kind() == ElementKind::HorizontalVector || element.Kind() == ElementKind::VerticalEquation;
-}
-
-}  // namespace
-
-const SymbolRecord* TemplateCore::FindRecordBySequence(std::uint32_t sequence) const {
-  // The sequence is the place in the table.
-  return sequence >= 1 && sequence <= symbolTable.size() ? &symbolTable[sequence - 1] : nullptr;
-}
-
-const SymbolRecord* TemplateCore::FindRecordByUid(Uid uid) const {
-  return FindRecord(symbolTable, [uid](const SymbolRecord& record) { return record.uid == uid; });
-}
-
-const SymbolRecord* TemplateCore::RecordOfElement(const CEL_Element& element) const {
-  // Behind a rebuild the element's number is the place of its (for a movement with two, its second) record.
-  const auto place = static_cast<std::uint32_t>(element.id.IntValue());
-  for (const std::uint32_t sequence : {place - 1, place}) {
-    const SymbolRecord* record = FindRecordBySequence(sequence);
-    if (record != nullptr && record->element == &element) return record;
-  }
-  return FindRecordByUid(element.GetUid());
-}
-
-void TemplateCore::AppendRecordSymbol(const SymbolRecord& record, std::string& text) const {
-  if (record.element == nullptr) {
-    text += "unknown";
-    return;
-  }
-  if (IsMovement(*record.element)) {
-    text += "(" + At(species, static_cast<std::size_t>(record.specieIndex)).symbol.Text() + ")";
-  }
-  text += record.element->symbol.Text();
-}
-
-std::string TemplateCore::RecordSymbol(const SymbolRecord& record) const {
-  std::string symbol;
-  AppendRecordSymbol(record, symbol);
-  return symbol;
-}
-
 CEL_Element* TemplateCore::GetElement(Uid uid, ElementKind kindFilter) const {
   if (const SymbolRecord* record = FindRecordByUid(uid)) {
     const bool fits = kindFilter == ElementKind::None || record->element->Kind() == kindFilter;
     return fits ? record->element : nullptr;
   }
-  for (const auto& specie : species) {
+  for (const auto& specie : Species()) {
     for (const auto& head : specie->Heads()) {
       if (head->GetUid() == uid) return head.get();
     }
   }
-  for (const auto& function : misc.ExternalFunctions()) {
+  for (const auto& function : state.misc.ExternalFunctions()) {
     if (function->GetUid() == uid) return function.get();
   }
   return nullptr;
@@ -78,20 +27,10 @@ CEL_Element* TemplateCore::GetElementBySequence(std::uint32_t sequence) const {
 }
 
 bool TemplateCore::FindSymbol(std::string_view symbol, std::uint32_t& sequence) const {
-  const SymbolRecord* record = FindRecord(symbolTable, [this, symbol](const SymbolRecord& candidate) {
-    if (candidate.element != nullptr && !IsMovement(*candidate.element)) {
-      return candidate.element->symbol.Text() == symbol;
-    }
-    return RecordSymbol(candidate) == symbol;
-  });
+  const SymbolRecord* record = state.table.BySymbol(symbol);
   if (record == nullptr) return false;
   sequence = record->sequence;
   return true;
-}
-
-bool TemplateCore::SymbolExists(std::string_view symbol) const {
-  std::uint32_t sequence = 0;
-  return FindSymbol(symbol, sequence);
 }
 
 bool TemplateCore::GetSymbolOfUid(Uid uid, std::string& symbol) const {
@@ -109,9 +48,9 @@ bool TemplateCore::GetSequenceOfUid(Uid uid, std::uint32_t& sequence) const {
 }
 
 bool TemplateCore::IsSymbolTakenByOther(Uid uid, std::string_view symbol) const {
-  return FindRecord(symbolTable, [this, uid, symbol](const SymbolRecord& record) {
-           return record.uid != uid && RecordSymbol(record) == symbol;
-         }) != nullptr;
+  return std::any_of(SymbolTable().begin(), SymbolTable().end(), [uid, symbol](const SymbolRecord& record) {
+    return record.uid != uid && tessal::RecordSymbol(record) == symbol;
+  });
 }
 
 bool TemplateCore::IsReferenced(Uid uid) const {
@@ -136,21 +75,16 @@ bool TemplateCore::GetReferrerSymbols(Uid uid, std::vector<std::string>& symbols
 
 std::vector<std::string> TemplateCore::ReferrerSymbols(const SymbolRecord& record) const {
   std::vector<std::string> symbols;
-  // By record number, which is at hand; a movement whose two expressions both use the symbol stands once.
-  const CEL_Element* previous = nullptr;
-  for (const std::uint32_t sequence : record.referencedBy) {
-    const SymbolRecord* referrer = FindRecordBySequence(sequence);
-    if (referrer == nullptr || referrer->element == previous) continue;
-    previous = referrer->element;
-    symbols.push_back(RecordSymbol(*referrer));
-  }
+  state.table.ForEachElement(record.referencedBy, [&symbols](const SymbolRecord& user) {
+    symbols.push_back(tessal::RecordSymbol(user));
+  });
   return symbols;
 }
 
 bool TemplateCore::FindElementBySymbol(std::string_view symbol, std::int32_t& id,
                                        ElementKind& elementKind) const {
   const CEL_Element* found = nullptr;
-  ForEachNamedElement([symbol, &found](const CEL_Element& element) {
+  ForEachNamedElement(Elements(), [symbol, &found](const CEL_Element& element) {
     if (found == nullptr && element.symbol.Text() == symbol) found = &element;
   });
   elementKind = found == nullptr ? ElementKind::Unknown : found->Kind();
@@ -160,7 +94,7 @@ bool TemplateCore::FindElementBySymbol(std::string_view symbol, std::int32_t& id
 }
 
 CEL_Lagrange_Specie* TemplateCore::GetParentSpecie(Uid headUid) const {
-  for (const auto& specie : species) {
+  for (const auto& specie : Species()) {
     for (const auto& head : specie->Heads()) {
       if (head->GetUid() == headUid) return specie.get();
     }
@@ -173,27 +107,24 @@ std::vector<const CEL_Element*> TemplateCore::ReferencedElements(const CEL_Eleme
   const SymbolRecord* record = RecordOfElement(element);
   if (record == nullptr) return elements;
   elements.reserve(record->references.size());
-  for (const std::uint32_t sequence : record->references) elements.push_back(Record(sequence).element);
+  for (const std::uint32_t used : record->references) elements.push_back(state.table.Used(used).element);
   return elements;
 }
 
 std::vector<NamedNumber> TemplateCore::SpecieNames() const {
   std::vector<NamedNumber> names;
-  names.reserve(species.size());
-  for (const auto& specie : species) names.push_back({specie->symbol.Text(), specie->Index()});
+  names.reserve(Species().size());
+  for (const auto& specie : Species()) names.push_back({specie->symbol.Text(), specie->Index()});
   return names;
 }
 
 std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<Uid>& uids) const {
   std::set<std::int32_t> numbers;
   if (uids.empty()) return numbers;
-  const CEL_Element* previous = nullptr;
-  for (const SymbolRecord& record : symbolTable) {
-    // The second record of a movement counts as its first.
-    if (record.element == nullptr || record.element == previous) continue;
-    previous = record.element;
-    if (uids.contains(record.element->GetUid())) numbers.insert(static_cast<std::int32_t>(record.sequence));
-  }
+  // The second record of a movement counts as its first.
+  state.table.ForEachElement([&uids, &numbers](const SymbolRecord& record) {
+    if (uids.contains(record.uid)) numbers.insert(static_cast<std::int32_t>(record.sequence));
+  });
   return numbers;
 }
 

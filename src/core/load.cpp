@@ -4,6 +4,8 @@
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
+#include "core/visibility_groups.h"
+#include "elements/list_section.h"
 #include "elements/property_io.h"
 #include "keyfile/keywords.h"
 #include "keyfile/reader.h"
@@ -28,18 +30,6 @@ class OpenFile final {
  private:
   KvfHandle handle;
   int error;
-};
-
-/// Switches rebuilds off, and on again on every way out.
-class RebuildsOff final {
- public:
-  explicit RebuildsOff(bool& rebuildSwitch) : enabled(rebuildSwitch) { enabled = false; }
-  RebuildsOff(const RebuildsOff&) = delete;
-  RebuildsOff& operator=(const RebuildsOff&) = delete;
-  ~RebuildsOff() { enabled = true; }
-
- private:
-  bool& enabled;
 };
 
 /// Where the syntax error of a failed load lies.
@@ -89,37 +79,29 @@ bool IsEmptyTarget(KvfNode target) {
          !HasKeyword(target, key::kOnlineHelp) && !HasKeyword(target, key::kDocumentation);
 }
 
-}  // namespace
+/// The reading of one file into a template that was cleared.
+class Reading final {
+ public:
+  Reading(TemplateCore& target, TemplateState& targetState) : core(target), state(targetState) {}
 
-bool TemplateCore::LoadWrapper(const std::string& path) {
-  // A copy: the path may be the template's own file name, which the load empties first.
-  return Load(std::string(path));
-}
+  /// False when the file could not be read; the registry then holds the reason.
+  bool ReadFile(const std::string& path);
+  /// Whether the numbers of all elements are among those of the records; one that is not gets the last of
+  /// them.
+  bool CheckIdRange();
 
-bool TemplateCore::Load(const std::string& path) {
-  const NotificationsOff silent;
-  try {
-    Clear();
-    if (!ReadTemplate(path)) return false;
-    if (!CheckIdRange()) AssignIds();
-    RebuildSymbolTable();
-    if (flags.strictScopeRule != 0) {
-      CheckScopeRule();
-    } else {
-      CheckProcessRule();
-    }
-    ParseAllExpressions();
-    ValidateTemplate();
-    flags.modified = false;
-    return true;
-  } catch (const std::exception& failure) {
-    // What was built so far stays; the reason must reach the user.
-    Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});
-    return false;
-  }
-}
+ private:
+  bool ReadSections(KvfHandle file, int targetNumber);
+  void ReadSettings(KvfNode target, int& status);
+  template <class Element>
+  void ReadCollection(const Collection<Element>& row, KvfNode target, int& status);
+  void ReadTemplateEquations(KvfNode target, int& status);
 
-bool TemplateCore::ReadTemplate(const std::string& path) {
+  TemplateCore& core;
+  TemplateState& state;
+};
+
+bool Reading::ReadFile(const std::string& path) {
   {
     // Closed before the second reading: a large file need not lie in memory twice.
     const OpenFile file(path);
@@ -127,106 +109,72 @@ bool TemplateCore::ReadTemplate(const std::string& path) {
       ReportFailedLoad(file, path);
       return false;
     }
-    saveFileName = path;
-    templateFileName = path;
+    state.saveFileName = path;
+    state.templateFileName = path;
     if (!ReadSections(file.Handle(), 1)) return false;
   }
-  keptTree.Clear();
-  if (LoadKeyFileTree(path, keptTree) == 0) {
+  state.keptTree.Clear();
+  if (LoadKeyFileTree(path, state.keptTree) == 0) {
     Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(path)}});
   }
   return true;
 }
 
-bool TemplateCore::ReadSections(KvfHandle file, int targetNumber) {
+bool Reading::ReadSections(KvfHandle file, int targetNumber) {
   int status = 0;
   const KvfNode target = kvfTargetByNameNum(file, section::kTarget, targetNumber);
   if (target != nullptr) {
-    const RebuildsOff noRebuilds(flags.rebuildEnabled);
-    if (!IsEmptyTarget(target)) root.Read(target, status);
-    ReadMisc(target, status);
-    ReadCollections(target, status);
-    ReadEquations(target, status);
-    ReadSpecies(target, status);
+    const RebuildsOff noRebuilds(state.flags);
+    if (!IsEmptyTarget(target)) state.root.Read(target, status);
+    ReadSettings(target, status);
+    ForEachHeadedCollection(
+        [this, target, &status](const auto& row) { ReadCollection(row, target, status); });
+    // The file holds no symbol for these: their place gives it.
+    std::size_t place = 0;
+    for (const auto& output : state.collections.derivedOutputs) {
+      output->symbol.SetText("Derived Output " + std::to_string(++place));
+    }
+    ReadTemplateEquations(target, status);
+    WithCollection(ElementKind::Specie,
+                   [this, target, &status](const auto& row) { ReadCollection(row, target, status); });
   }
-  RebuildSymbolTable();
-  if (hasMisc) ApplyVisibilityGroups();
+  core.RebuildSymbolTable();
+  if (state.hasMisc) VisibilityGroups(state).TakeRecordNumbers();
   if (Errors().GetErrorCount(static_cast<std::uint32_t>(ErrorLevel::Fatal)) > 0) return false;
-  flags.modified = false;
+  state.flags.modified = false;
   return true;
 }
 
-void TemplateCore::ReadMisc(KvfNode target, int& status) {
+void Reading::ReadSettings(KvfNode target, int& status) {
   const KvfNode settings = kvfSectionByNameNum(target, section::kMisc, 1);
-  hasMisc = settings != nullptr;
-  if (hasMisc) misc.Read(settings, status);
+  state.hasMisc = settings != nullptr;
+  if (state.hasMisc) state.misc.Read(settings, status);
 }
 
-template <class AddElement>
-void TemplateCore::ReadCollection(KvfNode target, std::string_view name, ElementKind listKind, int& status,
-                                  AddElement add) {
-  const KvfNode list = kvfSectionByNameNum(target, name, 1);
-  if (list == nullptr) return;
-  ListHead(listKind).Read(list, status);
-  const int count = kvfGetNoSections(list);
-  for (int number = 1; number <= count; ++number) {
-    CEL_Element& element = add();
-    element.Read(kvfSectionByNum(list, number), status);
-    element.SetLoaded(true);
-  }
+template <class Element>
+void Reading::ReadCollection(const Collection<Element>& row, KvfNode target, int& status) {
+  CEL_Element* head = row.HasHead() ? &state.ListHead(row.listKind) : nullptr;
+  ReadList(target, row.section, head, status,
+           [this, &row]() -> CEL_Element& { return *core.AddElement(row.kind); });
 }
 
-void TemplateCore::ReadCollections(KvfNode target, int& status) {
-  ReadCollection(target, section::kStateVariables, ElementKind::StateVariableList, status,
-                 [this]() -> CEL_Element& { return AddStateVariable(); });
-  ReadCollection(target, section::kConstants, ElementKind::ConstantList, status,
-                 [this]() -> CEL_Element& { return AddConstant(); });
-  ReadCollection(target, section::kForcings, ElementKind::ForcingList, status,
-                 [this]() -> CEL_Element& { return AddForcing(); });
-  ReadCollection(target, section::kAuxiliaryVariables, ElementKind::AuxiliaryList, status,
-                 [this]() -> CEL_Element& { return AddAuxiliary(); });
-  ReadCollection(target, section::kProcesses, ElementKind::ProcessList, status,
-                 [this]() -> CEL_Element& { return AddProcess(); });
-  ReadCollection(target, section::kDerivedOutputs, ElementKind::DerivedOutputList, status,
-                 [this]() -> CEL_Element& { return AddDerivedOutput(); });
-  // The file holds no symbol for these: their place gives it.
-  for (std::size_t place = 0; place < derivedOutputs.size(); ++place) {
-    derivedOutputs[place]->symbol.SetText("Derived Output " + std::to_string(place + 1));
-  }
-}
-
-void TemplateCore::ReadEquations(KvfNode target, int& status) {
+void Reading::ReadTemplateEquations(KvfNode target, int& status) {
   const KvfNode equations = kvfSectionByNameNum(target, section::kStateVariableEquations, 1);
   if (equations == nullptr) return;
-  const int count = kvfGetNoSections(equations);
-  if (static_cast<std::size_t>(count) > stateVariables.size()) {
+  if (static_cast<std::size_t>(kvfGetNoSections(equations)) > state.collections.stateVariables.size()) {
     Errors().ReportInFile("", kvfGetLine(equations), {"surplus-equations"});
   }
-  for (int number = 1; number <= count; ++number) {
-    GetStateVariable(static_cast<std::size_t>(number - 1))
-        .ReadEquation(kvfSectionByNum(equations, number), status);
-  }
+  ReadEquations(equations, state.collections.stateVariables, status);
 }
 
-void TemplateCore::ReadSpecies(KvfNode target, int& status) {
-  const KvfNode classes = kvfSectionByNameNum(target, section::kLagrange, 1);
-  if (classes == nullptr) return;
-  const int count = kvfGetNoSections(classes);
-  for (int number = 1; number <= count; ++number) {
-    CEL_Lagrange_Specie& specie = AddSpecie();
-    specie.Read(kvfSectionByNum(classes, number), status);
-    specie.SetLoaded(true);
-  }
-}
-
-bool TemplateCore::CheckIdRange() {
+bool Reading::CheckIdRange() {
   constexpr std::int32_t kSlotsOfVector = 2;
-  auto slots = static_cast<std::int32_t>(CountNamedElements());
-  for (const auto& specie : species) {
+  auto slots = static_cast<std::int32_t>(core.CountNamedElements());
+  for (const auto& specie : state.collections.species) {
     slots += 1 + kSlotsOfVector * static_cast<std::int32_t>(specie->horizontalVectors.size()) + 1;
   }
   bool good = true;
-  ForEachNamedElement([slots, &good](CEL_Element& element) {
+  ForEachNamedElement(state.collections, [slots, &good](CEL_Element& element) {
     if (element.id.IntValue() <= slots) return;
     element.id.SetInt(slots);
     good = false;
@@ -234,14 +182,28 @@ bool TemplateCore::CheckIdRange() {
   return good;
 }
 
-void TemplateCore::AssignIds() {
-  ResolveReferencesToNames();
-  for (const SymbolRecord& record : symbolTable) {
-    record.element->id.SetInt(static_cast<std::int32_t>(record.sequence));
+}  // namespace
+
+bool TemplateCore::LoadWrapper(const std::string& path) {
+  // A copy: the path may be the template's own file name, which the load empties first.
+  const std::string file = path;
+  const NotificationsOff silent;
+  try {
+    Clear();
+    Reading reading(*this, state);
+    if (!reading.ReadFile(file)) return false;
+    if (!reading.CheckIdRange()) state.AssignIds();
+    RebuildSymbolTable();
+    state.flags.strictScopeRule ? CheckScopeRule() : CheckProcessRule();
+    ParseAllExpressions();
+    ValidateTemplate();
+    state.flags.modified = false;
+    return true;
+  } catch (const std::exception& failure) {
+    // What was built so far stays; the reason must reach the user.
+    Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});
+    return false;
   }
-  NumberSpecies();
-  ResolveNamesToReferences();
-  flags.modified = true;
 }
 
 }  // namespace tessal

@@ -18,14 +18,6 @@ std::string ReplaceInExpression(std::string_view expression, std::string_view ol
   return std::string(StripExpressionQuotes(rewritten));
 }
 
-ElementField TextField(std::string_view name, std::string_view text) {
-  ElementField field;
-  field.kind = FieldKind::Text;
-  field.name = name;
-  field.text = text;
-  return field;
-}
-
 }  // namespace
 
 std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord) {
@@ -70,58 +62,22 @@ std::string RenameFailure(std::string_view newSymbol) {
 
 bool TemplateCore::RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol,
                                 bool replaceInExpressions) {
-  std::uint32_t sequence = 0;
-  if (SymbolExists(newSymbol) || !FindSymbol(oldSymbol, sequence)) return false;
-  flags.modified = true;
-  // The rewrites must not change the table under the walk.
-  flags.rebuildEnabled = false;
-  if (replaceInExpressions) RewriteUsers(Record(sequence), oldSymbol, newSymbol);
-  GetElementBySequence(sequence)->symbol.SetText(newSymbol);
-  ApplySymbol(sequence, newSymbol);
-  flags.rebuildEnabled = true;
-  RebuildSymbolTable();
-  return true;
-}
-
-void TemplateCore::RewriteUsers(const SymbolRecord& renamed, std::string_view oldSymbol,
-                                std::string_view newSymbol) {
-  const auto rewrite = [oldSymbol, newSymbol](CEL_Property& expression) {
-    expression.SetText(ReplaceInExpression(expression.Text(), oldSymbol, newSymbol));
-  };
-  const CEL_Element* previous = nullptr;
-  for (const std::uint32_t sequence : renamed.referencedBy) {
-    const SymbolRecord& user = Record(sequence);
-    // A movement has two records, side by side; its first one rewrites both expressions.
-    if (std::exchange(previous, user.element) == user.element) continue;
-    switch (user.element->Kind()) {
-      case ElementKind::HorizontalVector: {
-        auto& vector = static_cast<CEL_Lagrange_Horizontal_Vector&>(*user.element);
-        rewrite(vector.direction);
-        rewrite(vector.speed);
-        break;
-      }
-      case ElementKind::VerticalEquation:
-        rewrite(static_cast<CEL_Lagrange_Vertical_Equation&>(*user.element).speed);
-        break;
-      default:
-        ApplyExpression(sequence, ReplaceInExpression(user.text, oldSymbol, newSymbol));
-        break;
+  const SymbolRecord* renamed = state.table.BySymbol(oldSymbol);
+  if (renamed == nullptr || SymbolExists(newSymbol)) return false;
+  state.flags.modified = true;
+  {
+    // The rewrites must not change the table under the walk.
+    const RebuildsOff noRebuilds(state.flags);
+    if (replaceInExpressions) {
+      state.table.ForEachElement(renamed->referencedBy, [oldSymbol, newSymbol](const SymbolRecord& user) {
+        user.element->ForEachExpression([oldSymbol, newSymbol](const PropertyRow&, CEL_Property& expression) {
+          expression.SetText(ReplaceInExpression(expression.Text(), oldSymbol, newSymbol));
+        });
+      });
     }
+    renamed->element->symbol.SetText(newSymbol);
   }
-}
-
-bool TemplateCore::ApplyExpression(std::uint32_t sequence, std::string_view text) {
-  return ApplyFields(sequence, {TextField("Expression", text), TextField("Equation", text)});
-}
-
-bool TemplateCore::ApplySymbol(std::uint32_t sequence, std::string_view text) {
-  return ApplyFields(sequence, {TextField("Symbol", text)});
-}
-
-bool TemplateCore::ApplyFields(std::uint32_t sequence, const std::vector<ElementField>& fields) {
-  CEL_Element* element = GetElementBySequence(sequence);
-  if (element == nullptr || element->SetFields(fields) == 0) return false;
-  flags.modified = true;
+  RebuildSymbolTable();
   return true;
 }
 

@@ -7,6 +7,7 @@
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
+#include "elements/list_section.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
 #include "platform/ascii.h"
@@ -92,34 +93,34 @@ std::string WithCarriageReturns(const std::string& text) {
   return result;
 }
 
-template <class Elements>
-void WriteElements(const Elements& elements, std::string_view prefix, KvfHandle file, int& status) {
-  for (std::size_t place = 0; place < elements.size(); ++place) {
-    kvfAddSection(file, std::string(prefix) + std::to_string(place + 1));
-    elements[place]->Write(file, status);
-    kvfEndSection(file);
-  }
-}
+/// The writing of one template.
+class Writing final {
+ public:
+  explicit Writing(TemplateState& source) : state(source) {}
 
-}  // namespace
+  /// Under a new name: with fresh version stamps and a restarted revision.
+  bool SaveAs(const std::string& path);
+  bool SaveInPlace(const std::string& path);
 
-bool TemplateCore::SaveWrapper(const std::string& path) {
-  return Save(path);
-}
+ private:
+  /// Writes everything into the place of the file; the empty text, or the reason of a failure.
+  std::string WriteThrough(const std::string& path);
+  bool WriteSections(KvfHandle file);
+  std::string KeptSectionsText() const;
 
-bool TemplateCore::Save(const std::string& path) {
-  return path == saveFileName ? WriteTemplateFile(path) : SaveAs(path);
-}
+  TemplateState& state;
+};
 
-bool TemplateCore::SaveAs(const std::string& path) {
-  const bool hadMisc = hasMisc;
+bool Writing::SaveAs(const std::string& path) {
+  CEL_Miscanellous& misc = state.misc;
+  const bool hadMisc = state.hasMisc;
   const Stamps former(misc);
   // A file that had no settings stays with the meaning that it was written with.
   std::string angleUnit = "Radians";
-  if (hasMisc) {
+  if (state.hasMisc) {
     angleUnit = misc.trigonometrics.Text();
   } else {
-    hasMisc = true;
+    state.hasMisc = true;
     misc.Reset();
   }
   misc.tessalVersion.SetReal(SoftwareVersion());
@@ -127,14 +128,14 @@ bool TemplateCore::SaveAs(const std::string& path) {
   misc.documentRevision.SetInt(0);
   misc.optimise.SetBool(true);
   misc.trigonometrics.SetText(angleUnit);
-  if (WriteTemplateFile(path)) return true;
-  hasMisc = hadMisc;
+  if (SaveInPlace(path)) return true;
+  state.hasMisc = hadMisc;
   former.PutBack(misc);
   return false;
 }
 
-bool TemplateCore::WriteTemplateFile(const std::string& path) {
-  const std::int32_t formerRevision = misc.documentRevision.IntValue();
+bool Writing::SaveInPlace(const std::string& path) {
+  const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
   std::string reason;
   try {
     reason = WriteThrough(path);
@@ -143,18 +144,18 @@ bool TemplateCore::WriteTemplateFile(const std::string& path) {
   }
   if (!reason.empty()) {
     // What is in memory stays unsaved, and its revision uncounted.
-    misc.documentRevision.SetInt(formerRevision);
-    flags.modified = true;
+    state.misc.documentRevision.SetInt(formerRevision);
+    state.flags.modified = true;
     ReportFailure(reason);
     return false;
   }
-  templateFileName = path;
-  saveFileName = path;
-  flags.modified = false;
+  state.templateFileName = path;
+  state.saveFileName = path;
+  state.flags.modified = false;
   return true;
 }
 
-std::string TemplateCore::WriteThrough(const std::string& path) {
+std::string Writing::WriteThrough(const std::string& path) {
   const std::string temporary = path + "$";
   std::string text;
   {
@@ -170,12 +171,12 @@ std::string TemplateCore::WriteThrough(const std::string& path) {
   return reason;
 }
 
-std::string TemplateCore::KeptSectionsText() const {
+std::string Writing::KeptSectionsText() const {
   std::ostringstream text;
   text.imbue(std::locale::classic());
   // The first target of the template's name is the one that was read; it is not always the first of all.
   bool targetSeen = false;
-  for (const auto& child : keptTree.Children()) {
+  for (const auto& child : state.keptTree.Children()) {
     if (child->ItemKind() != CKvfBaseItem::kSection) continue;
     const bool isTarget = !targetSeen && EqualIgnoringCase(child->name, section::kTarget);
     targetSeen = targetSeen || isTarget;
@@ -184,58 +185,36 @@ std::string TemplateCore::KeptSectionsText() const {
   return WithCarriageReturns(text.str());
 }
 
-bool TemplateCore::WriteSections(KvfHandle file) {
+bool Writing::WriteSections(KvfHandle file) {
   int status = 0;
-  AssignIds();
+  state.AssignIds();
   kvfAddTarget(file, section::kTarget);
-  root.Write(file, status);
-  if (hasMisc) {
+  state.root.Write(file, status);
+  if (state.hasMisc) {
     kvfAddSection(file, section::kMisc);
-    misc.Write(file, status);
+    state.misc.Write(file, status);
     kvfEndSection(file);
   }
-  WriteCollections(file, status);
-  WriteEquations(file, status);
-  WriteSpecies(file, status);
+  ForEachHeadedCollection([this, file, &status](const auto& row) {
+    WriteList(state.collections.*row.elements, row.section, row.prefix, &state.ListHead(row.writtenHead),
+              file, status);
+  });
+  WriteEquations(state.collections.stateVariables, section::kStateVariableEquations,
+                 section::kStateVariableEquationPrefix, file, status);
+  if (!state.collections.species.empty()) {
+    WithCollection(ElementKind::Specie, [this, file, &status](const auto& row) {
+      WriteList(state.collections.*row.elements, row.section, row.prefix, nullptr, file, status);
+    });
+  }
   kvfEndSection(file);
   return status == 0;
 }
 
-void TemplateCore::WriteCollections(KvfHandle file, int& status) {
-  const auto write = [this, file, &status](const auto& elements, std::string_view name,
-                                           std::string_view prefix, ElementKind headKind) {
-    kvfAddSection(file, name);
-    ListHead(headKind).Write(file, status);
-    WriteElements(elements, prefix, file, status);
-    kvfEndSection(file);
-  };
-  write(stateVariables, section::kStateVariables, section::kStateVariablePrefix,
-        ElementKind::StateVariableList);
-  write(constants, section::kConstants, section::kConstantPrefix, ElementKind::ConstantList);
-  write(forcings, section::kForcings, section::kForcingPrefix, ElementKind::ForcingList);
-  // The texts of the auxiliaries' head are those of the constants: files have always been written so.
-  write(auxiliaries, section::kAuxiliaryVariables, section::kAuxiliaryVariablePrefix,
-        ElementKind::ConstantList);
-  write(processes, section::kProcesses, section::kProcessPrefix, ElementKind::ProcessList);
-  write(derivedOutputs, section::kDerivedOutputs, section::kDerivedOutputPrefix,
-        ElementKind::DerivedOutputList);
-}
+}  // namespace
 
-void TemplateCore::WriteEquations(KvfHandle file, int& status) {
-  kvfAddSection(file, section::kStateVariableEquations);
-  for (std::size_t place = 0; place < stateVariables.size(); ++place) {
-    kvfAddSection(file, std::string(section::kStateVariableEquationPrefix) + std::to_string(place + 1));
-    stateVariables[place]->WriteEquation(file, status);
-    kvfEndSection(file);
-  }
-  kvfEndSection(file);
-}
-
-void TemplateCore::WriteSpecies(KvfHandle file, int& status) {
-  if (species.empty()) return;
-  kvfAddSection(file, section::kLagrange);
-  WriteElements(species, section::kSpeciePrefix, file, status);
-  kvfEndSection(file);
+bool TemplateCore::SaveWrapper(const std::string& path) {
+  Writing writing(state);
+  return path == state.saveFileName ? writing.SaveInPlace(path) : writing.SaveAs(path);
 }
 
 }  // namespace tessal

@@ -1,14 +1,22 @@
-// The choices that area searches offer come from the template around them: its classes and its values.
-#include <map>
+#include "core/search_functions.h"
 
-#include "core/template_core.h"
+#include <algorithm>
+#include <map>
+#include <unordered_map>
+
+#include "core/collections.h"
 
 namespace tessal {
 
 namespace {
 
-ChoiceList ShareChoices(std::vector<CEL_Choice> choices) {
-  return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+/// The marker of a lost reference, as it has always been spelt.
+constexpr std::string_view kLostName = "unkown";
+constexpr std::string_view kUnresolvedName = "unknown";
+
+bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
+  return std::any_of(species.begin(), species.end(),
+                     [](const auto& specie) { return !specie->spatialFunctions.empty(); });
 }
 
 std::vector<CEL_Choice> NoVariable() {
@@ -24,7 +32,8 @@ void Offer(std::vector<CEL_Choice>& choices, const Elements& elements) {
 
 }  // namespace
 
-void TemplateCore::NumberSpecies() {
+void NumberSpecies(const Collections& collections) {
+  const auto& species = collections.species;
   const NotificationsOff silent;
   std::map<std::int32_t, std::int32_t> numbers;  // new by old
   for (std::size_t place = 0; place < species.size(); ++place) {
@@ -37,27 +46,53 @@ void TemplateCore::NumberSpecies() {
     species[place]->SetIndex(number);
     species[place]->StampMembers();
   }
-  ForEachSearchFunction([&numbers](CEL_Lagrange_Spatial_Function& function) {
+  ForEachSearchFunction(collections, [&numbers](CEL_Lagrange_Spatial_Function& function) {
     const auto sought = numbers.find(function.lookFor.IntValue());
     if (sought != numbers.end()) function.lookFor.SetInt(sought->second);
   });
 }
 
-void TemplateCore::ForgetSpecie(std::int32_t number) {
+void ForgetSpecie(const Collections& collections, std::int32_t number) {
   constexpr std::int32_t kNoSpecie = 0;
   const NotificationsOff silent;
-  ForEachSearchFunction([number](CEL_Lagrange_Spatial_Function& function) {
+  ForEachSearchFunction(collections, [number](CEL_Lagrange_Spatial_Function& function) {
     if (function.lookFor.IntValue() == number) function.lookFor.SetInt(kNoSpecie);
   });
 }
 
-void TemplateCore::RefreshSearchFunctionChoices() {
-  if (species.empty()) return;
-  const std::vector<NamedNumber> names = SpecieNames();
+void ResolveReferencesToNames(const Collections& collections) {
+  if (!HasSearchFunction(collections.species)) return;
+  std::unordered_map<std::int32_t, const CEL_Element*> byId;
+  ForEachNamedElement(collections,
+                      [&byId](const CEL_Element& element) { byId.emplace(element.id.IntValue(), &element); });
+  ForEachSearchFunction(collections, [&byId](CEL_Lagrange_Spatial_Function& function) {
+    const std::int32_t number = function.variableId.IntValue();
+    const auto hit = number > 0 ? byId.find(number) : byId.end();
+    function.SetVariableName(hit == byId.end() ? kLostName : std::string_view(hit->second->symbol.Text()));
+  });
+}
+
+void ResolveNamesToReferences(const Collections& collections) {
+  if (!HasSearchFunction(collections.species)) return;
+  std::unordered_map<std::string_view, const CEL_Element*> byName;
+  ForEachNamedElement(collections, [&byName](const CEL_Element& element) {
+    byName.emplace(element.symbol.Text(), &element);
+  });
+  ForEachSearchFunction(collections, [&byName](CEL_Lagrange_Spatial_Function& function) {
+    if (function.VariableName() == kUnresolvedName) return;
+    const auto hit = byName.find(function.VariableName());
+    if (hit != byName.end()) function.variableId.SetInt(hit->second->id.IntValue());
+  });
+}
+
+bool OfferSearchChoices(const Collections& collections) {
+  const auto& species = collections.species;
+  std::vector<NamedNumber> names;
+  for (const auto& specie : species) names.push_back({specie->symbol.Text(), specie->Index()});
   std::vector<CEL_Choice> grid = NoVariable();
-  Offer(grid, stateVariables);
-  Offer(grid, constants);
-  Offer(grid, forcings);
+  Offer(grid, collections.stateVariables);
+  Offer(grid, collections.constants);
+  Offer(grid, collections.forcings);
   const ChoiceList gridValues = ShareChoices(std::move(grid));
   const ChoiceList noValues = ShareChoices(NoVariable());
   std::map<std::int32_t, ChoiceList> particleValues;  // by the number of the class
@@ -84,7 +119,7 @@ void TemplateCore::RefreshSearchFunctionChoices() {
       function->SelectPresentValues();
     }
   }
-  misc.buildSpatialTree.SetBool(needTree);
+  return needTree;
 }
 
 }  // namespace tessal

@@ -1,6 +1,8 @@
 // The check pass: every element checks itself, and the rules of order and scope run over the symbol table.
 // All findings go to the error registry; nothing stops at its first one.
+#include "core/declaration_order.h"
 #include "core/error_registry.h"
+#include "core/scope_rule.h"
 #include "core/template_core.h"
 #include "elements/element_checks.h"
 
@@ -25,13 +27,11 @@ bool ParseAll(const Elements& elements) {
 
 bool CheckSpecie(CEL_Lagrange_Specie& specie) {
   bool good = specie.Check();
-  good = CheckAll(specie.stateVariables) && good;
-  good = CheckAll(specie.constants) && good;
-  good = CheckAll(specie.spatialFunctions) && good;
-  good = CheckAll(specie.arithmeticExpressions) && good;
-  good = CheckAll(specie.horizontalVectors) && good;
-  // The forcings of a class stay unchecked, unlike those of the template.
-  return specie.verticalEquation->Check() && good;
+  specie.ForEachMember([&good](CEL_Element& member) {
+    // The forcings of a class stay unchecked, unlike those of the template.
+    if (member.Kind() != ElementKind::SpecieForcing) good = member.Check() && good;
+  });
+  return good;
 }
 
 bool CheckRootText(const CEL_Element& root) {
@@ -44,26 +44,42 @@ bool CheckRootText(const CEL_Element& root) {
 
 bool TemplateCore::ValidateTemplate() {
   Errors().ResetExpressionWarningCount();
-  bool good = CheckAll(stateVariables);
-  good = CheckAll(constants) && good;
-  good = CheckAll(forcings) && good;
-  good = CheckAll(auxiliaries) && good;
-  good = CheckAll(processes) && good;
-  good = CheckAll(derivedOutputs) && good;
+  bool good = true;
+  ForEachHeadedCollection(
+      [this, &good](const auto& row) { good = CheckAll(Elements().*row.elements) && good; });
   good = CheckDeclarationOrder() && good;
-  for (const auto& specie : species) good = CheckSpecie(*specie) && good;
-  good = (flags.strictScopeRule != 0 ? CheckScopeRule() : CheckProcessRule()) && good;
-  good = CheckRootText(root) && good;
+  for (const auto& specie : Species()) good = CheckSpecie(*specie) && good;
+  good = (state.flags.strictScopeRule ? CheckScopeRule() : CheckProcessRule()) && good;
+  good = CheckRootText(state.root) && good;
   // Also for a template without settings, on their default values.
-  return misc.Check() && good;
+  return state.misc.Check() && good;
 }
 
 bool TemplateCore::ParseAllExpressions() {
-  bool good = ParseAll(auxiliaries);
-  good = ParseAll(processes) && good;
-  good = ParseAll(derivedOutputs) && good;
-  good = ParseAll(stateVariables) && good;
-  return ParseAll(species) && good;
+  bool good = true;
+  ForEachHeadedCollection([this, &good](const auto& row) {
+    if (row.kind != ElementKind::StateVariable) good = ParseAll(Elements().*row.elements) && good;
+  });
+  // Equations come after what they use.
+  good = ParseAll(StateVariables()) && good;
+  return ParseAll(Species()) && good;
+}
+
+bool TemplateCore::CheckElementOrder(Uid uid) const {
+  const SymbolRecord* record = FindRecordByUid(uid);
+  return record == nullptr || CheckRecordOrder(state.table, *record);
+}
+
+bool TemplateCore::CheckDeclarationOrder() const {
+  return tessal::CheckDeclarationOrder(state.table);
+}
+
+bool TemplateCore::CheckScopeRule() const {
+  return tessal::CheckScopeRule(state.table);
+}
+
+bool TemplateCore::CheckProcessRule() const {
+  return tessal::CheckProcessRule(state.table);
 }
 
 }  // namespace tessal

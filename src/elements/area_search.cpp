@@ -43,8 +43,7 @@ const ChoiceList& PropertyChoices() {
 }
 
 const ChoiceList& DimensionChoices() {
-  static const ChoiceList kList = std::make_shared<const std::vector<CEL_Choice>>(
-      std::vector<CEL_Choice>{CEL_Choice::Number("2", 2), CEL_Choice::Number("3", 3)});
+  static const ChoiceList kList = ShareChoices({CEL_Choice::Number("2", 2), CEL_Choice::Number("3", 3)});
   return kList;
 }
 
@@ -71,13 +70,8 @@ constexpr std::array<PropertyRow, 11> kRows = {{
 
 /// Selects the choice that stores the property's text; without one the first choice takes its place.
 void SelectOrTakeFirst(CEL_Property& property) {
-  const auto& choices = property.Choices();
-  for (std::size_t index = 0; index < choices.size(); ++index) {
-    if (choices[index].fileText != property.Text()) continue;
-    property.SelectIndex(static_cast<std::int32_t>(index));
-    return;
-  }
-  if (choices.empty()) return;
+  property.SelectIndex(property.PresentChoice());
+  if (property.Selected() >= 0 || !property.HasChoices()) return;
   property.SelectIndex(0);
   property.ApplySelection();
 }
@@ -94,7 +88,7 @@ CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view ca
   Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
                &framework, &property, &math, &lookFor});
   ListenTo({&variableId, &lookFor, &purpose, &framework});
-  lookFor.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(FirstLookForChoices()));
+  lookFor.SetChoices(ShareChoices(FirstLookForChoices()));
   CEL_Lagrange_Spatial_Function::Reset();
 }
 
@@ -122,8 +116,7 @@ bool CEL_Lagrange_Spatial_Function::SearchesParticles() const {
 void CEL_Lagrange_Spatial_Function::RebuildChoices() {
   if (framework.Text() == kEuler && purpose.Text() == kOilspill) {
     // No longer offered, but kept where a file has it.
-    purpose.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(
-        1, CEL_Choice::Text("Oilspill(deprecated)", kOilspill)));
+    purpose.SetChoices(ShareChoices({CEL_Choice::Text("Oilspill(deprecated)", kOilspill)}));
     purpose.SelectIndex(0);
   } else if (framework.Text() == kEuler) {
     purpose.SetChoices(MakeTextChoices(kEulerPurposes));
@@ -151,8 +144,8 @@ void CEL_Lagrange_Spatial_Function::OfferSpecies(const std::vector<NamedNumber>&
     owners.push_back(CEL_Choice::Number(specie.name, specie.number));
     lookedFor.push_back(CEL_Choice::Number(specie.name, specie.number));
   }
-  specieId.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(std::move(owners)));
-  lookFor.SetChoices(std::make_shared<const std::vector<CEL_Choice>>(std::move(lookedFor)));
+  specieId.SetChoices(ShareChoices(std::move(owners)));
+  lookFor.SetChoices(ShareChoices(std::move(lookedFor)));
   SelectPresentValues();
 }
 

@@ -18,6 +18,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  std::string RecordText() const override { return variableName; }
 
   /// Fills the choices of purpose and mathematics from the framework and the purpose.
   void RebuildChoices();

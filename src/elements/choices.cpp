@@ -2,41 +2,73 @@
 
 #include <algorithm>
 #include <array>
+#include <map>
 #include <utility>
+
+#include "expr/builtin_catalogue.h"
+#include "keyfile/water_body.h"
 
 namespace tessal {
 
 namespace {
 
-constexpr std::array<std::string_view, 4> kLayerScopes = {"WS", "WC", "WB", "SED"};
-
-// The first two rows are one text, and the first of them wins a selection: the built-in catalogue counts
-// its layers by this table.
-constexpr std::array<std::string_view, 6> kInputScopes = {
-    "NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC", "WB", "SED"};
-
-constexpr std::array<std::string_view, 1> kNoScope = {"NOT_SPECIFIED"};
+constexpr std::array<std::string_view, 4> kLayerScopes = {scope::kWaterSurface, scope::kWaterColumn,
+                                                          scope::kWaterBottom, scope::kSediment};
+constexpr std::array<std::string_view, 1> kNoScope = {scope::kNotSpecified};
 
 struct DisplayedText {
   std::string_view display;
   std::string_view fileText;
 };
 
-// Files and rules go by the misspelt forms.
 constexpr std::array<DisplayedText, 3> kSpatialVariations = {{
-    {"NONE", "NONE"},
-    {"HORIZONTAL", "HORISONTAL"},
-    {"HORIZONTAL_AND_VERTICAL", "HORISONTAL_AND_VERTICAL"},
+    {"NONE", variation::kNone},
+    {"HORIZONTAL", variation::kHorizontal},
+    {"HORIZONTAL_AND_VERTICAL", variation::kHorizontalAndVertical},
 }};
 
-ChoiceList Share(std::vector<CEL_Choice> choices) {
-  return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
-}
+constexpr std::array<UnitTypeRow, 1> kPlainRows = {{{kUserDefined, kUserDefinedUnit, 0, "undefined"}}};
+
+constexpr std::array<UnitTypeRow, 2> kInputRows = {{
+    {"Process rate", 100150, 0, "/d"},
+    {kUserDefined, kUserDefinedUnit, 0, ""},
+}};
+
+constexpr std::array<UnitTypeRow, 6> kStateVariableRows = {{
+    {"Concentration", 100404, 2205, "mg/l"},
+    {"Mass per Area", 100437, 4400, "g/m2"},
+    {"Bacteria Concentration", 100008, 3001, "per 100 ml"},
+    {kUserDefined, kUserDefinedUnit, 0, "undefined"},
+    {"Volume", 110230, 1600, "m3"},
+    {"Length", 110220, 1000, "m"},
+}};
+
+constexpr std::array<UnitTypeRow, 14> kParticleRows = {{
+    {"Mass", 100039, 0, "kg"},
+    {kUserDefined, kUserDefinedUnit, 0, "undefined"},
+    {"Concentration", 100404, 0, "mg/l"},
+    {"Mass per Area", 100437, 0, "g/m2"},
+    {"Density", 100017, 0, "kg/m3"},
+    {"Temperature", 100006, 0, "degree Celsius"},
+    {"Surface Area", 100135, 0, "m2"},
+    {"Light exinction", 100220, 0, "per meter"},
+    {"Fraction", 100239, 0, "fraction"},
+    {"Wind Speed", 100274, 0, "meter/sec"},
+    {"Current Speed", 100242, 0, "meter/sec"},
+    {"Attenuation", 100317, 0, "per meter"},
+    {"Volume", 110230, 0, "m3"},
+    {"Length", 110220, 0, "m"},
+}};
 
 }  // namespace
 
+ChoiceList ShareChoices(std::vector<CEL_Choice> choices) {
+  return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+}
+
 const ChoiceList& YesNoChoices() {
-  static const ChoiceList kList = Share({CEL_Choice::Boolean("YES", true), CEL_Choice::Boolean("NO", false)});
+  static const ChoiceList kList =
+      ShareChoices({CEL_Choice::Boolean(kYes, true), CEL_Choice::Boolean(kNo, false)});
   return kList;
 }
 
@@ -46,7 +78,7 @@ const ChoiceList& LayerScopeChoices() {
 }
 
 const ChoiceList& InputScopeChoices() {
-  static const ChoiceList kList = MakeTextChoices(kInputScopes);
+  static const ChoiceList kList = MakeTextChoices(LayerTexts());
   return kList;
 }
 
@@ -62,7 +94,7 @@ const ChoiceList& SpatialVariationChoices() {
     for (const DisplayedText& row : kSpatialVariations) {
       choices.push_back(CEL_Choice::Text(row.display, row.fileText));
     }
-    return Share(std::move(choices));
+    return ShareChoices(std::move(choices));
   }();
   return kList;
 }
@@ -71,26 +103,30 @@ ChoiceList MakeTextChoices(std::span<const std::string_view> texts) {
   std::vector<CEL_Choice> choices;
   choices.reserve(texts.size());
   for (const std::string_view text : texts) choices.push_back(CEL_Choice::Text(text, text));
-  return Share(std::move(choices));
+  return ShareChoices(std::move(choices));
 }
 
-const UnitTypeRow* FindUnitType(std::span<const UnitTypeRow> rows, std::int32_t unqType) {
-  const auto hit = std::find_if(rows.begin(), rows.end(),
+const UnitTypes kPlainUnitTypes{kPlainRows, false};
+const UnitTypes kInputUnitTypes{kInputRows, false};
+const UnitTypes kStateVariableUnitTypes{kStateVariableRows, false};
+const UnitTypes kParticleUnitTypes{kParticleRows, true};
+
+const UnitTypeRow* FindUnitType(const UnitTypes& types, std::int32_t unqType) {
+  const auto hit = std::find_if(types.rows.begin(), types.rows.end(),
                                 [unqType](const UnitTypeRow& row) { return row.unqType == unqType; });
-  return hit == rows.end() ? nullptr : &*hit;
+  return hit == types.rows.end() ? nullptr : &*hit;
 }
 
-ChoiceList MakeUnitTypeChoices(std::span<const UnitTypeRow> rows) {
-  std::vector<CEL_Choice> choices;
-  choices.reserve(rows.size());
-  for (const UnitTypeRow& row : rows) choices.push_back(CEL_Choice::Number(row.display, row.unqType));
-  return Share(std::move(choices));
-}
-
-std::string_view SpatialVariationOfScope(std::string_view scope) {
-  if (scope == "WC") return "HORISONTAL_AND_VERTICAL";
-  if (scope == "WS" || scope == "WB" || scope == "SED") return "HORISONTAL";
-  return {};
+const ChoiceList& UnitTypeChoices(const UnitTypes& types) {
+  static std::map<const UnitTypeRow*, ChoiceList> lists;
+  ChoiceList& list = lists[types.rows.data()];
+  if (!list) {
+    std::vector<CEL_Choice> choices;
+    choices.reserve(types.rows.size());
+    for (const UnitTypeRow& row : types.rows) choices.push_back(CEL_Choice::Number(row.display, row.unqType));
+    list = ShareChoices(std::move(choices));
+  }
+  return list;
 }
 
 }  // namespace tessal

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <span>
 #include <string_view>
+#include <vector>
 
 #include "elements/property.h"
 
@@ -22,10 +23,13 @@ const ChoiceList& InputScopeChoices();
 const ChoiceList& NoScopeChoices();
 const ChoiceList& SpatialVariationChoices();
 
+/// A list that properties may share.
+ChoiceList ShareChoices(std::vector<CEL_Choice> choices);
 /// A list of text choices whose display is their stored text.
 ChoiceList MakeTextChoices(std::span<const std::string_view> texts);
 
-/// A unit type: its number, the unit number that goes with it and the unit text that it fixes.
+/// A unit type: its number, the unit number that goes with it and the unit text that it brings; an
+/// empty text leaves the unit as it is.
 struct UnitTypeRow {
   std::string_view display;
   std::int32_t unqType;
@@ -33,16 +37,27 @@ struct UnitTypeRow {
   std::string_view unit;
 };
 
+/// What a choice without a fixed value is called: a unit type, a quantity that is not built in.
+inline constexpr std::string_view kUserDefined = "User defined";
+
 /// The number of the unit type "User defined".
 inline constexpr std::int32_t kUserDefinedUnit = 999;
 
+/// The unit types of a family of elements.
+struct UnitTypes {
+  std::span<const UnitTypeRow> rows;
+  bool keepsUnknown;  ///< a number without a row stays; otherwise it becomes "User defined"
+};
+
+extern const UnitTypes kPlainUnitTypes;          ///< of elements without unit types of their own
+extern const UnitTypes kInputUnitTypes;          ///< of constants and forcings
+extern const UnitTypes kStateVariableUnitTypes;  ///< of the template's state variables
+extern const UnitTypes kParticleUnitTypes;       ///< of the values of particle classes
+
 /// The row of a unit type, or none.
-const UnitTypeRow* FindUnitType(std::span<const UnitTypeRow> rows, std::int32_t unqType);
+const UnitTypeRow* FindUnitType(const UnitTypes& types, std::int32_t unqType);
 
-/// Numbered choices over the unit types.
-ChoiceList MakeUnitTypeChoices(std::span<const UnitTypeRow> rows);
-
-/// The spatial variation that a scope brings with it; empty for a scope that brings none.
-std::string_view SpatialVariationOfScope(std::string_view scope);
+/// Numbered choices over the unit types, one list for each family.
+const ChoiceList& UnitTypeChoices(const UnitTypes& types);
 
 }  // namespace tessal

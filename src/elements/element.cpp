@@ -4,9 +4,11 @@
 #include <array>
 #include <cassert>
 
+#include "elements/element_checks.h"
 #include "elements/element_owner.h"
 #include "elements/property_io.h"
 #include "keyfile/keywords.h"
+#include "keyfile/water_body.h"
 
 namespace tessal {
 
@@ -17,18 +19,8 @@ std::int32_t& UidCounter() {
   return last;
 }
 
-constexpr std::string_view kUserDefined = "User defined";
-
-constexpr std::array<UnitTypeRow, 1> kUserDefinedType = {{{kUserDefined, kUserDefinedUnit, 0, "undefined"}}};
-
 const ChoiceList& UserDefinedUnitChoices() {
-  static const ChoiceList kList =
-      std::make_shared<const std::vector<CEL_Choice>>(1, CEL_Choice::Number(kUserDefined, 0));
-  return kList;
-}
-
-const ChoiceList& UserDefinedTypeChoices() {
-  static const ChoiceList kList = MakeUnitTypeChoices(kUserDefinedType);
+  static const ChoiceList kList = ShareChoices({CEL_Choice::Number(kUserDefined, 0)});
   return kList;
 }
 
@@ -57,7 +49,7 @@ void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
       property.SetInt(static_cast<std::int32_t>(row.defaultNumber));
       break;
     case ValueType::Boolean:
-      property.SetBool(row.defaultText == "YES");
+      property.SetBool(row.defaultText == kYes);
       break;
     default:
       property.SetText(row.defaultText);
@@ -69,7 +61,8 @@ void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
 
 CEL_Element::CEL_Element(bool withSymbol, bool withId, bool withDescription)
     : hasDescription(withDescription), hasSymbol(withSymbol), hasId(withId), uid(Uid{++UidCounter()}) {
-  OfferUnitTypes(kUserDefinedType);
+  unqType.SetInt(kUserDefinedUnit);
+  OfferUnitTypes(kPlainUnitTypes);
   unqUnit.SetChoices(UserDefinedUnitChoices());
   unqUnit.SelectIndex(0);
 }
@@ -85,11 +78,30 @@ CEL_ListHead::CEL_ListHead(ElementKind kindNumber, std::string_view caption)
   SetLoaded(true);
 }
 
-void CEL_Element::OfferUnitTypes(std::span<const UnitTypeRow> rows) {
-  unqType.SetChoices(rows.data() == kUserDefinedType.data() ? UserDefinedTypeChoices()
-                                                            : MakeUnitTypeChoices(rows));
-  unqType.SetInt(kUserDefinedUnit);
-  unqType.SelectChoice(kUserDefined);
+void CEL_Element::OfferUnitTypes(const UnitTypes& types) {
+  unqType.SetChoices(UnitTypeChoices(types));
+  unqType.SelectIndex(unqType.PresentChoice());
+}
+
+void CEL_Element::ApplyUnitType(const UnitTypes& types, CEL_Property& unit) {
+  const UnitTypeRow* row = FindUnitType(types, unqType.IntValue());
+  if (row == nullptr) {
+    if (!types.keepsUnknown) {
+      unqType.SetInt(kUserDefinedUnit);
+      SelectPresentValues();
+    }
+    unit.SetEditable(true);
+    return;
+  }
+  if (!row->unit.empty()) unit.SetText(row->unit);
+  unit.SetEditable(row->unqType == kUserDefinedUnit);
+}
+
+void CEL_Element::ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation) {
+  const std::string_view variation = VariationOfScope(scope.Text());
+  if (!variation.empty()) spatialVariation.SetText(variation);
+  // A form opens on the selection, and would store it over the new variation.
+  SelectPresentValues();
 }
 
 void CEL_Element::SetFileFlags(bool withSymbol, bool withId, bool withDescription) {
@@ -317,6 +329,20 @@ int CEL_Element::SetOwnFields(const std::vector<ElementField>& fields) {
 
 int CEL_Element::SetFields(const std::vector<ElementField>& fields) {
   return SetBaseFields(fields) + SetOwnFields(fields);
+}
+
+bool CEL_Element::HasExpression() const {
+  bool found = false;
+  ForEachExpression([&found](const PropertyRow&, const CEL_Property&) { found = true; });
+  return found;
+}
+
+bool CEL_Element::ParseExpression() {
+  bool good = true;
+  ForEachExpression([this, &good](const PropertyRow& row, const CEL_Property& expression) {
+    good = CheckParses(*this, row.caption.empty() ? symbol.Text() : row.caption, expression) && good;
+  });
+  return good;
 }
 
 void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) {

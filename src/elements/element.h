@@ -30,10 +30,29 @@ struct PropertyRow {
   ChoiceSource choices = nullptr;
   std::string_view defaultText{};  ///< as it stands in the file
   double defaultNumber = 0.0;
-  bool readLast = false;        ///< a value that is read behind the bounds that limit it
-  bool listedLast = false;      ///< stands behind the others in the field list
+  bool readLast = false;        ///< a value that is read after the bounds that limit it
+  bool listedLast = false;      ///< comes after the others in the field list
   std::string_view onlyWith{};  ///< read only when the section has this keyword; without it the value stays
+  std::string_view caption{};   ///< the item under which a failed parse is reported; else the symbol
 };
+
+// A row with one of its less common columns.
+constexpr PropertyRow ReadLast(PropertyRow row) {
+  row.readLast = true;
+  return row;
+}
+constexpr PropertyRow ListedLast(PropertyRow row) {
+  row.listedLast = true;
+  return row;
+}
+constexpr PropertyRow OnlyWith(std::string_view keyword, PropertyRow row) {
+  row.onlyWith = keyword;
+  return row;
+}
+constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
+  row.caption = caption;
+  return row;
+}
 
 /// Which unit data an element has in the file.
 enum class UnitMode : std::int32_t { None = 0, Type = 1, Unit = 2, Both = 3 };
@@ -57,13 +76,26 @@ class CEL_Element : public PropertyListener {
   /// Reports each problem to the registry; true when there is none.
   virtual bool Check() { return true; }
   /// Compiles the expressions, reports failures; true when all compiled.
-  virtual bool ParseExpression() { return true; }
+  virtual bool ParseExpression();
   /// Appends a named field for each property.
   virtual void GetFields(std::vector<ElementField>& fields) const;
   /// Sets each property that the list has a field for; the count of fields found.
   virtual int SetFields(const std::vector<ElementField>& fields);
 
   void OnPropertyChanged(CEL_Property& changed) override;
+
+  /// Calls the visitor with each expression, its row and its property, in the order of the class's table.
+  template <class Visitor>
+  void ForEachExpression(Visitor visit) const {
+    for (const OwnProperty& own : ownProperties) {
+      if (own.row->type == ValueType::Expression) visit(*own.row, *own.property);
+    }
+  }
+
+  bool HasExpression() const;
+  /// What the symbol table holds for an element without expressions: the number of an input, the name that a
+  /// search looks for.
+  virtual std::string RecordText() const { return {}; }
 
   /// Points each property's selection at the choice that stands for its value.
   void SelectPresentValues();
@@ -143,8 +175,13 @@ class CEL_Element : public PropertyListener {
   int SetBaseFields(const std::vector<ElementField>& fields);
   int SetOwnFields(const std::vector<ElementField>& fields);
 
-  /// The unit type "User defined" and the unit type's own choices and defaults.
-  void OfferUnitTypes(std::span<const UnitTypeRow> rows);
+  /// Offers the unit types, and selects the one that stands for the present number.
+  void OfferUnitTypes(const UnitTypes& types);
+  /// What a new unit type does to the unit: a type that fixes it sets it and locks it. A number without a
+  /// type counts as "User defined", and becomes it unless the family keeps it.
+  void ApplyUnitType(const UnitTypes& types, CEL_Property& unit);
+  /// What a new scope does to the spatial variation.
+  void ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation);
 
   void RebuildOwner();
 

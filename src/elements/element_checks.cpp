@@ -3,12 +3,10 @@
 #include <algorithm>
 #include <array>
 #include <string>
-#include <utility>
 
 #include "core/error_registry.h"
 #include "elements/element.h"
 #include "expr/parser.h"
-#include "expr/scanner.h"
 #include "expr/semantic_checks.h"
 
 namespace tessal {
@@ -56,20 +54,19 @@ bool CheckTextContent(const CEL_Element& element) {
   return false;
 }
 
-bool CheckExpression(const CEL_Element& element, const CEL_Property& expression) {
-  return CheckFunctionsSpecified(element.symbol.Text(), element.GetUid(),
-                                 StripExpressionQuotes(expression.Text())) != 0;
+bool CheckExpressions(const CEL_Element& element) {
+  bool good = true;
+  element.ForEachExpression([&element, &good](const PropertyRow&, const CEL_Property& expression) {
+    good = CheckFunctions(element.symbol.Text(), element.GetUid(), expression.Parsed()) && good;
+  });
+  return good;
 }
 
-bool CompileExpression(const CEL_Element& element, std::string_view caption, const CEL_Property& expression,
-                       ExpressionNode& tree) {
-  ParsedExpression parsed = ParseExpression(StripExpressionQuotes(expression.Text()));
-  if (const ParseFailure* failure = parsed.Failure()) {
-    Errors().ReportElementError(caption, element.GetUid(), failure->message);
-    return false;
-  }
-  tree = std::move(std::get<ExpressionNode>(parsed.result));
-  return true;
+bool CheckParses(const CEL_Element& element, std::string_view caption, const CEL_Property& expression) {
+  const ParseFailure* failure = expression.Parsed().Failure();
+  if (failure == nullptr) return true;
+  Errors().ReportElementError(caption, element.GetUid(), failure->message);
+  return false;
 }
 
 }  // namespace tessal

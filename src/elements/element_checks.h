@@ -4,8 +4,6 @@
 
 #include <string_view>
 
-#include "expr/expression_node.h"
-
 namespace tessal {
 
 class CEL_Element;
@@ -19,13 +17,11 @@ bool CheckRangeOrder(const CEL_Element& element, const CEL_Property& minimum, co
 bool CheckSymbolForm(const CEL_Element& element);
 /// No "!" in the descriptive texts; reported once.
 bool CheckTextContent(const CEL_Element& element);
-/// Calls, arguments and particle properties of an expression. The result tells only whether it parses.
-bool CheckExpression(const CEL_Element& element, const CEL_Property& expression);
+/// Calls, arguments and particle properties of all expressions. The result says only whether they parse.
+bool CheckExpressions(const CEL_Element& element);
 
-/// Compiles an expression into its tree. On failure the tree keeps what it held, and the parser's message is
-/// reported under the caption.
-bool CompileExpression(const CEL_Element& element, std::string_view caption, const CEL_Property& expression,
-                       ExpressionNode& tree);
+/// Whether an expression parses; if not, the parser's message is reported under the caption.
+bool CheckParses(const CEL_Element& element, std::string_view caption, const CEL_Property& expression);
 
 /// Whether the text holds a "!", which the simulation engine's files cannot carry.
 bool HoldsIllegalText(const CEL_Element& element);

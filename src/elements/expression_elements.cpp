@@ -4,6 +4,7 @@
 
 #include "elements/element_checks.h"
 #include "keyfile/keywords.h"
+#include "keyfile/water_body.h"
 
 namespace tessal {
 
@@ -24,30 +25,30 @@ const ChoiceList& FormatChoices() {
 }
 
 constexpr std::array<PropertyRow, 5> kAuxiliaryRows = {{
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, "YES"},
-    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, "NOT_SPECIFIED"},
+    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
+    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, scope::kNotSpecified},
     {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices,
-     "HORISONTAL_AND_VERTICAL"},
+     variation::kHorizontalAndVertical},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
 }};
 
 constexpr std::array<PropertyRow, 8> kProcessRows = {{
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, "YES"},
+    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
     {key::kProcessType, "Process type", ValueType::Text, ProcessTypeChoices, "TRANSFORMATION"},
-    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, "WC"},
+    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, scope::kWaterColumn},
     {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices,
-     "HORISONTAL_AND_VERTICAL"},
+     variation::kHorizontalAndVertical},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
     // Files of older versions lack both.
-    {key::kControlId, "Control ID", ValueType::Integer, nullptr, "", -1.0, false, false, key::kControlId},
-    {key::kControlValue, "Control Value", ValueType::Real, nullptr, "", 0.8, false, false, key::kControlId},
+    OnlyWith(key::kControlId, {key::kControlId, "Control ID", ValueType::Integer, nullptr, "", -1.0}),
+    OnlyWith(key::kControlId, {key::kControlValue, "Control Value", ValueType::Real, nullptr, "", 0.8}),
 }};
 
 constexpr std::array<PropertyRow, 5> kDerivedOutputRows = {{
-    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, "NOT_SPECIFIED"},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, "NONE"},
+    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, scope::kNotSpecified},
+    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, variation::kNone},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kFormat, "Format", ValueType::Text, FormatChoices, "INSTANTANEOUS"},
     {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
@@ -66,24 +67,17 @@ void CEL_ExpressionElement::Reset() {
 }
 
 bool CEL_ExpressionElement::Check() {
-  const bool expressed = CheckExpression(*this, expression);
+  const bool expressed = CheckExpressions(*this);
   const bool worded = CheckTextContent(*this);
   return expressed && worded;
 }
 
-bool CEL_ExpressionElement::ParseExpression() {
-  return CompileExpression(*this, symbol.Text(), expression, tree);
-}
-
 void CEL_ExpressionElement::OnPropertyChanged(CEL_Property& changed) {
-  if (&changed != &scope) {
+  if (&changed == &scope) {
+    ApplyScope(scope, spatialVariation);
+  } else {
     RebuildOwner();
-    return;
   }
-  const std::string_view variation = SpatialVariationOfScope(scope.Text());
-  if (!variation.empty()) spatialVariation.SetText(variation);
-  // A form opens on the selection, and would store it over the new variation.
-  SelectPresentValues();
 }
 
 CEL_Auxilliary_Variable::CEL_Auxilliary_Variable(std::string_view caption)

@@ -3,19 +3,15 @@
 #pragma once
 
 #include "elements/element.h"
-#include "expr/expression_node.h"
 
 namespace tessal {
 
-/// What the three share: a place in the water body, a unit, an expression and its tree.
+/// What the three share: a place in the water body, a unit, and an expression.
 class CEL_ExpressionElement : public CEL_Element {
  public:
   void Reset() override;
   bool Check() override;
-  bool ParseExpression() override;
   void OnPropertyChanged(CEL_Property& changed) override;
-
-  const ExpressionNode& Tree() const { return tree; }
 
   CEL_Property scope{ValueType::Text};
   CEL_Property spatialVariation{ValueType::Text};
@@ -24,9 +20,6 @@ class CEL_ExpressionElement : public CEL_Element {
 
  protected:
   CEL_ExpressionElement(ElementKind kindNumber, std::string_view caption);
-
- private:
-  ExpressionNode tree;
 };
 
 class CEL_Auxilliary_Variable final : public CEL_ExpressionElement {

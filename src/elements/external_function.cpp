@@ -26,7 +26,7 @@ const ChoiceList& ParameterChoices() {
     for (std::int32_t count = 1; count <= kMostParameters; ++count) {
       choices.push_back(CEL_Choice::Number(std::to_string(count), count));
     }
-    return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+    return ShareChoices(std::move(choices));
   }();
   return kList;
 }

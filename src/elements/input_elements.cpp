@@ -8,6 +8,8 @@
 #include "elements/element_checks.h"
 #include "expr/builtin_catalogue.h"
 #include "keyfile/keywords.h"
+#include "keyfile/water_body.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -16,26 +18,15 @@ namespace {
 constexpr InputKind kConstantKind{ElementKind::Constant, 1, ConstantBuiltinIds};
 constexpr InputKind kForcingKind{ElementKind::Forcing, 2, ForcingBuiltinIds};
 
-constexpr std::string_view kUserDefined = "User defined";
 constexpr std::int32_t kNoBuiltin = -1;
 
-constexpr std::array<UnitTypeRow, 2> kUnitTypes = {{
-    {"Process rate", 100150, 0, "/d"},
-    {kUserDefined, kUserDefinedUnit, 0, ""},
-}};
-
-const ChoiceList& UnitTypeChoices() {
-  static const ChoiceList kList = MakeUnitTypeChoices(kUnitTypes);
-  return kList;
-}
-
 constexpr std::array<PropertyRow, 8> kRows = {{
-    {key::kIsUserSpecified, "Is user specified", ValueType::Boolean, YesNoChoices, "YES"},
+    {key::kIsUserSpecified, "Is user specified", ValueType::Boolean, YesNoChoices, kYes},
     {key::kBuiltInId, "Build in ID", ValueType::Integer, nullptr, "", kNoBuiltin},
-    {key::kScope, "Scope", ValueType::Text, InputScopeChoices, "NOT_SPECIFIED"},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, "NONE"},
+    {key::kScope, "Scope", ValueType::Text, InputScopeChoices, scope::kNotSpecified},
+    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, variation::kNone},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0, true},
+    ReadLast({key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0}),
     {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
     {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
 }};
@@ -47,7 +38,7 @@ ChoiceList BuiltinChoices(const InputKind& input, bool withDeprecated, std::int3
     if (IsDeprecatedBuiltin(builtinId) && !withDeprecated && builtinId != inUse) continue;
     if (GetBuiltinById(builtinId, row) == 0) choices.push_back(CEL_Choice::Number(row.name, builtinId));
   }
-  return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+  return ShareChoices(std::move(choices));
 }
 
 /// The list of an element that shows no deprecated row is the same for all of its kind.
@@ -63,7 +54,7 @@ CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
     : CEL_Element(caption), input(inputKind) {
   SetKind(input.kind);
   SetUnitMode(UnitMode::Both);
-  unqType.SetChoices(UnitTypeChoices());
+  OfferUnitTypes(kInputUnitTypes);
   Bind(kRows,
        {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
   ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
@@ -96,6 +87,10 @@ void CEL_Input::RebuildBuiltInChoices(bool withDeprecated) {
   SelectPresentValues();
 }
 
+std::string CEL_Input::RecordText() const {
+  return SixDigitNumberText(defaultValue.RealValue());
+}
+
 bool CEL_Input::Check() {
   const bool inRange = CheckDefaultInRange(*this, minValue, defaultValue, maxValue);
   const bool ordered = CheckRangeOrder(*this, minValue, maxValue);
@@ -110,11 +105,9 @@ void CEL_Input::OnPropertyChanged(CEL_Property& changed) {
   if (&changed == &builtInId) {
     ApplyBuiltin();
   } else if (&changed == &unqType) {
-    ApplyUnitType();
+    ApplyUnitType(kInputUnitTypes, unit);
   } else if (&changed == &scope) {
-    const std::string_view variation = SpatialVariationOfScope(scope.Text());
-    if (!variation.empty()) spatialVariation.SetText(variation);
-    SelectPresentValues();
+    ApplyScope(scope, spatialVariation);
   } else {
     RebuildOwner();
   }
@@ -154,19 +147,6 @@ void CEL_Input::ApplyBuiltin() {
   SetDataEditable(false);
   SelectPresentValues();
   RebuildOwner();
-}
-
-void CEL_Input::ApplyUnitType() {
-  const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
-  if (row == nullptr) {
-    unqType.SetInt(kUserDefinedUnit);
-    SelectPresentValues();
-    unit.SetEditable(true);
-    return;
-  }
-  const bool fixesUnit = row->unqType != kUserDefinedUnit;
-  if (fixesUnit) unit.SetText(row->unit);
-  unit.SetEditable(!fixesUnit);
 }
 
 }  // namespace tessal

@@ -20,6 +20,7 @@ class CEL_Input : public CEL_Element {
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  std::string RecordText() const override;
 
   /// Fills the choices of the built-in id: the catalogue's rows of this kind by name, deprecated ones only
   /// when asked for or in use.
@@ -39,7 +40,6 @@ class CEL_Input : public CEL_Element {
 
  private:
   void ApplyBuiltin();
-  void ApplyUnitType();
   void SetDataEditable(bool editable);
 
   const InputKind& input;

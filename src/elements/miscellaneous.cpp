@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "elements/element_checks.h"
+#include "elements/list_section.h"
 #include "elements/property_io.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
@@ -30,27 +31,26 @@ const ChoiceList& DebugLevelChoices() {
     for (std::size_t level = 0; level < kDebugLevels.size(); ++level) {
       choices.push_back(CEL_Choice::Number(kDebugLevels[level], static_cast<std::int32_t>(level)));
     }
-    return std::make_shared<const std::vector<CEL_Choice>>(std::move(choices));
+    return ShareChoices(std::move(choices));
   }();
   return kList;
 }
 
-// The last column names the keywords that old files lack and that are not reported when they do.
+// Old files lack some keywords, and that is not reported.
 constexpr std::array<PropertyRow, 11> kRows = {{
     {key::kTessalVersion, "Tessal version", ValueType::Real},
     {key::kParserVersion, "Parser version", ValueType::Real},
-    {key::kDocumentRevision, "Revision", ValueType::Integer, nullptr, "", 0.0, false, true,
-     key::kDocumentRevision},
+    ListedLast(OnlyWith(key::kDocumentRevision, {key::kDocumentRevision, "Revision", ValueType::Integer})),
     {key::kRandSeed, "Randseed", ValueType::Integer},
     {key::kDebugLevel, "Debug level", ValueType::Integer, DebugLevelChoices},
     {key::kDebugLog, "Debug log", ValueType::Text},
-    {key::kRandomParticleDir, "Inital random particle dir", ValueType::Boolean, YesNoChoices, "NO"},
-    {key::kBuildSpatialTree, "Build spatial tree", ValueType::Boolean, YesNoChoices, "NO"},
+    {key::kRandomParticleDir, "Inital random particle dir", ValueType::Boolean, YesNoChoices, kNo},
+    {key::kBuildSpatialTree, "Build spatial tree", ValueType::Boolean, YesNoChoices, kNo},
     {key::kChecksum, "Checksum", ValueType::Text, nullptr, "0"},
-    {key::kOptimise, "Optimise expressions", ValueType::Boolean, YesNoChoices, "YES", 0.0, false, false,
-     key::kOptimise},
-    {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree", 0.0, false,
-     false, key::kTrigonometrics},
+    OnlyWith(key::kOptimise,
+             {key::kOptimise, "Optimise expressions", ValueType::Boolean, YesNoChoices, kYes}),
+    OnlyWith(key::kTrigonometrics,
+             {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree"}),
 }};
 
 }  // namespace
@@ -84,14 +84,8 @@ void CEL_Miscanellous::Read(KvfNode section, int& status) {
   CEL_Element::Read(section, status);
   tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
   parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));
-  const KvfNode list = kvfSectionByNameNum(section, section::kExternalFunctions, 1);
-  if (list != nullptr) {
-    functionHead.Read(list, status);
-    const int count = kvfGetNoSections(list);
-    for (int number = 1; number <= count; ++number) {
-      AddExternalFunction().Read(kvfSectionByNum(list, number), status);
-    }
-  }
+  ReadList(section, section::kExternalFunctions, &functionHead, status,
+           [this]() -> CEL_Element& { return AddExternalFunction(); });
   visibilities.Read(section, status);
 }
 
@@ -102,14 +96,8 @@ void CEL_Miscanellous::Write(KvfHandle file, int& status) {
   }
   CEL_Element::Write(file, status);
   if (!functions.empty()) {
-    kvfAddSection(file, section::kExternalFunctions);
-    functionHead.Write(file, status);
-    for (std::size_t index = 0; index < functions.size(); ++index) {
-      kvfAddSection(file, std::string(section::kExternalFunctionPrefix) + std::to_string(index + 1));
-      functions[index]->Write(file, status);
-      kvfEndSection(file);
-    }
-    kvfEndSection(file);
+    WriteList(functions, section::kExternalFunctions, section::kExternalFunctionPrefix, &functionHead, file,
+              status);
   }
   if (!visibilities.groups.empty()) visibilities.Write(file, status);
 }

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "expr/parser.h"
+#include "expr/scanner.h"
 #include "platform/number_text.h"
 
 namespace tessal {
@@ -18,9 +20,6 @@ std::int32_t NextValueSerial() {
   static std::int32_t serial = 0;
   return ++serial;
 }
-
-constexpr std::string_view kYes = "YES";
-constexpr std::string_view kNo = "NO";
 
 }  // namespace
 
@@ -53,6 +52,10 @@ void SetNotifyChanges(bool on) {
   NotificationSwitch() = on;
 }
 
+CEL_Property::CEL_Property(ValueType valueType) : type(valueType) {}
+
+CEL_Property::~CEL_Property() = default;
+
 bool CEL_Property::SetInt(std::int32_t value) {
   if (type != ValueType::Integer) return false;
   if (value == intValue) return true;
@@ -82,6 +85,7 @@ bool CEL_Property::SetText(std::string_view value) {
   if (value == text) return true;
   std::string replacement(value);  // the view may lie in the text that is replaced
   prevText = std::exchange(text, std::move(replacement));
+  parsed.reset();
   RaiseChange();
   return true;
 }
@@ -97,6 +101,10 @@ std::string CEL_Property::TextOf() const {
     default:
       return text;
   }
+}
+
+const ParsedExpression& CEL_Property::Parsed() const {
+  return ParseOnce(parsed, StripExpressionQuotes(text));
 }
 
 std::int32_t CEL_Property::ChangeStamp() {

@@ -48,6 +48,7 @@ struct CEL_Choice {
 using ChoiceList = std::shared_ptr<const std::vector<CEL_Choice>>;
 
 class CEL_Property;
+struct ParsedExpression;
 
 /// Who wants to know of changes. Called after the change, in order of registration.
 class PropertyListener {
@@ -60,6 +61,10 @@ class PropertyListener {
   PropertyListener& operator=(const PropertyListener&) = default;
   ~PropertyListener() = default;
 };
+
+/// The words of a boolean, in files and choices.
+inline constexpr std::string_view kYes = "YES";
+inline constexpr std::string_view kNo = "NO";
 
 /// The process-wide switch of all listeners. Off at start, during a load and during a rebuild.
 bool NotifyChanges();
@@ -81,7 +86,8 @@ class NotificationsOff final {
 
 class CEL_Property final {
  public:
-  explicit CEL_Property(ValueType valueType) : type(valueType) {}
+  explicit CEL_Property(ValueType valueType);
+  ~CEL_Property();
   CEL_Property(const CEL_Property&) = delete;
   CEL_Property& operator=(const CEL_Property&) = delete;
 
@@ -104,6 +110,10 @@ class CEL_Property final {
 
   /// The value as text: numbers in decimal, booleans as "YES" or "NO", texts as they stand.
   std::string TextOf() const;
+
+  /// The parse of an expression, its quotes stripped. It is held beside the text and made when it is first
+  /// asked for after a change; asking has the effect of a parse on the scanner's start all the same.
+  const ParsedExpression& Parsed() const;
 
   /// A number that identifies the property to its listeners, drawn on first need.
   std::int32_t ChangeStamp();
@@ -165,6 +175,7 @@ class CEL_Property final {
   bool forceReal = false;
   ChoiceList choices;
   std::vector<PropertyListener*> listeners;
+  mutable std::unique_ptr<const ParsedExpression> parsed;
 };
 
 }  // namespace tessal

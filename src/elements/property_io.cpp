@@ -12,8 +12,6 @@ namespace tessal {
 namespace {
 
 constexpr std::string_view kBlanks = " \n\r\t";
-constexpr std::string_view kYes = "YES";
-constexpr std::string_view kNo = "NO";
 
 std::string& LastKeyErrorText() {
   static std::string text;

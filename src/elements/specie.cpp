@@ -4,11 +4,10 @@
 #include <optional>
 
 #include "core/error_registry.h"
-#include "elements/element_checks.h"
 #include "elements/element_owner.h"
-#include "elements/property_io.h"
 #include "expr/semantic_checks.h"
 #include "keyfile/keywords.h"
+#include "keyfile/water_body.h"
 
 namespace tessal {
 
@@ -23,9 +22,9 @@ const ChoiceList& TransportChoices() {
 
 // In file order; people read the transport before the two numbers.
 constexpr std::array<PropertyRow, 4> kRows = {{
-    {key::kScope, "Scope", ValueType::Text, nullptr, "WC"},
-    {key::kProjectionTime, "Projection time", ValueType::Real, nullptr, "", 0.0, false, true},
-    {key::kFieldOfView, "Field of view", ValueType::Real, nullptr, "", 180.0, false, true},
+    {key::kScope, "Scope", ValueType::Text, nullptr, scope::kWaterColumn},
+    ListedLast({key::kProjectionTime, "Projection time", ValueType::Real, nullptr, "", 0.0}),
+    ListedLast({key::kFieldOfView, "Field of view", ValueType::Real, nullptr, "", 180.0}),
     {key::kTransport, "Transport", ValueType::Text, TransportChoices, kTransports[0]},
 }};
 
@@ -41,79 +40,6 @@ constexpr std::array<TextRow, 4> kTextRows = {{
     {"Documentation", &CEL_Element::documentation},
     {"Online help", &CEL_Element::onlineHelp},
 }};
-
-/// Reads one list section: its head keywords, then a member for each sub-section by position.
-template <class AddMember>
-void ReadList(KvfNode specie, std::string_view name, CEL_Element* head, int& status, AddMember addMember) {
-  const KvfNode list = kvfSectionByNameNum(specie, name, 1);
-  if (list == nullptr) return;
-  if (head != nullptr) head->Read(list, status);
-  const int count = kvfGetNoSections(list);
-  for (int number = 1; number <= count; ++number) {
-    CEL_Element& member = addMember();
-    member.Read(kvfSectionByNum(list, number), status);
-    member.SetLoaded(true);
-  }
-}
-
-template <class Member>
-void WriteList(const Sequence<Member>& members, std::string_view name, std::string_view memberPrefix,
-               CEL_Element* head, KvfHandle file, int& status) {
-  kvfAddSection(file, name);
-  if (head != nullptr) head->Write(file, status);
-  for (std::size_t place = 0; place < members.size(); ++place) {
-    kvfAddSection(file, std::string(memberPrefix) + std::to_string(place + 1));
-    members[place]->Write(file, status);
-    kvfEndSection(file);
-  }
-  kvfEndSection(file);
-}
-
-Finding NotOfThisClass(std::string_view what, const CEL_Element& used, const CEL_Element& specie) {
-  return {"foreign-member", {what, used.symbol.Text(), specie.symbol.Text()}};
-}
-
-/// What a state variable's equation may use: the arithmetic expressions of its class.
-std::optional<Finding> FindEquationFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
-  if (used.Kind() != ElementKind::ArithmeticExpression) {
-    return Finding("foreign-equation-term", {used.symbol.Text(), specie.symbol.Text()});
-  }
-  const auto& expression = static_cast<const CEL_Lagrange_Arithmetical_Expression&>(used);
-  if (expression.specie.IntValue() == specie.Index()) return std::nullopt;
-  return NotOfThisClass("expression", used, specie);
-}
-
-/// What other members may use: the template's inputs and state variables, and members of their own class.
-std::optional<Finding> FindExpressionFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
-  switch (used.Kind()) {
-    case ElementKind::StateVariable:
-    case ElementKind::Constant:
-    case ElementKind::Forcing:
-      return std::nullopt;
-    case ElementKind::SpecieStateVariable:
-      if (specie.Owns(used)) return std::nullopt;
-      return Finding("foreign-state-variable", {used.symbol.Text(), specie.symbol.Text()});
-    case ElementKind::SpecieConstant:
-      if (specie.Owns(used)) return std::nullopt;
-      return NotOfThisClass("constant", used, specie);
-    case ElementKind::SpatialFunction:
-      if (specie.Owns(used)) return std::nullopt;
-      return NotOfThisClass("spatial function", used, specie);
-    case ElementKind::ArithmeticExpression:
-      if (specie.Owns(used)) return std::nullopt;
-      return NotOfThisClass("expression", used, specie);
-    default:
-      if (specie.Owns(used)) return std::nullopt;
-      return NotOfThisClass("symbol", used, specie);
-  }
-}
-
-/// Whether an element is declared behind its user. A class that is not behind this one is known already.
-bool IsDeclaredAfter(const CEL_Element& used, const CEL_Element& user, const CEL_Lagrange_Specie& specie) {
-  if (used.id.IntValue() <= user.id.IntValue()) return false;
-  if (used.Kind() != ElementKind::Specie) return true;
-  return static_cast<const CEL_Lagrange_Specie&>(used).Index() > specie.Index();
-}
 
 }  // namespace
 
@@ -144,12 +70,7 @@ bool CEL_Lagrange_Specie::Owns(const CEL_Element& element) const {
 }
 
 void CEL_Lagrange_Specie::DropMembers() {
-  stateVariables.clear();
-  constants.clear();
-  forcings.clear();
-  spatialFunctions.clear();
-  arithmeticExpressions.clear();
-  horizontalVectors.clear();
+  ForEachMemberList([this](const auto& list) { (this->*list.members).clear(); });
   verticalEquation = std::make_unique<CEL_Lagrange_Vertical_Equation>("Downward Velocity");
   Adopt(*verticalEquation, ElementKind::VerticalEquationList);
 }
@@ -162,18 +83,10 @@ void CEL_Lagrange_Specie::Reset() {
   DropMembers();
 }
 
-template <class Member>
-void CEL_Lagrange_Specie::Adopt(Member& member, ElementKind listKind) {
+void CEL_Lagrange_Specie::Adopt(CEL_Element& member, ElementKind listKind) {
   member.SetListHeader(&Head(listKind));
   member.SetOwner(Owner());
   member.SetModifiedFlag(templateModified);
-}
-
-template <class Member>
-Member& CEL_Lagrange_Specie::Append(Sequence<Member>& members, ElementKind listKind, std::string_view word) {
-  members.push_back(std::make_unique<Member>(UnusedSymbol(word, members.size() + 1)));
-  Adopt(*members.back(), listKind);
-  return *members.back();
 }
 
 std::string CEL_Lagrange_Specie::UnusedSymbol(std::string_view word, std::size_t number) const {
@@ -185,147 +98,55 @@ std::string CEL_Lagrange_Specie::UnusedSymbol(std::string_view word, std::size_t
   return candidate;
 }
 
-CEL_Lagrange_StateVariable& CEL_Lagrange_Specie::AddStateVariable() {
-  auto& member = Append(stateVariables, ElementKind::SpecieStateVariableList, "StateVariable_");
-  member.specie.SetInt(index);
-  return member;
-}
-
-CEL_Lagrange_Constant& CEL_Lagrange_Specie::AddConstant() {
-  return Append(constants, ElementKind::SpecieConstantList, "Constant_");
-}
-
-CEL_Lagrange_Forcing& CEL_Lagrange_Specie::AddForcing() {
-  return Append(forcings, ElementKind::SpecieForcingList, "Forcing_");
-}
-
-CEL_Lagrange_Spatial_Function& CEL_Lagrange_Specie::AddSpatialFunction() {
-  return Append(spatialFunctions, ElementKind::SpatialFunctionList, "Search_Function_");
-}
-
-CEL_Lagrange_Arithmetical_Expression& CEL_Lagrange_Specie::AddArithmeticExpression() {
-  auto& member =
-      Append(arithmeticExpressions, ElementKind::ArithmeticExpressionList, "Arithmetic_Expression_");
-  member.specie.SetInt(index);
-  return member;
-}
-
-CEL_Lagrange_Horizontal_Vector& CEL_Lagrange_Specie::AddHorizontalVector() {
-  std::size_t number = horizontalVectors.size() + 1;
-  const auto caption = [&number] { return "Horizontal Vector" + std::to_string(number); };
+std::string CEL_Lagrange_Specie::UnusedCaption(std::string_view word, std::size_t number) const {
+  std::string candidate = std::string(word) + std::to_string(number);
   while (std::any_of(horizontalVectors.begin(), horizontalVectors.end(),
-                     [&caption](const auto& vector) { return vector->symbol.Text() == caption(); })) {
-    ++number;
+                     [&candidate](const auto& vector) { return vector->symbol.Text() == candidate; })) {
+    candidate = std::string(word) + std::to_string(++number);
   }
-  horizontalVectors.push_back(std::make_unique<CEL_Lagrange_Horizontal_Vector>(caption()));
-  Adopt(*horizontalVectors.back(), ElementKind::HorizontalVectorList);
-  return *horizontalVectors.back();
+  return candidate;
+}
+
+template <class Member>
+Member& CEL_Lagrange_Specie::Add(const MemberList<Member>& list) {
+  auto& members = this->*list.members;
+  // Movements have captions of their own, which the class's name does not begin.
+  const bool isMovement = list.kind == ElementKind::HorizontalVector;
+  members.push_back(std::make_unique<Member>(isMovement ? UnusedCaption(list.word, members.size() + 1)
+                                                        : UnusedSymbol(list.word, members.size() + 1)));
+  Member& member = *members.back();
+  Adopt(member, list.listKind);
+  if constexpr (requires { member.specie; }) member.specie.SetInt(index);
+  return member;
+}
+
+CEL_Element* CEL_Lagrange_Specie::AddMember(ElementKind kind) {
+  CEL_Element* added = nullptr;
+  ForEachMemberList([this, kind, &added](const auto& list) {
+    if (list.kind == kind) added = &Add(list);
+  });
+  return added;
 }
 
 void CEL_Lagrange_Specie::StampMembers() {
-  for (const auto& member : stateVariables) member->specie.SetInt(index);
-  for (const auto& member : arithmeticExpressions) member->specie.SetInt(index);
+  ForEachMemberList([this](const auto& list) {
+    for (const auto& member : this->*list.members) {
+      if constexpr (requires { member->specie; }) member->specie.SetInt(index);
+    }
+  });
 }
-
-namespace {
-
-/// Calls the visitor with every member of a class, in the order of its lists.
-template <class Visitor>
-void ForEachMember(const CEL_Lagrange_Specie& specie, Visitor visit) {
-  for (const auto& member : specie.stateVariables) visit(*member);
-  for (const auto& member : specie.constants) visit(*member);
-  for (const auto& member : specie.forcings) visit(*member);
-  for (const auto& member : specie.spatialFunctions) visit(*member);
-  for (const auto& member : specie.arithmeticExpressions) visit(*member);
-  for (const auto& member : specie.horizontalVectors) visit(*member);
-  visit(*specie.verticalEquation);
-}
-
-}  // namespace
 
 void CEL_Lagrange_Specie::SetOwner(ElementOwner* template_) {
   CEL_Element::SetOwner(template_);
   for (const auto& head : heads) head->SetOwner(template_);
-  ForEachMember(*this, [template_](CEL_Element& member) { member.SetOwner(template_); });
+  ForEachMember([template_](CEL_Element& member) { member.SetOwner(template_); });
 }
 
 void CEL_Lagrange_Specie::BindMembers(bool* flag) {
   templateModified = flag;
   CEL_Element::SetModifiedFlag(flag);
   for (const auto& head : heads) head->SetModifiedFlag(flag);
-  ForEachMember(*this, [flag](CEL_Element& member) { member.SetModifiedFlag(flag); });
-}
-
-void CEL_Lagrange_Specie::Read(KvfNode section, int& status) {
-  if (!kvfIsSection(section)) return;
-  DropMembers();
-  ReadBase(section, status);
-  ReadProperty(symbol, section, key::kName, status);
-  ReadProperty(description, section, key::kDescription, status);
-  ReadProperty(onlineHelp, section, key::kOnlineHelp, status);
-  ReadProperty(documentation, section, key::kDocumentation, status);
-  ReadOwn(section, status);
-
-  ReadList(section, section::kStateVariables, &Head(ElementKind::SpecieStateVariableList), status,
-           [this]() -> CEL_Element& { return AddStateVariable(); });
-  ReadList(section, section::kConstants, &Head(ElementKind::SpecieConstantList), status,
-           [this]() -> CEL_Element& { return AddConstant(); });
-  ReadList(section, section::kForcings, &Head(ElementKind::SpecieForcingList), status,
-           [this]() -> CEL_Element& { return AddForcing(); });
-  ReadList(section, section::kSpatialFunctions, &Head(ElementKind::SpatialFunctionList), status,
-           [this]() -> CEL_Element& { return AddSpatialFunction(); });
-  ReadList(section, section::kArithmeticalExpressions, &Head(ElementKind::ArithmeticExpressionList), status,
-           [this]() -> CEL_Element& { return AddArithmeticExpression(); });
-  ReadEquations(section, status);
-  ReadList(section, section::kHorizontalVectors, nullptr, status,
-           [this]() -> CEL_Element& { return AddHorizontalVector(); });
-  const KvfNode vertical = kvfSectionByNameNum(section, section::kVerticalSpeedEquation, 1);
-  if (vertical != nullptr) verticalEquation->Read(vertical, status);
-}
-
-void CEL_Lagrange_Specie::ReadEquations(KvfNode section, int& status) {
-  const KvfNode equations = kvfSectionByNameNum(section, section::kLagrangeEquations, 1);
-  if (equations == nullptr) return;
-  const int count = kvfGetNoSections(equations);
-  for (int number = 1; number <= count; ++number) {
-    At(stateVariables, static_cast<std::size_t>(number - 1))
-        .ReadEquation(kvfSectionByNum(equations, number), status);
-  }
-}
-
-void CEL_Lagrange_Specie::Write(KvfHandle file, int& status) {
-  WriteProperty(symbol, file, key::kName, *this, status);
-  WriteProperty(description, file, key::kDescription, *this, status);
-  WriteProperty(onlineHelp, file, key::kOnlineHelp, *this, status);
-  WriteProperty(documentation, file, key::kDocumentation, *this, status);
-  WriteOwn(file, status);
-
-  WriteList(stateVariables, section::kStateVariables, section::kStateVariablePrefix,
-            &Head(ElementKind::SpecieStateVariableList), file, status);
-  WriteList(constants, section::kConstants, section::kConstantPrefix, &Head(ElementKind::SpecieConstantList),
-            file, status);
-  WriteList(forcings, section::kForcings, section::kForcingPrefix, &Head(ElementKind::SpecieForcingList),
-            file, status);
-  WriteList(spatialFunctions, section::kSpatialFunctions, section::kSpatialFunctionPrefix,
-            &Head(ElementKind::SpatialFunctionList), file, status);
-  WriteList(arithmeticExpressions, section::kArithmeticalExpressions, section::kArithmeticalExpressionPrefix,
-            &Head(ElementKind::ArithmeticExpressionList), file, status);
-  WriteEquations(file, status);
-  WriteList(horizontalVectors, section::kHorizontalVectors, section::kHorizontalVectorPrefix, nullptr, file,
-            status);
-  kvfAddSection(file, section::kVerticalSpeedEquation);
-  verticalEquation->Write(file, status);
-  kvfEndSection(file);
-}
-
-void CEL_Lagrange_Specie::WriteEquations(KvfHandle file, int& status) {
-  kvfAddSection(file, section::kLagrangeEquations);
-  for (std::size_t place = 0; place < stateVariables.size(); ++place) {
-    kvfAddSection(file, std::string(section::kStateVariableEquationPrefix) + std::to_string(place + 1));
-    stateVariables[place]->WriteEquation(file, status);
-    kvfEndSection(file);
-  }
-  kvfEndSection(file);
+  ForEachMember([flag](CEL_Element& member) { member.SetModifiedFlag(flag); });
 }
 
 void CEL_Lagrange_Specie::GetFields(std::vector<ElementField>& fields) const {
@@ -341,45 +162,6 @@ int CEL_Lagrange_Specie::SetFields(const std::vector<ElementField>& fields) {
     if (field != nullptr && SetFromField(this->*row.property, *field)) ++found;
   }
   return found + SetOwnFields(fields);
-}
-
-bool CEL_Lagrange_Specie::ParseExpression() {
-  bool good = true;
-  const auto parse = [&good](CEL_Element& member) { good = member.ParseExpression() && good; };
-  for (const auto& member : arithmeticExpressions) parse(*member);
-  for (const auto& member : stateVariables) parse(*member);
-  for (const auto& member : horizontalVectors) parse(*member);
-  parse(*verticalEquation);
-  return good;
-}
-
-bool CEL_Lagrange_Specie::Check() {
-  bool good = CheckTextContent(*this);
-  const auto check = [this, &good](const CEL_Element& member) {
-    good = CheckMemberReferences(member) && good;
-  };
-  for (const auto& member : stateVariables) check(*member);
-  for (const auto& member : arithmeticExpressions) check(*member);
-  for (const auto& member : horizontalVectors) check(*member);
-  check(*verticalEquation);
-  return good;
-}
-
-bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const {
-  if (Owner() == nullptr) return true;
-  const bool isEquation = member.Kind() == ElementKind::SpecieStateVariable;
-  bool good = true;
-  for (const CEL_Element* used : Owner()->ReferencedElements(member)) {
-    auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
-    // Equations use what they use regardless of order: state variables are integrated.
-    if (!isEquation && IsDeclaredAfter(*used, member, *this)) {
-      finding = Finding("order-violated", {used->symbol.Text(), member.symbol.Text()});
-    }
-    if (!finding) continue;
-    Errors().Report(member.symbol.Text(), member.GetUid(), *finding);
-    good = false;
-  }
-  return good;
 }
 
 void CEL_Lagrange_Specie::OnPropertyChanged(CEL_Property& changed) {

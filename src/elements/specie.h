@@ -5,14 +5,34 @@
 
 #include <array>
 #include <memory>
+#include <tuple>
 
 #include "elements/area_search.h"
 #include "elements/element.h"
 #include "elements/sequence.h"
 #include "elements/specie_expressions.h"
 #include "elements/specie_values.h"
+#include "keyfile/keywords.h"
 
 namespace tessal {
+
+class CEL_Lagrange_Specie;
+
+/// A list of members: where the class holds it, what is in it, and how it is in the file.
+template <class Member>
+struct MemberList {
+  Sequence<Member> CEL_Lagrange_Specie::*members;
+  ElementKind kind;
+  ElementKind listKind;
+  std::string_view section;
+  std::string_view prefix;  ///< of the sub-sections
+  std::string_view word;    ///< begins a default symbol, after the class's name
+  bool hasHead;             ///< whether the file holds the texts of the list's head
+};
+
+template <class Member>
+MemberList(Sequence<Member> CEL_Lagrange_Specie::*, ElementKind, ElementKind, std::string_view,
+           std::string_view, std::string_view, bool) -> MemberList<Member>;
 
 class CEL_Lagrange_Specie final : public CEL_Element {
  public:
@@ -40,12 +60,12 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   /// Writes the class's number into the members that name their class, where it differs.
   void StampMembers();
 
-  CEL_Lagrange_StateVariable& AddStateVariable();
-  CEL_Lagrange_Constant& AddConstant();
-  CEL_Lagrange_Forcing& AddForcing();
-  CEL_Lagrange_Spatial_Function& AddSpatialFunction();
-  CEL_Lagrange_Arithmetical_Expression& AddArithmeticExpression();
-  CEL_Lagrange_Horizontal_Vector& AddHorizontalVector();
+  /// Makes a member of the kind at the end of its list, with a symbol that is not in use; none for a kind
+  /// without a list.
+  CEL_Element* AddMember(ElementKind kind);
+  /// Calls the visitor with every member, in the order of the lists.
+  template <class Visitor>
+  void ForEachMember(Visitor visit) const;
 
   /// The list heads, in the order of the kinds 28 to 34.
   CEL_ListHead& Head(ElementKind listKind) const;
@@ -68,19 +88,62 @@ class CEL_Lagrange_Specie final : public CEL_Element {
 
  private:
   template <class Member>
-  Member& Append(Sequence<Member>& members, ElementKind listKind, std::string_view word);
-  template <class Member>
-  void Adopt(Member& member, ElementKind listKind);
+  Member& Add(const MemberList<Member>& list);
+  void Adopt(CEL_Element& member, ElementKind listKind);
   std::string UnusedSymbol(std::string_view word, std::size_t number) const;
+  std::string UnusedCaption(std::string_view word, std::size_t number) const;
 
   void DropMembers();
-  void ReadEquations(KvfNode section, int& status);
-  void WriteEquations(KvfHandle file, int& status);
   bool CheckMemberReferences(const CEL_Element& member) const;
 
   std::int32_t index = 0;
   bool* templateModified = nullptr;
   std::array<std::unique_ptr<CEL_ListHead>, kListCount> heads;
 };
+
+/// The lists of a class, in the order of the file. The equations come before the movements, and the one
+/// downward movement after them.
+inline constexpr std::tuple kMemberLists{
+    MemberList{&CEL_Lagrange_Specie::stateVariables, ElementKind::SpecieStateVariable,
+               ElementKind::SpecieStateVariableList, section::kStateVariables, section::kStateVariablePrefix,
+               "StateVariable_", true},
+    MemberList{&CEL_Lagrange_Specie::constants, ElementKind::SpecieConstant, ElementKind::SpecieConstantList,
+               section::kConstants, section::kConstantPrefix, "Constant_", true},
+    MemberList{&CEL_Lagrange_Specie::forcings, ElementKind::SpecieForcing, ElementKind::SpecieForcingList,
+               section::kForcings, section::kForcingPrefix, "Forcing_", true},
+    MemberList{&CEL_Lagrange_Specie::spatialFunctions, ElementKind::SpatialFunction,
+               ElementKind::SpatialFunctionList, section::kSpatialFunctions, section::kSpatialFunctionPrefix,
+               "Search_Function_", true},
+    MemberList{&CEL_Lagrange_Specie::arithmeticExpressions, ElementKind::ArithmeticExpression,
+               ElementKind::ArithmeticExpressionList, section::kArithmeticalExpressions,
+               section::kArithmeticalExpressionPrefix, "Arithmetic_Expression_", true},
+    MemberList{&CEL_Lagrange_Specie::horizontalVectors, ElementKind::HorizontalVector,
+               ElementKind::HorizontalVectorList, section::kHorizontalVectors,
+               section::kHorizontalVectorPrefix, "Horizontal Vector", false},
+};
+
+/// Calls the visitor with each row of the lists.
+template <class Visitor>
+void ForEachMemberList(Visitor visit) {
+  std::apply([&visit](const auto&... list) { (visit(list), ...); }, kMemberLists);
+}
+
+/// Calls the operation with the row of the kind; false for a kind without a list.
+template <class Operation>
+bool WithMemberList(ElementKind kind, Operation operation) {
+  return std::apply(
+      [kind, &operation](const auto&... list) {
+        return ((list.kind == kind && (operation(list), true)) || ...);
+      },
+      kMemberLists);
+}
+
+template <class Visitor>
+void CEL_Lagrange_Specie::ForEachMember(Visitor visit) const {
+  ForEachMemberList([this, &visit](const auto& list) {
+    for (const auto& member : this->*list.members) visit(*member);
+  });
+  visit(*verticalEquation);
+}
 
 }  // namespace tessal

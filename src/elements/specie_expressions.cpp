@@ -14,8 +14,8 @@ constexpr std::string_view kProcessType = "PROCESS";
 constexpr std::array<std::string_view, 1> kVariations = {"PER_INDIVIDUAL"};
 
 const ChoiceList& ExpressionTypeChoices() {
-  static const ChoiceList kList = std::make_shared<const std::vector<CEL_Choice>>(std::vector<CEL_Choice>{
-      CEL_Choice::Text("Auxiliary variable", kAuxiliaryType), CEL_Choice::Text("Process", kProcessType)});
+  static const ChoiceList kList = ShareChoices(
+      {CEL_Choice::Text("Auxiliary variable", kAuxiliaryType), CEL_Choice::Text("Process", kProcessType)});
   return kList;
 }
 
@@ -27,19 +27,22 @@ const ChoiceList& VariationChoices() {
 constexpr std::array<PropertyRow, 6> kExpressionRows = {{
     {key::kExpressionType, "Expression type", ValueType::Text, ExpressionTypeChoices, kAuxiliaryType},
     {key::kSpecie, "Specie", ValueType::Integer},
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, "YES"},
+    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
     {key::kSpatialVariation, "Spatial Variation", ValueType::Text, VariationChoices, kVariations[0]},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
 }};
 
 constexpr std::array<PropertyRow, 2> kHorizontalRows = {{
-    {key::kExpressionHorizontalSpeed, "Speed", ValueType::Expression, nullptr, "0"},
-    {key::kExpressionHorizontalDirection, "Direction", ValueType::Expression, nullptr, "0"},
+    Captioned("horizontal speed equation",
+              {key::kExpressionHorizontalSpeed, "Speed", ValueType::Expression, nullptr, "0"}),
+    Captioned("horizontal direction equation",
+              {key::kExpressionHorizontalDirection, "Direction", ValueType::Expression, nullptr, "0"}),
 }};
 
 constexpr std::array<PropertyRow, 1> kVerticalRows = {{
-    {key::kExpressionVerticalSpeed, "Speed", ValueType::Expression, nullptr, "0"},
+    Captioned("vertical speed equation",
+              {key::kExpressionVerticalSpeed, "Speed", ValueType::Expression, nullptr, "0"}),
 }};
 
 }  // namespace
@@ -59,72 +62,39 @@ void CEL_Lagrange_Arithmetical_Expression::Reset() {
 }
 
 bool CEL_Lagrange_Arithmetical_Expression::Check() {
-  const bool expressed = CheckExpression(*this, expression);
+  const bool expressed = CheckExpressions(*this);
   const bool worded = CheckTextContent(*this);
   return expressed && worded;
-}
-
-bool CEL_Lagrange_Arithmetical_Expression::ParseExpression() {
-  return CompileExpression(*this, symbol.Text(), expression, tree);
 }
 
 void CEL_Lagrange_Arithmetical_Expression::Classify(bool isProcess) {
   expressionType.SetText(isProcess ? kProcessType : kAuxiliaryType);
 }
 
-CEL_Lagrange_Horizontal_Vector::CEL_Lagrange_Horizontal_Vector(std::string_view caption)
-    : CEL_Element(caption) {
-  SetKind(ElementKind::HorizontalVector);
+CEL_Movement::CEL_Movement(ElementKind kind, std::string_view caption) : CEL_Element(caption) {
+  SetKind(kind);
   SetFileFlags(false, false, false);
+}
+
+bool CEL_Movement::Check() {
+  return CheckExpressions(*this);
+}
+
+void CEL_Movement::GetFields(std::vector<ElementField>& fields) const {
+  AppendCaption(fields);
+  AppendOwnFields(fields);
+}
+
+CEL_Lagrange_Horizontal_Vector::CEL_Lagrange_Horizontal_Vector(std::string_view caption)
+    : CEL_Movement(ElementKind::HorizontalVector, caption) {
   Bind(kHorizontalRows, {&speed, &direction});
   ListenTo({&speed, &direction});
 }
 
-bool CEL_Lagrange_Horizontal_Vector::Check() {
-  const bool speedGood = CheckExpression(*this, speed);
-  const bool directionGood = CheckExpression(*this, direction);
-  return speedGood && directionGood;
-}
-
-bool CEL_Lagrange_Horizontal_Vector::ParseExpression() {
-  const bool speedGood = CompileExpression(*this, "horizontal speed equation", speed, speedTree);
-  const bool directionGood =
-      CompileExpression(*this, "horizontal direction equation", direction, directionTree);
-  return speedGood && directionGood;
-}
-
-void CEL_Lagrange_Horizontal_Vector::GetFields(std::vector<ElementField>& fields) const {
-  AppendCaption(fields);
-  AppendOwnFields(fields);
-}
-
-int CEL_Lagrange_Horizontal_Vector::SetFields(const std::vector<ElementField>& fields) {
-  return SetOwnFields(fields);
-}
-
 CEL_Lagrange_Vertical_Equation::CEL_Lagrange_Vertical_Equation(std::string_view caption)
-    : CEL_Element(caption) {
-  SetKind(ElementKind::VerticalEquation);
-  SetFileFlags(false, false, false);
+    : CEL_Movement(ElementKind::VerticalEquation, caption) {
   Bind(kVerticalRows, {&speed});
   ListenTo({&speed});
-}
-
-bool CEL_Lagrange_Vertical_Equation::Check() {
-  return CheckExpression(*this, speed);
-}
-
-bool CEL_Lagrange_Vertical_Equation::ParseExpression() {
-  return CompileExpression(*this, "vertical speed equation", speed, speedTree);
-}
-
-void CEL_Lagrange_Vertical_Equation::GetFields(std::vector<ElementField>& fields) const {
-  AppendCaption(fields);
-  AppendOwnFields(fields);
-}
-
-int CEL_Lagrange_Vertical_Equation::SetFields(const std::vector<ElementField>& fields) {
-  return SetOwnFields(fields);
 }
 
 }  // namespace tessal

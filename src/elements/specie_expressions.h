@@ -3,7 +3,6 @@
 #pragma once
 
 #include "elements/element.h"
-#include "expr/expression_node.h"
 
 namespace tessal {
 
@@ -14,12 +13,9 @@ class CEL_Lagrange_Arithmetical_Expression final : public CEL_Element {
   /// Leaves the number of the class, to which it still belongs.
   void Reset() override;
   bool Check() override;
-  bool ParseExpression() override;
 
   /// Whether it is a process follows from its use: one that a state variable of its class uses is one.
   void Classify(bool isProcess);
-
-  const ExpressionNode& Tree() const { return tree; }
 
   CEL_Property expressionType{ValueType::Text};
   CEL_Property specie{ValueType::Integer};  ///< the number of the owning class, from 1
@@ -27,49 +23,34 @@ class CEL_Lagrange_Arithmetical_Expression final : public CEL_Element {
   CEL_Property spatialVariation{ValueType::Text};
   CEL_Property unit{ValueType::Text};
   CEL_Property expression{ValueType::Expression};
+};
 
- private:
-  ExpressionNode tree;
+/// What the movements of a class share: expressions, and nothing else in the file or among the fields.
+class CEL_Movement : public CEL_Element {
+ public:
+  void Reset() override { ResetOwn(); }
+  bool Check() override;
+  void GetFields(std::vector<ElementField>& fields) const override;
+  int SetFields(const std::vector<ElementField>& fields) override { return SetOwnFields(fields); }
+
+ protected:
+  CEL_Movement(ElementKind kind, std::string_view caption);
 };
 
 /// One horizontal movement. It takes two places in the symbol table: its direction, then its speed.
-class CEL_Lagrange_Horizontal_Vector final : public CEL_Element {
+class CEL_Lagrange_Horizontal_Vector final : public CEL_Movement {
  public:
   explicit CEL_Lagrange_Horizontal_Vector(std::string_view caption);
 
-  void Reset() override { ResetOwn(); }
-  bool Check() override;
-  bool ParseExpression() override;
-  void GetFields(std::vector<ElementField>& fields) const override;
-  int SetFields(const std::vector<ElementField>& fields) override;
-
-  const ExpressionNode& SpeedTree() const { return speedTree; }
-  const ExpressionNode& DirectionTree() const { return directionTree; }
-
   CEL_Property speed{ValueType::Expression};
   CEL_Property direction{ValueType::Expression};
-
- private:
-  ExpressionNode speedTree;
-  ExpressionNode directionTree;
 };
 
-class CEL_Lagrange_Vertical_Equation final : public CEL_Element {
+class CEL_Lagrange_Vertical_Equation final : public CEL_Movement {
  public:
   explicit CEL_Lagrange_Vertical_Equation(std::string_view caption);
 
-  void Reset() override { ResetOwn(); }
-  bool Check() override;
-  bool ParseExpression() override;
-  void GetFields(std::vector<ElementField>& fields) const override;
-  int SetFields(const std::vector<ElementField>& fields) override;
-
-  const ExpressionNode& SpeedTree() const { return speedTree; }
-
   CEL_Property speed{ValueType::Expression};
-
- private:
-  ExpressionNode speedTree;
 };
 
 }  // namespace tessal

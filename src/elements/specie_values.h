@@ -3,7 +3,6 @@
 #pragma once
 
 #include "elements/element.h"
-#include "expr/expression_node.h"
 
 namespace tessal {
 
@@ -12,6 +11,7 @@ class CEL_SpecieValue : public CEL_Element {
  public:
   void Reset() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  std::string RecordText() const override;
 
   CEL_Property unit{ValueType::Text};
   CEL_Property defaultValue{ValueType::Real};
@@ -32,19 +32,9 @@ class CEL_Lagrange_StateVariable final : public CEL_SpecieValue {
   /// Leaves the number of the class, to which it still belongs.
   void Reset() override;
   bool Check() override;
-  bool ParseExpression() override;
-
-  /// The equation stands in a section of its own, under the symbol as keyword.
-  void ReadEquation(KvfNode section, int& status);
-  void WriteEquation(KvfHandle file, int& status);
-
-  const ExpressionNode& EquationTree() const { return equationTree; }
 
   CEL_Property specie{ValueType::Integer};  ///< the number of the owning class, from 1
   CEL_Property equation{ValueType::Expression};
-
- private:
-  ExpressionNode equationTree;
 };
 
 class CEL_Lagrange_Constant final : public CEL_SpecieValue {

@@ -6,19 +6,11 @@
 #include "elements/element_checks.h"
 #include "elements/property_io.h"
 #include "keyfile/keywords.h"
+#include "keyfile/water_body.h"
 
 namespace tessal {
 
 namespace {
-
-constexpr std::array<UnitTypeRow, 6> kUnitTypes = {{
-    {"Concentration", 100404, 2205, "mg/l"},
-    {"Mass per Area", 100437, 4400, "g/m2"},
-    {"Bacteria Concentration", 100008, 3001, "per 100 ml"},
-    {"User defined", kUserDefinedUnit, 0, "undefined"},
-    {"Volume", 110230, 1600, "m3"},
-    {"Length", 110220, 1000, "m"},
-}};
 
 constexpr std::array<std::string_view, 2> kTransports = {"ADVECTION_DISPERSION", "FIXED"};
 
@@ -27,13 +19,8 @@ const ChoiceList& TransportChoices() {
   return kList;
 }
 
-const ChoiceList& UnitTypeChoices() {
-  static const ChoiceList kList = MakeUnitTypeChoices(kUnitTypes);
-  return kList;
-}
-
 constexpr std::array<PropertyRow, 7> kRows = {{
-    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, "WC"},
+    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, scope::kWaterColumn},
     {key::kTransport, "Transport", ValueType::Text, TransportChoices, "ADVECTION_DISPERSION"},
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0},
@@ -47,7 +34,7 @@ constexpr std::array<PropertyRow, 7> kRows = {{
 CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(caption) {
   SetKind(ElementKind::StateVariable);
   SetUnitMode(UnitMode::Both);
-  unqType.SetChoices(UnitTypeChoices());
+  OfferUnitTypes(kStateVariableUnitTypes);
   Bind(kRows, {&scope, &transport, &unit, &defaultValue, &minValue, &maxValue, &equation});
   ListenTo({&symbol, &scope, &unqType, &unqUnit, &equation});
   CEL_StateVariable::Reset();
@@ -55,7 +42,7 @@ CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(cap
 
 void CEL_StateVariable::Reset() {
   unqType.SetInt(kUserDefinedUnit);
-  unqType.SelectChoice("User defined");
+  unqType.SelectChoice(kUserDefined);
   unqUnit.SetInt(0);
   ResetOwn();
 }
@@ -76,41 +63,21 @@ void CEL_StateVariable::Read(KvfNode section, int& status) {
   SelectPresentValues();
 }
 
-void CEL_StateVariable::ReadEquation(KvfNode section, int& status) {
-  ReadProperty(equation, section, symbol.Text(), status);
-}
-
-void CEL_StateVariable::WriteEquation(KvfHandle file, int& status) {
-  WriteProperty(equation, file, symbol.Text(), *this, status);
-}
-
 bool CEL_StateVariable::Check() {
   const bool inRange = CheckDefaultInRange(*this, minValue, defaultValue, maxValue);
   const bool ordered = CheckRangeOrder(*this, minValue, maxValue);
   const bool named = CheckSymbolForm(*this);
-  const bool expressed = CheckExpression(*this, equation);
+  const bool expressed = CheckExpressions(*this);
   const bool worded = CheckTextContent(*this);
   return inRange && ordered && named && expressed && worded;
 }
 
-bool CEL_StateVariable::ParseExpression() {
-  return CompileExpression(*this, symbol.Text(), equation, equationTree);
-}
-
 void CEL_StateVariable::OnPropertyChanged(CEL_Property& changed) {
-  if (&changed != &unqType) {
+  if (&changed == &unqType) {
+    ApplyUnitType(kStateVariableUnitTypes, unit);
+  } else {
     RebuildOwner();
-    return;
   }
-  const UnitTypeRow* row = FindUnitType(kUnitTypes, unqType.IntValue());
-  if (row == nullptr) {
-    unqType.SetInt(kUserDefinedUnit);
-    SelectPresentValues();
-    unit.SetEditable(true);
-    return;
-  }
-  unit.SetText(row->unit);
-  unit.SetEditable(row->unqType == kUserDefinedUnit);
 }
 
 }  // namespace tessal

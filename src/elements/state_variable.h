@@ -2,7 +2,6 @@
 #pragma once
 
 #include "elements/element.h"
-#include "expr/expression_node.h"
 
 namespace tessal {
 
@@ -13,14 +12,8 @@ class CEL_StateVariable final : public CEL_Element {
   void Read(KvfNode section, int& status) override;
   void Reset() override;
   bool Check() override;
-  bool ParseExpression() override;
   void OnPropertyChanged(CEL_Property& changed) override;
 
-  /// The equation stands in a section of its own, under the symbol as keyword.
-  void ReadEquation(KvfNode section, int& status);
-  void WriteEquation(KvfHandle file, int& status);
-
-  const ExpressionNode& EquationTree() const { return equationTree; }
   bool UnitEditable() const { return unit.Editable(); }
 
   CEL_Property scope{ValueType::Text};
@@ -30,9 +23,6 @@ class CEL_StateVariable final : public CEL_Element {
   CEL_Property minValue{ValueType::Real};
   CEL_Property maxValue{ValueType::Real};
   CEL_Property equation{ValueType::Expression};
-
- private:
-  ExpressionNode equationTree;
 };
 
 }  // namespace tessal

@@ -5,6 +5,8 @@
 
 #include "expr/function_catalogue.h"
 
+#include "keyfile/water_body.h"
+
 namespace tessal {
 
 namespace {
@@ -25,10 +27,12 @@ constexpr std::int32_t kFull = 3;
 /// The unit type "User defined" of the elements.
 constexpr std::int32_t kUserUnit = 999;
 
-constexpr std::array<std::string_view, 6> kLayers = {
-    "NOT_SPECIFIED", "NOT_SPECIFIED", "WS", "WC", "WB", "SED"};
-constexpr std::array<std::string_view, 4> kVariations = {"NONE", "NONE", "HORISONTAL",
-                                                         "HORISONTAL_AND_VERTICAL"};
+// The first two rows are one text, and the first of them wins a selection.
+constexpr std::array<std::string_view, 6> kLayers = {scope::kNotSpecified, scope::kNotSpecified,
+                                                     scope::kWaterSurface, scope::kWaterColumn,
+                                                     scope::kWaterBottom,  scope::kSediment};
+constexpr std::array<std::string_view, 4> kVariations = {
+    variation::kNone, variation::kNone, variation::kHorizontal, variation::kHorizontalAndVertical};
 
 // Names, units without a denominator and limits are part of the vocabulary and stay as they are.
 constexpr CatalogueBuiltin kRows[] = {
@@ -166,6 +170,10 @@ const std::vector<std::int32_t>& ForcingBuiltinIds() {
 bool IsDeprecatedBuiltin(std::int32_t id) {
   return std::any_of(kDeprecated.begin(), kDeprecated.end(),
                      [id](const DeprecatedRange& range) { return id >= range.first && id <= range.last; });
+}
+
+std::span<const std::string_view> LayerTexts() {
+  return kLayers;
 }
 
 std::string_view LayerText(std::int32_t layer) {

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <string_view>
 #include <vector>
 
@@ -32,6 +33,9 @@ const std::vector<std::int32_t>& ConstantBuiltinIds();
 const std::vector<std::int32_t>& ForcingBuiltinIds();
 
 bool IsDeprecatedBuiltin(std::int32_t id);
+
+/// The scopes that layers are counted by.
+std::span<const std::string_view> LayerTexts();
 
 /// The scope and the spatial variation that an element takes from a row, as files spell them.
 std::string_view LayerText(std::int32_t layer);

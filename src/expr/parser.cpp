@@ -19,12 +19,13 @@ ParsedExpression ParseExpression(std::string_view text) {
   return parsed;
 }
 
-const ParsedExpression& ParseOnce(std::optional<ParsedExpression>& held, std::string_view text) {
+const ParsedExpression& ParseOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text) {
   if (held && held->began == ExpressionScannerStart()) {
     SetExpressionScannerStart(held->left);
     return *held;
   }
-  return held.emplace(ParseExpression(text));
+  held = std::make_unique<const ParsedExpression>(ParseExpression(text));
+  return *held;
 }
 
 int ParseExpressionText(const std::string& text, ExpressionNode& node, std::int32_t& line,

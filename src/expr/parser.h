@@ -3,7 +3,7 @@
 #pragma once
 
 #include <cstdint>
-#include <optional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <variant>
@@ -39,7 +39,7 @@ ParsedExpression ParseExpression(std::string_view text);
 /// The parse of a text of which an earlier parse may be held: that one, with the same effect on the scanner,
 /// unless the scan would begin elsewhere now; otherwise a new one, which is held from then on. The holder
 /// resets `held` whenever the text changes.
-const ParsedExpression& ParseOnce(std::optional<ParsedExpression>& held, std::string_view text);
+const ParsedExpression& ParseOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text);
 
 /// The same by outputs. On success gives 1, the tree, line and position -1 and "no error". On failure gives
 /// 0, the message, line and position, and leaves the tree alone.

@@ -1,0 +1,112 @@
+// The collections of a template, and the table of what holds for each: where it is kept, what it holds, how
+// it is in the file and how its new elements are called. Loading, saving, numbering, moving, deleting,
+// creating, validating, the tree and the documentation are loops over its rows.
+#pragma once
+
+#include <string_view>
+#include <tuple>
+
+#include "elements/expression_elements.h"
+#include "elements/input_elements.h"
+#include "elements/sequence.h"
+#include "elements/specie.h"
+#include "elements/state_variable.h"
+#include "keyfile/keywords.h"
+
+namespace tessal {
+
+/// The elements of a template, each sequence in the order of declaration.
+struct Collections {
+  Sequence<CEL_StateVariable> stateVariables;
+  Sequence<CEL_Constant> constants;
+  Sequence<CEL_Forcing> forcings;
+  Sequence<CEL_Auxilliary_Variable> auxiliaries;
+  Sequence<CEL_Process> processes;
+  Sequence<CEL_Derived_Output> derivedOutputs;
+  Sequence<CEL_Lagrange_Specie> species;
+};
+
+template <class Element>
+struct Collection {
+  Sequence<Element> Collections::*elements;
+  ElementKind kind;
+  ElementKind listKind;  ///< of the list head; None for the particle classes, which have none
+  std::string_view section;
+  std::string_view prefix;        ///< of the sub-sections
+  std::string_view symbolPrefix;  ///< of default symbols
+  ElementKind writtenHead;        ///< the list head whose texts a save writes
+
+  bool HasHead() const { return listKind != ElementKind::None; }
+};
+
+template <class Element>
+Collection(Sequence<Element> Collections::*, ElementKind, ElementKind, std::string_view, std::string_view,
+           std::string_view, ElementKind) -> Collection<Element>;
+
+/// In the order of the file. The equations come between the collections with a head and the particle classes.
+inline constexpr std::tuple kCollections{
+    Collection{&Collections::stateVariables, ElementKind::StateVariable, ElementKind::StateVariableList,
+               section::kStateVariables, section::kStateVariablePrefix, "StateVariable_",
+               ElementKind::StateVariableList},
+    Collection{&Collections::constants, ElementKind::Constant, ElementKind::ConstantList, section::kConstants,
+               section::kConstantPrefix, "Constant_", ElementKind::ConstantList},
+    Collection{&Collections::forcings, ElementKind::Forcing, ElementKind::ForcingList, section::kForcings,
+               section::kForcingPrefix, "Forcing_", ElementKind::ForcingList},
+    // The texts of the auxiliaries' head are those of the constants: files have always been written so.
+    Collection{&Collections::auxiliaries, ElementKind::Auxiliary, ElementKind::AuxiliaryList,
+               section::kAuxiliaryVariables, section::kAuxiliaryVariablePrefix, "Auxiliary_",
+               ElementKind::ConstantList},
+    Collection{&Collections::processes, ElementKind::Process, ElementKind::ProcessList, section::kProcesses,
+               section::kProcessPrefix, "Process_", ElementKind::ProcessList},
+    Collection{&Collections::derivedOutputs, ElementKind::DerivedOutput, ElementKind::DerivedOutputList,
+               section::kDerivedOutputs, section::kDerivedOutputPrefix, "Derived Output ",
+               ElementKind::DerivedOutputList},
+    Collection{&Collections::species, ElementKind::Specie, ElementKind::None, section::kLagrange,
+               section::kSpeciePrefix, "Specie_", ElementKind::None},
+};
+
+/// Calls the visitor with each row.
+template <class Visitor>
+void ForEachCollection(Visitor visit) {
+  std::apply([&visit](const auto&... row) { (visit(row), ...); }, kCollections);
+}
+
+/// Calls the visitor with each row that has a list head: all but the particle classes.
+template <class Visitor>
+void ForEachHeadedCollection(Visitor visit) {
+  ForEachCollection([&visit](const auto& row) {
+    if (row.HasHead()) visit(row);
+  });
+}
+
+/// Calls the operation with the row of the kind; false for a kind without one.
+template <class Operation>
+bool WithCollection(ElementKind kind, Operation operation) {
+  return std::apply([kind, &operation](
+                        const auto&... row) { return ((row.kind == kind && (operation(row), true)) || ...); },
+                    kCollections);
+}
+
+/// Calls the visitor with each element that a reference by number or name may mean, in the order in which the
+/// first hit wins: the template's collections, then those of each particle class.
+template <class Visitor>
+void ForEachNamedElement(const Collections& collections, Visitor visit) {
+  ForEachHeadedCollection([&collections, &visit](const auto& row) {
+    for (const auto& element : collections.*row.elements) visit(*element);
+  });
+  for (const auto& specie : collections.species) {
+    ForEachMemberList([&specie, &visit](const auto& list) {
+      if (!list.hasHead) return;
+      for (const auto& member : (*specie).*list.members) visit(*member);
+    });
+  }
+}
+
+template <class Visitor>
+void ForEachSearchFunction(const Collections& collections, Visitor visit) {
+  for (const auto& specie : collections.species) {
+    for (const auto& function : specie->spatialFunctions) visit(*function);
+  }
+}
+
+}  // namespace tessal

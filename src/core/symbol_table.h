@@ -1,0 +1,103 @@
+// The flat symbol table of a template: a record for each element in the order of the file, who uses whom, and
+// the names in use that stand for nothing. A rebuild makes it again, never patches it, in time proportional
+// to the template.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "keyfile/water_body.h"
+#include "platform/uid.h"
+
+namespace tessal {
+
+class CEL_Element;
+class CEL_Miscanellous;
+struct Collections;
+
+/// One slot of the symbol table. A horizontal movement takes two: its direction, then its speed.
+struct SymbolRecord {
+  std::uint32_t sequence = 0;  ///< 1-based place in the table, the element's `ID` after a rebuild
+  /// Both mean something for the template's own collections only; the records of particle classes carry on
+  /// those of the record before them.
+  Scope scope = Scope::Global;
+  SpatialVariation spatial = SpatialVariation::None;
+  std::int32_t index = 0;         ///< place of the element in its own sequence, from 0
+  std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
+  std::string text;               ///< the expression, or the number of an input as text
+  /// The records that the expression uses and those that use this one: by sequence number and, in parallel,
+  /// by identity. Each entry stands once, in the order of first use.
+  std::vector<std::uint32_t> references;
+  std::vector<std::uint32_t> referencedBy;
+  std::vector<Uid> referenceUids;
+  std::vector<Uid> referencedByUids;
+  CEL_Element* element = nullptr;
+  Uid uid = Uid::None;  ///< the element's identity
+};
+
+/// A name that expressions use and nobody has defined.
+struct UndefinedSymbol {
+  bool asked = false;  ///< the user has been asked about it
+  bool stale = false;  ///< not met yet in the rebuild under way
+  std::string symbol;
+  std::vector<Uid> usedBy;  ///< identities of the users, each once, in first-seen order
+};
+
+/// The symbol of a record: the element's, composed with the class's for movements.
+std::string RecordSymbol(const SymbolRecord& record);
+void AppendRecordSymbol(const SymbolRecord& record, std::string& text);
+
+class SymbolTable final {
+ public:
+  const std::vector<SymbolRecord>& Records() const { return records; }
+  std::vector<std::unique_ptr<UndefinedSymbol>>& Undefined() { return undefined; }
+  const std::vector<std::unique_ptr<UndefinedSymbol>>& Undefined() const { return undefined; }
+  void Clear();
+
+  /// Numbers the elements, makes the records and finds who uses whom. Reports nothing. The public names of
+  /// the settings' user functions count as defined.
+  void Rebuild(const Collections& collections, const CEL_Miscanellous& settings);
+
+  // Finding; none when there is no such record. The sizes are those of hand-written templates: the searches
+  // are linear, and no index is kept between rebuilds.
+  const SymbolRecord* BySequence(std::uint32_t sequence) const;
+  /// The first record of the element: a horizontal movement's is that of its direction.
+  const SymbolRecord* ByUid(Uid uid) const;
+  /// The same for an element that is at hand: without a search, after a rebuild.
+  const SymbolRecord* OfElement(const CEL_Element& element) const;
+  const SymbolRecord* BySymbol(std::string_view symbol) const;
+  /// The record that a use names; its number must be one of the table's.
+  const SymbolRecord& Used(std::uint32_t sequence) const { return records[sequence - 1]; }
+
+  /// Calls the visitor with each element that has a record, once: the two records of a movement are side by
+  /// side.
+  template <class Visitor>
+  void ForEachElement(Visitor visit) const {
+    const CEL_Element* previous = nullptr;
+    for (const SymbolRecord& record : records) {
+      if (record.element != previous) visit(record);
+      previous = record.element;
+    }
+  }
+  /// The same for the records of the given numbers, in their order.
+  template <class Visitor>
+  void ForEachElement(const std::vector<std::uint32_t>& sequences, Visitor visit) const {
+    const CEL_Element* previous = nullptr;
+    for (const std::uint32_t sequence : sequences) {
+      const SymbolRecord& record = Used(sequence);
+      if (record.element != previous) visit(record);
+      previous = record.element;
+    }
+  }
+
+ private:
+  class RebuildSteps;
+
+  std::vector<SymbolRecord> records;
+  std::vector<std::unique_ptr<UndefinedSymbol>> undefined;
+};
+
+}  // namespace tessal

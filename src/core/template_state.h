@@ -1,0 +1,60 @@
+// What a template holds. The front, TemplateCore, owns it; the local classes of loading, saving and
+// visibility groups work on it, so that a change to one of their steps touches no header.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <memory>
+#include <string>
+
+#include "core/collections.h"
+#include "core/symbol_table.h"
+#include "elements/miscellaneous.h"
+#include "keyfile/item_tree.h"
+
+namespace tessal {
+
+/// The switches of one template. Every property holds the address of the first.
+struct TemplateFlags {
+  bool modified = false;
+  bool rebuildEnabled = true;
+  bool showAllBuiltIns = false;
+  bool strictScopeRule = true;  ///< the scope rule; otherwise the process rule
+};
+
+struct TemplateState {
+  static constexpr std::size_t kListHeadCount = 6;
+  using ListHeads = std::array<std::unique_ptr<CEL_ListHead>, kListHeadCount>;
+
+  /// The list head of a kind from StateVariableList to DerivedOutputList; any other raises the subscript
+  /// failure.
+  CEL_ListHead& ListHead(ElementKind listKind) const;
+  /// Writes the numbers of the records into the elements and renumbers the classes, with what refers to them.
+  void AssignIds();
+
+  TemplateFlags flags;
+  bool hasMisc = true;
+  CEL_Miscanellous misc;
+  CEL_ListHead root{ElementKind::Root, "Tessal Setup"};
+  ListHeads listHeads;
+  Collections collections;
+  SymbolTable table;
+  CKvfSectionItem keptTree;  ///< of the file that was loaded
+  std::uint32_t groupCounter = 0;
+  std::string templateFileName;
+  std::string saveFileName;
+};
+
+/// Switches rebuilds off, and on again on every way out.
+class RebuildsOff final {
+ public:
+  explicit RebuildsOff(TemplateFlags& templateFlags) : flags(templateFlags) { flags.rebuildEnabled = false; }
+  RebuildsOff(const RebuildsOff&) = delete;
+  RebuildsOff& operator=(const RebuildsOff&) = delete;
+  ~RebuildsOff() { flags.rebuildEnabled = true; }
+
+ private:
+  TemplateFlags& flags;
+};
+
+}  // namespace tessal

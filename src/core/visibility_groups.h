@@ -1,0 +1,34 @@
+// Visibility groups: the definitions in the settings and the memberships that the elements keep are changed
+// together. In memory both go by identity; the file holds record numbers. Groups and levels count from 1;
+// everything does nothing, and gives 0 or an empty text, for a template without settings.
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+#include "core/template_state.h"
+
+namespace tessal {
+
+class VisibilityGroups final {
+ public:
+  explicit VisibilityGroups(TemplateState& templateState) : state(templateState) {}
+
+  /// Makes memberships of the record numbers that a file holds.
+  void TakeRecordNumbers();
+  std::int32_t AddGroup();
+  void RemoveGroup(std::int32_t group);
+  std::int32_t CreateLevel(std::int32_t group);
+  void DeleteLevel(std::int32_t group, std::int32_t level);
+  void AddItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
+  void RemoveItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
+  /// Takes an element out of all groups.
+  void Leave(CEL_Element& element);
+
+ private:
+  std::vector<VisibilityGroup>& Groups() { return state.misc.Visibilities().groups; }
+
+  TemplateState& state;
+};
+
+}  // namespace tessal
