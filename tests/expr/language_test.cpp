@@ -70,10 +70,10 @@ std::string Walks(const std::string& text) {
 
 std::string Findings(const std::string& text) {
   Errors().Reset();
-  std::string rows = CheckFunctionsSpecified("S", 7, text) == 1 ? "" : "no tree\n";
+  std::string rows = CheckFunctionsSpecified("S", Uid{7}, text) == 1 ? "" : "no tree\n";
   for (const ErrorRecord& record : Errors().Records()) {
-    rows += std::to_string(record.level) + " " + record.symbol + std::to_string(record.uid) + " " +
-            record.text + "\n";
+    rows += std::to_string(record.level) + " " + record.symbol + std::to_string(NumberOf(record.uid)) + " " +
+            std::string(record.code) + ": " + record.text + "\n";
   }
   return rows;
 }
@@ -122,7 +122,8 @@ const std::map<std::string, std::string (*)(const std::string&)> kQuestions = {
 
 std::string Ask(const std::string& question, const std::string& text) {
   const auto hit = kQuestions.find(question);
-  return hit == kQuestions.end() ? "no question: " + question + "\n" : hit->second(text);
+  EXPECT_NE(hit, kQuestions.end()) << question;
+  return hit == kQuestions.end() ? "no such question\n" : hit->second(text);
 }
 
 /// The rest of a text after its first words; nothing when it begins otherwise.
