@@ -9,7 +9,7 @@
 #include "expr/carbonate/options.h"
 #include "expr/carbonate/ph_solvers.h"
 #include "expr/carbonate/speciation.h"
-#include "expr/evaluators.h"
+#include "expr/function_catalogue.h"
 
 namespace {
 
@@ -41,11 +41,7 @@ std::vector<Evaluator> SpecieFunctions() {
       "GET_OH",   "GET_HCO3", "GET_CO3",   "GET_CO2",  "GET_FCO2", "GET_DIC_EST", "GET_ALK_EST",
       "GET_CALK", "GET_BALK", "GET_SIALK", "GET_PALK", "GET_HF",   "GET_HFREE",   "GET_HSO4"};
   std::vector<Evaluator> functions;
-  for (const std::string_view name : kNames) {
-    for (const EvaluatorRow& row : Evaluators()) {
-      if (row.name == name) functions.push_back(row.evaluator);
-    }
-  }
+  for (const std::string_view name : kNames) functions.push_back(FindFunction(name)->evaluator);
   return functions;
 }
 

@@ -45,7 +45,7 @@ void Identifiers(benchmark::State& state) {
 
 void Check(benchmark::State& state) {
   for ([[maybe_unused]] auto turn : state) {
-    benchmark::DoNotOptimize(CheckFunctionsSpecified("S", 1, Text(state)));
+    benchmark::DoNotOptimize(CheckFunctionsSpecified("S", Uid{1}, Text(state)));
   }
   state.SetItemsProcessed(state.iterations());
 }

@@ -21,9 +21,6 @@ using fuzz::Require;
 
 /// The slowest call, the simple pH solver on water where it never settles, takes a million rounds.
 constexpr int kMostCalls = 16;
-constexpr std::int32_t kFirstRandom = 50;
-constexpr std::int32_t kLastRandom = 58;
-constexpr std::int32_t kArcTangentOfTwo = 4;
 
 /// Values at which functions change their ways.
 constexpr std::array kValues = {0.0,
@@ -110,17 +107,13 @@ bool AreSame(double first, double second) {
   return first == second || (std::isnan(first) && std::isnan(second));
 }
 
-bool IsRandom(const CatalogueFunction& function) {
-  return function.id >= kFirstRandom && function.id <= kLastRandom;
-}
-
 void CheckCall(const CatalogueFunction& function, const std::vector<double>& values) {
   const double answer = function.evaluator(values);
-  if (IsRandom(function)) return;
+  if (function.traits.drawsRandomNumbers) return;
   Require(AreSame(function.evaluator(values), answer), "the same question has the same answer");
   double evaluated = answer;
   std::vector<double> order = values;
-  if (function.id == kArcTangentOfTwo) std::swap(order[0], order[1]);
+  if (function.traits.swapsArguments) std::swap(order[0], order[1]);
   EvaluateFunction(function.name, order, evaluated);
   Require(AreSame(evaluated, answer), "what a host may evaluate is what the row computes");
 }

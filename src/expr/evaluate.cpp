@@ -12,29 +12,12 @@ namespace tessal {
 namespace {
 
 constexpr std::int32_t kPlainMathematics = 1;
-constexpr std::size_t kMostArguments = 6;
-constexpr std::int32_t kArcTangentOfTwo = 4;
+constexpr std::size_t kMostValues = 6;
 constexpr double kHalfTurn = 180.0;
 
-struct IdRange {
-  std::int32_t first;
-  std::int32_t last;
-};
-
-/// Functions that draw random numbers, need the engine or keep state.
-constexpr std::array<IdRange, 4> kRefused = {{{50, 58}, {68, 73}, {78, 88}, {92, 92}}};
-
-/// Functions of an angle, and functions that give one.
-constexpr std::array<std::int32_t, 6> kTakeAngle = {6, 7, 14, 15, 18, 19};
-constexpr IdRange kGiveAngle{2, 5};
-
-bool IsIn(const IdRange& range, std::int32_t id) {
-  return id >= range.first && id <= range.last;
-}
-
-bool IsRefused(std::int32_t id) {
-  return std::any_of(kRefused.begin(), kRefused.end(),
-                     [id](const IdRange& range) { return IsIn(range, id); });
+/// Whether a call has no effect and depends on its arguments alone.
+bool IsPure(const FunctionTraits& traits) {
+  return !traits.drawsRandomNumbers && !traits.needsEngine && !traits.keepsState;
 }
 
 }  // namespace
@@ -46,19 +29,18 @@ bool& AnglesAreDegrees() {
 
 int EvaluateFunction(const std::string& name, std::span<const double> arguments, double& value) {
   const CatalogueFunction* function = FindFunction(name);
-  if (function == nullptr || IsRefused(function->id)) return 0;
+  if (function == nullptr || !IsPure(function->traits)) return 0;
   if (function->argumentCount != static_cast<std::int32_t>(arguments.size()) ||
-      function->functionClass != kPlainMathematics || arguments.size() > kMostArguments ||
+      function->functionClass != kPlainMathematics || arguments.size() > kMostValues ||
       function->evaluator == nullptr) {
     return 0;
   }
-  std::array<double, kMostArguments> values{};
+  std::array<double, kMostValues> values{};
   std::copy(arguments.begin(), arguments.end(), values.begin());
-  const bool takesAngle = std::find(kTakeAngle.begin(), kTakeAngle.end(), function->id) != kTakeAngle.end();
-  if (AnglesAreDegrees() && takesAngle) values[0] *= std::numbers::pi / kHalfTurn;
-  if (function->id == kArcTangentOfTwo) std::swap(values[0], values[1]);
+  if (AnglesAreDegrees() && function->traits.takesAngle) values[0] *= std::numbers::pi / kHalfTurn;
+  if (function->traits.swapsArguments) std::swap(values[0], values[1]);
   value = function->evaluator(std::span(values).first(arguments.size()));
-  if (AnglesAreDegrees() && IsIn(kGiveAngle, function->id)) value *= kHalfTurn / std::numbers::pi;
+  if (AnglesAreDegrees() && function->traits.givesAngle) value *= kHalfTurn / std::numbers::pi;
   return 1;
 }
 

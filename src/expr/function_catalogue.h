@@ -16,18 +16,30 @@ namespace tessal {
 /// The answer of a look-up that finds no row.
 inline constexpr std::uint32_t kCatalogueNotFound = 0x80040306U;
 
+/// What is special about a function.
+struct FunctionTraits {
+  bool takesAngle = false;      ///< its first argument is an angle
+  bool givesAngle = false;      ///< its value is an angle
+  bool swapsArguments = false;  ///< a host gives its two arguments in the other order
+  bool drawsRandomNumbers = false;
+  bool needsEngine = false;  ///< its value or effect is the simulation engine's
+  bool keepsState = false;   ///< it reads or writes what another call left
+  bool isDeprecated = false;
+};
+
 struct CatalogueFunction {
   std::string name;  ///< in upper case
   std::int32_t id = 0;
-  std::int32_t functionClass =
-      0;  ///< 1 plain mathematics, 3 calendar of a time, 4 to 7 one each, 2 all others
+  /// 1 plain mathematics, 3 calendar of a time, 4 to 7 one each, 2 all others.
+  std::int32_t functionClass = 0;
   std::int32_t firstFlag = 1;
   std::int32_t secondFlag = 1;
   std::int32_t argumentCount = 0;
   std::int32_t thirdFlag = 0;
   std::int32_t variant = 0;
-  std::string internalName;  ///< in the catalogue as set up, the name again
-  Evaluator evaluator = nullptr;
+  std::string internalName;       ///< in the catalogue as set up, the name again
+  Evaluator evaluator = nullptr;  ///< none when the simulation engine alone computes it
+  FunctionTraits traits;
 };
 
 struct CatalogueArgument {
@@ -44,10 +56,10 @@ struct CatalogueGroup {
 /// Counts one more user; the first one sets the catalogues up and reads the option file of the current
 /// folder.
 void InitCatalogues();
-/// Counts one user fewer; behind the last one the state that belongs to the catalogues is released.
+/// Counts one user fewer; after the last one the state that belongs to the catalogues is released.
 void ReleaseCatalogues();
 
-/// The rows in table order. Their evaluators are there once the catalogues are set up.
+/// The rows in table order.
 const std::vector<CatalogueFunction>& Functions();
 const std::vector<CatalogueArgument>& Arguments();
 const std::array<CatalogueGroup, 2>& Groups();

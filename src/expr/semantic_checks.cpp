@@ -90,7 +90,7 @@ class FunctionCheck final {
     if (function->argumentCount != arguments) {
       Report({"argument-count", {name, JoinedArguments(*function)}});
     }
-    if (IsDeprecatedFunction(function->id)) {
+    if (function->traits.isDeprecated) {
       Report({"deprecated-function", {name}});
     }
   }

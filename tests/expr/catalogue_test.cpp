@@ -1,131 +1,117 @@
+// The catalogues as listings, and what a host of the expression layer may compute.
 #include <gtest/gtest.h>
 
-#include <algorithm>
-#include <map>
-#include <set>
+#include <sstream>
 
 #include "expr/builtin_catalogue.h"
+#include "expr/evaluate.h"
 #include "expr/function_catalogue.h"
+#include "support/case_file.h"
 
 namespace tessal {
 namespace {
 
-TEST(FunctionCatalogue, HoldsItsRows) {
-  EXPECT_EQ(Functions().size(), 141U);
-  EXPECT_EQ(Arguments().size(), 394U);
-  std::set<std::int32_t> ids;
-  for (const CatalogueFunction& function : Functions()) {
-    ids.insert(function.id);
-    EXPECT_EQ(function.internalName, function.name);
+/// The numbers of values that a host may give a function.
+std::string CountsComputed(const std::string& name) {
+  std::string counts;
+  for (std::size_t count = 0; count <= 16; ++count) {
+    double value = -12345;
+    const bool computes = EvaluateFunction(name, std::vector<double>(count, 0.5), value) == 1;
+    EXPECT_NE(computes, value == -12345) << name << " of " << count;
+    if (computes) counts += " " + std::to_string(count);
   }
-  EXPECT_EQ(ids.size(), 141U);
-  EXPECT_EQ(*ids.begin(), 1);
-  EXPECT_EQ(*ids.rbegin(), 141);
-  // The one row out of the order of ids.
-  const auto row = std::find_if(Functions().begin(), Functions().end(),
-                                [](const CatalogueFunction& function) { return function.id == 138; });
-  EXPECT_EQ(std::prev(row)->id, 101);
-  EXPECT_EQ(std::next(row)->id, 102);
+  return counts;
 }
 
-TEST(FunctionCatalogue, ClassesAreAsTheEngineReadsThem) {
-  std::map<std::int32_t, int> counts;
-  for (const CatalogueFunction& function : Functions()) ++counts[function.functionClass];
-  EXPECT_EQ(counts[3], 6);
-  EXPECT_EQ(counts[4] + counts[5] + counts[6] + counts[7], 4);
-  EXPECT_EQ(FindFunction("floor")->functionClass, 2);
-  EXPECT_EQ(FindFunction("Sign")->functionClass, 1);
-}
-
-TEST(FunctionCatalogue, FindsNamesInAnyCase) {
-  std::string internalName;
-  std::int32_t count = -1;
-  std::int32_t functionClass = -1;
-  std::int32_t id = -1;
-  for (const char* name : {"sin", "Sin", "SIN"}) {
-    EXPECT_EQ(FindFunctionUpper(name, internalName, count, functionClass, id), 1);
-    EXPECT_EQ(id, 14);
-    EXPECT_EQ(count, 1);
-  }
-  EXPECT_EQ(FindFunctionUpper("exceedance_frequency", internalName, count, functionClass, id), 1);
-  EXPECT_EQ(id, 43);
-  EXPECT_EQ(FindFunctionUpper("_get_k1", internalName, count, functionClass, id), 1);
-  EXPECT_EQ(id, 90);
-  EXPECT_EQ(FindFunctionUpper("GET_K0", internalName, count, functionClass, id), 0);
-  EXPECT_EQ(id, 90) << "untouched when nothing is found";
-  EXPECT_EQ(FindFunction("S\xC3\x8DN"), nullptr);
-
-  std::string name = "max";
-  EXPECT_TRUE(IsFunctionName(name));
-  EXPECT_EQ(name, "MAX");
-  EXPECT_EQ(FunctionIdByName("MAX"), 11);
-  EXPECT_EQ(FunctionIdByName("max"), -1);
-}
-
-TEST(FunctionCatalogue, AnswersByNumber) {
-  CatalogueFunction function;
-  EXPECT_EQ(GetFunctionById(141, function), 0U);
-  EXPECT_EQ(function.name, "MOONPHASE");
-  EXPECT_EQ(GetFunctionById(142, function), 0x80040306U);
-  std::string name = "kept";
-  EXPECT_EQ(GetArgumentName(58, 1, name), 0U);
-  EXPECT_EQ(name, "Propability");
-  EXPECT_EQ(GetArgumentName(58, 3, name), 0x80040306U);
-  EXPECT_EQ(name, "Propability");
-  EXPECT_EQ(JoinedArguments(*FindFunction("SET_KS_OPTION")), "Option (1-2)");
-  for (const std::int32_t id : {21, 22, 43, 44, 49}) EXPECT_TRUE(IsDeprecatedFunction(id)) << id;
-  EXPECT_FALSE(IsDeprecatedFunction(42));
-}
-
-TEST(FunctionCatalogue, SetUpGivesEvaluatorsToAllButTheEnginesOwn) {
+TEST(Catalogues, FunctionsAreTheListing) {
   InitCatalogues();
-  const std::set<std::string> without = {"F1",
-                                         "X",
-                                         "ANUTRC11",
-                                         "ANUTRC12",
-                                         "ANUTRC22",
-                                         "ANUTRC13",
-                                         "ANUTRC23",
-                                         "ANUTRC33",
-                                         "SECCHI_DEPTH",
-                                         "AVERAGE_WATER_COLUMN",
-                                         "SMOOTHING_AVERAGE",
-                                         "MOVING_AVERAGE",
-                                         "DISTANCE_TO",
-                                         "INSIDE",
-                                         "_GET_K1",
-                                         "_GET_K2"};
-  for (const CatalogueFunction& function : Functions()) {
-    EXPECT_EQ(function.evaluator == nullptr, without.contains(function.name)) << function.name;
+  std::ostringstream listing;
+  for (const CatalogueFunction& each : Functions()) {
+    listing << each.id << ' ' << each.name << ' ' << each.internalName << " class " << each.functionClass
+            << " flags " << each.firstFlag << each.secondFlag << each.thirdFlag << each.variant << " ("
+            << JoinedArguments(each) << ')' << (each.evaluator == nullptr ? " without evaluator" : "")
+            << (IsDeprecatedFunction(each.id) ? " deprecated" : "");
+    const std::string counts = CountsComputed(each.name);
+    listing << (counts.empty() ? "" : " computed from" + counts) << '\n';
+    EXPECT_EQ(FindFunction(each.name), &each);
+    CatalogueFunction found;
+    EXPECT_EQ(GetFunctionById(each.id, found), 0U);
+    EXPECT_EQ(found.name, each.name);
   }
+  for (const CatalogueGroup& each : Groups()) listing << each.id << ' ' << each.name << '\n';
+  test::ExpectListing("expr/cases/functions.txt", listing.str());
+  EXPECT_EQ(Arguments().size(), 394U);
   ReleaseCatalogues();
 }
 
-TEST(BuiltinCatalogue, HoldsItsRowsAndLists) {
-  ASSERT_EQ(Builtins().size(), 73U);
-  for (std::size_t place = 0; place < Builtins().size(); ++place) {
-    EXPECT_EQ(Builtins()[place].id, static_cast<std::int32_t>(place + 1));
-    EXPECT_EQ(Builtins()[place].unitType, 999);
+TEST(Catalogues, BuiltinsAreTheListing) {
+  std::ostringstream listing;
+  for (const CatalogueBuiltin& each : Builtins()) {
+    listing << each.id << ' ' << each.name << (each.kind == 1 ? " constant " : " forcing ")
+            << LayerText(each.layer) << ' ' << VariationText(each.variation) << ' ' << each.unitType << " '"
+            << each.unit << "' " << each.defaultValue << ' ' << each.minimum << ' ' << each.maximum
+            << (IsDeprecatedBuiltin(each.id) ? " deprecated" : "") << '\n';
+    CatalogueBuiltin found;
+    EXPECT_EQ(GetBuiltinById(each.id, found), 0U);
+    EXPECT_EQ(found.name, each.name);
   }
-  CatalogueBuiltin row;
-  EXPECT_EQ(GetBuiltinById(0, row), 0x80040306U);
-  EXPECT_EQ(GetBuiltinById(74, row), 0x80040306U);
-  ASSERT_EQ(GetBuiltinById(73, row), 0U);
-  EXPECT_EQ(row.unit, "()");
-  EXPECT_EQ(LayerText(row.layer), "WS");
-  EXPECT_EQ(VariationText(row.variation), "HORISONTAL");
-  EXPECT_EQ(VariationText(9), "NONE");
-
-  EXPECT_EQ(ConstantBuiltinIds().size() + ForcingBuiltinIds().size(), 73U);
-  const auto nameOf = [](std::int32_t id) { return Builtins()[static_cast<std::size_t>(id - 1)].name; };
   for (const auto* ids : {&ConstantBuiltinIds(), &ForcingBuiltinIds()}) {
-    EXPECT_TRUE(std::is_sorted(ids->begin(), ids->end(), [&](std::int32_t left, std::int32_t right) {
-      return nameOf(left) < nameOf(right);
-    }));
+    for (const std::int32_t id : *ids) listing << id << ' ';
+    listing << '\n';
   }
-  int deprecated = 0;
-  for (std::int32_t id = 0; id <= 74; ++id) deprecated += IsDeprecatedBuiltin(id) ? 1 : 0;
-  EXPECT_EQ(deprecated, 27);
+  test::ExpectListing("expr/cases/builtins.txt", listing.str());
+}
+
+TEST(Catalogues, ALookUpThatFindsNothingChangesNothing) {
+  std::string text = "kept";
+  std::int32_t count = -1;
+  std::int32_t functionClass = -1;
+  std::int32_t id = -1;
+  for (const char* name : {"GET_K0", "S\xC3\x8DN", "", "ABS "}) {
+    EXPECT_EQ(FindFunctionUpper(name, text, count, functionClass, id), 0) << name;
+  }
+  EXPECT_EQ(std::tie(text, count, functionClass, id), std::make_tuple("kept", -1, -1, -1));
+  EXPECT_EQ(FindFunctionUpper("Arctan2", text, count, functionClass, id), 1);
+  EXPECT_EQ(std::tie(text, count, functionClass, id), std::make_tuple("ARCTAN2", 2, 1, 4));
+
+  CatalogueFunction function;
+  CatalogueBuiltin builtin;
+  for (const std::int32_t number : {0, 142}) EXPECT_EQ(GetFunctionById(number, function), 0x80040306U);
+  for (const std::int32_t number : {0, 74}) EXPECT_EQ(GetBuiltinById(number, builtin), 0x80040306U);
+  for (const std::int32_t place : {0, 3}) EXPECT_EQ(GetArgumentName(58, place, text), 0x80040306U);
+  EXPECT_EQ(text, "ARCTAN2");
+  EXPECT_EQ(FunctionIdByName("MAX"), 11);
+  EXPECT_EQ(FunctionIdByName("max"), -1) << "this look-up takes names in upper case";
+  EXPECT_TRUE(IsFunctionName(text = "max"));
+  EXPECT_EQ(text, "MAX");
+  EXPECT_FALSE(IsFunctionName(text = "max_"));
+  EXPECT_EQ(text, "MAX_");
+  for (const std::int32_t row : {-1, 9}) {
+    EXPECT_EQ(VariationText(row), "NONE");
+    EXPECT_EQ(LayerText(row), "NOT_SPECIFIED");
+  }
+}
+
+TEST(Catalogues, AHostComputesInRadiansOrDegrees) {
+  test::RunCases("expr/cases/evaluation.txt", [](const test::Case& each) -> test::Answer {
+    return [input = each.input](const test::CaseCall& call) {
+      AnglesAreDegrees() = call.words == "each in degrees";
+      std::string answers = test::AnswerEach(input, [](const std::string& line) {
+        std::istringstream words(line);
+        std::string name;
+        words >> name;
+        const std::vector<double> values{std::istream_iterator<double>(words), {}};
+        double value = 0;
+        if (EvaluateFunction(name, values, value) == 0) return std::string("refused\n");
+        std::ostringstream text;
+        text.precision(12);
+        text << value << '\n';
+        return text.str();
+      });
+      AnglesAreDegrees() = false;
+      return answers;
+    };
+  });
 }
 
 }  // namespace

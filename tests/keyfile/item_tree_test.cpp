@@ -4,6 +4,8 @@
 
 #include <sstream>
 
+#include "keyfile/reader.h"
+
 namespace tessal {
 namespace {
 
@@ -45,17 +47,7 @@ TEST(ItemTree, WritesValuesAndBlocks) {
 
 TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
   CKvfSectionItem root;
-  auto section = std::make_unique<CKvfSectionItem>();
-  section->name = "S";
-  section->startComment = "s";
-  section->comment = "e";
-  auto key = std::make_unique<CKvfKeyItem>();
-  key->name = "K";
-  key->values = {KvfValue::Integer(1)};
-  key->line = 3;
-  section->AppendChild(std::move(key));
-  root.AppendChild(std::move(section));
-
+  ASSERT_EQ(ParseKeyFileTree("\n[S] //s\nK = 1\nEndSect //e\n", root), 1);
   CKvfSectionItem other;
   other.Assign(root);
   other.Assign(root);
@@ -76,6 +68,33 @@ TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
   other.Assign(root);
   EXPECT_EQ(other.ItemKind(), CKvfBaseItem::kSection);
   EXPECT_EQ(other.startComment, "");
+}
+
+TEST(ItemTree, KeywordsSayHowTheyDiffer) {
+  const auto key = [](std::vector<KvfValue> values, const char* name = "K") {
+    CKvfKeyItem item;
+    item.name = name;
+    item.values = std::move(values);
+    return item;
+  };
+  const IgnoredNames ignored = {"K"};
+  const auto compare = [](CKvfKeyItem left, CKvfKeyItem right, const IgnoredNames* names = nullptr) {
+    std::ostringstream report;
+    const bool same = left.Compare(right, &report, names, false);
+    return (same ? "same " : "different ") + report.str();
+  };
+  const std::vector<KvfValue> one = {KvfValue::Integer(1)};
+  const std::vector<KvfValue> two = {KvfValue::Integer(1), KvfValue::Integer(2)};
+  const std::vector<KvfValue> other = {KvfValue::Integer(1), KvfValue::Integer(3)};
+  EXPECT_EQ(compare(key(two), key(two)), "same K matches\n");
+  EXPECT_EQ(compare(key(two), key(other)), "different K Value #2 is different\n");
+  EXPECT_EQ(compare(key(one), key(two)), "different K different value count\n");
+  EXPECT_EQ(compare(key({}), key({})), "different ");
+  EXPECT_EQ(compare(key(one), key(one, "L")), "different Different key names K<>L\n");
+  EXPECT_EQ(compare(key(one), key(two), &ignored), "same ignored key name K\n");
+  CKvfSectionItem section;
+  EXPECT_FALSE(section.Compare(*key(one).Copy(), nullptr, nullptr, false));
+  EXPECT_FALSE(key(one).Copy()->Compare(section, nullptr, nullptr, false));
 }
 
 }  // namespace

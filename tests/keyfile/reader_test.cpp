@@ -1,11 +1,15 @@
+// Key files as trees: what the reader makes of a text, where it finds each item, and how two trees compare.
+// In the files of cases ^ is a line's end; a comparison has a line for each side.
 #include "keyfile/reader.h"
 
 #include <gtest/gtest.h>
 
 #include <random>
+#include <regex>
 #include <sstream>
 
 #include "keyfile/item_tree.h"
+#include "support/case_file.h"
 #include "support/temporary_folder.h"
 
 namespace tessal {
@@ -22,65 +26,63 @@ std::string Read(const std::string& text) {
   return written.str();
 }
 
-bool Accepts(const std::string& text) {
-  CKvfSectionItem tree;
-  return ParseKeyFileTree(text, tree) != 0;
+std::string Exchanged(std::string text, char from, char to) {
+  std::replace(text.begin(), text.end(), from, to);
+  return text;
 }
 
-TEST(Reader, KeepsCommentsWhereTheyStand) {
-  const std::string text =
-      "// first\n//second\n\n[T] // start\n"
-      "   // of its own\n"
-      "   A = 1,2.5,true,'text',|path| // behind\n"
-      "   [S]\n      B = -7\n   EndSect // end of S\n\n"
-      "EndSect // T\n\n";
-  EXPECT_EQ(Read(text),
-            "// first\n//second\n\n"
-            "[T] // start\n"
-            "   // of its own\n"
-            "   A = 1,2.5,true,'text',|path| // behind\n"
-            "   [S]\n"
-            "      B = -7\n"
-            "   EndSect // end of S\n\n"
-            "EndSect // T\n\n"
-            "\n\n");
+/// All items of a text with depth, place and mark.
+std::string Items(const CKvfSectionItem& section) {
+  std::string rows;
+  for (const auto& each : section.Children()) {
+    EXPECT_EQ(each->parent, &section);
+    rows += std::to_string(each->depth) + " " + each->Describe() + " " + std::to_string(each->line) + ":" +
+            std::to_string(each->column) + " mark " + std::to_string(each->mark) + "\n";
+    if (each->ItemKind() == CKvfBaseItem::kSection) rows += Items(static_cast<const CKvfSectionItem&>(*each));
+  }
+  return rows;
 }
 
-TEST(Reader, AcceptsAndRefusesByTheGrammar) {
-  struct Row {
-    const char* text;
-    bool accepted;
-  };
-  const Row rows[] = {
-      {"\n[T]\nEndSect\n", true},
-      {"[T]\nEndSect\n", false},           // no line feed ahead of the first section
-      {"\n[T]\nEndSect", false},           // none behind the last
-      {"\n", false},                       // no section
-      {"\nA = 1\n[T]\nEndSect\n", false},  // a keyword outside
-      {"\n[T]\nendsect\n", true},
-      {"\n[T]\nENDSECT // x\n", true},
-      {"\n[T]\nA = 1, 2\n, 3\nEndSect\n", false},
-      {"\n[T]\nTRUE = 1\nEndSect\n", false},
-      {"\n[T]\nTrueness = 1\nEndSection = 2\nEndSect\n", true},
-      {"\n[T]\nA = .5\nEndSect\n", false},
-      {"\n[T]\nA = 5., +5, 1e3, tRuE\nEndSect\n", true},
-      {"\n[T]\nA = 'open\nEndSect\n", false},
-      {"\n[T]\nA = 'a\nb'\nEndSect\n", true},
-      {"\n[T]\nEndSect\n[U]\nEndSect\n", true},
-      {"\n[T]\nEndSect\n// between\n[U]\nEndSect\n", false},
-      {"// a header without a blank line\n[T]\nEndSect\n", false},
-      {"// a header\n\n[T]\nEndSect\n", true},
-      {"\n[T] EndSect\n", false},
-      {"\n[T]\n\n\n// c\n\nA = 1\n\nEndSect\n", true},
-  };
-  for (const Row& row : rows) EXPECT_EQ(Accepts(row.text), row.accepted) << row.text << KeyFileFailureText();
+/// The report of a comparison and the marks that it leaves.
+std::string Compared(const std::string& lines, const IgnoredNames* ignored, bool onlyKeywords) {
+  const std::size_t end = lines.find('\n');
+  CKvfSectionItem left;
+  CKvfSectionItem right;
+  EXPECT_EQ(ParseKeyFileTree(Exchanged(lines.substr(0, end), '^', '\n'), left), 1) << KeyFileFailureText();
+  EXPECT_EQ(ParseKeyFileTree(Exchanged(lines.substr(end + 1), '^', '\n'), right), 1) << KeyFileFailureText();
+  std::ostringstream report;
+  const bool same = left.Compare(right, &report, ignored, onlyKeywords);
+  EXPECT_EQ(left.Compare(right, nullptr, ignored, onlyKeywords), same);
+  return (same ? "same\n" : "different\n") + report.str() + Items(left) + Items(right);
 }
 
-TEST(Reader, WordsItsFailures) {
-  EXPECT_EQ(Read("[T]\nEndSect\n"),
-            "Error syntax error, unexpected LEFT_SQUARE, expecting NEWLINEin line 0, column 1");
-  EXPECT_EQ(Read("\n[T]\nA = .5\nEndSect\n").substr(0, 43), "Error syntax error, unexpected $undefinedin");
-  EXPECT_EQ(Read("\n[T]\n A = 'open").substr(0, 53), "Error syntax error, unexpected $end, expecting STRING");
+class KeyFile : public testing::TestWithParam<const char*> {};
+
+TEST_P(KeyFile, IsAsTheCasesSay) {
+  test::RunCases(std::string("keyfile/cases/") + GetParam(), [](const test::Case& each) -> test::Answer {
+    return [input = each.input](const test::CaseCall& call) {
+      if (call.words == "read") return Read(input);
+      if (call.words == "compare") return Compared(input, nullptr, false);
+      if (call.words == "compare keywords") return Compared(input, nullptr, true);
+      if (call.words == "each read") {
+        return test::AnswerEach(input, [](const std::string& line) {
+          return Exchanged(Read(Exchanged(line, '^', '\n')), '\n', '^');
+        });
+      }
+      if (call.words == "items") {
+        CKvfSectionItem tree;
+        return ParseKeyFileTree(input, tree) == 0 ? KeyFileFailureText() : Items(tree);
+      }
+      std::istringstream words(call.words);
+      const IgnoredNames ignored{std::next(std::istream_iterator<std::string>(words), 2), {}};
+      return Compared(input, &ignored, false);
+    };
+  });
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, KeyFile, testing::Values("reading.txt", "comparing.txt"));
+
+TEST(Reader, DeepNestingIsAMessage) {
   std::string nested = "\n";
   for (int depth = 0; depth < 100'000; ++depth) nested += "[S]\n";
   EXPECT_NE(Read(nested).find("memory exhausted"), std::string::npos);
@@ -88,29 +90,10 @@ TEST(Reader, WordsItsFailures) {
 
 TEST(Reader, LineEndsOfEitherKindReadTheSame) {
   const std::string bare = "// header\n\n[T]\n  A = 'two\nlines'\n\n  // c\nEndSect // T\n\n[U]\nEndSect\n";
-  std::string full;
-  for (const char character : bare)
-    full += character == '\n' ? std::string("\r\n") : std::string(1, character);
+  const std::string full = std::regex_replace(bare, std::regex("\n"), "\r\n");
   EXPECT_EQ(Read(full), Read(bare));
   EXPECT_EQ(Read("\xEF\xBB\xBF" + full), Read(bare));
   EXPECT_EQ(Read(full + std::string("\0[", 2)), Read(bare));
-}
-
-TEST(Reader, TellsWhereItemsEnd) {
-  CKvfSectionItem tree;
-  ASSERT_EQ(ParseKeyFileTree("\n[T]\n A = 1\n [S]\n EndSect\nEndSect\n", tree), 1);
-  const auto& target = static_cast<const CKvfSectionItem&>(*tree.Children()[0]);
-  // A section carries the line of the last head inside it.
-  EXPECT_EQ(target.line, 3);
-  EXPECT_EQ(target.depth, 1U);
-  EXPECT_EQ(target.Children()[0]->line, 3) << "behind its line feed";
-  EXPECT_EQ(target.Children()[1]->depth, 2U);
-  EXPECT_EQ(target.Children()[1]->Path(), ".T.S");
-  EXPECT_EQ(target.Children()[0]->Describe(), "Keyword .T.A");
-}
-
-TEST(Reader, DropsTabsFromCommentsOnly) {
-  EXPECT_EQ(Read("\n[T] //a\tb\n A = 'a\tb'\nEndSect\n"), "[T] //ab\n   A = 'a\tb'\nEndSect\n\n\n\n");
 }
 
 TEST(Reader, FilesThatCannotBeRead) {
@@ -171,6 +154,17 @@ TEST(Reader, WrittenTreesReadBackTheSame) {
                                               << KeyFileFailureText() << text;
     ASSERT_EQ(Read("\n" + once).size(), once.size()) << "seed 11, round " << round;
   }
+}
+
+TEST(Comparison, RefusesAFaultyOrEndlessExpression) {
+  CKvfSectionItem tree;
+  ASSERT_EQ(ParseKeyFileTree("\n[T]\n" + std::string(1000, 'a') + " = 1\nEndSect\n", tree), 1);
+  for (const std::string& expression : {std::string("["), std::string(kLongestIgnoredName + 1, 'a')}) {
+    const IgnoredNames faulty = {expression};
+    EXPECT_THROW(tree.Compare(tree, nullptr, &faulty, false), std::regex_error);
+  }
+  const IgnoredNames backtracking = {"(a+)+b"};
+  EXPECT_TRUE(tree.Compare(tree, nullptr, &backtracking, false)) << "too many ways, and no name is ignored";
 }
 
 }  // namespace

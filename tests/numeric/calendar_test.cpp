@@ -151,8 +151,7 @@ TEST(Daylight, DayLengthFollowsSeasonAndLatitude) {
     double tolerance;
   } rows[] = {
       // Almanacs give the day with refraction and the sun's disc, 10 to 20 minutes longer; the formula
-      // stretches
-      // the latitude a little.
+      // stretches the latitude a little.
       {{2023, 6, 21}, 0, 12, 1e-9},
       {{2023, 6, 21}, 40, 15.0, 0.15},
       {{2023, 12, 21}, 40, 9.33, 0.3},

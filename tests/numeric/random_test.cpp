@@ -5,7 +5,6 @@
 #include <cmath>
 #include <cstdint>
 #include <functional>
-#include <limits>
 #include <string>
 #include <vector>
 
@@ -211,34 +210,8 @@ TEST_F(RandomDeviates, BinomialHasItsShapeForFewAndManyEvents) {
   }
 }
 
-TEST_F(RandomDeviates, ArgumentsOutsideTheirRangeHaveAnAnswer) {
-  constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
-  const struct {
-    std::string what;
-    double deviate;
-    double expected;
-  } rows[] = {
-      {"Poisson of 0", PoissonDeviate(0), 0},
-      {"Poisson of -1", PoissonDeviate(-1), 0},
-      {"Poisson of minus infinity", PoissonDeviate(-HUGE_VAL), 0},
-      {"Poisson of NaN", PoissonDeviate(kNaN), kNaN},
-      {"gamma of 0.99", GammaDeviate(0.99), 0},
-      {"gamma of -5", GammaDeviate(-5), 0},
-      {"gamma of NaN", GammaDeviate(kNaN), kNaN},
-      {"binomial of probability 0", BinomialDeviate(0, 50), 0},
-      {"binomial of probability 1", BinomialDeviate(1, 50), 50},
-      {"binomial of probability 7", BinomialDeviate(7, 50), 50},
-      {"binomial of probability -7", BinomialDeviate(-7, 50), 0},
-      {"binomial of no events", BinomialDeviate(0.5, 0.9), 0},
-      {"binomial of -3 events", BinomialDeviate(0.5, -3), 0},
-      {"binomial of NaN", BinomialDeviate(kNaN, 3), kNaN},
-      {"normal of a negative variance", NormalDeviateOf(0, -1), kNaN},
-  };
-  for (const auto& row : rows) {
-    EXPECT_TRUE(std::isnan(row.expected) ? std::isnan(row.deviate) : row.deviate == row.expected)
-        << row.what << " gives " << row.deviate;
-  }
-  // Where the acceptance has lost its digits the deviate is near the mean still.
+TEST_F(RandomDeviates, StayNearAHugeMean) {
+  // Where the acceptance has lost its digits the deviate is still near the mean.
   EXPECT_NEAR(PoissonDeviate(1e18) / 1e18, 1, 1e-6);
   EXPECT_NEAR(BinomialDeviate(0.5, 1e18) / 1e18, 0.5, 1e-6);
   EXPECT_NEAR(GammaDeviate(1e18) / 1e18, 1, 1e-6);

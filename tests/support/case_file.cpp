@@ -161,6 +161,21 @@ void RunCases(std::string_view file, const std::function<Answer(const Case&)>& b
   if (Blessing()) Write(file, TextOf(cases));
 }
 
+std::string AnswerEach(std::string_view lines, const std::function<std::string(const std::string&)>& answer) {
+  std::string rows;
+  for (const std::string& line : LinesOf(lines)) {
+    std::string_view separator = " => ";
+    rows += line;
+    for (const std::string& part : LinesOf(answer(line))) {
+      rows += separator;
+      rows += part;
+      separator = " | ";
+    }
+    rows += '\n';
+  }
+  return rows;
+}
+
 void ExpectListing(std::string_view file, std::string_view actual) {
   const std::string path = PathOf(file);
   const std::string shown = ShownText(actual);

@@ -47,6 +47,10 @@ using Answer = std::function<std::string(const CaseCall&)>;
 /// state from call to call.
 void RunCases(std::string_view file, const std::function<Answer(const Case&)>& begin);
 
+/// One line for each line of a text: the line, an arrow, and the lines of its answer with bars between them;
+/// the line alone when the answer is empty.
+std::string AnswerEach(std::string_view lines, const std::function<std::string(const std::string&)>& answer);
+
 /// Compares a text with the file that holds it.
 void ExpectListing(std::string_view file, std::string_view actual);
 
