@@ -65,7 +65,7 @@ bool CompileExpression(const CEL_Element& element, std::string_view caption, con
                        ExpressionNode& tree) {
   ParsedExpression parsed = ParseExpression(StripExpressionQuotes(expression.Text()));
   if (const ParseFailure* failure = parsed.Failure()) {
-    Errors().ReportElementError(caption, element.GetUid(), failure->message);
+    Errors().ReportCheck(caption, element.GetUid(), failure->finding);
     return false;
   }
   tree = std::move(std::get<ExpressionNode>(parsed.result));
