@@ -4,19 +4,19 @@
 #include <map>
 #include <memory>
 #include <set>
-#include <sstream>
 
 #include "core/error_registry.h"
-#include "core/loaded_template.h"
+#include "core/template_core.h"
+#include "expr/scanner.h"
 #include "support/case_file.h"
 #include "support/template_text.h"
+#include "support/temporary_folder.h"
 
 namespace tessal {
 namespace {
 
 using test::Case;
 using test::CaseCall;
-using test::TemplateText;
 
 std::set<std::string_view>& CodesSeen() {
   static std::set<std::string_view> codes;
@@ -47,55 +47,60 @@ std::string TakeMessages(const TemplateCore& core, const std::string& folder) {
 
 std::string TextOf(const std::string& input) {
   if (input.starts_with("from ")) return test::ReadFile(TESSAL_SOURCE_DIR "/" + input.substr(5));
-  if (input.empty() || input.starts_with('\n')) return input;
-  TemplateText text;
-  std::istringstream lines(input);
-  for (std::string kind, symbol, rest; lines >> kind >> symbol && std::getline(lines >> std::ws, rest);) {
-    if (kind == "constant") text.Constant(symbol, rest);
-    if (kind == "auxiliary") text.Auxiliary(symbol, rest);
-    if (kind == "class") text.Specie(symbol, rest, {});
-  }
-  return text.Text();
+  return input.empty() || input.starts_with('\n') ? input : test::TemplateFromNotation(input);
 }
 
-/// The calls: what is done with the template, given the rest of the call's line.
-using Operation = void (*)(TemplateCore&, const std::string& folder, const std::string& rest);
-const std::map<std::string, Operation> kOperations = {
-    {"load", [](TemplateCore& core, const std::string& folder,
-                const std::string& rest) { core.LoadWrapper(folder + "/" + rest); }},
-    {"save", [](TemplateCore& core, const std::string& folder,
-                const std::string& rest) { core.SaveWrapper(folder + "/" + rest); }},
-    {"rename-class", [](TemplateCore& core, const std::string&,
-                        const std::string& rest) { core.GetSpecie(0).symbol.SetText(rest); }},
-    {"describe-class", [](TemplateCore& core, const std::string&,
-                          const std::string& rest) { core.GetSpecie(0).description.SetText(rest); }},
-    {"repeat-in-auxiliary",
-     [](TemplateCore& core, const std::string&, const std::string& rest) {
-       std::istringstream words(rest);
-       std::string expression;
-       std::string piece;
-       for (words >> piece; expression.size() < 20'000; expression += piece) {
-       }
-       words >> std::ws >> piece;
-       core.GetAuxiliary(0).expression.SetText(expression.substr(0, std::stoul(piece)));
-       core.ValidateTemplate();
-     }},
-    {"process-rule",
-     [](TemplateCore& core, const std::string&, const std::string&) { core.CheckProcessRule(); }},
+/// A template in a folder of its own, loaded; notifications are on, as in an editor.
+struct OpenTemplate {
+  explicit OpenTemplate(const std::string& input) {
+    ResetExpressionScanner();
+    core.LoadWrapper(folder.Write("model.tessal", TextOf(input)));
+    SetNotifyChanges(true);
+  }
+  OpenTemplate(const OpenTemplate&) = delete;
+  OpenTemplate& operator=(const OpenTemplate&) = delete;
+  ~OpenTemplate() { SetNotifyChanges(false); }
+
+  test::TemporaryFolder folder;
+  TemplateCore core;
 };
 
+/// Gives the first auxiliary an expression of so many of a character.
+void Repeat(TemplateCore& core, const std::string& words) {
+  const std::size_t blank = words.find(' ');
+  core.GetAuxiliary(0).expression.SetText(std::string(std::stoul(words.substr(blank)), words.front()));
+  core.ValidateTemplate();
+}
+
+/// What is done with a template, given the rest of the call's line.
+using Operation = void (*)(OpenTemplate&, const std::string& rest);
+const std::map<std::string, Operation> kOperations = {
+    {"load",
+     [](OpenTemplate& open, const std::string& rest) { open.core.LoadWrapper(open.folder.File(rest)); }},
+    {"save",
+     [](OpenTemplate& open, const std::string& rest) { open.core.SaveWrapper(open.folder.File(rest)); }},
+    {"rename-class",
+     [](OpenTemplate& open, const std::string& rest) { open.core.GetSpecie(0).symbol.SetText(rest); }},
+    {"describe-class",
+     [](OpenTemplate& open, const std::string& rest) { open.core.GetSpecie(0).description.SetText(rest); }},
+    {"repeat-in-auxiliary", [](OpenTemplate& open, const std::string& rest) { Repeat(open.core, rest); }},
+    {"process-rule", [](OpenTemplate& open, const std::string&) { open.core.CheckProcessRule(); }},
+};
+
+std::string AnswerTo(const CaseCall& call, OpenTemplate& open) {
+  const std::size_t end = std::min(call.words.find(' '), call.words.size());
+  const std::string rest = call.words.substr(std::min(end + 1, call.words.size()));
+  if (call.words != "messages") {
+    Errors().Reset();
+    kOperations.at(call.words.substr(0, end))(open, rest);
+  }
+  return TakeMessages(open.core, open.folder.Path().string());
+}
+
 TEST(Messages, EachCodeIsGivenByAnExampleOrACase) {
-  test::RunCases("core/cases/messages.txt", [](const Case& given) {
-    auto loaded = std::make_shared<test::LoadedTemplate>(TextOf(given.input));
-    const std::string folder = loaded->Path().substr(0, loaded->Path().rfind('/'));
-    return [loaded, folder](const CaseCall& call) {
-      const std::size_t blank = std::min(call.words.find(' '), call.words.size());
-      const std::string rest = call.words.substr(std::min(blank + 1, call.words.size()));
-      if (call.words != "messages") {
-        Errors().Reset();
-        kOperations.at(call.words.substr(0, blank))(**loaded, folder, rest);
-      }
-      return TakeMessages(**loaded, folder);
+  test::RunCases("core/cases/messages.txt", [](const Case& given) -> test::Answer {
+    return [open = std::make_shared<OpenTemplate>(given.input)](const CaseCall& call) {
+      return AnswerTo(call, *open);
     };
   });
   // It guards the check itself: the counts balance on every tree of the parser.
@@ -114,10 +119,10 @@ TEST(Messages, ValuesAreFilledInAsTheyAre) {
 TEST(Messages, TheListCountsAndFormatsItsRecords) {
   ErrorRegistry registry;
   EXPECT_EQ(registry.JoinErrors(), "");
-  registry.AddError(2, "K", 5, "wrong");
-  registry.AddError(3, "", -1, "missing");
-  registry.AddError(9, "odd", 0, "level");
-  registry.ReportElementError("K", 5, "again");
+  registry.AddError(2, "K", Uid{5}, "wrong");
+  registry.AddError(3, "", Uid{-1}, "missing");
+  registry.AddError(9, "odd", Uid{0}, "level");
+  registry.ReportElementError("K", Uid{5}, "again");
   registry.ReportInFile("LOAD ", 7, {"load-failed", {"early"}});
   EXPECT_EQ(registry.GetErrorCount(2), 2U);
   EXPECT_EQ(registry.GetErrorCount(3), 1U);
@@ -130,17 +135,17 @@ TEST(Messages, TheListCountsAndFormatsItsRecords) {
 
   std::string symbol;
   std::string text;
-  std::int32_t uid = 0;
+  Uid uid{};
   std::uint32_t level = 0;
   registry.GetErrorForList(2, symbol, uid, text);
-  EXPECT_EQ(symbol + std::to_string(uid) + text, "odd-1: level");
+  EXPECT_EQ(symbol + std::to_string(static_cast<int>(uid)) + text, "odd-1: level");
   registry.GetErrorForList(5, symbol, uid, text);
-  EXPECT_EQ(symbol + std::to_string(uid) + text, "-1no errors");
+  EXPECT_EQ(symbol + std::to_string(static_cast<int>(uid)) + text, "-1no errors");
   EXPECT_FALSE(registry.FormatError(5, text));
   EXPECT_EQ(text, "invalid error number!");
   EXPECT_FALSE(registry.GetError(5, level, symbol, uid, text));
   EXPECT_TRUE(registry.GetError(0, level, symbol, uid, text));
-  EXPECT_EQ(std::to_string(level) + symbol + std::to_string(uid) + text, "2K5wrong");
+  EXPECT_EQ(std::to_string(level) + symbol + std::to_string(static_cast<int>(uid)) + text, "2K5wrong");
   registry.ClearErrors();
   EXPECT_EQ(registry.GetErrorCount(2) + registry.GetErrorCount(0), 0U);
   EXPECT_EQ(registry.ExpressionWarningCount(), 1);

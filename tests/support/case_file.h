@@ -47,6 +47,9 @@ using Answer = std::function<std::string(const CaseCall&)>;
 /// state from call to call.
 void RunCases(std::string_view file, const std::function<Answer(const Case&)>& begin);
 
+/// Compares a page that people read with the file that holds it byte for byte.
+void ExpectPage(std::string_view file, std::string_view actual);
+
 /// Compares a text with the file that holds it.
 void ExpectListing(std::string_view file, std::string_view actual);
 
