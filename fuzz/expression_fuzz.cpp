@@ -52,8 +52,8 @@ void CheckParse(const std::string& text) {
   if (const ParseFailure* failure = first.Failure()) {
     ResetExpressionScanner();
     const ParsedExpression again = ParseExpression(text);
-    Require(again.Failure() != nullptr && again.Failure()->message == failure->message);
-    Require(failure->message.starts_with("Line "));
+    Require(again.Failure() != nullptr && again.Failure()->finding.text == failure->finding.text);
+    Require(failure->finding.text.starts_with("Line "));
     return;
   }
   const ExpressionNode& tree = *first.Tree();

@@ -63,7 +63,7 @@ Answer WithTree(const std::string& expression, bool withMessage,
                 const std::function<std::string(const ExpressionNode&)>& textOf) {
   const ParsedExpression parsed = ParseExpression(expression);
   if (const ParseFailure* failure = parsed.Failure()) {
-    return {withMessage ? failure->message : std::string(), kContentFault};
+    return {withMessage ? failure->finding.text : std::string(), kContentFault};
   }
   return {textOf(*parsed.Tree()), kFine};
 }

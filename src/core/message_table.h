@@ -83,7 +83,7 @@ inline constexpr MessageRow kMessages[] = {
         ErrorLevel::Critical,
         "could not write key %1: %2",
         "A value cannot be written in the key-file format; the save fails and the file on disk is unchanged.",
-        "A description that holds both kinds of quotation marks.",
+        "A description that holds both an apostrophe and a vertical bar.",
         "Change the value of the element so that the format can hold it, and save again.",
     },
     {

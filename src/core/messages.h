@@ -36,7 +36,7 @@ class Message final {
 
 /// What a check found: a message, and its text with the values in their places.
 struct Finding {
-  /// As many values as the text of the row has places.
+  /// Takes a value for each place in the text of the row; further values are not used.
   Finding(Message message, std::initializer_list<std::string_view> values = {});
 
   Message message;

@@ -65,7 +65,7 @@ bool CheckExpressions(const CEL_Element& element) {
 bool CheckParses(const CEL_Element& element, std::string_view caption, const CEL_Property& expression) {
   const ParseFailure* failure = expression.Parsed().Failure();
   if (failure == nullptr) return true;
-  Errors().ReportElementError(caption, element.GetUid(), failure->message);
+  Errors().ReportCheck(caption, element.GetUid(), failure->finding);
   return false;
 }
 

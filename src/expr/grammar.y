@@ -235,5 +235,5 @@ static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value,
 }
 
 static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message) {
-  state.Fail(message);
+  state.FailAsParser(message);
 }

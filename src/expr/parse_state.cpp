@@ -31,17 +31,23 @@ int ParseState::Pull(LexemeSpan& lexeme) {
   const std::size_t length = scan.Lexeme().size();
   if (length >= kLexemeBuffer) {
     tooLong = true;
-    Fail("token too long");
+    Fail("token-too-long");
     return code;
   }
   lexeme = {text.data() + (scan.Consumed() - length), static_cast<std::uint32_t>(length)};
   return code;
 }
 
-void ParseState::Fail(std::string_view failure) {
-  message = "Line " + std::to_string(scan.Lines() + 1) + " position " + std::to_string(Position()) + " : ";
-  message += failure;
-  message += '\n';
+void ParseState::Fail(Message message, std::string_view words) {
+  failure = Finding(message, {std::to_string(scan.Lines() + 1), std::to_string(Position()), words});
+}
+
+void ParseState::FailAsParser(std::string_view words) {
+  if (words == "memory exhausted") {
+    Fail("nesting-too-deep");
+  } else {
+    Fail("syntax-error", words);
+  }
 }
 
 NodeHandle ParseState::Put(std::unique_ptr<ExpressionNode> node) {

@@ -6,10 +6,12 @@
 #include <cstdint>
 #include <initializer_list>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "core/messages.h"
 #include "expr/expression_grammar.h"
 #include "expr/expression_node.h"
 #include "expr/scanner.h"
@@ -24,7 +26,8 @@ class ParseState final {
   // The token side.
   int Pull(LexemeSpan& lexeme);
   bool TokenIsTooLong() const { return tooLong; }
-  void Fail(std::string_view message);
+  /// The failure in the words of the generated parser.
+  void FailAsParser(std::string_view words);
 
   // The tree side. Each takes its children out of the store and puts itself in.
   NodeHandle Leaf(NodeKind kind, LexemeSpan lexeme);
@@ -40,11 +43,14 @@ class ParseState final {
   void SetRoot(NodeHandle handle) { root = std::move(store[handle]); }
 
   std::unique_ptr<ExpressionNode>& Root() { return root; }
-  const std::string& Message() const { return message; }
+  /// What is wrong, after a parse that failed.
+  const Finding& Failure() const { return *failure; }
   std::int32_t Line() const { return static_cast<std::int32_t>(scan.Lines()); }
   std::int32_t Position() const { return static_cast<std::int32_t>(scan.Consumed() - scan.LineStart()); }
 
  private:
+  /// Notes a message of the parser. Its values are line, position, and the words if it has a place for them.
+  void Fail(Message message, std::string_view words = {});
   NodeHandle Put(std::unique_ptr<ExpressionNode> node);
   NodeHandle Number(const char* digits);
   NodeHandle IsTrue(NodeHandle conditional);
@@ -53,7 +59,7 @@ class ParseState final {
   ExpressionScan scan;
   std::vector<std::unique_ptr<ExpressionNode>> store;
   std::unique_ptr<ExpressionNode> root;
-  std::string message;
+  std::optional<Finding> failure;
   bool tooLong = false;
 };
 

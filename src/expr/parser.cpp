@@ -13,7 +13,7 @@ ParsedExpression ParseExpression(std::string_view text) {
   if (tessal_expression_grammar_parse(state) == 0 && state.Root()) {
     parsed.result = std::move(*state.Root());
   } else {
-    parsed.result = ParseFailure{state.Message(), state.Line(), state.Position()};
+    parsed.result = ParseFailure{state.Failure(), state.Line(), state.Position()};
   }
   parsed.left = ExpressionScannerStart();
   return parsed;
@@ -34,7 +34,7 @@ int ParseExpressionText(const std::string& text, ExpressionNode& node, std::int3
   if (const ParseFailure* failure = parsed.Failure()) {
     line = failure->line;
     position = failure->position;
-    message = failure->message;
+    message = failure->finding.text;
     return 0;
   }
   node = std::move(std::get<ExpressionNode>(parsed.result));

@@ -8,6 +8,7 @@
 #include <string_view>
 #include <variant>
 
+#include "core/messages.h"
 #include "expr/expression_node.h"
 #include "expr/scanner.h"
 
@@ -15,7 +16,7 @@ namespace tessal {
 
 /// Why a text has no tree.
 struct ParseFailure {
-  std::string message;    ///< "Line L position P : ...", ends in a line feed
+  Finding finding;        ///< its text is "Line L position P : ...", ends in a line feed
   std::int32_t line;      ///< line feeds scanned until then
   std::int32_t position;  ///< characters of the last line scanned until then
 };

@@ -108,7 +108,7 @@ bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& pa
   FunctionCheck check(symbol, uid);
   const ExpressionNode* tree = parsed.Tree();
   if (tree == nullptr) {
-    Errors().ReportElementError(symbol, uid, parsed.Failure()->message);
+    check.Report(parsed.Failure()->finding);
     return false;
   }
   check.Walk(*tree);

@@ -97,7 +97,7 @@ QString CAutoRichEditCtrl::ParserMessage() const {
   const ScannerRest rest;
   const ParsedExpression parsed = ParseExpression(FromScreen(ContentText(), content));
   const ParseFailure* failure = parsed.Failure();
-  return failure == nullptr ? QString() : ToScreen(failure->message).trimmed();
+  return failure == nullptr ? QString() : ToScreen(failure->finding.text).trimmed();
 }
 
 Uid CAutoRichEditCtrl::LinkAt(const QPoint& point) const {

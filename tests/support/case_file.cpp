@@ -129,6 +129,25 @@ void Write(std::string_view file, std::string_view text) {
   std::ofstream(PathOf(file), std::ios::binary) << text;
 }
 
+/// Reports where a file and what it is to hold first differ, or writes the file.
+void ExpectSame(std::string_view file, const std::string& given) {
+  if (Blessing()) {
+    Write(file, given);
+    return;
+  }
+  const std::string path = PathOf(file);
+  const std::vector<std::string> expectedLines = LinesOf(ReadFile(path));
+  const std::vector<std::string> givenLines = LinesOf(given);
+  for (std::size_t place = 0; place < std::max(expectedLines.size(), givenLines.size()); ++place) {
+    const std::string want = place < expectedLines.size() ? expectedLines[place] : "(the end)";
+    const std::string have = place < givenLines.size() ? givenLines[place] : "(the end)";
+    if (want == have) continue;
+    ADD_FAILURE_AT(path.c_str(), static_cast<int>(place + 1))
+        << "expected: " << want << "\ngiven:    " << have;
+    return;  // what follows is often only shifted
+  }
+}
+
 }  // namespace
 
 bool Blessing() {
@@ -176,23 +195,12 @@ std::string AnswerEach(std::string_view lines, const std::function<std::string(c
   return rows;
 }
 
+void ExpectPage(std::string_view file, std::string_view actual) {
+  ExpectSame(file, std::string(actual));
+}
+
 void ExpectListing(std::string_view file, std::string_view actual) {
-  const std::string path = PathOf(file);
-  const std::string shown = ShownText(actual);
-  if (Blessing()) {
-    Write(file, shown);
-    return;
-  }
-  const std::vector<std::string> expected = LinesOf(ReadFile(path));
-  const std::vector<std::string> given = LinesOf(shown);
-  for (std::size_t place = 0; place < std::max(expected.size(), given.size()); ++place) {
-    const std::string want = place < expected.size() ? expected[place] : "(the end)";
-    const std::string have = place < given.size() ? given[place] : "(the end)";
-    if (want == have) continue;
-    ADD_FAILURE_AT(path.c_str(), static_cast<int>(place + 1))
-        << "expected: " << want << "\ngiven:    " << have;
-    return;  // what follows is often only shifted
-  }
+  ExpectSame(file, ShownText(actual));
 }
 
 }  // namespace tessal::test

@@ -51,6 +51,9 @@ void RunCases(std::string_view file, const std::function<Answer(const Case&)>& b
 /// the line alone when the answer is empty.
 std::string AnswerEach(std::string_view lines, const std::function<std::string(const std::string&)>& answer);
 
+/// Compares a page that people read with the file that holds it byte for byte.
+void ExpectPage(std::string_view file, std::string_view actual);
+
 /// Compares a text with the file that holds it.
 void ExpectListing(std::string_view file, std::string_view actual);
 
