@@ -19,7 +19,7 @@ void ShellSession::Write(const std::string& name, const std::string& content) co
 ShellRun ShellSession::Run(const std::string& command) const {
   const std::string output = results.File("output");
   const std::string errors = results.File("errors");
-  const std::string line = "export LC_ALL=C PATH='" TESSAL_TOOL_FOLDER "':\"$PATH\"; cd '" +
+  const std::string line = "unset NO_COLOR; export LC_ALL=C PATH='" TESSAL_TOOL_FOLDER "':\"$PATH\"; cd '" +
                            folder.Path().string() + "' && (" + command + "\n) </dev/null >'" + output +
                            "' 2>'" + errors + "'";
   const int status = std::system(line.c_str());
