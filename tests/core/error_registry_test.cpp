@@ -8,10 +8,10 @@ namespace {
 TEST(ErrorRegistry, CountsAndFormatsItsRecords) {
   ErrorRegistry registry;
   EXPECT_EQ(registry.JoinErrors(), "");
-  registry.AddError(2, "K", 5, "wrong");
-  registry.AddError(3, "", -1, "missing");
-  registry.AddError(9, "odd", 0, "level");
-  registry.ReportElementError("K", 5, "again");
+  registry.AddError(2, "K", Uid{5}, "wrong");
+  registry.AddError(3, "", Uid{-1}, "missing");
+  registry.AddError(9, "odd", Uid::None, "level");
+  registry.ReportElementError("K", Uid{5}, "again");
   EXPECT_EQ(registry.GetErrorCount(2), 2U);
   EXPECT_EQ(registry.GetErrorCount(3), 1U);
   EXPECT_EQ(registry.GetErrorCount(0), 4U);
@@ -23,12 +23,12 @@ TEST(ErrorRegistry, CountsAndFormatsItsRecords) {
 
   std::string symbol;
   std::string text;
-  std::int32_t uid = 0;
+  Uid uid = Uid::None;
   registry.GetErrorForList(2, symbol, uid, text);
-  EXPECT_EQ(uid, -1);
+  EXPECT_EQ(NumberOf(uid), -1);
   EXPECT_EQ(text, ": level");
   registry.GetErrorForList(4, symbol, uid, text);
-  EXPECT_EQ(symbol + std::to_string(uid) + text, "-1no errors");
+  EXPECT_EQ(symbol + std::to_string(NumberOf(uid)) + text, "-1no errors");
   EXPECT_FALSE(registry.FormatError(4, text));
   EXPECT_EQ(text, "invalid error number!");
   registry.ClearErrors();

@@ -73,43 +73,46 @@ constexpr std::array<std::string_view, 14> kKinds = {"",
                                                      "class.expression",
                                                      "class.movement"};
 
-std::int32_t KindOf(const std::string& word) {
+ElementKind KindOf(const std::string& word) {
   const auto hit = std::find(kKinds.begin(), kKinds.end(), word);
-  return hit == kKinds.end() ? Number(word) : static_cast<std::int32_t>(hit - kKinds.begin());
+  return static_cast<ElementKind>(hit == kKinds.end() ? Number(word) : hit - kKinds.begin());
 }
 
-/// The list of a class that holds members of the kind.
-std::int32_t ClassListOf(std::int32_t kindNumber) {
-  return kindNumber + kind::kSpecieStateVariableList - kind::kSpecieStateVariable;
+/// The list that holds elements of the kind: a head of the template or of a class.
+ElementKind ListOf(ElementKind kind) {
+  const bool isMember = kind >= ElementKind::SpecieStateVariable;
+  const auto place = static_cast<std::size_t>(
+      NumberOf(kind) - NumberOf(isMember ? ElementKind::SpecieStateVariable : ElementKind::StateVariable));
+  return KindAfter(isMember ? ElementKind::SpecieStateVariableList : ElementKind::StateVariableList, place);
 }
 
-CEL_Element& AddElement(TemplateCore& core, std::int32_t kindNumber, CEL_Lagrange_Specie* specie) {
-  switch (kindNumber) {
-    case 1:
+CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Specie* specie) {
+  switch (kind) {
+    case ElementKind::StateVariable:
       return core.AddStateVariable();
-    case 2:
+    case ElementKind::Constant:
       return core.AddConstant();
-    case 3:
+    case ElementKind::Forcing:
       return core.AddForcing();
-    case 4:
+    case ElementKind::Auxiliary:
       return core.AddAuxiliary();
-    case 5:
+    case ElementKind::Process:
       return core.AddProcess();
-    case 6:
+    case ElementKind::DerivedOutput:
       return core.AddDerivedOutput();
-    case 7:
+    case ElementKind::Specie:
       return core.AddSpecie();
-    case 8:
+    case ElementKind::SpecieStateVariable:
       return specie->AddStateVariable();
-    case 9:
+    case ElementKind::SpecieConstant:
       return specie->AddConstant();
-    case 10:
+    case ElementKind::SpecieForcing:
       return specie->AddForcing();
-    case 11:
+    case ElementKind::SpatialFunction:
       return specie->AddSpatialFunction();
-    case 12:
+    case ElementKind::ArithmeticExpression:
       return specie->AddArithmeticExpression();
-    case 13:
+    case ElementKind::HorizontalVector:
       return specie->AddHorizontalVector();
     default:
       throw std::invalid_argument("no kind that can be made");
@@ -138,8 +141,9 @@ class NotedQuestions final : public CreationQuestions {
     return answers[symbol];
   }
   void Create(const CreateRequest& request) override {
-    const auto* specie = core.GetParentSpecie(static_cast<std::uint32_t>(request.ownerId));
-    notes += "  creates " + request.symbol + ", " + std::string(kKinds.at(request.kind)) +
+    const auto* specie = core.GetParentSpecie(request.ownerId);
+    notes += "  creates " + request.symbol + ", " +
+             std::string(kKinds.at(static_cast<std::size_t>(request.kind))) +
              (specie == nullptr ? "" : " of " + specie->symbol.Text()) + "\n";
     core.CreateElement(request);
   }
@@ -209,9 +213,9 @@ CEL_Element& TemplateScript::Element(const std::string& name) {
   if (name == "setup") return core.Root();
   if (name == "settings" && core.GetMisc() != nullptr) return *core.GetMisc();
   const std::size_t list = name.find("list ");
-  if (list == 0) return core.ListHead(KindOf(name.substr(5)) + kind::kStateVariableList - 1);
+  if (list == 0) return core.ListHead(ListOf(KindOf(name.substr(5))));
   if (list != std::string::npos) {
-    return ClassIn({name.substr(0, list - 1)}, 0)->Head(ClassListOf(KindOf(name.substr(list + 5))));
+    return ClassIn({name.substr(0, list - 1)}, 0)->Head(ListOf(KindOf(name.substr(list + 5))));
   }
   if (name.starts_with("function ")) {
     return *core.GetMisc()->ExternalFunctions().at(Place(name.substr(9)));
@@ -224,7 +228,7 @@ std::uint32_t TemplateScript::SequenceOf(const std::string& name) const {
   return core.FindSymbol(name, sequence) ? sequence : static_cast<std::uint32_t>(Number(name));
 }
 
-std::string TemplateScript::SymbolOf(std::uint32_t uid) const {
+std::string TemplateScript::SymbolOf(Uid uid) const {
   std::string symbol;
   return core.GetSymbolOfUid(uid, symbol) ? symbol : "-";
 }
@@ -324,10 +328,10 @@ std::string TemplateScript::Set(const std::string& name, const std::string& labe
 
 std::string TemplateScript::Create(const Words& words) {
   CreateRequest request;
-  request.kind = static_cast<std::uint32_t>(KindOf(words.at(0)));
+  request.kind = KindOf(words.at(0));
   request.symbol = words.at(1) == "-" ? "" : words.at(1);
   if (words.size() > 2) {
-    request.ownerId = ClassIn(words, 2)->Head(ClassListOf(KindOf(words[0]))).MessageUid();
+    request.ownerId = ClassIn(words, 2)->Head(ListOf(KindOf(words[0]))).GetUid();
   }
   const CreatedElement created = core.CreateElement(request);
   std::string answer = "created " + SymbolOf(created.uid);
@@ -375,7 +379,7 @@ std::string TemplateScript::Lookups(const std::string& name) {
   std::string text = std::string(element.KindText());
   if (core.GetElement(uid) != &element) text += ", not found";
   if (core.GetElement(uid, element.Kind()) == nullptr) text += ", not of its kind";
-  if (core.GetElement(uid, kind::kUnknown) != nullptr) text += ", of any kind";
+  if (core.GetElement(uid, ElementKind::Unknown) != nullptr) text += ", of any kind";
   if (core.FindRecordByUid(uid) != core.RecordOfElement(element)) text += ", of two records";
   std::uint32_t sequence = 0;
   if (core.GetSequenceOfUid(uid, sequence)) text += ", number " + std::to_string(sequence);
@@ -388,13 +392,13 @@ std::string TemplateScript::Lookups(const std::string& name) {
   std::vector<std::string> symbols = {"stale"};
   text += core.GetReferrerSymbols(uid, symbols) ? ", used by" : ", no referrers";
   for (const std::string& symbol : symbols) text += " " + symbol;
-  std::vector<std::uint32_t> uids;
+  std::vector<Uid> uids;
   if (core.GetReferrerUids(uid, uids)) text += " (" + std::to_string(uids.size()) + ")";
   if (const auto* specie = core.GetParentSpecie(uid)) text += ", list of " + specie->symbol.Text();
   std::int32_t id = -1;
-  std::int32_t found = 0;
+  auto found = ElementKind::None;
   text += core.FindElementBySymbol(name, id, found) ? ", by symbol " : ", not by symbol ";
-  return text + std::to_string(id) + " " + std::to_string(found);
+  return text + std::to_string(id) + " " + std::to_string(NumberOf(found));
 }
 
 std::string TemplateScript::State() const {
@@ -440,7 +444,7 @@ CEL_Lagrange_Specie* TemplateScript::ClassIn(const Words& words, std::size_t pla
 }
 
 std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
-  std::uint32_t predecessor = 4711;
+  Uid predecessor{4711};
   const bool moved = core.MoveBeforeFirstUser(UidOf(name), predecessor);
   return YesNo(moved) + " after " + SymbolOf(predecessor);
 }

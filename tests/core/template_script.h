@@ -53,8 +53,8 @@ class TemplateScript final {
   std::string Items(const Words& words);
   std::string Lookups(const std::string& name);
   std::string Shortened(std::string text) const;
-  std::string SymbolOf(std::uint32_t uid) const;
-  std::uint32_t UidOf(const std::string& name) { return Element(name).GetUid(); }
+  std::string SymbolOf(Uid uid) const;
+  Uid UidOf(const std::string& name) { return Element(name).GetUid(); }
   std::uint32_t SequenceOf(const std::string& name) const;
 
   TemporaryFolder folder;
