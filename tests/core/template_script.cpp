@@ -10,6 +10,7 @@
 #include "core/rename.h"
 #include "elements/version_stamp.h"
 #include "expr/scanner.h"
+#include "platform/number_text.h"
 #include "support/template_text.h"
 
 namespace tessal::test {
@@ -203,7 +204,7 @@ std::string TemplateScript::Shortened(std::string text) const {
       text.replace(place, part.size(), by);
   };
   replace(folder.Path().string(), "FOLDER");
-  replace(RealText(SoftwareVersion()), "VERSION");
+  replace(PlainNumberText(SoftwareVersion()), "VERSION");
   return text;
 }
 
