@@ -12,7 +12,7 @@ using test::TemplateText;
 TEST(Editing, IdentitiesAreNeverReused) {
   TemplateCore first;
   TemplateCore second;
-  const std::uint32_t uid = first.AddConstant().GetUid();
+  const Uid uid = first.AddConstant().GetUid();
   EXPECT_NE(second.AddConstant().GetUid(), uid);
   first.DeleteElement(uid);
   EXPECT_GT(first.AddConstant().GetUid(), uid);

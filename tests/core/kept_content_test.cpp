@@ -46,9 +46,7 @@ TEST(KeptContent, NothingOfOneFileGetsIntoTheNext) {
                 "DOCUMENTATION = ''\nGROUPS = 0\nEndSect\n")
           .Behind("[EXTRA]\nA = 'leak'\nEndSect\n")
           .Text());
-  for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
-    full->ListHead(list).description.SetText("leak");
-  }
+  for (const auto& head : full->ListHeads()) head->description.SetText("leak");
   ASSERT_TRUE(full.Loaded());
   LoadedTemplate bare("\n[TESSAL_SETUP]\nDESCRIPTION = 'x'\nONLINE_HELP = ''\nDOCUMENTATION = ''\nEndSect\n");
   ASSERT_TRUE(full->LoadWrapper(bare.Path()));

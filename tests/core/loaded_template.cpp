@@ -1,7 +1,5 @@
 #include "core/loaded_template.h"
 
-#include <stdexcept>
-
 #include "core/error_registry.h"
 #include "expr/scanner.h"
 
@@ -15,24 +13,6 @@ LoadedTemplate::LoadedTemplate(const std::string& text) : path(folder.Write("mod
 
 LoadedTemplate::~LoadedTemplate() {
   SetNotifyChanges(false);
-}
-
-std::uint32_t LoadedTemplate::Uid(const std::string& symbol) const {
-  return Record(symbol).element->GetUid();
-}
-
-const SymbolRecord& LoadedTemplate::Record(const std::string& symbol) const {
-  std::uint32_t sequence = 0;
-  if (!core.FindSymbol(symbol, sequence)) throw std::runtime_error("no symbol " + symbol);
-  return *core.FindRecordBySequence(sequence);
-}
-
-std::string LoadedTemplate::References(const std::string& symbol) const {
-  std::string names;
-  for (const std::uint32_t used : Record(symbol).references) {
-    names += core.RecordSymbol(*core.FindRecordBySequence(used)) + " ";
-  }
-  return names;
 }
 
 std::string LoadedTemplate::Undefined() const {

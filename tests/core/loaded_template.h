@@ -20,10 +20,6 @@ class LoadedTemplate final {
   TemplateCore* operator->() { return &core; }
   bool Loaded() const { return loaded; }
   const std::string& Path() const { return path; }
-  std::uint32_t Uid(const std::string& symbol) const;
-  const SymbolRecord& Record(const std::string& symbol) const;
-  /// The symbols of an element's references, parted by blanks.
-  std::string References(const std::string& symbol) const;
   std::string Undefined() const;
 
  private:

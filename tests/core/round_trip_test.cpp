@@ -115,8 +115,9 @@ void FillSpecie(CEL_Lagrange_Specie& specie, Filler& filler) {
   for (const auto& vector : specie.horizontalVectors) filler.FillFields(*vector);
   filler.FillFields(*specie.verticalEquation);
   filler.FillFields(specie);
-  for (std::int32_t list = kind::kSpecieStateVariableList; list <= kind::kArithmeticExpressionList; ++list)
-    filler.FillTexts(specie.Head(list));
+  // Movements have no list of their own in the file.
+  constexpr std::size_t kListsWithHeads = 5;
+  for (std::size_t place = 0; place < kListsWithHeads; ++place) filler.FillTexts(*specie.Heads()[place]);
 }
 
 void FillSettings(TemplateCore& core, Filler& filler) {
@@ -151,8 +152,7 @@ void FillTemplate(TemplateCore& core, Filler& filler, std::size_t most) {
     FillSpecie(core.AddSpecie(), filler);
   }
   filler.FillTexts(core.Root());
-  for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list)
-    filler.FillTexts(core.ListHead(list));
+  for (const auto& head : core.ListHeads()) filler.FillTexts(*head);
   core.RebuildSymbolTable();
   for (const auto& specie : core.Species()) {
     for (const auto& search : specie->spatialFunctions) filler.FillSearch(*search, filler.Pick(2) ? 1 : -1);
@@ -161,8 +161,8 @@ void FillTemplate(TemplateCore& core, Filler& filler, std::size_t most) {
   FillSettings(core, filler);
 }
 
-std::set<std::int32_t> KindsIn(const TemplateCore& core) {
-  std::set<std::int32_t> kinds;
+std::set<ElementKind> KindsIn(const TemplateCore& core) {
+  std::set<ElementKind> kinds;
   for (const SymbolRecord& record : core.SymbolTable()) kinds.insert(record.element->Kind());
   return kinds;
 }

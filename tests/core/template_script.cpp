@@ -10,6 +10,7 @@
 #include "core/rename.h"
 #include "elements/version_stamp.h"
 #include "expr/scanner.h"
+#include "platform/number_text.h"
 #include "support/template_text.h"
 
 namespace tessal::test {
@@ -17,6 +18,7 @@ namespace tessal::test {
 namespace {
 
 constexpr std::string_view kExample = "from examples/";
+constexpr const char* kModel = "model.tessal";
 constexpr std::string_view kFile = "key file";
 
 std::string YesNo(bool value) {
@@ -27,6 +29,19 @@ std::int32_t Number(const std::string& word) {
   std::int32_t number = 0;
   std::from_chars(word.data(), word.data() + word.size(), number);
   return number;
+}
+
+/// A place from 0 of a number from 1.
+std::size_t Place(const std::string& word) {
+  return static_cast<std::size_t>(Number(word) - 1);
+}
+
+/// How many messages there are of each level, from 0 for all, and how many warnings of expressions.
+std::string Counts() {
+  std::string text;
+  for (std::uint32_t level = 0; level <= 5; ++level)
+    text += std::to_string(Errors().GetErrorCount(level)) + " ";
+  return text + "warnings " + std::to_string(Errors().ExpressionWarningCount());
 }
 
 /// Words between blanks; one between double quotes may hold blanks.
@@ -59,43 +74,46 @@ constexpr std::array<std::string_view, 14> kKinds = {"",
                                                      "class.expression",
                                                      "class.movement"};
 
-std::int32_t KindOf(const std::string& word) {
+ElementKind KindOf(const std::string& word) {
   const auto hit = std::find(kKinds.begin(), kKinds.end(), word);
-  return hit == kKinds.end() ? Number(word) : static_cast<std::int32_t>(hit - kKinds.begin());
+  return static_cast<ElementKind>(hit == kKinds.end() ? Number(word) : hit - kKinds.begin());
 }
 
-/// The list of a class that holds members of the kind.
-std::int32_t ClassListOf(std::int32_t kindNumber) {
-  return kindNumber + kind::kSpecieStateVariableList - kind::kSpecieStateVariable;
+/// The list that holds elements of the kind: a head of the template or of a class.
+ElementKind ListOf(ElementKind kind) {
+  const bool isMember = kind >= ElementKind::SpecieStateVariable;
+  const auto place = static_cast<std::size_t>(
+      NumberOf(kind) - NumberOf(isMember ? ElementKind::SpecieStateVariable : ElementKind::StateVariable));
+  return KindAfter(isMember ? ElementKind::SpecieStateVariableList : ElementKind::StateVariableList, place);
 }
 
-CEL_Element& AddElement(TemplateCore& core, std::int32_t kindNumber, CEL_Lagrange_Specie* specie) {
-  switch (kindNumber) {
-    case 1:
+CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Specie* specie) {
+  switch (kind) {
+    case ElementKind::StateVariable:
       return core.AddStateVariable();
-    case 2:
+    case ElementKind::Constant:
       return core.AddConstant();
-    case 3:
+    case ElementKind::Forcing:
       return core.AddForcing();
-    case 4:
+    case ElementKind::Auxiliary:
       return core.AddAuxiliary();
-    case 5:
+    case ElementKind::Process:
       return core.AddProcess();
-    case 6:
+    case ElementKind::DerivedOutput:
       return core.AddDerivedOutput();
-    case 7:
+    case ElementKind::Specie:
       return core.AddSpecie();
-    case 8:
+    case ElementKind::SpecieStateVariable:
       return specie->AddStateVariable();
-    case 9:
+    case ElementKind::SpecieConstant:
       return specie->AddConstant();
-    case 10:
+    case ElementKind::SpecieForcing:
       return specie->AddForcing();
-    case 11:
+    case ElementKind::SpatialFunction:
       return specie->AddSpatialFunction();
-    case 12:
+    case ElementKind::ArithmeticExpression:
       return specie->AddArithmeticExpression();
-    case 13:
+    case ElementKind::HorizontalVector:
       return specie->AddHorizontalVector();
     default:
       throw std::invalid_argument("no kind that can be made");
@@ -124,8 +142,9 @@ class NotedQuestions final : public CreationQuestions {
     return answers[symbol];
   }
   void Create(const CreateRequest& request) override {
-    const auto* specie = core.GetParentSpecie(static_cast<std::uint32_t>(request.ownerId));
-    notes += "  creates " + request.symbol + ", " + std::string(kKinds.at(request.kind)) +
+    const auto* specie = core.GetParentSpecie(request.ownerId);
+    notes += "  creates " + request.symbol + ", " +
+             std::string(kKinds.at(static_cast<std::size_t>(request.kind))) +
              (specie == nullptr ? "" : " of " + specie->symbol.Text()) + "\n";
     core.CreateElement(request);
   }
@@ -139,18 +158,18 @@ class NotedQuestions final : public CreationQuestions {
 
 }  // namespace
 
-TemplateScript::TemplateScript(const Case& script) : path(folder.File("model.tessal")) {
+TemplateScript::TemplateScript(const Case& script) {
   ResetExpressionScanner();
   Errors().Reset();
   SetNotifyChanges(true);
   if (script.input.starts_with(kExample)) {
     const std::string name = script.input.substr(kExample.size());
-    folder.Write("model.tessal", ReadFile(std::string(TESSAL_SOURCE_DIR) + "/examples/" + name));
+    folder.Write(kModel, ReadFile(std::string(TESSAL_SOURCE_DIR) + "/examples/" + name));
   } else if (script.input.starts_with(kFile)) {
     folder.Write("model.tessal",
                  script.input.size() > kFile.size() ? script.input.substr(kFile.size() + 1) + "\n" : "");
   } else if (!script.input.empty()) {
-    folder.Write("model.tessal", TemplateFromNotation(script.input));
+    folder.Write(kModel, TemplateFromNotation(script.input));
   }
 }
 
@@ -162,11 +181,15 @@ std::string TemplateScript::Answer(const CaseCall& call) {
   Words words = WordsOf(call.words);
   const std::string name = words.front();
   words.erase(words.begin());
-  const auto operation = Operations().find(name);
-  if (operation == Operations().end()) return "no such call\n";
   std::string answer;
   try {
-    answer = operation->second(*this, words);
+    if (const auto question = Questions().find(name); question != Questions().end()) {
+      answer = question->second(*this, words);
+    } else {
+      core.SetModified(false);
+      answer = Changes().at(name)(*this, words);
+      if (core.Modified()) answer += answer.empty() || answer.ends_with('\n') ? "modified" : ", modified";
+    }
   } catch (const std::exception& failure) {
     answer = std::string("failure: ") + failure.what();
   }
@@ -181,7 +204,7 @@ std::string TemplateScript::Shortened(std::string text) const {
       text.replace(place, part.size(), by);
   };
   replace(folder.Path().string(), "FOLDER");
-  replace(RealText(SoftwareVersion()), "VERSION");
+  replace(PlainNumberText(SoftwareVersion()), "VERSION");
   return text;
 }
 
@@ -191,13 +214,12 @@ CEL_Element& TemplateScript::Element(const std::string& name) {
   if (name == "setup") return core.Root();
   if (name == "settings" && core.GetMisc() != nullptr) return *core.GetMisc();
   const std::size_t list = name.find("list ");
-  if (list == 0) return core.ListHead(KindOf(name.substr(5)) + kind::kStateVariableList - 1);
+  if (list == 0) return core.ListHead(ListOf(KindOf(name.substr(5))));
   if (list != std::string::npos) {
-    auto& specie = dynamic_cast<CEL_Lagrange_Specie&>(Element(name.substr(0, list - 1)));
-    return specie.Head(ClassListOf(KindOf(name.substr(list + 5))));
+    return ClassIn({name.substr(0, list - 1)}, 0)->Head(ListOf(KindOf(name.substr(list + 5))));
   }
   if (name.starts_with("function ")) {
-    return *core.GetMisc()->ExternalFunctions().at(static_cast<std::size_t>(Number(name.substr(9)) - 1));
+    return *core.GetMisc()->ExternalFunctions().at(Place(name.substr(9)));
   }
   throw std::invalid_argument("no element " + name);
 }
@@ -207,16 +229,9 @@ std::uint32_t TemplateScript::SequenceOf(const std::string& name) const {
   return core.FindSymbol(name, sequence) ? sequence : static_cast<std::uint32_t>(Number(name));
 }
 
-std::string TemplateScript::SymbolOf(std::uint32_t uid) const {
+std::string TemplateScript::SymbolOf(Uid uid) const {
   std::string symbol;
   return core.GetSymbolOfUid(uid, symbol) ? symbol : "-";
-}
-
-std::string TemplateScript::Change(const std::function<std::string()>& change) {
-  core.SetModified(false);
-  std::string answer = change();
-  if (core.Modified()) answer += answer.empty() || answer.ends_with('\n') ? "modified" : ", modified";
-  return answer;
 }
 
 std::string TemplateScript::Load(const std::string& from) {
@@ -269,6 +284,12 @@ std::string TemplateScript::Table() const {
   return text;
 }
 
+std::string TemplateScript::Order() const {
+  std::string text;
+  for (const SymbolRecord& record : core.SymbolTable()) text += core.RecordSymbol(record) + "; ";
+  return text;
+}
+
 std::string TemplateScript::Undefined() const {
   std::string text;
   for (const auto& undefined : core.UndefinedSymbols()) {
@@ -308,11 +329,10 @@ std::string TemplateScript::Set(const std::string& name, const std::string& labe
 
 std::string TemplateScript::Create(const Words& words) {
   CreateRequest request;
-  request.kind = static_cast<std::uint32_t>(KindOf(words.at(0)));
+  request.kind = KindOf(words.at(0));
   request.symbol = words.at(1) == "-" ? "" : words.at(1);
   if (words.size() > 2) {
-    const auto list = ClassListOf(static_cast<std::int32_t>(request.kind));
-    request.ownerId = dynamic_cast<CEL_Lagrange_Specie&>(Element(words.at(2))).Head(list).MessageUid();
+    request.ownerId = ClassIn(words, 2)->Head(ListOf(KindOf(words[0]))).GetUid();
   }
   const CreatedElement created = core.CreateElement(request);
   std::string answer = "created " + SymbolOf(created.uid);
@@ -360,7 +380,7 @@ std::string TemplateScript::Lookups(const std::string& name) {
   std::string text = std::string(element.KindText());
   if (core.GetElement(uid) != &element) text += ", not found";
   if (core.GetElement(uid, element.Kind()) == nullptr) text += ", not of its kind";
-  if (core.GetElement(uid, kind::kUnknown) != nullptr) text += ", of any kind";
+  if (core.GetElement(uid, ElementKind::Unknown) != nullptr) text += ", of any kind";
   if (core.FindRecordByUid(uid) != core.RecordOfElement(element)) text += ", of two records";
   std::uint32_t sequence = 0;
   if (core.GetSequenceOfUid(uid, sequence)) text += ", number " + std::to_string(sequence);
@@ -373,132 +393,142 @@ std::string TemplateScript::Lookups(const std::string& name) {
   std::vector<std::string> symbols = {"stale"};
   text += core.GetReferrerSymbols(uid, symbols) ? ", used by" : ", no referrers";
   for (const std::string& symbol : symbols) text += " " + symbol;
-  std::vector<std::uint32_t> uids;
+  std::vector<Uid> uids;
   if (core.GetReferrerUids(uid, uids)) text += " (" + std::to_string(uids.size()) + ")";
   if (const auto* specie = core.GetParentSpecie(uid)) text += ", list of " + specie->symbol.Text();
   std::int32_t id = -1;
-  std::int32_t found = 0;
+  auto found = ElementKind::None;
   text += core.FindElementBySymbol(name, id, found) ? ", by symbol " : ", not by symbol ";
-  return text + std::to_string(id) + " " + std::to_string(found);
+  return text + std::to_string(id) + " " + std::to_string(NumberOf(found));
 }
 
-const std::map<std::string, TemplateScript::Operation>& TemplateScript::Operations() {
-  using Script = TemplateScript;
-  const auto changing = [](auto change) -> Operation {
-    return [change](Script& script, const Words& words) {
-      return script.Change([&] { return std::string(change(script, words)); });
-    };
+std::string TemplateScript::State() const {
+  std::ostringstream text;
+  text << core.GetStateVariableCount() << " states " << core.GetConstantCount() << " constants "
+       << core.GetForcingCount() << " forcings " << core.GetAuxiliaryCount() << " auxiliaries "
+       << core.GetProcessCount() << " processes " << core.GetDerivedOutputCount() << " outputs "
+       << core.GetSpecieCount() << " classes " << core.GetExternalFunctionCount() << " functions, named "
+       << core.CountNamedElements() << ", revision " << core.GetDocumentRevision() << "\nfile '"
+       << core.TemplateFileName() << "' saved to '" << core.SaveFileName() << "' kept "
+       << core.KeptTree().Children().size() << (core.Modified() ? " modified" : "");
+  return text.str();
+}
+
+std::string TemplateScript::Save(const std::string& name) {
+  core.SetModified(false);
+  const bool saved = core.SaveWrapper(name.starts_with("/") ? name : folder.File(name));
+  return std::string(saved ? "saved" : "failed") + (core.Modified() ? ", modified" : "");
+}
+
+/// The file's bytes, with a mark for each line feed that has no carriage return before it.
+std::string TemplateScript::File(const std::string& name) const {
+  const std::string text = ReadFile(folder.File(name));
+  std::string shown;
+  for (std::size_t place = 0; place < text.size(); ++place) {
+    const bool isLineEnd = text.compare(place, 2, "\r\n") == 0;
+    if (text[place] == '\n') shown += "(no carriage return)";
+    if (isLineEnd) ++place;
+    shown += text[place];
+  }
+  return shown;
+}
+
+std::string TemplateScript::EditFile(const std::string& part, const std::string& by) {
+  std::string text = ReadFile(folder.File(kModel));
+  text.replace(text.find(part), part.size(), by);
+  folder.Write(kModel, text);
+  return {};
+}
+
+CEL_Lagrange_Specie* TemplateScript::ClassIn(const Words& words, std::size_t place) {
+  return place < words.size() ? &dynamic_cast<CEL_Lagrange_Specie&>(Element(words[place])) : nullptr;
+}
+
+std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
+  Uid predecessor{4711};
+  const bool moved = core.MoveBeforeFirstUser(UidOf(name), predecessor);
+  return YesNo(moved) + " after " + SymbolOf(predecessor);
+}
+
+/// Calls that only ask.
+const std::map<std::string, TemplateScript::Operation>& TemplateScript::Questions() {
+  using S = TemplateScript&;
+  using W = const Words&;
+  static const std::map<std::string, Operation> kQuestions = {
+      {"load", [](S s, W w) { return s.Load(s.folder.File(w.empty() ? kModel : w[0])); }},
+      {"load-own", [](S s, W) { return s.Load(s.core.TemplateFileName()); }},
+      {"load-nowhere", [](S s, W) { return s.Load("/nowhere.tessal"); }},
+      {"save", [](S s, W w) { return s.Save(w.empty() ? std::string(kModel) : w[0]); }},
+      {"file", [](S s, W w) { return s.File(w.empty() ? std::string(kModel) : w[0]); }},
+      {"edit-file", [](S s, W w) { return s.EditFile(w.at(0), w.at(1)); }},
+      {"messages", [](S, W) { return Messages(); }},
+      {"counts", [](S, W) { return Counts(); }},
+      {"forget", [](S, W) { return Errors().ClearErrors(), ""; }},
+      {"table", [](S s, W) { return s.Table(); }},
+      {"order", [](S s, W) { return s.Order(); }},
+      {"undefined", [](S s, W) { return s.Undefined(); }},
+      {"state", [](S s, W) { return s.State(); }},
+      {"fields", [](S s, W w) { return s.Fields(w.at(0)); }},
+      {"look", [](S s, W w) { return s.Lookups(w.at(0)); }},
+      {"groups", [](S s, W) { return s.Groups(); }},
+      {"items", [](S s, W w) { return s.Items(w); }},
+      {"modified", [](S s, W) { return YesNo(s.core.Modified()); }},
+      {"mark", [](S s, W) { return s.core.SetModified(true), ""; }},
+      {"clear", [](S s, W) { return s.core.Clear(), ""; }},
+      {"validate", [](S s, W) { return YesNo(s.core.ValidateTemplate()); }},
+      {"parse", [](S s, W) { return YesNo(s.core.ParseAllExpressions()); }},
+      {"check-order", [](S s, W) { return YesNo(s.core.CheckDeclarationOrder()); }},
+      {"check-order-of", [](S s, W w) { return YesNo(s.core.CheckElementOrder(s.UidOf(w.at(0)))); }},
+      {"scope-rule", [](S s, W) { return YesNo(s.core.CheckScopeRule()); }},
+      {"process-rule", [](S s, W) { return YesNo(s.core.CheckProcessRule()); }},
+      {"strict", [](S s, W w) { return s.core.SetStrictScopeRule(Number(w.at(0))), ""; }},
+      {"rebuilds", [](S s, W w) { return s.core.SetRebuildEnabled(w.at(0) == "on"), ""; }},
+      {"all-builtins", [](S s, W w) { return s.core.SetShowAllBuiltIns(w.at(0) == "yes"), ""; }},
+      {"can-delete", [](S s, W w) { return YesNo(s.core.CanDelete(s.UidOf(w.at(0)))); }},
+      {"can-move", [](S s, W w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
+      {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},
+      {"rename-failure", [](S, W w) { return RenameFailure(w.at(0)); }},
+      {"replace", [](S, W w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
   };
-  static const std::map<std::string, Operation> kOperations = {
-      {"load", [](Script& s, const Words& w) { return s.Load(w.empty() ? s.path : s.folder.File(w[0])); }},
-      {"load-own", [](Script& s, const Words&) { return s.Load(s.core.TemplateFileName()); }},
-      {"load-nowhere", [](Script& s, const Words&) { return s.Load("/nowhere.tessal"); }},
-      {"messages", [](Script&, const Words&) { return Messages(); }},
-      {"counts", [](Script&, const Words&) {
-         std::string text;
-         for (std::uint32_t level = 0; level <= 5; ++level) text += std::to_string(Errors().GetErrorCount(level)) + " ";
-         return text + "warnings " + std::to_string(Errors().ExpressionWarningCount());
-       }},
-      {"forget", [](Script&, const Words&) { return Errors().ClearErrors(), std::string(); }},
-      {"table", [](Script& s, const Words&) { return s.Table(); }},
-      {"order", [](Script& s, const Words&) {
-         std::string text;
-         for (const SymbolRecord& record : s.core.SymbolTable()) text += s.core.RecordSymbol(record) + "; ";
-         return text;
-       }},
-      {"undefined", [](Script& s, const Words&) { return s.Undefined(); }},
-      {"validate", [](Script& s, const Words&) { return YesNo(s.core.ValidateTemplate()); }},
-      {"parse", [](Script& s, const Words&) { return YesNo(s.core.ParseAllExpressions()); }},
-      {"check-order", [](Script& s, const Words& w) {
-         return YesNo(w.empty() ? s.core.CheckDeclarationOrder() : s.core.CheckElementOrder(s.UidOf(w[0])));
-       }},
-      {"scope-rule", [](Script& s, const Words&) { return YesNo(s.core.CheckScopeRule()); }},
-      {"process-rule", [](Script& s, const Words&) { return YesNo(s.core.CheckProcessRule()); }},
-      {"strict", [](Script& s, const Words& w) { return s.core.SetStrictScopeRule(Number(w.at(0))), std::string(); }},
-      {"add", changing([](Script& s, const Words& w) {
-         auto* specie = w.size() < 2 ? nullptr : &dynamic_cast<CEL_Lagrange_Specie&>(s.Element(w[1]));
-         return AddElement(s.core, KindOf(w.at(0)), specie).symbol.Text();
-       })},
-      {"add-function", changing([](Script& s, const Words&) { return s.core.GetMisc()->AddExternalFunction().symbol.Text(); })},
-      {"remove-function", changing([](Script& s, const Words& w) {
-         return YesNo(s.core.GetMisc()->RemoveExternalFunction(static_cast<std::size_t>(Number(w.at(0)) - 1)));
-       })},
-      {"rebuilds", [](Script& s, const Words& w) { return s.core.SetRebuildEnabled(w.at(0) == "on"), std::string(); }},
-      {"mark", [](Script& s, const Words&) { return s.core.SetModified(true), std::string(); }},
-      {"rebuild", changing([](Script& s, const Words&) { return s.core.RebuildSymbolTable(), ""; })},
-      {"can-delete", [](Script& s, const Words& w) { return YesNo(s.core.CanDelete(s.UidOf(w.at(0)))); }},
-      {"delete", changing([](Script& s, const Words& w) { return YesNo(s.core.DeleteElement(s.UidOf(w.at(0)))); })},
-      {"can-move", [](Script& s, const Words& w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
-      {"move", changing([](Script& s, const Words& w) {
+  return kQuestions;
+}
+
+/// Calls that may change the template. Each is run with the mark of a change taken off, and says whether it
+/// is back.
+const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes() {
+  using S = TemplateScript&;
+  using W = const Words&;
+  static const std::map<std::string, Operation> kChanges = {
+      {"add", [](S s, W w) { return AddElement(s.core, KindOf(w.at(0)), s.ClassIn(w, 1)).symbol.Text(); }},
+      {"add-function", [](S s, W) { return s.core.GetMisc()->AddExternalFunction().symbol.Text(); }},
+      {"remove-function",
+       [](S s, W w) { return YesNo(s.core.GetMisc()->RemoveExternalFunction(Place(w.at(0)))); }},
+      {"rebuild", [](S s, W) { return s.core.RebuildSymbolTable(), ""; }},
+      {"delete", [](S s, W w) { return YesNo(s.core.DeleteElement(s.UidOf(w.at(0)))); }},
+      {"move",
+       [](S s, W w) {
          return YesNo(s.core.MoveElement(s.UidOf(w.at(0)), s.UidOf(w.at(2)), w[1] == "before"));
-       })},
-      {"move-before-first-user", changing([](Script& s, const Words& w) {
-         std::uint32_t predecessor = 4711;
-         const bool moved = s.core.MoveBeforeFirstUser(s.UidOf(w.at(0)), predecessor);
-         return YesNo(moved) + " after " + s.SymbolOf(predecessor);
-       })},
-      {"create", changing([](Script& s, const Words& w) { return s.Create(w); })},
-      {"offer", changing([](Script& s, const Words& w) { return s.Offer(w); })},
-      {"rename", changing([](Script& s, const Words& w) {
-         return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3));
-       })},
-      {"refusal", [](Script& s, const Words& w) { return RenameRefusal(s.core, w.at(0)); }},
-      {"rename-failure", [](Script&, const Words& w) { return RenameFailure(w.at(0)); }},
-      {"replace", [](Script&, const Words& w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
-      {"set", changing([](Script& s, const Words& w) { return s.Set(w.at(0), w.at(1), w.at(2)); })},
-      {"fields", [](Script& s, const Words& w) { return s.Fields(w.at(0)); }},
-      {"look", [](Script& s, const Words& w) { return s.Lookups(w.at(0)); }},
-      {"all-builtins", [](Script& s, const Words& w) { return s.core.SetShowAllBuiltIns(w.at(0) == "yes"), YesNo(s.core.ShowAllBuiltIns()); }},
-      {"refresh-searches", changing([](Script& s, const Words&) { return s.core.RefreshSearchFunctionChoices(), ""; })},
-      {"groups", [](Script& s, const Words&) { return s.Groups(); }},
-      {"items", [](Script& s, const Words& w) { return s.Items(w); }},
-      {"add-group", changing([](Script& s, const Words&) { return std::to_string(s.core.AddVisibilityGroup()); })},
-      {"remove-group", changing([](Script& s, const Words& w) { return s.core.RemoveVisibilityGroup(Number(w.at(0))), ""; })},
-      {"add-level", changing([](Script& s, const Words& w) { return std::to_string(s.core.CreateLevel(Number(w.at(0)))); })},
-      {"delete-level", changing([](Script& s, const Words& w) { return s.core.DeleteLevel(Number(w.at(0)), Number(w.at(1))), ""; })},
-      {"add-item", changing([](Script& s, const Words& w) {
+       }},
+      {"move-before-first-user", [](S s, W w) { return s.MoveBeforeFirstUser(w.at(0)); }},
+      {"create", [](S s, W w) { return s.Create(w); }},
+      {"offer", [](S s, W w) { return s.Offer(w); }},
+      {"rename", [](S s, W w) { return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3)); }},
+      {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
+      {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},
+      {"add-group", [](S s, W) { return std::to_string(s.core.AddVisibilityGroup()); }},
+      {"remove-group", [](S s, W w) { return s.core.RemoveVisibilityGroup(Number(w.at(0))), ""; }},
+      {"add-level", [](S s, W w) { return std::to_string(s.core.CreateLevel(Number(w.at(0)))); }},
+      {"delete-level", [](S s, W w) { return s.core.DeleteLevel(Number(w.at(0)), Number(w.at(1))), ""; }},
+      {"add-item",
+       [](S s, W w) {
          return s.core.AddItemToLevel(Number(w.at(0)), Number(w.at(1)), s.SequenceOf(w.at(2))), "";
-       })},
-      {"remove-item", changing([](Script& s, const Words& w) {
+       }},
+      {"remove-item",
+       [](S s, W w) {
          return s.core.RemoveItemFromLevel(Number(w.at(0)), Number(w.at(1)), s.SequenceOf(w.at(2))), "";
-       })},
-      {"state", [](Script& s, const Words&) {
-         const TemplateCore& core = s.core;
-         std::ostringstream text;
-         text << core.GetStateVariableCount() << " states " << core.GetConstantCount() << " constants "
-              << core.GetForcingCount() << " forcings " << core.GetAuxiliaryCount() << " auxiliaries "
-              << core.GetProcessCount() << " processes " << core.GetDerivedOutputCount() << " outputs "
-              << core.GetSpecieCount() << " classes " << core.GetExternalFunctionCount() << " functions, named "
-              << core.CountNamedElements() << ", revision " << core.GetDocumentRevision() << "\nfile '"
-              << core.TemplateFileName() << "' saved to '" << core.SaveFileName() << "' kept "
-              << core.KeptTree().Children().size() << (core.Modified() ? " modified" : "");
-         return text.str();
-       }},
-      {"modified", [](Script& s, const Words&) { return YesNo(s.core.Modified()); }},
-      {"clear", [](Script& s, const Words&) { return s.core.Clear(), std::string(); }},
-      {"save", [](Script& s, const Words& w) {
-         const std::string target = w.empty() ? s.path : w[0].starts_with("/") ? w[0] : s.folder.File(w[0]);
-         s.core.SetModified(false);
-         return std::string(s.core.SaveWrapper(target) ? "saved" : "failed") + (s.core.Modified() ? ", modified" : "");
-       }},
-      {"file", [](Script& s, const Words& w) {
-         std::string text = ReadFile(w.empty() ? s.path : s.folder.File(w[0]));
-         std::string shown;
-         for (std::size_t place = 0; place < text.size(); ++place) {
-           if (text.compare(place, 2, "\r\n") == 0) ++place;
-           else if (text[place] == '\n') shown += "(no carriage return)";
-           shown += text[place];
-         }
-         return shown;
-       }},
-      {"edit-file", [](Script& s, const Words& w) {
-         std::string text = ReadFile(s.path);
-         text.replace(text.find(w.at(0)), w[0].size(), w.at(1));
-         s.folder.Write("model.tessal", text);
-         return std::string();
        }},
   };
-  return kOperations;
+  return kChanges;
 }
 
 }  // namespace tessal::test

@@ -29,30 +29,35 @@ class TemplateScript final {
  private:
   using Words = std::vector<std::string>;
   using Operation = std::function<std::string(TemplateScript&, const Words&)>;
-  static const std::map<std::string, Operation>& Operations();
+  static const std::map<std::string, Operation>& Questions();
+  static const std::map<std::string, Operation>& Changes();
 
   /// The element of a name: a symbol, `setup`, `settings`, `list KIND`, `function N`, or `CLASS list KIND`.
   CEL_Element& Element(const std::string& name);
-  /// Does what changes the template, with the mark of a change taken off first; says whether it came back.
-  std::string Change(const std::function<std::string()>& change);
+  CEL_Lagrange_Specie* ClassIn(const Words& words, std::size_t place);
 
   std::string Load(const std::string& path);
+  std::string Save(const std::string& name);
+  std::string File(const std::string& name) const;
+  std::string EditFile(const std::string& part, const std::string& by);
+  std::string State() const;
   std::string Table() const;
+  std::string Order() const;
   std::string Undefined() const;
   std::string Fields(const std::string& name);
   std::string Set(const std::string& name, const std::string& field, const std::string& value);
+  std::string MoveBeforeFirstUser(const std::string& name);
   std::string Create(const Words& words);
   std::string Offer(const Words& words);
   std::string Groups();
   std::string Items(const Words& words);
   std::string Lookups(const std::string& name);
   std::string Shortened(std::string text) const;
-  std::string SymbolOf(std::uint32_t uid) const;
-  std::uint32_t UidOf(const std::string& name) { return Element(name).GetUid(); }
+  std::string SymbolOf(Uid uid) const;
+  Uid UidOf(const std::string& name) { return Element(name).GetUid(); }
   std::uint32_t SequenceOf(const std::string& name) const;
 
   TemporaryFolder folder;
-  std::string path;
   TemplateCore core;
 };
 

@@ -9,6 +9,7 @@
 #include "elements/input_elements.h"
 #include "elements/specie_values.h"
 #include "elements/state_variable.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 namespace {

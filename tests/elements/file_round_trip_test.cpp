@@ -85,7 +85,7 @@ TEST(ElementFiles, AnEmptySectionIsReportedAndKeepsTheNumbers) {
   std::string missing;
   for (const ErrorRecord& record : Errors().Records()) {
     EXPECT_EQ(record.level, 3U);
-    EXPECT_EQ(record.uid, -1);
+    EXPECT_EQ(NumberOf(record.uid), -1);
     missing += record.text.substr(std::string("could not find key ").size()) + ";";
   }
   // The number behind a missing text is not looked for.

@@ -1,6 +1,7 @@
 #include "support/template_text.h"
 
-#include <functional>
+#include <algorithm>
+#include <array>
 #include <random>
 #include <sstream>
 #include <stdexcept>
@@ -9,12 +10,76 @@ namespace tessal::test {
 
 namespace {
 
-std::string Quoted(const std::string& text) {
-  return "'" + text + "'";
+/// A kind of line: where it goes, and its keywords, with the symbol for $S, the value for $V and the number
+/// of the class for $N. Expressions are written between both kinds of quotes.
+struct KindRow {
+  std::string_view word;
+  std::string_view section;  ///< the list; the elements of a kind without one are sections of their own
+  std::string_view prefix;
+  std::string_view keywords;
+};
+
+#define TESSAL_TEXTS "DESCRIPTION='';ONLINE_HELP='';DOCUMENTATION='';"
+#define TESSAL_NAMED "SYMBOL='$S';ID=1;" TESSAL_TEXTS
+#define TESSAL_BASE TESSAL_NAMED "UNQ_TYPE=999;UNQ_UNIT=0;"
+#define TESSAL_INPUT \
+  TESSAL_BASE        \
+      "IS_USER_SPECIFIED='YES';BUILT_IN_ID=-1;SCOPE='NOT_SPECIFIED';SPATIAL_VARIATION='NONE';UNIT='m';"
+
+constexpr std::array<KindRow, 17> kKinds = {{
+    {"state", "STATE_VARIABLES", "STATE_VARIABLE_",
+     TESSAL_BASE "SCOPE='WC';TRANSPORT='FIXED';UNIT='mg/l';DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=10"},
+    {"constant", "CONSTANTS", "CONSTANT_", TESSAL_INPUT "DEFAULT_VALUE=$V;MIN_VALUE=0;MAX_VALUE=100"},
+    {"forcing", "FORCINGS", "FORCING_", TESSAL_INPUT "DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=100"},
+    {"auxiliary", "AUXILIARY_VARIABLES", "AUXILIARY_VARIABLE_",
+     TESSAL_BASE "OUTPUT='YES';SCOPE='NOT_SPECIFIED';SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';"
+                 "EXPRESSION='\"$V\"'"},
+    {"process", "PROCESSES", "PROCESS_",
+     TESSAL_BASE "OUTPUT='YES';PROCESS_TYPE='TRANSFORMATION';SCOPE='WC';"
+                 "SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';EXPRESSION='\"$V\"';CONTROLID=-1;"
+                 "CONTROLVALUE=0.8"},
+    {"output", "DERIVED_OUTPUTS", "DERIVED_OUTPUT_",
+     "ID=1;" TESSAL_TEXTS "UNQ_TYPE=999;UNQ_UNIT=0;SCOPE='NOT_SPECIFIED';"
+     "SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';FORMAT='INSTANTANEOUS';EXPRESSION='\"$V\"'"},
+    {"class.state", "STATE_VARIABLES", "S",
+     TESSAL_BASE "SPECIE=$N;UNIT='kg';DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=10"},
+    {"class.constant", "CONSTANTS", "C",
+     TESSAL_BASE "SPATIAL_VARIATION='PER_SPECIE';UNIT='kg';DEFAULT_VALUE=$V;MIN_VALUE=0;MAX_VALUE=10"},
+    {"class.forcing", "FORCINGS", "F",
+     TESSAL_BASE "SCOPE='PER_SPECIE';SPATIAL_VARIATION='PER_SPECIE';UNIT='m';DEFAULT_VALUE=1;MIN_VALUE=0;"
+                 "MAX_VALUE=10"},
+    {"class.search", "SPATIAL_FUNCTIONS", "SPATIAL_FUNCTION_",
+     TESSAL_BASE "FUNCTION_ID=100;VARIABLE_ID=$V;SPECIE_ID=$N;RADIUS=5;DIMENSION=2;"
+                 "SPATIAL_VARIATION='PER_INDIVIDUAL';PURPOSE='MAGNITUDE';FRAMEWORK='EULER';PROPERTY='NONE';"
+                 "MATH='MIN';LOOKFOR=-1"},
+    {"class.expression", "ARITHMETICAL_EXPRESSIONS", "A",
+     TESSAL_BASE "EXPRESSION_TYPE='AUXILIARY_VARIABLE';SPECIE=$N;OUTPUT='YES';"
+                 "SPATIAL_VARIATION='PER_INDIVIDUAL';UNIT='-';EXPRESSION='\"$V\"'"},
+    {"class.movement", "", "H",
+     "EXPRESSION_HORIZONTAL_SPEED='\"$S\"';EXPRESSION_HORIZONTAL_DIRECTION='\"$V\"'"},
+    {"class.descent", "", "VERTICAL", "EXPRESSION_VERTICAL_SPEED='\"$V\"'"},
+    {"class", "", "SPECIE_",
+     "NAME='$S';" TESSAL_TEXTS "SCOPE='WC';PROJECTION_TIME=0;FIELD_OF_VIEW=180;TRANSPORT='USER_SPECIFIED'"},
+    {"settings", "", "MISC",
+     TESSAL_TEXTS "TESSAL_VERSION=2017.0014;PARSER_VERSION=2017.001;RANDSEED=0;DEBUG_LEVEL=0;DEBUG_LOG='';"
+                  "RANDOM_PARTICLE_DIR='NO';BUILD_SPATIAL_TREE='NO';CHECKSUM='0'"},
+    {"function", "EXTERNAL_FUNCTIONS", "EXTERNAL_FUNCTION_",
+     "SYMBOL='User $S';ID=1;" TESSAL_TEXTS "PUBLICNAME='$S';PARAMETERS=1;USED_AS='AS_MATH_FUNC';"
+     "DLL='plugin.dll';ENTRYPOINT='entry'"},
+    {"head", "", "", TESSAL_TEXTS},
+}};
+
+const KindRow& RowOf(std::string_view word) {
+  const auto* const row =
+      std::find_if(kKinds.begin(), kKinds.end(), [word](const KindRow& each) { return each.word == word; });
+  if (row == kKinds.end()) throw std::invalid_argument("no kind of line: " + std::string(word));
+  return *row;
 }
 
-std::string Expression(const std::string& text) {
-  return "'\"" + text + "\"'";
+std::string Replaced(std::string text, std::string_view part, const std::string& by) {
+  for (std::size_t place = 0; (place = text.find(part, place)) != std::string::npos; place += by.size())
+    text.replace(place, part.size(), by);
+  return text;
 }
 
 std::string Lines(const Keywords& keywords) {
@@ -27,303 +92,131 @@ std::string Section(const std::string& name, const std::string& content) {
   return "[" + name + "]\n" + content + "EndSect  // " + name + "\n\n";
 }
 
-const Keywords kHead = {{"DESCRIPTION", "''"}, {"ONLINE_HELP", "''"}, {"DOCUMENTATION", "''"}};
-
-Keywords Base(const std::string& symbol) {
-  Keywords keywords = {{"SYMBOL", Quoted(symbol)}, {"ID", "1"}};
-  keywords.insert(keywords.end(), kHead.begin(), kHead.end());
-  keywords.insert(keywords.end(), {{"UNQ_TYPE", "999"}, {"UNQ_UNIT", "0"}});
-  return keywords;
-}
-
-Keywords Joined(Keywords keywords, const Keywords& more) {
-  keywords.insert(keywords.end(), more.begin(), more.end());
-  return keywords;
-}
-
-Keywords Input(const std::string& symbol, const std::string& value) {
-  return Joined(Base(symbol), {{"IS_USER_SPECIFIED", "'YES'"},
-                               {"BUILT_IN_ID", "-1"},
-                               {"SCOPE", "'NOT_SPECIFIED'"},
-                               {"SPATIAL_VARIATION", "'NONE'"},
-                               {"UNIT", "'m'"},
-                               {"DEFAULT_VALUE", value},
-                               {"MIN_VALUE", "0"},
-                               {"MAX_VALUE", "100"}});
-}
-
 }  // namespace
 
-TemplateText& TemplateText::Add(Elements& elements, Element element) {
-  elements.push_back(std::move(element));
-  last = &elements;
+TemplateText& TemplateText::Add(const std::string& kind, const std::string& symbol,
+                                const std::string& value) {
+  if (kind == "class") classes.emplace_back();
+  const bool isInClass = kind.starts_with("class");
+  Elements& elements = isInClass ? classes.back()[kind] : lists[kind == "head" ? symbol : kind];
+  last = &elements.emplace_back();
+  last->equation = Section("E", symbol + " = '\"" + value + "\"'\n");
+  std::istringstream rows{std::string(RowOf(kind).keywords)};
+  for (std::string row; std::getline(rows, row, ';');) {
+    const std::size_t equals = row.find('=');
+    const std::string number = std::to_string(classes.size());
+    last->keywords.emplace_back(
+        row.substr(0, equals),
+        Replaced(Replaced(Replaced(row.substr(equals + 1), "$S", symbol), "$N", number), "$V", value));
+  }
   return *this;
-}
-
-TemplateText& TemplateText::StateVariable(const std::string& symbol, const std::string& equation) {
-  return Add(stateVariables, {Joined(Base(symbol), {{"SCOPE", "'WC'"},
-                                                    {"TRANSPORT", "'FIXED'"},
-                                                    {"UNIT", "'mg/l'"},
-                                                    {"DEFAULT_VALUE", "1"},
-                                                    {"MIN_VALUE", "0"},
-                                                    {"MAX_VALUE", "10"}}),
-                              Section("E", symbol + " = " + Expression(equation) + "\n")});
-}
-
-TemplateText& TemplateText::Constant(const std::string& symbol, const std::string& value) {
-  return Add(constants, {Input(symbol, value), ""});
-}
-
-TemplateText& TemplateText::Forcing(const std::string& symbol) {
-  return Add(forcings, {Input(symbol, "1"), ""});
-}
-
-TemplateText& TemplateText::Auxiliary(const std::string& symbol, const std::string& expression) {
-  return Add(auxiliaries, {Joined(Base(symbol), {{"OUTPUT", "'YES'"},
-                                                 {"SCOPE", "'NOT_SPECIFIED'"},
-                                                 {"SPATIAL_VARIATION", "'HORISONTAL_AND_VERTICAL'"},
-                                                 {"UNIT", "'-'"},
-                                                 {"EXPRESSION", Expression(expression)}}),
-                           ""});
-}
-
-TemplateText& TemplateText::Process(const std::string& symbol, const std::string& expression) {
-  return Add(processes, {Joined(Base(symbol), {{"OUTPUT", "'YES'"},
-                                               {"PROCESS_TYPE", "'TRANSFORMATION'"},
-                                               {"SCOPE", "'WC'"},
-                                               {"SPATIAL_VARIATION", "'HORISONTAL_AND_VERTICAL'"},
-                                               {"UNIT", "'-'"},
-                                               {"EXPRESSION", Expression(expression)},
-                                               {"CONTROLID", "-1"},
-                                               {"CONTROLVALUE", "0.8"}}),
-                         ""});
-}
-
-TemplateText& TemplateText::DerivedOutput(const std::string& expression) {
-  Add(derivedOutputs, {Joined(Base(""), {{"SCOPE", "'NOT_SPECIFIED'"},
-                                         {"SPATIAL_VARIATION", "'HORISONTAL_AND_VERTICAL'"},
-                                         {"UNIT", "'-'"},
-                                         {"FORMAT", "'INSTANTANEOUS'"},
-                                         {"EXPRESSION", Expression(expression)}}),
-                       ""});
-  return Without("SYMBOL");
 }
 
 TemplateText& TemplateText::Specie(const std::string& name, const std::string& equation,
                                    const Keywords& expressions) {
-  Class(name).ClassState(name + "_Mass", equation);
-  for (const auto& [symbol, expression] : expressions) ClassExpression(symbol, expression);
-  return ClassMovement("0", "0");
-}
-
-TemplateText& TemplateText::Class(const std::string& name) {
-  return Add(classes.emplace_back().itself,
-             {Joined(Joined({{"NAME", Quoted(name)}}, kHead), {{"SCOPE", "'WC'"},
-                                                               {"PROJECTION_TIME", "0"},
-                                                               {"FIELD_OF_VIEW", "180"},
-                                                               {"TRANSPORT", "'USER_SPECIFIED'"}}),
-              ""});
-}
-
-TemplateText& TemplateText::ClassState(const std::string& symbol, const std::string& equation) {
-  return Add(classes.back().states, {Joined(Base(symbol), {{"SPECIE", std::to_string(classes.size())},
-                                                           {"UNIT", "'kg'"},
-                                                           {"DEFAULT_VALUE", "1"},
-                                                           {"MIN_VALUE", "0"},
-                                                           {"MAX_VALUE", "10"}}),
-                                     Section("E", symbol + " = " + Expression(equation) + "\n")});
-}
-
-TemplateText& TemplateText::ClassConstant(const std::string& symbol, const std::string& value) {
-  return Add(classes.back().constants, {Joined(Base(symbol), {{"SPATIAL_VARIATION", "'PER_SPECIE'"},
-                                                              {"UNIT", "'kg'"},
-                                                              {"DEFAULT_VALUE", value},
-                                                              {"MIN_VALUE", "0"},
-                                                              {"MAX_VALUE", "10"}}),
-                                        ""});
-}
-
-TemplateText& TemplateText::ClassForcing(const std::string& symbol) {
-  return Add(classes.back().forcings, {Joined(Base(symbol), {{"SCOPE", "'PER_SPECIE'"},
-                                                             {"SPATIAL_VARIATION", "'PER_SPECIE'"},
-                                                             {"UNIT", "'m'"},
-                                                             {"DEFAULT_VALUE", "1"},
-                                                             {"MIN_VALUE", "0"},
-                                                             {"MAX_VALUE", "10"}}),
-                                       ""});
-}
-
-TemplateText& TemplateText::ClassSearch(const std::string& symbol, const std::string& variable) {
-  return Add(classes.back().searches, {Joined(Base(symbol), {{"FUNCTION_ID", "100"},
-                                                             {"VARIABLE_ID", variable},
-                                                             {"SPECIE_ID", std::to_string(classes.size())},
-                                                             {"RADIUS", "5"},
-                                                             {"DIMENSION", "2"},
-                                                             {"SPATIAL_VARIATION", "'PER_INDIVIDUAL'"},
-                                                             {"PURPOSE", "'MAGNITUDE'"},
-                                                             {"FRAMEWORK", "'EULER'"},
-                                                             {"PROPERTY", "'NONE'"},
-                                                             {"MATH", "'MIN'"},
-                                                             {"LOOKFOR", "-1"}}),
-                                       ""});
-}
-
-TemplateText& TemplateText::ClassExpression(const std::string& symbol, const std::string& expression) {
-  return Add(classes.back().expressions, {Joined(Base(symbol), {{"EXPRESSION_TYPE", "'AUXILIARY_VARIABLE'"},
-                                                                {"SPECIE", std::to_string(classes.size())},
-                                                                {"OUTPUT", "'YES'"},
-                                                                {"SPATIAL_VARIATION", "'PER_INDIVIDUAL'"},
-                                                                {"UNIT", "'-'"},
-                                                                {"EXPRESSION", Expression(expression)}}),
-                                          ""});
-}
-
-TemplateText& TemplateText::ClassMovement(const std::string& speed, const std::string& direction) {
-  return Add(classes.back().movements, {{{"EXPRESSION_HORIZONTAL_SPEED", Expression(speed)},
-                                         {"EXPRESSION_HORIZONTAL_DIRECTION", Expression(direction)}},
-                                        ""});
-}
-
-TemplateText& TemplateText::ClassDescent(const std::string& speed) {
-  return Add(classes.back().descent, {{{"EXPRESSION_VERTICAL_SPEED", Expression(speed)}}, ""});
+  Add("class", name).Add("class.state", name + "_Mass", equation);
+  for (const auto& [symbol, expression] : expressions) Add("class.expression", symbol, expression);
+  return Add("class.movement", "0", "0");
 }
 
 TemplateText& TemplateText::With(const std::string& keyword, const std::string& value) {
-  for (auto& [name, present] : last->back().keywords) {
+  for (auto& [name, present] : last->keywords) {
     if (name != keyword) continue;
     present = value;
     return *this;
   }
-  last->back().keywords.emplace_back(keyword, value);
+  last->keywords.emplace_back(keyword, value);
   return *this;
 }
 
 TemplateText& TemplateText::Without(const std::string& keyword) {
-  std::erase_if(last->back().keywords, [&keyword](const auto& entry) { return entry.first == keyword; });
+  std::erase_if(last->keywords, [&keyword](const auto& entry) { return entry.first == keyword; });
   return *this;
-}
-
-TemplateText& TemplateText::Misc(const std::string& content) {
-  hasSettings = true;
-  furtherSettings = content;
-  return Add(settings, {Joined(kHead, {{"TESSAL_VERSION", "2017.0014"},
-                                       {"PARSER_VERSION", "2017.001"},
-                                       {"RANDSEED", "0"},
-                                       {"DEBUG_LEVEL", "0"},
-                                       {"DEBUG_LOG", "''"},
-                                       {"RANDOM_PARTICLE_DIR", "'NO'"},
-                                       {"BUILD_SPATIAL_TREE", "'NO'"},
-                                       {"CHECKSUM", "'0'"}}),
-                        ""});
-}
-
-TemplateText& TemplateText::Behind(const std::string& text) {
-  behind += text;
-  return *this;
-}
-
-TemplateText& TemplateText::Before(const std::string& text) {
-  before += text;
-  return *this;
-}
-
-TemplateText& TemplateText::Head(const std::string& list) {
-  return Add(heads[list], {kHead, ""});
-}
-
-TemplateText& TemplateText::Function(const std::string& publicName) {
-  return Add(functions, {Joined(Base("User " + publicName), {{"PUBLICNAME", Quoted(publicName)},
-                                                             {"PARAMETERS", "1"},
-                                                             {"USED_AS", "'AS_MATH_FUNC'"},
-                                                             {"DLL", "'plugin.dll'"},
-                                                             {"ENTRYPOINT", "'entry'"}}),
-                         ""});
 }
 
 TemplateText& TemplateText::Group(const std::string& name) {
-  groups.push_back({name, {}});
+  groups.emplace_back(name, "");
   return *this;
 }
 
 TemplateText& TemplateText::Level(const std::string& name, const std::string& items) {
-  groups.back().second.push_back({name, items});
+  const std::string listed = items.empty() ? "ITEMCOUNT = 0\n" : "ITEMCOUNT = 1\nITEMS = " + items + "\n";
+  groups.back().second +=
+      Section("L", "LEVEL = '" + name + "'\nDESCRIPTION = '" + name + " text'\n" + listed);
   return *this;
 }
 
-std::string TemplateText::Members(const std::string& prefix, const Elements& elements) {
+std::string TemplateText::Members(const Lists& from, std::string_view kind) {
+  const auto elements = from.find(kind);
   std::string content;
-  int number = 0;
-  for (const Element& element : elements) {
-    content += Section(prefix + std::to_string(++number), Lines(element.keywords));
+  for (std::size_t place = 0; elements != from.end() && place < elements->second.size(); ++place) {
+    content += Section(std::string(RowOf(kind).prefix) + std::to_string(place + 1),
+                       Lines(elements->second[place].keywords));
   }
   return content;
 }
 
-std::string TemplateText::List(const std::string& name, const std::string& prefix,
-                               const Elements& elements) const {
-  const auto head = heads.find(name);
-  return Section(
-      name, Lines(head == heads.end() ? kHead : head->second.back().keywords) + Members(prefix, elements));
+std::string TemplateText::Equations(const Lists& from, std::string_view kind) {
+  const auto elements = from.find(kind);
+  std::string content;
+  for (std::size_t place = 0; elements != from.end() && place < elements->second.size(); ++place)
+    content += elements->second[place].equation;
+  return content;
 }
 
-std::string TemplateText::ClassText(const ParticleClass& specie, const std::string& number) {
-  const auto list = [](const std::string& name, const std::string& prefix, const Elements& members) {
-    return members.empty() ? "" : Section(name, Lines(kHead) + Members(prefix, members));
-  };
-  std::string equations;
-  for (const Element& state : specie.states) equations += state.equation;
-  return Section("SPECIE_" + number,
-                 Lines(specie.itself.back().keywords) + list("STATE_VARIABLES", "S", specie.states) +
-                     list("CONSTANTS", "C", specie.constants) + list("FORCINGS", "F", specie.forcings) +
-                     list("SPATIAL_FUNCTIONS", "SPATIAL_FUNCTION_", specie.searches) +
-                     list("ARITHMETICAL_EXPRESSIONS", "A", specie.expressions) +
-                     Section("LAGRANGE_STATE_VARIABLE_EQUATIONS", equations) +
-                     Section("HORIZONTAL_VECTORS_SECTION", Members("H", specie.movements)) +
-                     (specie.descent.empty()
-                          ? ""
-                          : Section("VERTICAL_SPEED_EQUATION", Lines(specie.descent.back().keywords))));
+std::string TemplateText::HeadOf(std::string_view list) const {
+  const auto head = lists.find(list);
+  return head == lists.end() ? "DESCRIPTION = ''\nONLINE_HELP = ''\nDOCUMENTATION = ''\n"
+                             : Lines(head->second.back().keywords);
+}
+
+std::string TemplateText::ListOf(const Lists& from, std::string_view kind) const {
+  const std::string section(RowOf(kind).section);
+  const bool isInClass = kind.starts_with("class");
+  return Section(section, HeadOf(isInClass ? "none" : section) + Members(from, kind));
+}
+
+std::string TemplateText::ClassText(const Lists& specie, const std::string& number) const {
+  std::string content = Lines(specie.at("class").back().keywords);
+  for (const char* kind :
+       {"class.state", "class.constant", "class.forcing", "class.search", "class.expression"}) {
+    if (specie.contains(kind)) content += ListOf(specie, kind);
+  }
+  content += Section("LAGRANGE_STATE_VARIABLE_EQUATIONS", Equations(specie, "class.state")) +
+             Section("HORIZONTAL_VECTORS_SECTION", Members(specie, "class.movement"));
+  if (specie.contains("class.descent")) {
+    content += Section("VERTICAL_SPEED_EQUATION", Lines(specie.at("class.descent").back().keywords));
+  }
+  return Section("SPECIE_" + number, content);
 }
 
 std::string TemplateText::SettingsText() const {
-  if (!hasSettings) return "";
-  std::string content = Lines(settings.back().keywords) + furtherSettings;
-  if (!functions.empty()) content += List("EXTERNAL_FUNCTIONS", "EXTERNAL_FUNCTION_", functions);
-  std::string groupsText;
+  const auto settings = lists.find("settings");
+  if (settings == lists.end()) return "";
+  std::string content = Lines(settings->second.back().keywords) + furtherSettings;
+  if (lists.contains("function")) content += ListOf(lists, "function");
+  std::string all;
   for (const auto& [name, levels] : groups) {
-    std::string levelsText;
-    for (const auto& [level, items] : levels) {
-      levelsText +=
-          Section("L", Lines({{"LEVEL", Quoted(level)}, {"DESCRIPTION", Quoted(level + " text")}}) +
-                           (items.empty() ? "ITEMCOUNT = 0\n" : "ITEMCOUNT = 1\nITEMS = " + items + "\n"));
-    }
-    groupsText += Section("G", Lines({{"GROUP", Quoted(name)},
-                                      {"DESCRIPTION", Quoted(name + " text")},
-                                      {"LEVELS", std::to_string(levels.size())}}) +
-                                   levelsText);
+    all += Section("G", "GROUP = '" + name + "'\nDESCRIPTION = '" + name + " text'\nLEVELS = 0\n" + levels);
   }
   if (!groups.empty()) {
     content += Section("VISIBILITY_GROUPS",
-                       Lines(Joined(kHead, {{"GROUPS", std::to_string(groups.size())}})) + groupsText);
+                       HeadOf("none") + "GROUPS = " + std::to_string(groups.size()) + "\n" + all);
   }
   return Section("MISC", content);
 }
 
 std::string TemplateText::Text() const {
-  std::string equations;
-  for (const Element& element : stateVariables) equations += element.equation;
+  std::string content = HeadOf("") + SettingsText();
+  for (const char* kind : {"state", "constant", "forcing", "auxiliary", "process", "output"}) {
+    content += ListOf(lists, kind);
+  }
+  content += Section("STATE_VARIABLE_EQUATIONS", Equations(lists, "state"));
   std::string species;
   for (std::size_t place = 0; place < classes.size(); ++place) {
     species += ClassText(classes[place], std::to_string(place + 1));
   }
-  const auto head = heads.find("");
-  const std::string content =
-      Lines(head == heads.end() ? kHead : head->second.back().keywords) + SettingsText() +
-      List("STATE_VARIABLES", "STATE_VARIABLE_", stateVariables) + List("CONSTANTS", "CONSTANT_", constants) +
-      List("FORCINGS", "FORCING_", forcings) +
-      List("AUXILIARY_VARIABLES", "AUXILIARY_VARIABLE_", auxiliaries) +
-      List("PROCESSES", "PROCESS_", processes) + List("DERIVED_OUTPUTS", "DERIVED_OUTPUT_", derivedOutputs) +
-      Section("STATE_VARIABLE_EQUATIONS", equations) +
-      (species.empty() ? std::string() : Section("LAGRANGE", species));
+  if (!species.empty()) content += Section("LAGRANGE", species);
   return "\n" + before + Section("TESSAL_SETUP", content) + behind;
 }
 
@@ -348,51 +241,25 @@ void Change(TemplateText& text, std::istringstream changes) {
   }
 }
 
-/// A line's kind, and what builds it from the word after the kind and the rest.
-using LineBuilder = std::function<void(TemplateText&, std::string rest)>;
-
-template <class Build>
-LineBuilder Named(Build build) {
-  return [build](TemplateText& text, std::string rest) {
-    const std::string name = TakeWord(rest);
-    build(text, name, rest);
-  };
-}
-
-const std::map<std::string, LineBuilder>& LineBuilders() {
-  using Text = TemplateText;
-  using Word = const std::string&;
-  static const std::map<std::string, LineBuilder> kBuilders = {
-      {"state", Named([](Text& text, Word name, Word rest) { text.StateVariable(name, rest); })},
-      {"constant",
-       Named([](Text& text, Word name, Word rest) { text.Constant(name, rest.empty() ? "1" : rest); })},
-      {"forcing", Named([](Text& text, Word name, Word) { text.Forcing(name); })},
-      {"auxiliary", Named([](Text& text, Word name, Word rest) { text.Auxiliary(name, rest); })},
-      {"process", Named([](Text& text, Word name, Word rest) { text.Process(name, rest); })},
-      {"output", [](Text& text, Word rest) { text.DerivedOutput(rest); }},
-      {"class", [](Text& text, Word rest) { text.Class(rest); }},
-      {"class.state", Named([](Text& text, Word name, Word rest) { text.ClassState(name, rest); })},
-      {"class.constant",
-       Named([](Text& text, Word name, Word rest) { text.ClassConstant(name, rest.empty() ? "1" : rest); })},
-      {"class.forcing", Named([](Text& text, Word name, Word) { text.ClassForcing(name); })},
-      {"class.search", Named([](Text& text, Word name, Word rest) { text.ClassSearch(name, rest); })},
-      {"class.expression", Named([](Text& text, Word name, Word rest) { text.ClassExpression(name, rest); })},
-      {"class.movement", Named([](Text& text, Word speed, Word rest) { text.ClassMovement(speed, rest); })},
-      {"class.descent", [](Text& text, Word rest) { text.ClassDescent(rest); }},
-      {"settings",
-       [](Text& text, std::string rest) {
-         std::string content;
-         while (!rest.empty()) content += TakeWord(rest) + "\n";
-         text.Misc(content);
-       }},
-      {"function", [](Text& text, Word rest) { text.Function(rest); }},
-      {"group", [](Text& text, Word rest) { text.Group(rest); }},
-      {"level", Named([](Text& text, Word name, Word rest) { text.Level(name, rest); })},
-      {"head", [](Text& text, Word rest) { text.Head(rest); }},
-      {"before", [](Text& text, Word rest) { text.Before(rest + "\n"); }},
-      {"behind", [](Text& text, Word rest) { text.Behind(rest + "\n"); }},
-  };
-  return kBuilders;
+void AddLine(TemplateText& text, const std::string& kind, std::string rest) {
+  if (kind == "settings") {
+    text.Misc(Replaced(rest, " ", "\n") + "\n");
+  } else if (kind == "before") {
+    text.Before(rest + "\n");
+  } else if (kind == "behind") {
+    text.Behind(rest + "\n");
+  } else if (kind == "group") {
+    text.Group(rest);
+  } else if (kind == "output" || kind == "class.descent") {
+    text.Add(kind, "", rest);
+  } else {
+    const std::string symbol = TakeWord(rest);
+    if (kind == "level") {
+      text.Level(symbol, rest);
+    } else {
+      text.Add(kind, symbol, rest.empty() && kind.ends_with("constant") ? "1" : rest);
+    }
+  }
 }
 
 }  // namespace
@@ -404,9 +271,7 @@ std::string TemplateFromNotation(const std::string& lines) {
     const std::size_t bar = line.find(" | ");
     std::string rest = line.substr(0, bar);
     const std::string kind = TakeWord(rest);
-    const auto builder = LineBuilders().find(kind);
-    if (builder == LineBuilders().end()) throw std::invalid_argument("no kind of line: " + line);
-    builder->second(text, rest);
+    AddLine(text, kind, rest);
     if (bar != std::string::npos) Change(text, std::istringstream(line.substr(bar + 3)));
   }
   return text.Text();

@@ -13,38 +13,40 @@ namespace tessal::test {
 /// Keywords of a section: name and value, the value as it stands in the file.
 using Keywords = std::vector<std::pair<std::string, std::string>>;
 
-/// Builds a file whose elements have every keyword; `With` (which adds what is not there) and `Without` change
-/// those of the last one.
+/// Builds a file whose elements have every keyword; `With` (which adds what is not there) and `Without`
+/// change those of the last one.
 class TemplateText final {
  public:
-  TemplateText& StateVariable(const std::string& symbol, const std::string& equation);
-  TemplateText& Constant(const std::string& symbol, const std::string& value = "1");
-  TemplateText& Forcing(const std::string& symbol);
-  TemplateText& Auxiliary(const std::string& symbol, const std::string& expression);
-  TemplateText& Process(const std::string& symbol, const std::string& expression);
-  TemplateText& DerivedOutput(const std::string& expression);
+  TemplateText& StateVariable(const std::string& symbol, const std::string& equation) {
+    return Add("state", symbol, equation);
+  }
+  TemplateText& Constant(const std::string& symbol, const std::string& value = "1") {
+    return Add("constant", symbol, value);
+  }
+  TemplateText& Forcing(const std::string& symbol) { return Add("forcing", symbol); }
+  TemplateText& Auxiliary(const std::string& symbol, const std::string& expression) {
+    return Add("auxiliary", symbol, expression);
+  }
+  TemplateText& Process(const std::string& symbol, const std::string& expression) {
+    return Add("process", symbol, expression);
+  }
+  TemplateText& DerivedOutput(const std::string& expression) { return Add("output", "", expression); }
   /// A particle class with one state variable of that equation and arithmetic expressions of its own.
   TemplateText& Specie(const std::string& name, const std::string& equation, const Keywords& expressions);
-  /// A particle class without members. The next calls give it some.
-  TemplateText& Class(const std::string& name);
-  TemplateText& ClassState(const std::string& symbol, const std::string& equation);
-  TemplateText& ClassConstant(const std::string& symbol, const std::string& value);
-  TemplateText& ClassForcing(const std::string& symbol);
-  TemplateText& ClassSearch(const std::string& symbol, const std::string& variable);
-  TemplateText& ClassExpression(const std::string& symbol, const std::string& expression);
-  TemplateText& ClassMovement(const std::string& speed, const std::string& direction);
-  TemplateText& ClassDescent(const std::string& speed);
   TemplateText& With(const std::string& keyword, const std::string& value);
   TemplateText& Without(const std::string& keyword);
-  TemplateText& Misc(const std::string& content = "");
-  TemplateText& Behind(const std::string& text);
-  TemplateText& Before(const std::string& text);
-  /// The descriptive texts of the template itself ("") or of one of its lists ("CONSTANTS").
-  TemplateText& Head(const std::string& list);
-  /// A function of a plug-in, a visibility group and a level of it, for settings that hold them.
-  TemplateText& Function(const std::string& publicName);
+  TemplateText& Misc(const std::string& content = "") {
+    furtherSettings = content;
+    return Add("settings", "");
+  }
+  TemplateText& Behind(const std::string& text) { return behind += text, *this; }
+  TemplateText& Before(const std::string& text) { return before += text, *this; }
+  /// A visibility group and a level of it, for settings that hold them.
   TemplateText& Group(const std::string& name);
   TemplateText& Level(const std::string& name, const std::string& items);
+
+  /// An element of any kind, by the words of the notation below. Members go to the last class.
+  TemplateText& Add(const std::string& kind, const std::string& symbol, const std::string& value = "");
 
   std::string Text() const;
 
@@ -53,41 +55,20 @@ class TemplateText final {
     Keywords keywords;
     std::string equation;
   };
-  using Elements = std::vector<Element>;
-  struct ParticleClass {
-    Elements itself;
-    Elements states;
-    Elements constants;
-    Elements forcings;
-    Elements searches;
-    Elements expressions;
-    Elements movements;
-    Elements descent;
-  };
-  struct LevelText {
-    std::string name;
-    std::string items;
-  };
+  using Elements = std::deque<Element>;
+  using Lists = std::map<std::string, Elements, std::less<>>;
 
-  TemplateText& Add(Elements& elements, Element element);
-  static std::string Members(const std::string& prefix, const Elements& elements);
-  std::string List(const std::string& name, const std::string& prefix, const Elements& elements) const;
-  static std::string ClassText(const ParticleClass& specie, const std::string& number);
+  static std::string Members(const Lists& from, std::string_view kind);
+  static std::string Equations(const Lists& from, std::string_view kind);
+  std::string HeadOf(std::string_view list) const;
+  std::string ListOf(const Lists& from, std::string_view kind) const;
+  std::string ClassText(const Lists& specie, const std::string& number) const;
   std::string SettingsText() const;
 
-  Elements stateVariables;
-  Elements constants;
-  Elements forcings;
-  Elements auxiliaries;
-  Elements processes;
-  Elements derivedOutputs;
-  std::deque<ParticleClass> classes;
-  std::map<std::string, Elements> heads;
-  Elements functions;
-  std::vector<std::pair<std::string, std::vector<LevelText>>> groups;
-  Elements* last = nullptr;
-  bool hasSettings = false;
-  Elements settings;
+  Lists lists;  ///< by kind; texts of heads by section
+  std::deque<Lists> classes;
+  std::vector<std::pair<std::string, std::string>> groups;
+  Element* last = nullptr;
   std::string furtherSettings;
   std::string before;
   std::string behind;
