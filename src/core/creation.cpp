@@ -1,6 +1,8 @@
 #include "core/creation.h"
 
+#include <algorithm>
 #include <array>
+#include <optional>
 
 #include "core/template_core.h"
 
@@ -34,7 +36,7 @@ struct ChoiceRow {
   ElementKind listKind;
 };
 
-constexpr std::array<ChoiceRow, 9> kChoices = {{
+constexpr std::array<ChoiceRow, CreationOffer::kChoiceCount> kChoices = {{
     {ElementKind::StateVariable, ElementKind::None},
     {ElementKind::Constant, ElementKind::None},
     {ElementKind::Forcing, ElementKind::None},
@@ -45,6 +47,13 @@ constexpr std::array<ChoiceRow, 9> kChoices = {{
     {ElementKind::SpatialFunction, ElementKind::SpatialFunctionList},
     {ElementKind::ArithmeticExpression, ElementKind::ArithmeticExpressionList},
 }};
+
+/// The mask that a user of a kind brings; none for kinds that leave the offer as it is.
+std::optional<std::uint32_t> MaskForUser(ElementKind userKind) {
+  const auto row = std::find_if(kOffers.begin(), kOffers.end(),
+                                [userKind](const OfferRow& entry) { return entry.userKind == userKind; });
+  return row == kOffers.end() ? std::nullopt : std::optional(row->mask);
+}
 
 void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, const std::string& documentation) {
   element.symbol.SetText(symbol);
@@ -106,60 +115,43 @@ CreatedElement TemplateCore::CreateElement(const CreateRequest& request) {
   return created;
 }
 
-CreateRequest TemplateCore::RequestFor(const UndefinedSymbol& undefined, int choice) const {
-  CreateRequest request;
-  const ChoiceRow& row = kChoices.at(static_cast<std::size_t>(choice));
-  request.symbol = undefined.symbol;
-  request.kind = row.kind;
-  if (row.listKind == ElementKind::None) return request;
-  for (const Uid user : undefined.usedBy) {
-    const SymbolRecord* record = FindRecordByUid(user);
-    if (record == nullptr || record->specieIndex < 0) continue;
-    const auto& specie = At(species, static_cast<std::size_t>(record->specieIndex));
-    request.ownerId = specie.Head(row.listKind).GetUid();
-  }
-  return request;
+const CreateRequest* CreationOffer::RequestOf(int choice) const {
+  const auto index = static_cast<std::size_t>(choice);
+  return choice >= 0 && index < requests.size() ? &requests[index] : nullptr;
 }
 
-std::uint32_t TemplateCore::OfferMask(const UndefinedSymbol& undefined) const {
-  std::uint32_t mask = kPlainKindsMask;
+CreationOffer TemplateCore::OfferFor(const UndefinedSymbol& undefined) const {
+  CreationOffer offer;
+  offer.symbol = undefined.symbol;
+  offer.question =
+      "There are undefined symbols!\n\nDo you want to create symbol '" + undefined.symbol + "' ?";
+  offer.mask = kPlainKindsMask;
+  const CEL_Lagrange_Specie* specie = nullptr;
+  // The last user decides; masks are not combined.
   for (const Uid user : undefined.usedBy) {
     const SymbolRecord* record = FindRecordByUid(user);
     if (record == nullptr) continue;
-    for (const OfferRow& row : kOffers) {
-      // The last user decides; masks are not combined.
-      if (row.userKind == record->element->Kind()) mask = row.mask;
-    }
+    if (const auto mask = MaskForUser(record->element->Kind())) offer.mask = *mask;
+    if (record->specieIndex >= 0) specie = &At(species, static_cast<std::size_t>(record->specieIndex));
   }
-  return mask;
+  for (std::size_t choice = 0; choice < kChoices.size(); ++choice) {
+    const ChoiceRow& row = kChoices[choice];
+    CreateRequest& request = offer.requests[choice];
+    request.symbol = undefined.symbol;
+    request.kind = row.kind;
+    const bool isMember = row.listKind != ElementKind::None;
+    if (isMember && specie != nullptr) request.ownerId = specie->Head(row.listKind).GetUid();
+  }
+  return offer;
 }
 
-bool TemplateCore::OfferUndefinedSymbols(CreationQuestions& questions) {
-  bool created = false;
-  std::size_t position = 0;
-  while (position < undefinedSymbols.size()) {
-    // Each creation rebuilds the list, so the position moves only over entries that are marked already.
-    UndefinedSymbol& undefined = *undefinedSymbols[position];
-    if (undefined.asked) {
-      ++position;
-    } else {
-      undefined.asked = true;
-      created = OfferSymbol(undefined, questions) || created;
-    }
-    if (created) RebuildSymbolTable();
+std::optional<CreationOffer> TemplateCore::NextOffer() {
+  for (const auto& undefined : undefinedSymbols) {
+    if (undefined->asked) continue;
+    undefined->asked = true;
+    return OfferFor(*undefined);
   }
-  return created;
-}
-
-bool TemplateCore::OfferSymbol(const UndefinedSymbol& undefined, CreationQuestions& questions) const {
-  if (!questions.AskYesNo("There are undefined symbols!\n\nDo you want to create symbol '" +
-                          undefined.symbol + "' ?")) {
-    return false;
-  }
-  const int choice = questions.ChooseKind(undefined.symbol, OfferMask(undefined));
-  if (choice < 0 || static_cast<std::size_t>(choice) >= kChoices.size()) return false;
-  questions.Create(RequestFor(undefined, choice));
-  return true;
+  return std::nullopt;
 }
 
 }  // namespace tessal

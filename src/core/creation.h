@@ -1,6 +1,8 @@
 // Making elements for names that expressions use and nobody has defined, and at a user's request.
 #pragma once
 
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <string>
 
@@ -23,22 +25,19 @@ struct CreatedElement {
   Uid predecessor = Uid::None;  ///< identity of the element before it, 0 for the first place
 };
 
-/// How the offer to create undefined symbols asks. The editor shows boxes; the tool and the tests answer.
-class CreationQuestions {
- public:
-  virtual ~CreationQuestions() = default;
+/// The question about a name that expressions use and nobody has defined. Whoever asks it hands the request
+/// of the answer to the template, and then asks the template for the next offer.
+struct CreationOffer {
+  static constexpr std::size_t kChoiceCount = 9;
 
-  /// Asks with Yes and No.
-  virtual bool AskYesNo(const std::string& question) = 0;
-  /// Lets the user choose one of the kinds that the mask offers (bit n for index n); -1 when declined.
-  virtual int ChooseKind(const std::string& symbol, std::uint32_t mask) = 0;
-  /// Makes the element, and shows it where elements are shown.
-  virtual void Create(const CreateRequest& request) = 0;
+  std::string symbol;
+  std::string question;                              ///< with Yes and No for answers
+  std::uint32_t mask = 0;                            ///< bit n offers choice n
+  std::array<CreateRequest, kChoiceCount> requests;  ///< what each choice makes
 
- protected:
-  CreationQuestions() = default;
-  CreationQuestions(const CreationQuestions&) = default;
-  CreationQuestions& operator=(const CreationQuestions&) = default;
+  /// What the choice with an index makes; none for an index that is no choice, such as the -1 of a dialog
+  /// that was skipped.
+  const CreateRequest* RequestOf(int choice) const;
 };
 
 }  // namespace tessal

@@ -7,6 +7,7 @@
 #include <array>
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -152,8 +153,9 @@ class TemplateCore final : public ElementOwner {
   /// Makes an element with the request's symbol and default texts, ahead of its users. Turns change
   /// notifications on; a request for a kind that cannot be made leaves them off.
   CreatedElement CreateElement(const CreateRequest& request);
-  /// Asks about each undefined symbol that was not asked about yet; true when something was created.
-  bool OfferUndefinedSymbols(CreationQuestions& questions);
+  /// The question about the first undefined symbol that was not asked about yet, which counts as asked from
+  /// now on; none when nothing is left to ask. An answer may change the list: each call looks at it afresh.
+  std::optional<CreationOffer> NextOffer();
   /// Gives an element a new symbol and, if asked to, rewrites every expression that uses it. False, with
   /// nothing changed, when the new symbol exists or the old one does not.
   bool RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol, bool replaceInExpressions);
@@ -235,9 +237,7 @@ class TemplateCore final : public ElementOwner {
   bool CheckRecordOrder(const SymbolRecord& record) const;
 
   CEL_Element* AddByRequest(const CreateRequest& request);
-  CreateRequest RequestFor(const UndefinedSymbol& undefined, int choice) const;
-  std::uint32_t OfferMask(const UndefinedSymbol& undefined) const;
-  bool OfferSymbol(const UndefinedSymbol& undefined, CreationQuestions& questions) const;
+  CreationOffer OfferFor(const UndefinedSymbol& undefined) const;
   void RewriteUsers(const SymbolRecord& renamed, std::string_view oldSymbol, std::string_view newSymbol);
   bool ApplyExpression(std::uint32_t sequence, std::string_view text);
   bool ApplySymbol(std::uint32_t sequence, std::string_view text);

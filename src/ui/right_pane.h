@@ -63,6 +63,8 @@ class CRightPaneBase : public QWidget {
   bool Rename(const std::string& newSymbol);
 
  private:
+  /// Asks about each undefined symbol that was not asked about yet; true when an element was created.
+  bool OfferUndefinedSymbols();
   bool IsDeaf() const { return loading || committing || closed; }
   void RequestCommit();
 
