@@ -39,9 +39,6 @@ class CRightPaneBase : public QWidget {
   /// Turns the form deaf for good: its node may go before it does.
   void Close() { closed = true; }
 
-  /// The number of the help topic of forms that have none of their own.
-  static constexpr int kNoHelp = 107;
-  virtual int HelpNumber() const { return kNoHelp; }
   bool IsDirty() const { return dirty; }
 
  protected:

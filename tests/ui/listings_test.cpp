@@ -10,7 +10,7 @@
 #include "ui/auto_create_dialog.h"
 #include "ui/editor.h"
 #include "ui/expression_editor_dialog.h"
-#include "ui/node_commands.h"
+#include "ui/node_kinds.h"
 
 namespace tessal {
 namespace {
