@@ -7,20 +7,18 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTest>
-#include <QTimer>
 #include <filesystem>
 
 #include "ui/auto_create_dialog.h"
 #include "ui/documentation_link.h"
 #include "ui/editor.h"
 #include "ui/expression_colours.h"
-#include "ui/expression_editor_dialog.h"
 
 namespace tessal {
 namespace {
 
 using test::Editor;
-using test::SmallModel;
+using test::ModelText;
 
 void Paste(QWidget& field, const QString& plain) {
   auto mime = std::make_unique<QMimeData>();
@@ -33,7 +31,7 @@ void Paste(QWidget& field, const QString& plain) {
 }
 
 TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
-  Editor editor(SmallModel().Text());
+  Editor editor(ModelText("small"));
   CEL_Auxilliary_Variable& auxiliary = editor.Core().GetAuxiliary(0);
   const QString enormous(1 << 20, u'1');
   editor.Select("a");
@@ -57,11 +55,8 @@ TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
 
 TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
   const std::string longText(5000, 'x');
-  Editor editor(SmallModel()
-                    .Constant("long")
-                    .With("DESCRIPTION", "|" + longText + "|")
-                    .With("ONLINE_HELP", "|" + longText + "|")
-                    .Text());
+  Editor editor(ModelText("small\nconstant long 1\nwith DESCRIPTION |" + longText + "|\nwith ONLINE_HELP |" +
+                          longText + "|"));
   editor.Select("long");
   editor.Type("Unit", "kg");
   editor.LeaveField();
@@ -94,25 +89,6 @@ TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
     if (*row.button == '\0') dialog.accept();
     EXPECT_EQ(dialog.ChosenIndex(), row.chosen) << row.button;
   }
-}
-
-TEST(ExpressionEditor, IsAShellThatChangesNothing) {
-  Editor editor(SmallModel().Text());
-  editor.Select("a");
-  int pressed = 0;
-  QTimer::singleShot(0, &editor.View(), [&pressed] {
-    auto* dialog = qobject_cast<CExpressionEditorDlg*>(QApplication::activeModalWidget());
-    ASSERT_NE(dialog, nullptr);
-    for (QPushButton* key : dialog->findChildren<QPushButton*>()) {
-      if (key->objectName().isEmpty()) continue;
-      key->click();
-      ++pressed;
-    }
-    dialog->accept();
-  });
-  QTest::mouseClick(&editor.Field("Expression Editor"), Qt::LeftButton);
-  EXPECT_EQ(pressed, 33);
-  EXPECT_EQ(editor.Text("Expression"), "k*f");
 }
 
 TEST(History, KeepsThirtyNodesNewestFirst) {

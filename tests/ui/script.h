@@ -13,10 +13,6 @@
 
 namespace tessal::test {
 
-/// Builds a template from lines such as "constant k 2" or "auxiliary a k*f"; "small" at the start is
-/// one element of each kind with a symbol: a uses k and f, p uses a, and S is made of p.
-std::string ModelText(std::string lines);
-
 class Script final {
  public:
   explicit Script(const std::string& model);
