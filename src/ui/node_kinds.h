@@ -26,10 +26,9 @@ enum class OwnerRule {
 
 struct NodeRow {
   ElementKind kind;
-  Uid id;  ///< of a node that is no element and there once; None for the nodes of elements
-  std::int32_t
-      folder;  ///< the id of the folder that holds all elements of the kind; None when there are several
-  int help;    ///< the number of the help topic
+  Uid id;               ///< of a node that is no element and there once; None for the nodes of elements
+  Uid folder;           ///< the folder that holds all elements of the kind; None when there are several
+  int help;             ///< the number of the help topic
   ElementKind creates;  ///< the kind that the node's menu creates; None for a node without a menu
   OwnerRule owner;
   bool offersDelete;

@@ -76,7 +76,7 @@ class Editor final {
   QTreeWidgetItem* Node(const QString& caption);
   void Select(const QString& caption);
   QString Selected() { return Tree().currentItem()->text(0); }
-  std::int32_t IdOf(const QString& caption) { return CElementTree::DataOf(*Node(caption)).id; }
+  Uid IdOf(const QString& caption) { return CElementTree::DataOf(*Node(caption)).id; }
   /// The captions of a node's children.
   QStringList Children(const QString& caption);
 

@@ -93,16 +93,16 @@ TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
 
 TEST(History, KeepsThirtyNodesNewestFirst) {
   CNavigationHistory history;
-  EXPECT_EQ(history.Back(), 0) << "an empty list finds nothing";
+  EXPECT_EQ(history.Back(), Uid::None) << "an empty list finds nothing";
   EXPECT_EQ(history.Position(), -1);
-  for (std::int32_t id = 1; id <= 31; ++id) history.Add(id, std::to_string(id));
+  for (std::int32_t id = 1; id <= 31; ++id) history.Add(Uid{id}, std::to_string(id));
   EXPECT_EQ(history.Entries().size(), 30U);
-  EXPECT_EQ(history.Entries().front().id, 31);
-  EXPECT_EQ(history.Entries().back().id, 2) << "the oldest went";
+  EXPECT_EQ(history.Entries().front().id, Uid{31});
+  EXPECT_EQ(history.Entries().back().id, Uid{2}) << "the oldest went";
   for (int step = 0; step < 40; ++step) history.Back();
   EXPECT_EQ(history.Position(), 29);
-  history.Add(99, "99");
-  EXPECT_EQ(history.Entries().back().id, 99) << "entered before the present one, which made it the 31st";
+  history.Add(Uid{99}, "99");
+  EXPECT_EQ(history.Entries().back().id, Uid{99}) << "entered before the present one, which made it the 31st";
 }
 
 TEST(Documentation, IsLookedForInThreePlaces) {

@@ -49,14 +49,14 @@ void SendHint(Editor& editor, const Words& words) {
   bool isNumber = false;
   const std::int32_t number = words.second.toInt(&isNumber);
   const bool isNode = !isNumber && !words.second.isEmpty();
-  Hint(editor, words.Number(), NumberHint(isNode ? editor.IdOf(words.second) : number));
+  Hint(editor, words.Number(), NumberHint(isNode ? NumberOf(editor.IdOf(words.second)) : number));
 }
 
 /// "9 in Constants: rate": the hint to create an element of a kind.
 void Create(Editor& editor, const Words& words) {
   CreateRequest request;
   const QStringList kindAndOwner = words.first.split(QStringLiteral(" in "));
-  request.kind = kindAndOwner[0].toUInt();
+  request.kind = ElementKind{kindAndOwner[0].toInt()};
   if (kindAndOwner.size() > 1) request.ownerId = editor.IdOf(kindAndOwner[1]);
   request.symbol = words.second.toStdString();
   Hint(editor, hint::kCreateElement, CreateHint(request));
@@ -193,7 +193,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"click-error", ClickError},
     {"enter-error", EnterError},
     {"follow-error",
-     [](Editor& editor, auto& words) { emit editor.View().ErrorList().ElementChosen(words.Number()); }},
+     [](Editor& editor, auto& words) { emit editor.View().ErrorList().ElementChosen(Uid{words.Number()}); }},
     {"go",
      [](Editor& editor, auto& words) {
        editor.View().findChild<QToolBar*>()->actions().at(words.first == "back" ? 0 : 1)->trigger();
