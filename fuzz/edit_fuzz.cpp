@@ -150,8 +150,18 @@ void ChangeGroups(TemplateCore& core, Choices& choices) {
   }
 }
 
+/// A user's answers to every name that nobody has defined, among them none and one that was not offered.
+void AnswerOffers(TemplateCore& core, Choices& choices) {
+  while (const auto offer = core.NextOffer()) {
+    const int choice = static_cast<int>(choices.Pick(CreationOffer::kChoiceCount + 1)) - 1;
+    const CreateRequest* request = offer->RequestOf(choice);
+    if (request != nullptr) core.CreateElement(*request);
+  }
+  SetNotifyChanges(true);
+}
+
 void Edit(TemplateCore& core, Choices& choices) {
-  switch (choices.Pick(9)) {
+  switch (choices.Pick(10)) {
     case 0:
     case 1:
       Add(core, choices);
@@ -183,6 +193,9 @@ void Edit(TemplateCore& core, Choices& choices) {
       break;
     case 7:
       ChangeTexts(core, choices);
+      break;
+    case 8:
+      AnswerOffers(core, choices);
       break;
     default:
       ChangeField(core, choices);

@@ -10,6 +10,7 @@
 #include "core/template_core.h"
 #include "docgen/mathml.h"
 #include "docgen/page_style.h"
+#include "expr/parser.h"
 #include "platform/file_replacement.h"
 #include "platform/unit_names.h"
 
@@ -237,6 +238,18 @@ class PageWriter final {
     return record == nullptr ? std::string() : core.RecordSymbol(*record);
   }
 
+  /// The block of an expression field, from the parse that its element holds.
+  static std::string MathMLOf(const CEL_Element& element, const ElementField& field, const std::string& symbol,
+                              bool isDerivative) {
+    const ParsedExpression* parsed = nullptr;
+    element.ForEachExpression([&field, &parsed](const PropertyRow& row, const CEL_Property& expression) {
+      // The page takes a text as it is, quotes and all; the held parse is without them.
+      if (row.label == field.name && field.text.find('"') == std::string::npos) parsed = &expression.Parsed();
+    });
+    if (parsed == nullptr) return ExpressionToMathML(field.text, symbol, isDerivative);
+    return parsed->Tree() == nullptr ? std::string() : TreeToMathML(*parsed->Tree(), symbol, isDerivative);
+  }
+
   void WriteElementEntry(const CEL_Element& element, bool detail, Keys keys, bool withReferences) {
     std::vector<ElementField> fields;
     element.GetFields(fields);
@@ -267,7 +280,7 @@ class PageWriter final {
     if (field->kind == FieldKind::Expression) {
       const bool isDerivative =
           element.Kind() == ElementKind::StateVariable || element.Kind() == ElementKind::SpecieStateVariable;
-      Line(ExpressionToMathML(field->text, symbol, isDerivative));
+      Line(MathMLOf(element, *field, symbol, isDerivative));
     } else {
       Line(FieldText(*field));
     }

@@ -128,6 +128,30 @@ CEL_Element* CEL_Lagrange_Specie::AddMember(ElementKind kind) {
   return added;
 }
 
+CEL_Lagrange_StateVariable& CEL_Lagrange_Specie::AddStateVariable() {
+  return static_cast<CEL_Lagrange_StateVariable&>(*AddMember(ElementKind::SpecieStateVariable));
+}
+
+CEL_Lagrange_Constant& CEL_Lagrange_Specie::AddConstant() {
+  return static_cast<CEL_Lagrange_Constant&>(*AddMember(ElementKind::SpecieConstant));
+}
+
+CEL_Lagrange_Forcing& CEL_Lagrange_Specie::AddForcing() {
+  return static_cast<CEL_Lagrange_Forcing&>(*AddMember(ElementKind::SpecieForcing));
+}
+
+CEL_Lagrange_Spatial_Function& CEL_Lagrange_Specie::AddSpatialFunction() {
+  return static_cast<CEL_Lagrange_Spatial_Function&>(*AddMember(ElementKind::SpatialFunction));
+}
+
+CEL_Lagrange_Arithmetical_Expression& CEL_Lagrange_Specie::AddArithmeticExpression() {
+  return static_cast<CEL_Lagrange_Arithmetical_Expression&>(*AddMember(ElementKind::ArithmeticExpression));
+}
+
+CEL_Lagrange_Horizontal_Vector& CEL_Lagrange_Specie::AddHorizontalVector() {
+  return static_cast<CEL_Lagrange_Horizontal_Vector&>(*AddMember(ElementKind::HorizontalVector));
+}
+
 void CEL_Lagrange_Specie::StampMembers() {
   ForEachMemberList([this](const auto& list) {
     for (const auto& member : this->*list.members) {

@@ -63,6 +63,12 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   /// Makes a member of the kind at the end of its list, with a symbol that is not in use; none for a kind
   /// without a list.
   CEL_Element* AddMember(ElementKind kind);
+  CEL_Lagrange_StateVariable& AddStateVariable();
+  CEL_Lagrange_Constant& AddConstant();
+  CEL_Lagrange_Forcing& AddForcing();
+  CEL_Lagrange_Spatial_Function& AddSpatialFunction();
+  CEL_Lagrange_Arithmetical_Expression& AddArithmeticExpression();
+  CEL_Lagrange_Horizontal_Vector& AddHorizontalVector();
   /// Calls the visitor with every member, in the order of the lists.
   template <class Visitor>
   void ForEachMember(Visitor visit) const;

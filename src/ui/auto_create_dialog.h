@@ -5,6 +5,8 @@
 #include <array>
 #include <cstdint>
 
+#include "core/creation.h"
+
 class QRadioButton;
 
 namespace tessal {
@@ -13,7 +15,7 @@ class CAutoCreateDlg final : public QDialog {
   Q_OBJECT
 
  public:
-  static constexpr std::size_t kKindCount = 9;
+  static constexpr std::size_t kKindCount = CreationOffer::kChoiceCount;
 
   /// Bit n of the mask enables the kind with index n.
   CAutoCreateDlg(const QString& symbol, std::uint32_t mask, QWidget* parent);

@@ -78,9 +78,9 @@ void LimitHeight(QWidget& editor) {
 
 }  // namespace
 
-CElementForm::CElementForm(const FormTable& formTable, const FormContext& context, QWidget* parent)
-    : CRightPaneBase(context, parent), table(formTable), layout(MakeChild<QGridLayout>(this)) {
-  for (const FormField& field : table.fields) AddField(field);
+CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
+    : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
+  for (const FormField& field : fields) AddField(field);
   Arrange(1);
   narrowWidth = layout->minimumSize().width();
   Arrange(2);
@@ -239,8 +239,8 @@ void CElementForm::JumpTo(Uid uid) {
   Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 
-bool CElementForm::IsEnabled(const FormField& /*field*/, const CEL_Property& property) const {
-  return property.Editable();
+bool CElementForm::IsEnabled(const FormField& field, const CEL_Property& property) const {
+  return field.isOpen != nullptr ? field.isOpen(Core()) : property.Editable();
 }
 
 void CElementForm::ItemToForm() {
@@ -327,9 +327,12 @@ void CElementForm::FormToItem() {
 }
 
 bool CElementForm::StoreFields(CEL_Element& element) {
-  bool changed = false;
-  for (const Control& control : controls) changed = Store(control, element) || changed;
-  return changed;
+  std::vector<int> changed;
+  for (const Control& control : controls) {
+    if (std::find(changed.begin(), changed.end(), control.field->follows) != changed.end()) continue;
+    if (Store(control, element)) changed.push_back(control.field->control);
+  }
+  return !changed.empty();
 }
 
 bool CElementForm::IsEdited(const Control& control) {

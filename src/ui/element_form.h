@@ -1,5 +1,4 @@
-// The forms of the elements: one implementation over tables of fields. A form class is its table and what is
-// truly its own.
+// The forms of the elements: one implementation over tables of fields. A form class is its table.
 #pragma once
 
 #include <QString>
@@ -40,25 +39,23 @@ struct FormField {
   const char* label;
   FieldEditor editor;
   CEL_Property& (*property)(CEL_Element& element);
-  /// What else the field's behaviour hangs on.
+  /// Whether the field is left unwritten while it is locked.
   bool onlyWhileEnabled = false;
+  /// The control whose change brings this field's value with it: then the one shown is not stored.
+  int follows = 0;
+  /// Whether the field may be used in a template; without it the property says so.
+  bool (*isOpen)(const TemplateCore& core) = nullptr;
 };
 
-/// A form: its class, its dialog and help numbers and its fields, in the order in which they are loaded.
-struct FormTable {
-  ElementKind kind;
-  int dialog;
-  int help;
-  std::span<const FormField> fields;
-};
+/// The fields of a form, in the order in which they are loaded.
+using FormTable = std::span<const FormField>;
 
 class CElementForm : public CRightPaneBase {
   Q_OBJECT
 
  public:
-  CElementForm(const FormTable& formTable, const FormContext& context, QWidget* parent);
+  CElementForm(FormTable fields, const FormContext& context, QWidget* parent);
 
-  int HelpNumber() const override { return table.help; }
   QSize minimumSizeHint() const override;
 
  protected:
@@ -66,6 +63,7 @@ class CElementForm : public CRightPaneBase {
   void ItemToForm() override;
   void FormToItem() override;
 
+ private:
   struct Control {
     const FormField* field = nullptr;
     QWidget* editor = nullptr;
@@ -75,14 +73,10 @@ class CElementForm : public CRightPaneBase {
     QString shown;            ///< the text that the last load gave a line
   };
 
-  /// Whether a control may be used; the property's flag, unless the form knows better.
-  virtual bool IsEnabled(const FormField& field, const CEL_Property& property) const;
-  /// Writes the fields behind the symbol; true when any has changed.
-  virtual bool StoreFields(CEL_Element& element);
+  bool IsEnabled(const FormField& field, const CEL_Property& property) const;
+  /// Writes the fields after the symbol; true when any has changed.
+  bool StoreFields(CEL_Element& element);
   bool Store(const Control& control, CEL_Element& element);
-  const std::vector<Control>& Controls() const { return controls; }
-
- private:
   void AddField(const FormField& field);
   /// Lays the fields out; short ones share a row when there are two columns.
   void Arrange(int columnCount);
@@ -107,7 +101,6 @@ class CElementForm : public CRightPaneBase {
   void BrowseDocumentation(QLineEdit& line);
   void OpenDocumentation(const QString& text);
 
-  const FormTable& table;
   std::vector<Control> controls;
   QGridLayout* layout;
   int columns = 0;

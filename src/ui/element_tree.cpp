@@ -6,6 +6,7 @@
 #include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
+#include "ui/node_kinds.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -22,19 +23,6 @@ class ElementItem final : public QTreeWidgetItem {
 };
 
 }  // namespace
-
-std::string ElementCaption(const CEL_Element& element) {
-  if (element.Kind() == ElementKind::DerivedOutput) return element.description.Text();
-  if (element.Kind() == ElementKind::ExternalFunction) {
-    return "User function '" + static_cast<const CEL_ExternalFunction&>(element).publicName.Text() + "'";
-  }
-  return element.symbol.Text();
-}
-
-std::string MarkedCaption(const CEL_Element& element) {
-  const std::string caption = ElementCaption(element);
-  return element.Loaded() ? caption : "*" + caption;
-}
 
 CElementTree::CElementTree(QWidget* parent) : QTreeWidget(parent) {
   setObjectName(QString::number(control_id::kTree));
@@ -59,27 +47,27 @@ QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, Elemen
   return item;
 }
 
+QTreeWidgetItem* CElementTree::InsertFixed(QTreeWidgetItem& parent, int place, Uid id) {
+  const NodeRow& row = NodeRowWithId(id);
+  return Insert(parent, place, row.kind, id, CaptionOfFixedNode(row));
+}
+
 template <class Elements>
-void CElementTree::InsertFolder(ElementKind kind, Uid id, const Elements& elements) {
-  QTreeWidgetItem* folder =
-      Insert(*RootItem(), RootItem()->childCount(), kind, id, std::string(KindText(kind)));
+void CElementTree::InsertFolder(Uid id, const Elements& elements) {
+  QTreeWidgetItem* folder = InsertFixed(*RootItem(), RootItem()->childCount(), id);
   for (const auto& element : elements) InsertElement(*folder, *element, folder->childCount());
 }
 
 void CElementTree::Build(TemplateCore& core) {
   clear();
   groupItems.clear();
-  auto* root = MakeChild<ElementItem>();
-  root->data.kind = node_kind::kRoot;
-  root->data.id = folder_id::kRoot;
-  root->setText(0, strings::kSetup);
-  addTopLevelItem(root);
-  InsertFolder(ElementKind::StateVariableList, folder_id::kStateVariables, core.StateVariables());
-  InsertFolder(ElementKind::ConstantList, folder_id::kConstants, core.Constants());
-  InsertFolder(ElementKind::ForcingList, folder_id::kForcings, core.Forcings());
-  InsertFolder(ElementKind::AuxiliaryList, folder_id::kAuxiliaries, core.Auxiliaries());
-  InsertFolder(ElementKind::ProcessList, folder_id::kProcesses, core.Processes());
-  InsertFolder(ElementKind::DerivedOutputList, folder_id::kDerivedOutputs, core.DerivedOutputs());
+  QTreeWidgetItem* root = InsertFixed(*invisibleRootItem(), 0, folder_id::kRoot);
+  InsertFolder(folder_id::kStateVariables, core.StateVariables());
+  InsertFolder(folder_id::kConstants, core.Constants());
+  InsertFolder(folder_id::kForcings, core.Forcings());
+  InsertFolder(folder_id::kAuxiliaries, core.Auxiliaries());
+  InsertFolder(folder_id::kProcesses, core.Processes());
+  InsertFolder(folder_id::kDerivedOutputs, core.DerivedOutputs());
   if (core.GetMisc() != nullptr) ShowMisc(core);
   if (core.GetSpecieCount() > 0) ShowParticles(core);
   root->setExpanded(true);
@@ -121,23 +109,19 @@ void CElementTree::ShowMisc(TemplateCore& core) {
   // Behind the collections and ahead of the particle classes.
   QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses);
   const int place = particles == nullptr ? RootItem()->childCount() : RootItem()->indexOfChild(particles);
-  QTreeWidgetItem* settings =
-      Insert(*RootItem(), place, ElementKind::Miscellaneous, folder_id::kMiscellaneous, "Miscellaneous");
+  QTreeWidgetItem* settings = InsertFixed(*RootItem(), place, folder_id::kMiscellaneous);
   const auto& functions = core.GetMisc()->ExternalFunctions();
   if (!functions.empty()) {
-    QTreeWidgetItem* list =
-        Insert(*settings, 0, node_kind::kPluginFunctions, folder_id::kPluginFunctions, "Plug-in Functions");
+    QTreeWidgetItem* list = InsertFixed(*settings, 0, folder_id::kPluginFunctions);
     for (const auto& function : functions) InsertElement(*list, *function, list->childCount());
   }
-  Insert(*settings, settings->childCount(), ElementKind::VisibilityGroups, folder_id::kVisibilityGroups,
-         "Visibility Groups");
+  InsertFixed(*settings, settings->childCount(), folder_id::kVisibilityGroups);
   for (const VisibilityGroup& group : core.GetMisc()->Visibilities().groups) AddGroup(group.name);
 }
 
 void CElementTree::ShowParticles(TemplateCore& core) {
   if (FindById(folder_id::kParticleClasses) != nullptr) return;
-  QTreeWidgetItem* folder = Insert(*RootItem(), RootItem()->childCount(), ElementKind::Specie,
-                                   folder_id::kParticleClasses, "Particle Classes");
+  QTreeWidgetItem* folder = InsertFixed(*RootItem(), RootItem()->childCount(), folder_id::kParticleClasses);
   for (const auto& specie : core.Species()) InsertSpecie(*folder, *specie);
   folder->setExpanded(true);
 }

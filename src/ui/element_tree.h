@@ -49,15 +49,12 @@ class CElementTree final : public QTreeWidget {
  private:
   QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                           const std::string& caption);
+  /// Inserts the node that is no element and has this id.
+  QTreeWidgetItem* InsertFixed(QTreeWidgetItem& parent, int place, Uid id);
   template <class Elements>
-  void InsertFolder(ElementKind kind, Uid id, const Elements& elements);
+  void InsertFolder(Uid id, const Elements& elements);
 
   std::vector<QTreeWidgetItem*> groupItems;
 };
-
-/// The caption of an element's node: its symbol, a derived output's description, or a user function's public
-/// name. With the mark, when nobody has looked at the element yet.
-std::string ElementCaption(const CEL_Element& element);
-std::string MarkedCaption(const CEL_Element& element);
 
 }  // namespace tessal

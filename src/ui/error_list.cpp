@@ -8,7 +8,7 @@
 #include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
-#include "ui/element_tree.h"
+#include "ui/node_kinds.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 

@@ -2,7 +2,6 @@
 
 #include <QLabel>
 #include <QVBoxLayout>
-#include <array>
 
 #include "core/document.h"
 #include "ui/child.h"
@@ -76,13 +75,22 @@ constexpr FormField kInputFields[] = {
     kReferencedIn,
 };
 
+// A new scope brings a spatial variation with it.
+constexpr FormField kFollowingSpatialVariation{
+    .control = kSpatialControl,
+    .label = "Spatial var.",
+    .editor = SortedChoice,
+    .property = Of<&CEL_ExpressionElement::spatialVariation>,
+    .follows = kScopeControl,
+};
+
 constexpr FormField kAuxiliaryFields[] = {
     kSymbol,
     kDescription,
     kOnlineHelp,
     kDocumentation,
     {kScopeControl, "Scope", SortedChoice, Of<&CEL_ExpressionElement::scope>},
-    {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
+    kFollowingSpatialVariation,
     {1050, "Output", SortedChoice, Of<&CEL_Auxilliary_Variable::output>},
     {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
     {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
@@ -95,7 +103,7 @@ constexpr FormField kProcessFields[] = {
     kOnlineHelp,
     kDocumentation,
     {kScopeControl, "Scope", SortedChoice, Of<&CEL_ExpressionElement::scope>},
-    {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
+    kFollowingSpatialVariation,
     {1050, "Output", SortedChoice, Of<&CEL_Process::output>},
     {1052, "Process type", SortedChoice, Of<&CEL_Process::processType>},
     {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
@@ -115,8 +123,14 @@ constexpr FormField kDerivedOutputFields[] = {
     {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
 };
 
-constexpr int kRandomBearingControl = 1054;
-constexpr int kSearchTreeControl = 1041;
+bool HasParticleClass(const TemplateCore& core) {
+  return core.GetSpecieCount() > 0;
+}
+
+constexpr FormField OnlyWithParticles(FormField field) {
+  field.isOpen = HasParticleClass;
+  return field;
+}
 
 constexpr FormField kMiscFields[] = {
     kDescription,
@@ -128,82 +142,21 @@ constexpr FormField kMiscFields[] = {
     {1095, "Rand. seed", Integer, Of<&CEL_Miscanellous::randSeed>},
     {1043, "Debug level", SortedChoice, Of<&CEL_Miscanellous::debugLevel>},
     {1070, "Debug log", Line, Of<&CEL_Miscanellous::debugLog>},
-    {kRandomBearingControl, "ABM: random bearing", SortedChoice, Of<&CEL_Miscanellous::randomParticleDir>},
-    {kSearchTreeControl, "ABM: search tree", SortedChoice, Of<&CEL_Miscanellous::buildSpatialTree>},
+    OnlyWithParticles({1054, "ABM: random bearing", SortedChoice, Of<&CEL_Miscanellous::randomParticleDir>}),
+    OnlyWithParticles({1041, "ABM: search tree", SortedChoice, Of<&CEL_Miscanellous::buildSpatialTree>}),
     {1068, "Checksum", ShortLine, Of<&CEL_Miscanellous::checksum>},
     {1049, "Optimise expressions", SortedChoice, Of<&CEL_Miscanellous::optimise>},
     {1060, "Angle Unit", SortedChoice, Of<&CEL_Miscanellous::trigonometrics>},
 };
 
-constexpr FormTable kStateVariableForm{ElementKind::StateVariable, 675, 100, kStateVariableFields};
-constexpr FormTable kConstantForm{ElementKind::Constant, 653, 102, kInputFields};
-constexpr FormTable kForcingForm{ElementKind::Forcing, 660, 106, kInputFields};
-constexpr FormTable kAuxiliaryForm{ElementKind::Auxiliary, 652, 101, kAuxiliaryFields};
-constexpr FormTable kProcessForm{ElementKind::Process, 667, 119, kProcessFields};
-constexpr FormTable kDerivedOutputForm{ElementKind::DerivedOutput, 655, 120, kDerivedOutputFields};
-constexpr FormTable kMiscForm{ElementKind::Miscellaneous, 665, 110, kMiscFields};
-
-template <class Form>
-std::unique_ptr<CRightPaneBase> Make(const FormContext& context, QWidget* parent) {
-  return std::make_unique<Form>(context, parent);
-}
-
-struct FormRow {
-  ElementKind kind;
-  std::unique_ptr<CRightPaneBase> (*make)(const FormContext& context, QWidget* parent);
-};
-
-constexpr std::array<FormRow, 7> kForms = {{
-    {ElementKind::StateVariable, Make<CStateVariableView>},
-    {ElementKind::Constant, Make<CConstantView>},
-    {ElementKind::Forcing, Make<CForcingView>},
-    {ElementKind::Auxiliary, Make<CAuxilarieView>},
-    {ElementKind::Process, Make<CProcessView>},
-    {ElementKind::DerivedOutput, Make<CDerviedView>},
-    {ElementKind::Miscellaneous, Make<CMiscView>},
-}};
-
 }  // namespace
 
-CStateVariableView::CStateVariableView(const FormContext& context, QWidget* parent)
-    : CElementForm(kStateVariableForm, context, parent) {}
-
-CConstantView::CConstantView(const FormContext& context, QWidget* parent)
-    : CElementForm(kConstantForm, context, parent) {}
-
-CForcingView::CForcingView(const FormContext& context, QWidget* parent)
-    : CElementForm(kForcingForm, context, parent) {}
-
-CAuxilarieView::CAuxilarieView(const FormContext& context, QWidget* parent)
-    : CScopedExpressionView(kAuxiliaryForm, context, parent) {}
-
-CProcessView::CProcessView(const FormContext& context, QWidget* parent)
-    : CScopedExpressionView(kProcessForm, context, parent) {}
-
-CDerviedView::CDerviedView(const FormContext& context, QWidget* parent)
-    : CElementForm(kDerivedOutputForm, context, parent) {}
-
-CMiscView::CMiscView(const FormContext& context, QWidget* parent)
-    : CElementForm(kMiscForm, context, parent) {}
-
-bool CScopedExpressionView::StoreFields(CEL_Element& element) {
-  bool changed = false;
-  bool newScope = false;
-  for (const Control& control : Controls()) {
-    if (newScope && control.field->control == kSpatialControl) continue;
-    const bool stored = Store(control, element);
-    if (control.field->control == kScopeControl) newScope = stored;
-    changed = changed || stored;
-  }
-  return changed;
-}
-
-bool CMiscView::IsEnabled(const FormField& field, const CEL_Property& property) const {
-  if (field.control == kRandomBearingControl || field.control == kSearchTreeControl) {
-    return Core().GetSpecieCount() > 0;
-  }
-  return CElementForm::IsEnabled(field, property);
-}
+constexpr FormTable kStateVariableForm = kStateVariableFields;
+constexpr FormTable kInputForm = kInputFields;
+constexpr FormTable kAuxiliaryForm = kAuxiliaryFields;
+constexpr FormTable kProcessForm = kProcessFields;
+constexpr FormTable kDerivedOutputForm = kDerivedOutputFields;
+constexpr FormTable kMiscForm = kMiscFields;
 
 CNoView::CNoView(const FormContext& context, QWidget* parent) : CRightPaneBase(context, parent) {
   auto* layout = MakeChild<QVBoxLayout>(this);
@@ -212,14 +165,6 @@ CNoView::CNoView(const FormContext& context, QWidget* parent) : CRightPaneBase(c
   text->setAlignment(Qt::AlignCenter);
   text->setWordWrap(true);
   layout->addWidget(text);
-}
-
-std::unique_ptr<CRightPaneBase> MakeForm(const FormContext& context, QWidget* parent) {
-  for (const FormRow& row : kForms) {
-    const bool isElement = IsElement(context.item.id) || context.item.kind == ElementKind::Miscellaneous;
-    if (isElement && row.kind == context.item.kind) return row.make(context, parent);
-  }
-  return std::make_unique<CNoView>(context, parent);
 }
 
 }  // namespace tessal

@@ -20,10 +20,10 @@
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
-#include "ui/form_tables.h"
 #include "ui/help_window.h"
 #include "ui/label.h"
-#include "ui/node_commands.h"
+#include "ui/node_kinds.h"
+#include "ui/right_pane.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -227,7 +227,7 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
   if (current != nullptr) {
     const CItemData& node = CElementTree::DataOf(*current);
     history.Add(node.id, current->text(0).toStdString());
-    helpNumber = HelpNumberOfKind(node.kind);
+    helpNumber = NodeRowOf(node).help;
   }
   UpdateNavigation();
 }
@@ -273,12 +273,8 @@ void CMainView::RefreshCaption(QTreeWidgetItem* item) {
   title->setText(item->text(0));
 }
 
-int CMainView::HelpNumber() const {
-  return form && form->HelpNumber() != CRightPaneBase::kNoHelp ? form->HelpNumber() : helpNumber;
-}
-
 void CMainView::ShowHelp() {
-  dialogs.ShowHelp(this, kFirstHelpTopic + HelpNumber());
+  dialogs.ShowHelp(this, kFirstHelpTopic + helpNumber);
 }
 
 void CMainView::SelectById(Uid id) {
@@ -314,9 +310,8 @@ void CMainView::FillHistoryMenu() {
 }
 
 QTreeWidgetItem* CMainView::FolderFor(const CreateRequest& request) const {
-  const ElementKind elementKind = request.kind;
-  if (const Uid folder = FolderOfKind(elementKind); folder != Uid::None) return tree->FindById(folder);
-  return tree->FindById(request.ownerId);
+  const Uid folder = NodeRowOfElements(request.kind).folder;
+  return tree->FindById(folder != Uid::None ? folder : request.ownerId);
 }
 
 Uid CMainView::CreateElement(const CreateRequest& request) {

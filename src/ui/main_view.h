@@ -47,8 +47,8 @@ class CMainView final : public QWidget, public CView {
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
   const CNavigationHistory& History() const { return history; }
-  /// The number of the help topic for the form, or for the node where it has none.
-  int HelpNumber() const;
+  /// The number of the help topic for the selected node.
+  int HelpNumber() const { return helpNumber; }
   QMenu& HistoryMenu() const { return *historyMenu; }
 
   /// Selects the node with this id and makes it visible; nothing happens when there is none.

@@ -1,5 +1,7 @@
 #include "ui/right_pane.h"
 
+#include <optional>
+
 #include "core/document.h"
 #include "core/rename.h"
 #include "ui/create_hint.h"
@@ -7,33 +9,6 @@
 #include "ui/text_bytes.h"
 
 namespace tessal {
-
-namespace {
-
-/// The questions about undefined symbols, asked over a form.
-class FormQuestions final : public CreationQuestions {
- public:
-  FormQuestions(QWidget& formWidget, UserDialogs& userDialogs, CTessalDoc& owningDocument)
-      : form(formWidget), dialogs(userDialogs), document(owningDocument) {}
-
-  bool AskYesNo(const std::string& question) override { return dialogs.Ask(&form, ToScreen(question)); }
-
-  int ChooseKind(const std::string& symbol, std::uint32_t mask) override {
-    return dialogs.ChooseKind(&form, ToScreen(symbol), mask);
-  }
-
-  void Create(const CreateRequest& request) override {
-    const CreateHint argument(request);
-    document.UpdateAllViews(nullptr, hint::kCreateElement, &argument);
-  }
-
- private:
-  QWidget& form;
-  UserDialogs& dialogs;
-  CTessalDoc& document;
-};
-
-}  // namespace
 
 CRightPaneBase::CRightPaneBase(const FormContext& formContext, QWidget* parent)
     : QWidget(parent), where(formContext) {}
@@ -66,11 +41,24 @@ void CRightPaneBase::Commit() {
   if (committing) return;
   committing = true;
   FormToItem();
-  FormQuestions questions(*this, where.dialogs, where.document);
-  const bool created = Core().OfferUndefinedSymbols(questions);
+  const bool created = OfferUndefinedSymbols();
   dirty = false;
   committing = false;
   if (created && !loading) Load();
+}
+
+bool CRightPaneBase::OfferUndefinedSymbols() {
+  bool created = false;
+  while (const std::optional<CreationOffer> offer = Core().NextOffer()) {
+    if (!Dialogs().Ask(this, ToScreen(offer->question))) continue;
+    const int choice = Dialogs().ChooseKind(this, ToScreen(offer->symbol), offer->mask);
+    const CreateRequest* request = offer->RequestOf(choice);
+    if (request == nullptr) continue;
+    const CreateHint argument(*request);
+    Document().UpdateAllViews(nullptr, hint::kCreateElement, &argument);
+    created = true;
+  }
+  return created;
 }
 
 void CRightPaneBase::NoteEdited() {

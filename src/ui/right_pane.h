@@ -39,9 +39,6 @@ class CRightPaneBase : public QWidget {
   /// Turns the form deaf for good: its node may go before it does.
   void Close() { closed = true; }
 
-  /// The number of the help topic of forms that have none of their own.
-  static constexpr int kNoHelp = 107;
-  virtual int HelpNumber() const { return kNoHelp; }
   bool IsDirty() const { return dirty; }
 
  protected:
@@ -63,6 +60,8 @@ class CRightPaneBase : public QWidget {
   bool Rename(const std::string& newSymbol);
 
  private:
+  /// Asks about each undefined symbol that was not asked about yet; true when an element was created.
+  bool OfferUndefinedSymbols();
   bool IsDeaf() const { return loading || committing || closed; }
   void RequestCommit();
 

@@ -15,7 +15,6 @@ inline const QString kNavigateForward = QStringLiteral("Navigate forward");
 inline const QString kNavigationHistory = QStringLiteral("Navigation history");
 
 // The main view.
-inline const QString kSetup = QStringLiteral("Tessal Setup");
 inline const QString kElements = QStringLiteral("Elements of the template");
 inline const QString kMessages = QStringLiteral("Messages");
 inline const QString kItemColumn = QStringLiteral("Item");

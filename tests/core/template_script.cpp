@@ -120,42 +120,6 @@ CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Speci
   }
 }
 
-/// Answers the offer from a list of `NAME=CHOICE`, No for a name without one; creates, and notes all of it.
-class NotedQuestions final : public CreationQuestions {
- public:
-  NotedQuestions(TemplateCore& templateCore, const std::vector<std::string>& words) : core(templateCore) {
-    for (const std::string& word : words) {
-      const std::size_t equals = word.find('=');
-      answers[word.substr(0, equals)] = Number(word.substr(equals + 1));
-    }
-  }
-
-  bool AskYesNo(const std::string& question) override {
-    constexpr std::string_view kStart = "There are undefined symbols!\n\nDo you want to create symbol '";
-    const std::string name = question.substr(kStart.size(), question.rfind("' ?") - kStart.size());
-    notes +=
-        (question.starts_with(kStart) ? "" : question) + name + (answers.contains(name) ? "" : " no") + "\n";
-    return answers.contains(name);
-  }
-  int ChooseKind(const std::string& symbol, std::uint32_t mask) override {
-    notes += "  one of " + std::to_string(mask) + " for " + symbol + "\n";
-    return answers[symbol];
-  }
-  void Create(const CreateRequest& request) override {
-    const auto* specie = core.GetParentSpecie(request.ownerId);
-    notes += "  creates " + request.symbol + ", " +
-             std::string(kKinds.at(static_cast<std::size_t>(request.kind))) +
-             (specie == nullptr ? "" : " of " + specie->symbol.Text()) + "\n";
-    core.CreateElement(request);
-  }
-
-  std::string notes;
-
- private:
-  TemplateCore& core;
-  std::map<std::string, int> answers;
-};
-
 }  // namespace
 
 TemplateScript::TemplateScript(const Case& script) {
@@ -340,10 +304,32 @@ std::string TemplateScript::Create(const Words& words) {
   return answer + (NotifyChanges() ? "" : ", notifications stay off");
 }
 
+/// Answers the offers from a list of `NAME=CHOICE`, No for a name without one; creates, and notes all of it.
 std::string TemplateScript::Offer(const Words& words) {
-  NotedQuestions questions(core, words);
-  const bool created = core.OfferUndefinedSymbols(questions);
-  return questions.notes + YesNo(created);
+  std::map<std::string, int> answers;
+  for (const std::string& word : words) {
+    const std::size_t equals = word.find('=');
+    answers[word.substr(0, equals)] = Number(word.substr(equals + 1));
+  }
+  std::string notes;
+  bool created = false;
+  while (const auto offer = core.NextOffer()) {
+    const std::string& name = offer->symbol;
+    const bool isUsual =
+        offer->question == "There are undefined symbols!\n\nDo you want to create symbol '" + name + "' ?";
+    notes += (isUsual ? "" : offer->question) + name + (answers.contains(name) ? "" : " no") + "\n";
+    if (!answers.contains(name)) continue;
+    notes += "  one of " + std::to_string(offer->mask) + " for " + name + "\n";
+    const CreateRequest* request = offer->RequestOf(answers[name]);
+    if (request == nullptr) continue;
+    const auto* specie = core.GetParentSpecie(request->ownerId);
+    notes += "  creates " + request->symbol + ", " +
+             std::string(kKinds.at(static_cast<std::size_t>(request->kind))) +
+             (specie == nullptr ? "" : " of " + specie->symbol.Text()) + "\n";
+    core.CreateElement(*request);
+    created = true;
+  }
+  return notes + YesNo(created);
 }
 
 std::string TemplateScript::Groups() {

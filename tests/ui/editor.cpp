@@ -9,27 +9,21 @@
 #include <QTest>
 #include <QTimer>
 #include <QTreeWidgetItemIterator>
+#include <iterator>
+#include <map>
+#include <sstream>
 #include <stdexcept>
 
+#include "support/template_text.h"
 #include "ui/text_bytes.h"
 
 namespace tessal::test {
 
-void ScriptedUser::ShowMessage(const std::string& text) {
-  log.append(ToScreen(text));
-}
+namespace {
 
-bool ScriptedUser::AskYesNo(const std::string& question) {
-  return Ask(nullptr, ToScreen(question));
-}
+constexpr const char* kSmallModel = "state S p\nconstant k 1\nforcing f\nauxiliary a k*f\nprocess p a*S";
 
-void ScriptedUser::Warn(QWidget* /*parent*/, const QString& text) {
-  log.append(text);
-}
-
-void ScriptedUser::ShowFailure(QWidget* /*parent*/, const QString& text) {
-  log.append(text);
-}
+}  // namespace
 
 bool ScriptedUser::Ask(QWidget* /*parent*/, const QString& question) {
   log.append(question);
@@ -47,27 +41,41 @@ int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::ui
   return choice;
 }
 
-QString ScriptedUser::ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) {
-  return documentationFile;
-}
-
 bool ScriptedUser::OpenWithSystem(const QString& target) {
   log.append(QStringLiteral("open ") + target);
   return openable.contains(target);
 }
 
-void ScriptedUser::ShowHelp(QWidget* /*parent*/, int topic) {
-  log.append(QStringLiteral("help %1").arg(topic));
-}
-
-QStringList ScriptedUser::TakeLog() {
-  return std::exchange(log, {});
-}
-
-TemplateText SmallModel() {
+std::string ModelText(std::string lines) {
+  constexpr std::string_view kSmall = "small";
+  if (lines.starts_with(kSmall)) lines.replace(0, kSmall.size(), kSmallModel);
+  using Words = std::vector<std::string>;
+  static const std::map<std::string, void (*)(TemplateText&, const Words&)> kLines = {
+      {"state", [](auto& text, auto& words) { text.StateVariable(words.at(1), words.at(2)); }},
+      {"constant", [](auto& text, auto& words) { text.Constant(words.at(1), words.at(2)); }},
+      {"forcing", [](auto& text, auto& words) { text.Forcing(words.at(1)); }},
+      {"auxiliary", [](auto& text, auto& words) { text.Auxiliary(words.at(1), words.at(2)); }},
+      {"process", [](auto& text, auto& words) { text.Process(words.at(1), words.at(2)); }},
+      {"output", [](auto& text, auto& words) { text.DerivedOutput(words.at(1)); }},
+      {"class",
+       [](auto& text, auto& words) {
+         text.Specie(words.at(1), words.at(2), {{words.at(2), words.at(3)}});
+       }},
+      {"with", [](auto& text, auto& words) { text.With(words.at(1), words.at(2)); }},
+      {"without", [](auto& text, auto& words) { text.Without(words.at(1)); }},
+      {"settings",
+       [](auto& text, auto& words) {
+         text.Misc(words.size() < 2 ? "" : words[1] + " = " + words.at(2) + "\n");
+       }},
+  };
   TemplateText text;
-  text.StateVariable("S", "p").Constant("k").Forcing("f").Auxiliary("a", "k*f").Process("p", "a*S");
-  return text;
+  std::istringstream input(lines);
+  for (std::string line; std::getline(input, line);) {
+    std::istringstream parts(line);
+    const Words words(std::istream_iterator<std::string>(parts), {});
+    kLines.at(words.at(0))(text, words);
+  }
+  return text.Text();
 }
 
 Editor::Editor(const std::string& templateText)

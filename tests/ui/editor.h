@@ -10,10 +10,10 @@
 #include <deque>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "core/document.h"
 #include "support/qt_print.h"
-#include "support/template_text.h"
 #include "support/temporary_folder.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
@@ -27,18 +27,22 @@ namespace tessal::test {
 /// Answers every question, and notes what was asked and shown, in order.
 class ScriptedUser final : public UserDialogs {
  public:
-  void ShowMessage(const std::string& text) override;
-  bool AskYesNo(const std::string& question) override;
-  void Warn(QWidget* parent, const QString& text) override;
-  void ShowFailure(QWidget* parent, const QString& text) override;
+  void ShowMessage(const std::string& text) override { log.append(QString::fromStdString(text)); }
+  bool AskYesNo(const std::string& question) override {
+    return Ask(nullptr, QString::fromStdString(question));
+  }
+  void Warn(QWidget* /*parent*/, const QString& text) override { log.append(text); }
+  void ShowFailure(QWidget* /*parent*/, const QString& text) override { log.append(text); }
   bool Ask(QWidget* parent, const QString& question) override;
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override;
-  QString ChooseDocumentationFile(QWidget* parent, const QString& start) override;
+  QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
+    return documentationFile;
+  }
   bool OpenWithSystem(const QString& target) override;
-  void ShowHelp(QWidget* parent, int topic) override;
+  void ShowHelp(QWidget* /*parent*/, int topic) override { log.append("help " + QString::number(topic)); }
 
   /// What was asked and shown since the last call.
-  QStringList TakeLog();
+  QStringList TakeLog() { return std::exchange(log, {}); }
 
   std::deque<bool> answers;  ///< to questions; Yes when used up
   std::deque<int> choices;   ///< of kinds; skips when used up
@@ -49,9 +53,9 @@ class ScriptedUser final : public UserDialogs {
   QStringList log;
 };
 
-/// One element of each kind with a symbol: the auxiliary a uses k and f, the process p uses a, and S is made
-/// of p.
-TemplateText SmallModel();
+/// Builds a template from lines such as "constant k 2" or "auxiliary a k*f"; "small" at the start is one
+/// element of each kind with a symbol: a uses k and f, p uses a, and S is made of p.
+std::string ModelText(std::string lines);
 
 class Editor final {
  public:
@@ -72,7 +76,7 @@ class Editor final {
   QTreeWidgetItem* Node(const QString& caption);
   void Select(const QString& caption);
   QString Selected() { return Tree().currentItem()->text(0); }
-  std::int32_t IdOf(const QString& caption) { return CElementTree::DataOf(*Node(caption)).id; }
+  Uid IdOf(const QString& caption) { return CElementTree::DataOf(*Node(caption)).id; }
   /// The captions of a node's children.
   QStringList Children(const QString& caption);
 

@@ -7,20 +7,18 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTest>
-#include <QTimer>
 #include <filesystem>
 
 #include "ui/auto_create_dialog.h"
 #include "ui/documentation_link.h"
 #include "ui/editor.h"
 #include "ui/expression_colours.h"
-#include "ui/expression_editor_dialog.h"
 
 namespace tessal {
 namespace {
 
 using test::Editor;
-using test::SmallModel;
+using test::ModelText;
 
 void Paste(QWidget& field, const QString& plain) {
   auto mime = std::make_unique<QMimeData>();
@@ -33,7 +31,7 @@ void Paste(QWidget& field, const QString& plain) {
 }
 
 TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
-  Editor editor(SmallModel().Text());
+  Editor editor(ModelText("small"));
   CEL_Auxilliary_Variable& auxiliary = editor.Core().GetAuxiliary(0);
   const QString enormous(1 << 20, u'1');
   editor.Select("a");
@@ -57,11 +55,8 @@ TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
 
 TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
   const std::string longText(5000, 'x');
-  Editor editor(SmallModel()
-                    .Constant("long")
-                    .With("DESCRIPTION", "|" + longText + "|")
-                    .With("ONLINE_HELP", "|" + longText + "|")
-                    .Text());
+  Editor editor(ModelText("small\nconstant long 1\nwith DESCRIPTION |" + longText + "|\nwith ONLINE_HELP |" +
+                          longText + "|"));
   editor.Select("long");
   editor.Type("Unit", "kg");
   editor.LeaveField();
@@ -96,37 +91,18 @@ TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
   }
 }
 
-TEST(ExpressionEditor, IsAShellThatChangesNothing) {
-  Editor editor(SmallModel().Text());
-  editor.Select("a");
-  int pressed = 0;
-  QTimer::singleShot(0, &editor.View(), [&pressed] {
-    auto* dialog = qobject_cast<CExpressionEditorDlg*>(QApplication::activeModalWidget());
-    ASSERT_NE(dialog, nullptr);
-    for (QPushButton* key : dialog->findChildren<QPushButton*>()) {
-      if (key->objectName().isEmpty()) continue;
-      key->click();
-      ++pressed;
-    }
-    dialog->accept();
-  });
-  QTest::mouseClick(&editor.Field("Expression Editor"), Qt::LeftButton);
-  EXPECT_EQ(pressed, 33);
-  EXPECT_EQ(editor.Text("Expression"), "k*f");
-}
-
 TEST(History, KeepsThirtyNodesNewestFirst) {
   CNavigationHistory history;
-  EXPECT_EQ(history.Back(), 0) << "an empty list finds nothing";
+  EXPECT_EQ(history.Back(), Uid::None) << "an empty list finds nothing";
   EXPECT_EQ(history.Position(), -1);
-  for (std::int32_t id = 1; id <= 31; ++id) history.Add(id, std::to_string(id));
+  for (std::int32_t id = 1; id <= 31; ++id) history.Add(Uid{id}, std::to_string(id));
   EXPECT_EQ(history.Entries().size(), 30U);
-  EXPECT_EQ(history.Entries().front().id, 31);
-  EXPECT_EQ(history.Entries().back().id, 2) << "the oldest went";
+  EXPECT_EQ(history.Entries().front().id, Uid{31});
+  EXPECT_EQ(history.Entries().back().id, Uid{2}) << "the oldest went";
   for (int step = 0; step < 40; ++step) history.Back();
   EXPECT_EQ(history.Position(), 29);
-  history.Add(99, "99");
-  EXPECT_EQ(history.Entries().back().id, 99) << "entered before the present one, which made it the 31st";
+  history.Add(Uid{99}, "99");
+  EXPECT_EQ(history.Entries().back().id, Uid{99}) << "entered before the present one, which made it the 31st";
 }
 
 TEST(Documentation, IsLookedForInThreePlaces) {

@@ -10,7 +10,7 @@
 #include "ui/auto_create_dialog.h"
 #include "ui/editor.h"
 #include "ui/expression_editor_dialog.h"
-#include "ui/node_commands.h"
+#include "ui/node_kinds.h"
 
 namespace tessal {
 namespace {
@@ -18,10 +18,11 @@ namespace {
 using test::Editor;
 
 /// The owner of what a menu makes: a folder's number, a node, or a list head that has no node.
-std::string OwnerText(Editor& editor, std::int32_t id) {
-  if (id < 0) return std::to_string(id);
-  for (std::int32_t list = kind::kStateVariableList; list <= kind::kDerivedOutputList; ++list) {
-    if (editor.Core().ListHead(list).MessageUid() == id) return "head " + std::to_string(list);
+std::string OwnerText(Editor& editor, Uid id) {
+  if (NumberOf(id) < 0) return std::to_string(NumberOf(id));
+  for (std::size_t place = 0; place < TemplateCore::kListHeadCount; ++place) {
+    const ElementKind list = KindAfter(ElementKind::StateVariableList, place);
+    if (editor.Core().ListHead(list).GetUid() == id) return "head " + std::to_string(NumberOf(list));
   }
   const QTreeWidgetItem* node = editor.Tree().FindById(id);
   return node == nullptr ? "?" : (node->parent()->text(0) + u'/' + node->text(0)).toStdString();
@@ -31,13 +32,13 @@ std::string NodeText(Editor& editor, const QTreeWidgetItem& item, const CItemDat
   const NodeCommands commands = CommandsOfNode(data, editor.Core());
   std::string text;
   for (const QTreeWidgetItem* above = item.parent(); above != nullptr; above = above->parent()) text += " ";
-  text += item.text(0).toStdString() + ": kind " + std::to_string(data.kind);
-  if (data.id < 0) text += ", id " + std::to_string(data.id);
+  text += item.text(0).toStdString() + ": kind " + std::to_string(NumberOf(data.kind));
+  if (NumberOf(data.id) < 0) text += ", id " + std::to_string(NumberOf(data.id));
   if (data.groupIndex != 0) text += ", group " + std::to_string(data.groupIndex);
   text += ", help " + std::to_string(editor.View().HelpNumber());
-  if (commands.kindToCreate != 0) {
+  if (commands.kindToCreate != ElementKind::None) {
     text += std::string(commands.canCreate ? ", makes " : ", would make ") +
-            std::to_string(commands.kindToCreate) + " in " + OwnerText(editor, commands.ownerId);
+            std::to_string(NumberOf(commands.kindToCreate)) + " in " + OwnerText(editor, commands.ownerId);
   }
   if (commands.offersDelete) text += commands.canDelete ? ", goes" : ", stays";
   return text + (item.isExpanded() ? ", open\n" : "\n");
@@ -45,7 +46,7 @@ std::string NodeText(Editor& editor, const QTreeWidgetItem& item, const CItemDat
 
 /// A line for the contents of a form. A control is described ahead of it where it is not as it was the last
 /// time in a form for that kind: number, class, label, state and choices.
-std::string FormText(const QWidget& form, std::int32_t kindOfNode, std::map<std::string, std::string>& seen) {
+std::string FormText(const QWidget& form, ElementKind kindOfNode, std::map<std::string, std::string>& seen) {
   std::string descriptions;
   std::string contents;
   for (const QWidget* control : form.findChildren<QWidget*>()) {
@@ -58,7 +59,7 @@ std::string FormText(const QWidget& form, std::int32_t kindOfNode, std::map<std:
     if (const auto* combo = qobject_cast<const QComboBox*>(control)) {
       text += ": " + Editor::Offered(*combo).join(QStringLiteral(" | ")).toStdString();
     }
-    const std::string key = std::to_string(kindOfNode) + " " + id;
+    const std::string key = std::to_string(NumberOf(kindOfNode)) + " " + id;
     if (std::exchange(seen[key], text) != text) descriptions += "  " + text + "\n";
     contents += (contents.empty() ? "" : " | ") + Editor::TextOf(*control).toStdString();
   }

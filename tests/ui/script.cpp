@@ -9,9 +9,9 @@
 #include <QPushButton>
 #include <QTest>
 #include <QTextBlock>
+#include <QTimer>
 #include <QToolBar>
-#include <algorithm>
-#include <sstream>
+#include <set>
 
 #include "core/error_registry.h"
 #include "ui/create_hint.h"
@@ -20,16 +20,6 @@
 namespace tessal::test {
 
 namespace {
-
-constexpr const char* kSmallModel = "state S p\nconstant k 1\nforcing f\nauxiliary a k*f\nprocess p a*S";
-
-/// The word at the start of a text; the text loses it and the blank after it.
-std::string TakeWord(std::string& text) {
-  const std::size_t end = std::min(text.find(' '), text.size());
-  std::string word = text.substr(0, end);
-  text.erase(0, end + 1);
-  return word;
-}
 
 /// What follows a call's verb: "Description: Rate" has two parts.
 struct Words {
@@ -59,14 +49,14 @@ void SendHint(Editor& editor, const Words& words) {
   bool isNumber = false;
   const std::int32_t number = words.second.toInt(&isNumber);
   const bool isNode = !isNumber && !words.second.isEmpty();
-  Hint(editor, words.Number(), NumberHint(isNode ? editor.IdOf(words.second) : number));
+  Hint(editor, words.Number(), NumberHint(isNode ? NumberOf(editor.IdOf(words.second)) : number));
 }
 
 /// "9 in Constants: rate": the hint to create an element of a kind.
 void Create(Editor& editor, const Words& words) {
   CreateRequest request;
   const QStringList kindAndOwner = words.first.split(QStringLiteral(" in "));
-  request.kind = kindAndOwner[0].toUInt();
+  request.kind = ElementKind{kindAndOwner[0].toInt()};
   if (kindAndOwner.size() > 1) request.ownerId = editor.IdOf(kindAndOwner[1]);
   request.symbol = words.second.toStdString();
   Hint(editor, hint::kCreateElement, CreateHint(request));
@@ -134,6 +124,18 @@ std::string PressTab(Editor& /*editor*/, const Words& words) {
   return text;
 }
 
+/// Presses a button, and closes the dialog that this may open.
+void Press(Editor& editor, const Words& words) {
+  QTimer::singleShot(0, &editor.View(), [&editor] {
+    QWidget* dialog = QApplication::activeModalWidget();
+    if (dialog == nullptr) return;
+    editor.User().ShowMessage("dialog " + dialog->windowTitle().toStdString());
+    dialog->close();
+  });
+  QTest::mouseClick(&editor.Field(words.first), Qt::LeftButton);
+  QCoreApplication::processEvents();
+}
+
 void ClickError(Editor& editor, const Words& words) {
   CErrorList& list = editor.View().ErrorList();
   const QRect row = list.visualItemRect(list.topLevelItem(words.Number()));
@@ -157,47 +159,43 @@ std::string Save(Editor& editor, const Words& words) {
 }
 
 const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActions = {
-    {"select", [](Editor& editor, const Words& words) { editor.Select(words.first); }},
-    {"type", [](Editor& editor, const Words& words) { editor.Type(words.first, words.second); }},
+    {"select", [](Editor& editor, auto& words) { editor.Select(words.first); }},
+    {"type", [](Editor& editor, auto& words) { editor.Type(words.first, words.second); }},
     {"enter",
-     [](Editor& editor, const Words& words) {
+     [](Editor& editor, auto& words) {
        editor.Type(words.first, words.second);
        editor.LeaveField();
      }},
     // Without the keys of a user: the focus stays where it is.
-    {"set",
-     [](Editor& editor, const Words& words) { editor.Field<QLineEdit>(words.first).setText(words.second); }},
-    {"choose", [](Editor& editor, const Words& words) { editor.Choose(words.first, words.second); }},
-    {"focus", [](Editor& editor, const Words& words) { editor.Field(words.first).setFocus(); }},
-    {"leave", [](Editor& editor, const Words& /*words*/) { editor.LeaveField(); }},
-    {"press", [](Editor& editor,
-                 const Words& words) { QTest::mouseClick(&editor.Field(words.first), Qt::LeftButton); }},
+    {"set", [](Editor& editor, auto& words) { editor.Field<QLineEdit>(words.first).setText(words.second); }},
+    {"choose", [](Editor& editor, auto& words) { editor.Choose(words.first, words.second); }},
+    {"focus", [](Editor& editor, auto& words) { editor.Field(words.first).setFocus(); }},
+    {"leave", [](Editor& editor, auto& /*words*/) { editor.LeaveField(); }},
+    {"press", Press},
     {"key",
-     [](Editor& /*editor*/, const Words& words) {
+     [](auto& /*editor*/, auto& words) {
        QTest::keyClick(QApplication::focusWidget(), QKeySequence(words.first)[0].key());
      }},
-    {"commit", [](Editor& editor, const Words& /*words*/) { editor.View().OnCommit(); }},
+    {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
     {"answer",
-     [](Editor& editor, const Words& words) {
+     [](Editor& editor, auto& words) {
        for (const char letter : words.all) editor.User().answers.push_back(letter == 'y');
      }},
-    {"pick", [](Editor& editor, const Words& words) { editor.User().choices.push_back(words.Number()); }},
-    {"browse", [](Editor& editor, const Words& words) { editor.User().documentationFile = words.first; }},
+    {"pick", [](Editor& editor, auto& words) { editor.User().choices.push_back(words.Number()); }},
+    {"browse", [](Editor& editor, auto& words) { editor.User().documentationFile = words.first; }},
     {"hint", SendHint},
     {"create", Create},
     {"rename-group",
-     [](Editor& editor, const Words& words) {
+     [](Editor& editor, auto& words) {
        Hint(editor, hint::kRenameGroup, RenameGroupHint(words.Number(), words.second.toStdString()));
      }},
-    {"use-menu", [](Editor& editor, const Words& words) { editor.UseMenu(words.first, words.second); }},
+    {"use-menu", [](Editor& editor, auto& words) { editor.UseMenu(words.first, words.second); }},
     {"click-error", ClickError},
     {"enter-error", EnterError},
     {"follow-error",
-     [](Editor& editor, const Words& words) {
-       emit editor.View().ErrorList().ElementChosen(words.Number());
-     }},
+     [](Editor& editor, auto& words) { emit editor.View().ErrorList().ElementChosen(Uid{words.Number()}); }},
     {"go",
-     [](Editor& editor, const Words& words) {
+     [](Editor& editor, auto& words) {
        editor.View().findChild<QToolBar*>()->actions().at(words.first == "back" ? 0 : 1)->trigger();
      }},
     {"revisit", Revisit},
@@ -206,49 +204,36 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
 };
 
 const std::map<std::string, std::string (*)(Editor& editor, const Words& words)> kLooks = {
-    {"children", [](Editor& editor, const Words& words) { return Lines(editor.Children(words.first)); }},
-    {"menu", [](Editor& editor, const Words& words) { return Lines(editor.UseMenu(words.first, "")); }},
-    {"rows", [](Editor& editor, const Words& /*words*/) { return Lines(editor.Rows()); }},
-    {"offered",
-     [](Editor& editor, const Words& words) {
-       return Lines(Editor::Offered(editor.Field<QComboBox>(words.first)));
-     }},
+    {"children", [](Editor& editor, auto& words) { return Lines(editor.Children(words.first)); }},
+    {"menu", [](Editor& editor, auto& words) { return Lines(editor.UseMenu(words.first, "")); }},
+    {"rows", [](Editor& editor, auto& /*words*/) { return Lines(editor.Rows()); }},
+    {"offered", [](Editor& editor,
+                   auto& words) { return Lines(Editor::Offered(editor.Field<QComboBox>(words.first))); }},
     {"tip",
-     [](Editor& editor, const Words& words) {
+     [](Editor& editor, auto& words) {
        const auto [field, point] = PointIn(editor, words);
        return field.TipOf(field.LinkAt(point)).toStdString() + "\n";
      }},
-    {"history", [](Editor& editor, const Words& /*words*/) { return History(editor); }},
+    {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"tabs", PressTab},
     {"save", Save},
 };
 
-/// The lines that went and those that came, each side in its order: the longest common part stays unsaid.
+/// The lines that went, then those that came.
 std::string Changes(const std::vector<std::string>& before, const std::vector<std::string>& after) {
-  const std::size_t rows = before.size();
-  const std::size_t columns = after.size();
-  std::vector<std::vector<int>> common(rows + 1, std::vector<int>(columns + 1, 0));
-  for (std::size_t row = rows; row-- > 0;) {
-    for (std::size_t column = columns; column-- > 0;) {
-      common[row][column] = before[row] == after[column]
-                                ? common[row + 1][column + 1] + 1
-                                : std::max(common[row + 1][column], common[row][column + 1]);
-    }
-  }
   std::string text;
-  std::size_t row = 0;
-  std::size_t column = 0;
-  while (row < rows || column < columns) {
-    if (row < rows && column < columns && before[row] == after[column]) {
-      ++row;
-      ++column;
-    } else if (column == columns || (row < rows && common[row + 1][column] >= common[row][column + 1])) {
-      text += "- " + before[row++] + "\n";
-    } else {
-      text += "+ " + after[column++] + "\n";
+  const auto append = [&text](const char* mark, const auto& lines, std::multiset<std::string> others) {
+    for (const std::string& line : lines) {
+      if (const auto same = others.find(line); same != others.end()) {
+        others.erase(same);
+      } else {
+        text += mark + line + "\n";
+      }
     }
-  }
+  };
+  append("- ", before, {after.begin(), after.end()});
+  append("+ ", after, {before.begin(), before.end()});
   return text;
 }
 
@@ -264,45 +249,13 @@ void AppendNodes(const QTreeWidgetItem& item, const std::string& path, std::vect
 
 }  // namespace
 
-std::string ModelText(std::string lines) {
-  constexpr std::string_view kSmall = "small";
-  if (lines.starts_with(kSmall)) lines.replace(0, kSmall.size(), kSmallModel);
-  using Words = std::vector<std::string>;
-  static const std::map<std::string, void (*)(TemplateText&, const Words&)> kLines = {
-      {"state", [](TemplateText& text, const Words& words) { text.StateVariable(words.at(1), words.at(2)); }},
-      {"constant", [](TemplateText& text, const Words& words) { text.Constant(words.at(1), words.at(2)); }},
-      {"forcing", [](TemplateText& text, const Words& words) { text.Forcing(words.at(1)); }},
-      {"auxiliary", [](TemplateText& text, const Words& words) { text.Auxiliary(words.at(1), words.at(2)); }},
-      {"process", [](TemplateText& text, const Words& words) { text.Process(words.at(1), words.at(2)); }},
-      {"output", [](TemplateText& text, const Words& words) { text.DerivedOutput(words.at(1)); }},
-      {"class",
-       [](TemplateText& text, const Words& words) {
-         text.Specie(words.at(1), words.at(2), {{words.at(2), words.at(3)}});
-       }},
-      {"with", [](TemplateText& text, const Words& words) { text.With(words.at(1), words.at(2)); }},
-      {"without", [](TemplateText& text, const Words& words) { text.Without(words.at(1)); }},
-      {"settings",
-       [](TemplateText& text, const Words& words) {
-         text.Misc(words.size() < 2 ? "" : words[1] + " = " + words.at(2) + "\n");
-       }},
-  };
-  TemplateText text;
-  std::istringstream input(lines);
-  for (std::string line; std::getline(input, line);) {
-    Words words;
-    while (!line.empty()) words.push_back(TakeWord(line));
-    kLines.at(words.at(0))(text, words);
-  }
-  return text.Text();
-}
-
 Script::Script(const std::string& model)
     : editor(std::make_unique<Editor>(ModelText(model))), former(Look()) {}
 
 std::string Script::Answer(const CaseCall& call) {
   std::string rest = call.words;
-  const std::string verb = TakeWord(rest);
-  const Words words(rest);
+  const std::string verb = rest.substr(0, rest.find(' '));
+  const Words words(rest.erase(0, verb.size() + 1));
   std::string answer;
   try {
     if (const auto look = kLooks.find(verb); look != kLooks.end()) {

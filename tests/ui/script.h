@@ -13,10 +13,6 @@
 
 namespace tessal::test {
 
-/// Builds a template from lines such as "constant k 2" or "auxiliary a k*f"; "small" at the start is
-/// one element of each kind with a symbol: a uses k and f, p uses a, and S is made of p.
-std::string ModelText(std::string lines);
-
 class Script final {
  public:
   explicit Script(const std::string& model);
@@ -27,7 +23,7 @@ class Script final {
  private:
   /// All that the window shows and the template holds, line by line.
   struct State {
-    std::int32_t node = 0;
+    Uid node = Uid::None;
     std::vector<std::string> lines;
     std::vector<std::string> form;
   };
@@ -36,7 +32,7 @@ class Script final {
   void AppendTemplate(std::vector<std::string>& lines);
 
   std::unique_ptr<Editor> editor;
-  std::map<std::uint32_t, std::string> names;  ///< the first symbol that each element was seen under
+  std::map<Uid, std::string> names;  ///< the first symbol that each element was seen under
   State former;
 };
 
