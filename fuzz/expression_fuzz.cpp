@@ -1,7 +1,7 @@
 // Any text scans, parses, is checked and walked without harm, and the answers agree with each other.
 #include <cstdint>
 #include <cstdlib>
-#include <optional>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -42,7 +42,7 @@ void CheckTokens(const std::string& text) {
 
 void CheckParse(const std::string& text) {
   ResetExpressionScanner();
-  std::optional<ParsedExpression> held;
+  std::unique_ptr<const ParsedExpression> held;
   const ParsedExpression first = ParseOnce(held, text);
   const ScannerStart left = ExpressionScannerStart();
   ResetExpressionScanner();

@@ -88,36 +88,9 @@ ElementKind ListOf(ElementKind kind) {
 }
 
 CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Specie* specie) {
-  switch (kind) {
-    case ElementKind::StateVariable:
-      return core.AddStateVariable();
-    case ElementKind::Constant:
-      return core.AddConstant();
-    case ElementKind::Forcing:
-      return core.AddForcing();
-    case ElementKind::Auxiliary:
-      return core.AddAuxiliary();
-    case ElementKind::Process:
-      return core.AddProcess();
-    case ElementKind::DerivedOutput:
-      return core.AddDerivedOutput();
-    case ElementKind::Specie:
-      return core.AddSpecie();
-    case ElementKind::SpecieStateVariable:
-      return specie->AddStateVariable();
-    case ElementKind::SpecieConstant:
-      return specie->AddConstant();
-    case ElementKind::SpecieForcing:
-      return specie->AddForcing();
-    case ElementKind::SpatialFunction:
-      return specie->AddSpatialFunction();
-    case ElementKind::ArithmeticExpression:
-      return specie->AddArithmeticExpression();
-    case ElementKind::HorizontalVector:
-      return specie->AddHorizontalVector();
-    default:
-      throw std::invalid_argument("no kind that can be made");
-  }
+  CEL_Element* added = specie == nullptr ? core.AddElement(kind) : specie->AddMember(kind);
+  if (added == nullptr) throw std::invalid_argument("no kind that can be made");
+  return *added;
 }
 
 }  // namespace
@@ -229,7 +202,7 @@ std::string TemplateScript::Table() const {
     text += std::to_string(record.sequence) + " " + core.RecordSymbol(record) + ": " +
             std::string(element.KindText()) + " " + std::to_string(record.index);
     if (record.specieIndex >= 0) text += " of class " + std::to_string(record.specieIndex);
-    text += ", scope " + std::to_string(record.scope) + ", spatial " + std::to_string(record.spatial) +
+    text += ", scope " + std::to_string(static_cast<int>(record.scope)) + ", spatial " + std::to_string(static_cast<int>(record.spatial)) +
             ", \"" + record.text + "\"";
     if (element.id.IntValue() != static_cast<std::int32_t>(record.sequence))
       text += ", id " + element.id.TextOf();

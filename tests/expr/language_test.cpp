@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <memory>
 #include <map>
 #include <random>
 
@@ -45,7 +46,7 @@ std::string TreeText(const ExpressionNode& node) {
 /// What is made of the tree of a text, or the parser's message.
 std::string OfTree(const std::string& text, const std::function<std::string(const ExpressionNode&)>& make) {
   const ParsedExpression parsed = ParseExpression(text);
-  return parsed.Failure() != nullptr ? parsed.Failure()->message : make(*parsed.Tree()) + "\n";
+  return parsed.Failure() != nullptr ? parsed.Failure()->finding.text : make(*parsed.Tree()) + "\n";
 }
 
 std::string Tree(const std::string& text) {
@@ -262,7 +263,7 @@ TEST_F(Language, AFailureLeavesTheTreeAlone) {
 }
 
 TEST_F(Language, AHeldParseIsUsedAgainAsIfItWereParsedAgain) {
-  std::optional<ParsedExpression> held;
+  std::unique_ptr<const ParsedExpression> held;
   const ParsedExpression* first = &ParseOnce(held, "a */ b /* open");
   EXPECT_NE(first->Failure(), nullptr) << "outside a comment this is a product without its right side";
   EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Text) << "the parse stopped before the comment";
