@@ -264,16 +264,21 @@ TEST_F(Language, AFailureLeavesTheTreeAlone) {
 
 TEST_F(Language, AHeldParseIsUsedAgainAsIfItWereParsedAgain) {
   std::unique_ptr<const ParsedExpression> held;
-  const ParsedExpression* first = &ParseOnce(held, "a */ b /* open");
-  EXPECT_NE(first->Failure(), nullptr) << "outside a comment this is a product without its right side";
-  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Text) << "the parse stopped before the comment";
+  EXPECT_NE(ParseOnce(held, "a */ b").Failure(), nullptr) << "in plain text a product without its right side";
   SetExpressionScannerStart(ScannerStart::Comment);
-  EXPECT_EQ(TreeText(*ParseOnce(held, "a */ b /* open").Tree()), "(2 b)");
-  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Comment);
-  // The text is not looked at when the scan would begin as it began.
+  EXPECT_EQ(TreeText(*ParseOnce(held, "a */ b").Tree()), "(2 b)") << "a scan that begins elsewhere is made";
+  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Text);
+  // When it would begin as it began the text is not looked at, and the comment is closed as the parse did.
+  SetExpressionScannerStart(ScannerStart::Comment);
   EXPECT_EQ(TreeText(*ParseOnce(held, "other").Tree()), "(2 b)");
-  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Comment)
-      << "a use leaves the comment open, as the parse did";
+  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Text);
+
+  held.reset();
+  ParseOnce(held, "a /* open");
+  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Comment);
+  ResetExpressionScanner();
+  ParseOnce(held, "other");
+  EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Comment);
 }
 
 TEST_F(Language, ATreeCopiesAndMoves) {

@@ -131,28 +131,19 @@ TEST(Reader, WrittenTreesReadBackTheSame) {
     std::string text = "\n";
     int open = 0;
     for (int line = 0; line < 60; ++line) {
-      switch (open == 0 ? 0 : random() % 6) {
-        case 0:
-          text += "[S" + std::to_string(random() % 9) + "]\n";
-          ++open;
-          break;
-        case 1:
-          text += "EndSect // done\n";
-          --open;
-          break;
-        case 2:
-          text += "// remark " + std::to_string(random()) + "\n";
-          break;
-        default:
-          text += "K = " + std::to_string(random()) + ", 0.25, 'a " + std::to_string(line) + "'\n";
-          break;
-      }
+      const std::string number = std::to_string(random() % 10'000);
+      const auto kind = open == 0 ? 0 : random() % 6;
+      text += kind == 0   ? "[S" + number + "]\n"
+              : kind == 1 ? "EndSect // done\n"
+              : kind == 2 ? "// remark " + number + "\n"
+                          : "K = " + number + ", 0.25, 'a " + number + "'\n";
+      open += kind == 0 ? 1 : kind == 1 ? -1 : 0;
     }
     for (; open > 0; --open) text += "EndSect\n";
     const std::string once = Read(text);
     ASSERT_TRUE(KeyFileFailureText().empty()) << "seed 11, round " << round << "\n"
                                               << KeyFileFailureText() << text;
-    ASSERT_EQ(Read("\n" + once).size(), once.size()) << "seed 11, round " << round;
+    ASSERT_EQ(Read("\n" + once), once) << "seed 11, round " << round;
   }
 }
 
