@@ -20,9 +20,8 @@ using test::Editor;
 /// The owner of what a menu makes: a folder's number, a node, or a list head that has no node.
 std::string OwnerText(Editor& editor, Uid id) {
   if (NumberOf(id) < 0) return std::to_string(NumberOf(id));
-  for (std::size_t place = 0; place < TemplateCore::kListHeadCount; ++place) {
-    const ElementKind list = KindAfter(ElementKind::StateVariableList, place);
-    if (editor.Core().ListHead(list).GetUid() == id) return "head " + std::to_string(NumberOf(list));
+  for (const auto& head : editor.Core().ListHeads()) {
+    if (head->GetUid() == id) return "head " + std::to_string(NumberOf(head->Kind()));
   }
   const QTreeWidgetItem* node = editor.Tree().FindById(id);
   return node == nullptr ? "?" : (node->parent()->text(0) + u'/' + node->text(0)).toStdString();
