@@ -1,5 +1,6 @@
 #include "docgen/html_documentation.h"
 
+#include <algorithm>
 #include <array>
 #include <filesystem>
 #include <span>
@@ -58,6 +59,37 @@ constexpr std::array<std::string_view, 23> kElementKeys = {"ID",
                                                            "vertical speed equation",
                                                            "vertical speed equation"};
 
+/// How the page heads and counts a list of elements.
+struct ListCaption {
+  ElementKind kind;
+  std::string_view count;    ///< in the summary
+  std::string_view heading;  ///< empty for a list without a section of its own
+};
+
+constexpr std::array<ListCaption, 11> kListCaptions = {{
+    {ElementKind::StateVariable, "<li>State variables : ", "<p> <li> <h2>State Variables </h2>"},
+    {ElementKind::Constant, "<li>Constants       : ", "<p> <li> <h2> Constants </h2>"},
+    {ElementKind::Forcing, "<li>Forcings        : ", "<p> <li> <h2> Forcing </h2>"},
+    {ElementKind::Auxiliary, "<li>Auxiliaries     : ", "<p> <li> <h2> Auxilliaries </h2>"},
+    {ElementKind::Process, "<li>Processes       : ", "<p> <li> <h2> Process </h2>"},
+    {ElementKind::DerivedOutput, "<li>Derived outputs : ", "<p> <li> <h2> Derived Outputs </h2>"},
+    {ElementKind::SpecieStateVariable,
+     "<li>State variables          : ", "<p> <li> <h2> State Variables </h2>"},
+    {ElementKind::SpecieConstant, "<li>Constants                : ", "<p> <li> <h2> Constants</h2>"},
+    {ElementKind::SpatialFunction,
+     "<li>Spatial functions        : ", "<p> <li> <h2>  Remote Area Search Functions </h2>"},
+    {ElementKind::ArithmeticExpression,
+     "<li>Arithmetical expressions : ", "<p> <li> <h2> Arithmetic Expressions </h2>"},
+    {ElementKind::HorizontalVector, "<li>Horizontal vectors       : ", ""},
+}};
+
+/// None for a list that the page leaves out: the forcings of a class.
+const ListCaption* CaptionOf(ElementKind kind) {
+  const auto hit = std::find_if(kListCaptions.begin(), kListCaptions.end(),
+                                [kind](const ListCaption& caption) { return caption.kind == kind; });
+  return hit == kListCaptions.end() ? nullptr : &*hit;
+}
+
 using Keys = std::span<const std::string_view>;
 
 bool HasUnitName(std::string_view key) {
@@ -87,6 +119,8 @@ class PageWriter final {
   }
 
  private:
+  static constexpr std::string_view kClosing = "</li> </p>";
+
   void Line(std::string_view text) {
     page += text;
     page += '\n';
@@ -123,23 +157,19 @@ class PageWriter final {
   void WriteSummary() {
     Line("<br><h3>Summary</h3>");
     Line("<ul>");
-    Count("<li>State variables : ", core.GetStateVariableCount());
-    Count("<li>Constants       : ", core.GetConstantCount());
-    Count("<li>Forcings        : ", core.GetForcingCount());
-    Count("<li>Auxiliaries     : ", core.GetAuxiliaryCount());
-    Count("<li>Processes       : ", core.GetProcessCount());
-    Count("<li>Derived outputs : ", core.GetDerivedOutputCount());
+    ForEachHeadedCollection([this](const auto& row) {
+      Count(CaptionOf(row.kind)->count, (core.Elements().*row.elements).size());
+    });
     if (core.GetSpecieCount() > 0) {
       Count("<li>Species         : ", core.GetSpecieCount());
       Line("<ul>");
       std::size_t number = 0;
       for (const auto& specie : core.Species()) {
         Count("<li>Specie ", ++number);
-        Count("<li>State variables          : ", specie->stateVariables.size());
-        Count("<li>Constants                : ", specie->constants.size());
-        Count("<li>Spatial functions        : ", specie->spatialFunctions.size());
-        Count("<li>Arithmetical expressions : ", specie->arithmeticExpressions.size());
-        Count("<li>Horizontal vectors       : ", specie->horizontalVectors.size());
+        ForEachMemberList([this, &specie](const auto& list) {
+          const ListCaption* caption = CaptionOf(list.kind);
+          if (caption != nullptr) Count(caption->count, ((*specie).*list.members).size());
+        });
         Count("<li>Vertical vectors         : ", 1);
       }
       Line("</ul>");
@@ -178,24 +208,22 @@ class PageWriter final {
   }
 
   template <class Elements>
-  void WriteCollection(std::string_view heading, std::string_view closing, const Elements& elements,
-                       bool detail, Keys keys) {
+  void WriteCollection(ElementKind kind, const Elements& elements, bool detail, Keys keys) {
+    const ListCaption* caption = CaptionOf(kind);
+    if (caption == nullptr || caption->heading.empty()) return;
     Line("<hr>");
-    Line(heading);
+    Line(caption->heading);
     if (elements.empty()) Line("-none- <br>");
     WriteEntries(elements, detail, keys);
-    Line(closing);
+    // The page has always had a blank here, and here alone.
+    Line(kind == ElementKind::StateVariable ? " </li> </p>" : kClosing);
   }
 
   void WriteElementSections(bool detail, Keys keys) {
-    constexpr std::string_view kClosing = "</li> </p>";
     Line("<ul>");
-    WriteCollection("<p> <li> <h2>State Variables </h2>", " </li> </p>", core.StateVariables(), detail, keys);
-    WriteCollection("<p> <li> <h2> Constants </h2>", kClosing, core.Constants(), detail, keys);
-    WriteCollection("<p> <li> <h2> Forcing </h2>", kClosing, core.Forcings(), detail, keys);
-    WriteCollection("<p> <li> <h2> Auxilliaries </h2>", kClosing, core.Auxiliaries(), detail, keys);
-    WriteCollection("<p> <li> <h2> Process </h2>", kClosing, core.Processes(), detail, keys);
-    WriteCollection("<p> <li> <h2> Derived Outputs </h2>", kClosing, core.DerivedOutputs(), detail, keys);
+    ForEachHeadedCollection([this, detail, keys](const auto& row) {
+      WriteCollection(row.kind, core.Elements().*row.elements, detail, keys);
+    });
     if (core.GetSpecieCount() > 0) {
       Line("<hr>");
       Line("<p> <h2>Lagrange particle classes</h2>");
@@ -207,15 +235,11 @@ class PageWriter final {
   }
 
   void WriteSpecie(const CEL_Lagrange_Specie& specie, bool detail, Keys keys) {
-    constexpr std::string_view kClosing = "</li> </p>";
     Line("<li> <h2> Particle Class &quot" + specie.symbol.Text() + "&quot</h2>");
     WriteElementEntry(specie, detail, keys, true);
-    WriteCollection("<p> <li> <h2> State Variables </h2>", kClosing, specie.stateVariables, detail, keys);
-    WriteCollection("<p> <li> <h2> Constants</h2>", kClosing, specie.constants, detail, keys);
-    WriteCollection("<p> <li> <h2>  Remote Area Search Functions </h2>", kClosing, specie.spatialFunctions,
-                    detail, keys);
-    WriteCollection("<p> <li> <h2> Arithmetic Expressions </h2>", kClosing, specie.arithmeticExpressions,
-                    detail, keys);
+    ForEachMemberList([this, &specie, detail, keys](const auto& list) {
+      WriteCollection(list.kind, specie.*list.members, detail, keys);
+    });
     Line("<hr>");
     Line("<p> <ul> <h2> Movement </h2>");
     Line("<p> <li> <h3> Horizontal Vectors</h3>");
@@ -239,8 +263,8 @@ class PageWriter final {
   }
 
   /// The block of an expression field, from the parse that its element holds.
-  static std::string MathMLOf(const CEL_Element& element, const ElementField& field, const std::string& symbol,
-                              bool isDerivative) {
+  static std::string MathMLOf(const CEL_Element& element, const ElementField& field,
+                              const std::string& symbol, bool isDerivative) {
     const ParsedExpression* parsed = nullptr;
     element.ForEachExpression([&field, &parsed](const PropertyRow& row, const CEL_Property& expression) {
       // The page takes a text as it is, quotes and all; the held parse is without them.

@@ -43,22 +43,14 @@ class OverviewBuilder final {
   explicit OverviewBuilder(const TemplateCore& templateCore) : core(templateCore) {}
 
   std::vector<OverviewRow> Build() {
-    const auto equation = [](const auto& element) { return element.equation.Text(); };
-    const auto value = [](const auto& element) { return element.defaultValue.TextOf(); };
-    const auto expression = [](const auto& element) { return element.expression.Text(); };
-    AddAll(core.StateVariables(), "", equation);
-    AddAll(core.Constants(), "", value);
-    AddAll(core.Forcings(), "", value);
-    AddAll(core.Auxiliaries(), "", expression);
-    AddAll(core.Processes(), "", expression);
-    AddAll(core.DerivedOutputs(), "", expression);
+    ForEachHeadedCollection([this](const auto& row) { AddAll(core.Elements().*row.elements, ""); });
     for (const auto& specie : core.Species()) {
       const std::string ofClass = " (" + specie->symbol.Text() + ")";
-      AddAll(specie->stateVariables, ofClass, equation);
-      AddAll(specie->constants, ofClass, value);
-      AddAll(specie->spatialFunctions, ofClass,
-             [this](const auto& function) { return SearchSummary(core, function); });
-      AddAll(specie->arithmeticExpressions, ofClass, expression);
+      ForEachMemberList([this, &specie, &ofClass](const auto& list) {
+        // The forcings of a class are kept out on purpose; its movements do not count.
+        const bool isListed = list.hasHead && list.kind != ElementKind::SpecieForcing;
+        if (isListed) AddAll((*specie).*list.members, ofClass);
+      });
       for (const auto& vector : specie->horizontalVectors) {
         AddMovement(*vector, "Direction" + ofClass, vector->direction, "horizontal direction equation");
         AddMovement(*vector, "Speed" + ofClass, vector->speed, "horizontal speed equation");
@@ -71,12 +63,28 @@ class OverviewBuilder final {
   }
 
  private:
-  template <class Elements, class TextOf>
-  void AddAll(const Elements& elements, const std::string& ofClass, TextOf textOf) {
+  /// What the table shows of an element: its expression, the summary of a search, or its default value.
+  template <class Element>
+  std::string TextOf(const Element& element) const {
+    if constexpr (requires { element.equation; }) {
+      return element.equation.Text();
+    } else if constexpr (requires { element.expression; }) {
+      return element.expression.Text();
+    } else if constexpr (requires { element.defaultValue; }) {
+      return element.defaultValue.TextOf();
+    } else if constexpr (requires { element.framework; }) {
+      return SearchSummary(core, element);
+    } else {
+      return {};
+    }
+  }
+
+  template <class Elements>
+  void AddAll(const Elements& elements, const std::string& ofClass) {
     for (const auto& element : elements) {
       rows.push_back(
           {{std::to_string(++counted), element->symbol.Text(), std::string(element->KindText()) + ofClass,
-            textOf(*element), element->description.Text()},
+            TextOf(*element), element->description.Text()},
            element->GetUid()});
     }
   }
