@@ -30,7 +30,7 @@ constexpr std::array<OfferRow, 8> kOffers = {{
     {ElementKind::ArithmeticExpression, 487},
 }};
 
-/// The kind, and for a member of a particle class the list, that each index of the choice stands for.
+/// The kind, and for a member of a particle class the list, that each index of the choice means.
 struct ChoiceRow {
   ElementKind kind;
   ElementKind listKind;

@@ -21,7 +21,7 @@ struct CreateRequest {
 /// A new element and its place among its siblings.
 struct CreatedElement {
   Uid uid = Uid::None;          ///< 0 when nothing was made
-  bool placed = false;          ///< moved ahead of its users, behind the predecessor
+  bool placed = false;          ///< moved before its users, after the predecessor
   Uid predecessor = Uid::None;  ///< identity of the element before it, 0 for the first place
 };
 

@@ -24,7 +24,7 @@ bool CTessalDoc::OnOpenDocument(const std::string& path) {
   } else {
     dialogs.ShowMessage(FailureText("load", path));
   }
-  // From here on the values tell their listeners.
+  // From here on changes of values reach their listeners.
   SetNotifyChanges(true);
   return loaded;
 }

@@ -63,7 +63,7 @@ bool ErrorRegistry::FormatError(std::size_t index, std::string& text) const {
     return false;
   }
   const ErrorRecord& record = records[index];
-  // The word stands glued to the text: people search their logs for this form.
+  // The word is glued to the text: people search their logs for this form.
   text = std::string(LevelWord(record.level)) + record.text;
   if (IsElement(record.uid)) {
     text += " symbol \"" + record.symbol + "\" ( UID=" + std::to_string(NumberOf(record.uid)) + ")";

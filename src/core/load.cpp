@@ -73,7 +73,7 @@ std::string TreeFailureText(const std::string& path) {
   return KeyFileSize(path) == 0 ? "the file is empty, or no regular file" : KeyFileFailureText();
 }
 
-/// A target that holds nothing stands for an empty template, and misses no key.
+/// A target that holds nothing is an empty template, and misses no key.
 bool IsEmptyTarget(KvfNode target) {
   return kvfGetNoSections(target) == 0 && !HasKeyword(target, key::kDescription) &&
          !HasKeyword(target, key::kOnlineHelp) && !HasKeyword(target, key::kDocumentation);

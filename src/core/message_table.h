@@ -121,6 +121,14 @@ inline constexpr MessageRow kMessages[] = {
         "Exchange the two, or correct the one that is wrong.",
     },
     {
+        "value-outside-range",
+        ErrorLevel::Warning,
+        "The default value is not within minimum to maximum!",
+        "Reserved. Checks report the side on which a default value lies outside its range.",
+        "None: no check reports it.",
+        "See value-below-minimum and value-above-maximum.",
+    },
+    {
         "illegal-symbol",
         ErrorLevel::Warning,
         "%1, illegal symbol name (keyword or illegal characters used)",
@@ -229,6 +237,14 @@ inline constexpr MessageRow kMessages[] = {
         "An expression uses a name that no element of the template has.",
         "k * Algae in a template without an element Algae.",
         "Correct the name, or create the element; the editor offers to create it.",
+    },
+    {
+        "unknown-symbol",
+        ErrorLevel::Warning,
+        "unknown symbol name used in expression",
+        "Reserved. Names that nobody has defined are listed one by one, with their users.",
+        "None: no check reports it.",
+        "See undefined-symbol.",
     },
     {
         "order-violated",

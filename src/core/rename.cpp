@@ -30,7 +30,7 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
     if (hit == std::string_view::npos) break;
     std::size_t end = hit + oldWord.size();
     // The left side is looked at from the third character on: the one at position 1 follows the opening quote
-    // of a stored expression. It is looked at as the text stands behind the replacements so far.
+    // of a stored expression. It is looked at as the text is after the replacements so far.
     const std::size_t hitInResult = result.size() + (hit - copied);
     const char left = hit > copied ? text[hit - 1] : (result.empty() ? '\0' : result.back());
     const bool boundLeft = hitInResult > 1 && IsAsciiLetter(left);

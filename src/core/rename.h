@@ -13,11 +13,11 @@ class TemplateCore;
 /// longer, so renaming `a` changes `a_1` and `a2` too. The result of a replacement is not looked at again.
 std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord);
 
-/// Why an element may not take a new symbol, as the user is told; empty when it may. Blanks at both ends of
+/// Why an element may not take a new symbol, in words for the user; empty when it may. Blanks at both ends of
 /// the new symbol are the caller's to cut.
 std::string RenameRefusal(const TemplateCore& core, std::string_view newSymbol);
 
-/// What the user is told when a rename fails all the same.
+/// What to say when a rename fails all the same.
 std::string RenameFailure(std::string_view newSymbol);
 
 }  // namespace tessal

@@ -1,5 +1,5 @@
 // The flat symbol table of a template: a record for each element in the order of the file, who uses whom, and
-// the names in use that stand for nothing. A rebuild makes it again, never patches it, in time proportional
+// the names in use that mean nothing. A rebuild makes it again, never patches it, in time proportional
 // to the template.
 #pragma once
 
@@ -29,7 +29,7 @@ struct SymbolRecord {
   std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
   std::string text;               ///< the expression, or the number of an input as text
   /// The records that the expression uses and those that use this one: by sequence number and, in parallel,
-  /// by identity. Each entry stands once, in the order of first use.
+  /// by identity. Each entry is there once, in the order of first use.
   std::vector<std::uint32_t> references;
   std::vector<std::uint32_t> referencedBy;
   std::vector<Uid> referenceUids;

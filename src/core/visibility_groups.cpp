@@ -55,7 +55,7 @@ void VisibilityGroups::TakeRecordNumbers() {
         const SymbolRecord* record =
             sequence < 1 ? nullptr : state.table.BySequence(static_cast<std::uint32_t>(sequence));
         if (record == nullptr) continue;
-        // Both records of a movement stand for one member.
+        // Both records of a movement are one member.
         if (level.items.insert(record->uid).second) record->element->SetVisibility(group, number);
       }
       level.records.clear();

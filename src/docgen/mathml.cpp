@@ -37,7 +37,7 @@ struct Relation {
   std::string_view markUp;
 };
 
-// The greater sign stands unescaped, unlike the smaller one.
+// The greater sign is not escaped, unlike the smaller one.
 constexpr std::array<Relation, 6> kRelations = {{
     {"==", "<mo>=</mo>"},
     {"!=", "<mo>&#x2260;</mo>"},

@@ -32,7 +32,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   /// Whether it looks at the values of the grid.
   bool SearchesGrid() const;
 
-  /// The name behind `variableId`. It carries the link through a renumbering, see the symbol references.
+  /// The name of the element that `variableId` means. It carries the link through a renumbering, see the symbol references.
   const std::string& VariableName() const { return variableName; }
   void SetVariableName(std::string_view name) { variableName = name; }
 
@@ -54,7 +54,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   std::string variableName;
 };
 
-/// The choices that stand first for what a search looks for.
+/// The first choices of what a search looks for.
 std::vector<CEL_Choice> FirstLookForChoices();
 
 }  // namespace tessal

@@ -28,7 +28,7 @@ struct PropertyRow {
   std::string_view label;
   ValueType type;
   ChoiceSource choices = nullptr;
-  std::string_view defaultText{};  ///< as it stands in the file
+  std::string_view defaultText{};  ///< as it is in the file
   double defaultNumber = 0.0;
   bool readLast = false;        ///< a value that is read after the bounds that limit it
   bool listedLast = false;      ///< comes after the others in the field list
@@ -59,7 +59,7 @@ enum class UnitMode : std::int32_t { None = 0, Type = 1, Unit = 2, Both = 3 };
 
 class CEL_Element : public PropertyListener {
  public:
-  /// A list head or the root: what it reads and writes is told by the flags.
+  /// A list head or the root: the flags say what it reads and writes.
   CEL_Element(bool withSymbol, bool withId, bool withDescription);
   /// An element with all three, and a caption in its symbol.
   explicit CEL_Element(std::string_view caption);
@@ -97,7 +97,7 @@ class CEL_Element : public PropertyListener {
   /// search looks for.
   virtual std::string RecordText() const { return {}; }
 
-  /// Points each property's selection at the choice that stands for its value.
+  /// Points each property's selection at the choice of its value.
   void SelectPresentValues();
 
   /// Empties the descriptive texts.
@@ -134,7 +134,7 @@ class CEL_Element : public PropertyListener {
   void SetVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibilityGroup(std::int32_t group);
-  /// Takes memberships of the groups (or, within a group, levels) behind a removed one along to their new
+  /// Takes memberships of the groups (or, within a group, levels) after a removed one along to their new
   /// numbers.
   void CloseVisibilityGroupGap(std::int32_t removedGroup);
   void CloseVisibilityLevelGap(std::int32_t group, std::int32_t removedLevel);
@@ -164,7 +164,7 @@ class CEL_Element : public PropertyListener {
 
   void ReadBase(KvfNode section, int& status);
   void WriteBase(KvfHandle file, int& status);
-  /// The properties of the class's table, in its order, those that are read last behind the others.
+  /// The properties of the class's table, in its order, those that are read last after the others.
   void ReadOwn(KvfNode section, int& status);
   void WriteOwn(KvfHandle file, int& status);
   void ResetOwn();
@@ -175,7 +175,7 @@ class CEL_Element : public PropertyListener {
   int SetBaseFields(const std::vector<ElementField>& fields);
   int SetOwnFields(const std::vector<ElementField>& fields);
 
-  /// Offers the unit types, and selects the one that stands for the present number.
+  /// Offers the unit types, and selects the one of the present number.
   void OfferUnitTypes(const UnitTypes& types);
   /// What a new unit type does to the unit: a type that fixes it sets it and locks it. A number without a
   /// type counts as "User defined", and becomes it unless the family keeps it.
@@ -216,7 +216,7 @@ ElementField MakeField(std::string_view label, const CEL_Property& property);
 /// Sets a property from a field of its kind; false when the kinds do not fit.
 bool SetFromField(CEL_Property& property, const ElementField& field);
 
-/// The counter behind the identities: the next element of the process gets this number plus 1. For tests.
+/// The counter of the identities: the next element of the process gets this number plus 1. For tests.
 void ResetElementUids();
 
 }  // namespace tessal

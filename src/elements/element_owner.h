@@ -24,7 +24,7 @@ class ElementOwner {
  public:
   virtual ~ElementOwner() = default;
 
-  /// Numbers all elements anew and finds out who uses whom.
+  /// Numbers all elements again and finds out who uses whom.
   virtual void RebuildSymbolTable() = 0;
 
   /// Whether any element has this symbol.

@@ -137,7 +137,7 @@ void CEL_Input::ApplyBuiltin() {
     spatialVariation.SetText(VariationText(row.variation));
     unqType.SetInt(row.unitType);
     unit.SetText(row.unit);
-    // Wide open first, so that no limit stands in the way of the default.
+    // Wide open first, so that no limit is in the way of the default.
     minValue.SetReal(std::numeric_limits<double>::lowest());
     maxValue.SetReal(std::numeric_limits<double>::max());
     defaultValue.SetReal(row.defaultValue);

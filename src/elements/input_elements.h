@@ -7,7 +7,7 @@
 
 namespace tessal {
 
-/// What tells the twins apart.
+/// What differs between the twins.
 struct InputKind {
   ElementKind kind;
   std::int32_t builtinKind;  ///< the kind of the catalogue rows that it may be bound to

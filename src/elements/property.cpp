@@ -187,7 +187,7 @@ void CEL_Property::AddListener(PropertyListener& listener) {
 void CEL_Property::RaiseChange() {
   if (modifiedFlag != nullptr) *modifiedFlag = true;
   if (!NotifyChanges()) return;
-  // By index: a listener may register another one while it is told.
+  // By index: a listener may register another one while it is called.
   // NOLINTNEXTLINE(modernize-loop-convert)
   for (std::size_t index = 0; index < listeners.size(); ++index) listeners[index]->OnPropertyChanged(*this);
 }

@@ -1,6 +1,6 @@
 // One typed value of a template element, with its previous value, its allowed choices and its listeners.
 // Every change goes through a setter: it keeps the old value, marks the template as modified and, while
-// change notifications are on, tells the listeners.
+// change notifications are on, calls the listeners.
 #pragma once
 
 #include <cstdint>
@@ -108,7 +108,7 @@ class CEL_Property final {
   bool SetBool(bool value);
   bool SetText(std::string_view value);
 
-  /// The value as text: numbers in decimal, booleans as "YES" or "NO", texts as they stand.
+  /// The value as text: numbers in decimal, booleans as "YES" or "NO", texts as they are.
   std::string TextOf() const;
 
   /// The parse of an expression, its quotes stripped. It is held beside the text and made when it is first
@@ -137,7 +137,7 @@ class CEL_Property final {
   void ClearChoices() { choices.reset(); }
   bool HasChoice(std::string_view display) const;
 
-  /// Index of the first choice that stands for the present value, -1 for none. A NaN is like nothing.
+  /// Index of the first choice of the present value, -1 for none. A NaN is like nothing.
   std::int32_t PresentChoice() const;
 
   /// Index of the selected choice, -1 for none.
@@ -154,7 +154,7 @@ class CEL_Property final {
   /// Registers a listener once; a second registration of the same one is ignored.
   void AddListener(PropertyListener& listener);
 
-  /// Marks the template as modified and tells the listeners, as a change of value does.
+  /// Marks the template as modified and calls the listeners, as a change of value does.
   void RaiseChange();
 
  private:

@@ -30,7 +30,7 @@ KvfNode FirstParameter(KvfNode section, std::string_view key) {
   return keyword == nullptr ? nullptr : kvfParamByNum(keyword, 1);
 }
 
-/// The parameter's text as it stands, with the report when there is none.
+/// The parameter's text as it is, with the report when there is none.
 bool ReadRawText(std::string& text, KvfNode section, std::string_view key, int& status) {
   const KvfNode parameter = FirstParameter(section, key);
   if (parameter == nullptr || kvfGetString(parameter, text) != kKvfOk) {

@@ -11,7 +11,7 @@ namespace tessal {
 class CEL_Element;
 class CEL_Property;
 
-/// The status that a missing key leaves behind.
+/// The status that a missing key leaves.
 inline constexpr int kStatusMissingKey = 1003;
 
 /// Reads the keyword into the property. A missing key, and a parameter of the wrong type, is reported at

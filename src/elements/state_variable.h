@@ -14,8 +14,6 @@ class CEL_StateVariable final : public CEL_Element {
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
 
-  bool UnitEditable() const { return unit.Editable(); }
-
   CEL_Property scope{ValueType::Text};
   CEL_Property transport{ValueType::Text};
   CEL_Property unit{ValueType::Text};

@@ -18,7 +18,7 @@ std::string_view SkipBlanks(std::string_view text) {
   return first == std::string_view::npos ? std::string_view() : text.substr(first);
 }
 
-/// The number at the start of the text, which then begins behind it.
+/// The number at the start of the text, which then begins after it.
 std::optional<int> TakeNumber(std::string_view& text) {
   text = SkipBlanks(text);
   int number = 0;
@@ -28,7 +28,7 @@ std::optional<int> TakeNumber(std::string_view& text) {
   return number;
 }
 
-std::optional<int> NumberBehind(std::string_view prefix, std::string_view stamp) {
+std::optional<int> NumberAfter(std::string_view prefix, std::string_view stamp) {
   if (!stamp.starts_with(prefix)) return std::nullopt;
   stamp.remove_prefix(prefix.size());
   return TakeNumber(stamp);
@@ -48,15 +48,15 @@ std::optional<int> YearOf(std::string_view date) {
 
 double VersionFromStamps(std::string_view branchStamp, std::string_view revisionStamp,
                          std::string_view buildDate) {
-  // Versions made before a release was branched off sort behind every release of their time.
+  // Versions made before a release was branched off sort after every release of their time.
   constexpr int kUnreleasedOffset = 100;
   double release = 0.0;
-  if (const auto number = NumberBehind(kBranchPrefix, branchStamp)) {
+  if (const auto number = NumberAfter(kBranchPrefix, branchStamp)) {
     release = *number;
   } else if (const auto year = YearOf(buildDate)) {
     release = *year + kUnreleasedOffset;
   }
-  return release + NumberBehind(kRevisionPrefix, revisionStamp).value_or(1) * 0.001;
+  return release + NumberAfter(kRevisionPrefix, revisionStamp).value_or(1) * 0.001;
 }
 
 double SoftwareVersion() {

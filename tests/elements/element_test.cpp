@@ -55,10 +55,10 @@ TEST(Elements, UnitTypesFixTheirUnits) {
   variable.unqType.SelectChoice("Volume");
   variable.unqType.ApplySelection();
   EXPECT_EQ(variable.unit.Text(), "m3");
-  EXPECT_FALSE(variable.UnitEditable());
+  EXPECT_FALSE(variable.unit.Editable());
   variable.unqType.SetInt(4711);
   EXPECT_EQ(variable.unqType.IntValue(), 999);
-  EXPECT_TRUE(variable.UnitEditable());
+  EXPECT_TRUE(variable.unit.Editable());
   CEL_Constant constant("c");
   constant.unqType.SelectChoice("Process rate");
   constant.unqType.ApplySelection();
