@@ -118,6 +118,12 @@ void CEL_Element::Bind(std::span<const PropertyRow> rows, std::initializer_list<
     assert(property->Type() == row->type);
     if (row->choices != nullptr) property->SetChoices(row->choices());
     ownProperties.push_back({&*row, property});
+    if (row->type == ValueType::Expression) {
+      const auto place = static_cast<std::uint8_t>(ownProperties.size() - 1);
+      assert(!HasExpression() || endOfExpressions == place);
+      if (!HasExpression()) firstExpression = place;
+      endOfExpressions = static_cast<std::uint8_t>(place + 1);
+    }
     ++row;
   }
   ResetOwn();
@@ -329,12 +335,6 @@ int CEL_Element::SetOwnFields(const std::vector<ElementField>& fields) {
 
 int CEL_Element::SetFields(const std::vector<ElementField>& fields) {
   return SetBaseFields(fields) + SetOwnFields(fields);
-}
-
-bool CEL_Element::HasExpression() const {
-  bool found = false;
-  ForEachExpression([&found](const PropertyRow&, const CEL_Property&) { found = true; });
-  return found;
 }
 
 bool CEL_Element::ParseExpression() {

@@ -87,12 +87,12 @@ class CEL_Element : public PropertyListener {
   /// Calls the visitor with each expression, its row and its property, in the order of the class's table.
   template <class Visitor>
   void ForEachExpression(Visitor visit) const {
-    for (const OwnProperty& own : ownProperties) {
-      if (own.row->type == ValueType::Expression) visit(*own.row, *own.property);
+    for (std::size_t place = firstExpression; place < endOfExpressions; ++place) {
+      visit(*ownProperties[place].row, *ownProperties[place].property);
     }
   }
 
-  bool HasExpression() const;
+  bool HasExpression() const { return firstExpression < endOfExpressions; }
   /// What the symbol table holds for an element without expressions: the number of an input, the name that a
   /// search looks for.
   virtual std::string RecordText() const { return {}; }
@@ -202,6 +202,9 @@ class CEL_Element : public PropertyListener {
   ElementOwner* owner = nullptr;
   std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
   std::vector<OwnProperty> ownProperties;
+  // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
+  std::uint8_t firstExpression = 0;
+  std::uint8_t endOfExpressions = 0;
 };
 
 /// A list head or the root: an element that carries the descriptive texts of a collection.
