@@ -202,8 +202,8 @@ std::string TemplateScript::Table() const {
     text += std::to_string(record.sequence) + " " + core.RecordSymbol(record) + ": " +
             std::string(element.KindText()) + " " + std::to_string(record.index);
     if (record.specieIndex >= 0) text += " of class " + std::to_string(record.specieIndex);
-    text += ", scope " + std::to_string(static_cast<int>(record.scope)) + ", spatial " + std::to_string(static_cast<int>(record.spatial)) +
-            ", \"" + record.text + "\"";
+    text += ", scope " + std::to_string(static_cast<int>(record.scope)) + ", spatial " +
+            std::to_string(static_cast<int>(record.spatial)) + ", \"" + record.text + "\"";
     if (element.id.IntValue() != static_cast<std::int32_t>(record.sequence))
       text += ", id " + element.id.TextOf();
     if (record.uid != element.GetUid()) text += ", of another identity";
@@ -298,7 +298,10 @@ std::string TemplateScript::Offer(const Words& words) {
     const auto* specie = core.GetParentSpecie(request->ownerId);
     notes += "  creates " + request->symbol + ", " +
              std::string(kKinds.at(static_cast<std::size_t>(request->kind))) +
-             (specie == nullptr ? "" : " of " + specie->symbol.Text()) + "\n";
+             (specie == nullptr ? ""
+                                : " of " + specie->symbol.Text() + ", " +
+                                      std::string(core.GetElement(request->ownerId)->KindText())) +
+             "\n";
     core.CreateElement(*request);
     created = true;
   }
