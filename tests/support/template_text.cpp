@@ -1,85 +1,51 @@
 #include "support/template_text.h"
 
 #include <algorithm>
-#include <array>
+#include <map>
 #include <random>
 #include <sstream>
 #include <stdexcept>
+
+#include "support/temporary_folder.h"
 
 namespace tessal::test {
 
 namespace {
 
-/// A kind of line: where it goes, and its keywords, with the symbol for $S, the value for $V and the number
-/// of the class for $N. Expressions are written between both kinds of quotes.
+/// A kind of line, a row of template_kinds.txt.
 struct KindRow {
-  std::string_view word;
-  std::string_view section;  ///< the list; the elements of a kind without one are sections of their own
-  std::string_view prefix;
-  std::string_view keywords;
+  std::string section;
+  std::string prefix;
+  std::string keywords;
 };
-
-#define TESSAL_TEXTS "DESCRIPTION='';ONLINE_HELP='';DOCUMENTATION='';"
-#define TESSAL_NAMED "SYMBOL='$S';ID=1;" TESSAL_TEXTS
-#define TESSAL_BASE TESSAL_NAMED "UNQ_TYPE=999;UNQ_UNIT=0;"
-#define TESSAL_INPUT \
-  TESSAL_BASE        \
-  "IS_USER_SPECIFIED='YES';BUILT_IN_ID=-1;SCOPE='NOT_SPECIFIED';SPATIAL_VARIATION='NONE';UNIT='m';"
-
-constexpr std::array<KindRow, 17> kKinds = {{
-    {"state", "STATE_VARIABLES", "STATE_VARIABLE_",
-     TESSAL_BASE "SCOPE='WC';TRANSPORT='FIXED';UNIT='mg/l';DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=10"},
-    {"constant", "CONSTANTS", "CONSTANT_", TESSAL_INPUT "DEFAULT_VALUE=$V;MIN_VALUE=0;MAX_VALUE=100"},
-    {"forcing", "FORCINGS", "FORCING_", TESSAL_INPUT "DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=100"},
-    {"auxiliary", "AUXILIARY_VARIABLES", "AUXILIARY_VARIABLE_",
-     TESSAL_BASE "OUTPUT='YES';SCOPE='NOT_SPECIFIED';SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';"
-                 "EXPRESSION='\"$V\"'"},
-    {"process", "PROCESSES", "PROCESS_",
-     TESSAL_BASE "OUTPUT='YES';PROCESS_TYPE='TRANSFORMATION';SCOPE='WC';"
-                 "SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';EXPRESSION='\"$V\"';CONTROLID=-1;"
-                 "CONTROLVALUE=0.8"},
-    {"output", "DERIVED_OUTPUTS", "DERIVED_OUTPUT_",
-     "ID=1;" TESSAL_TEXTS "UNQ_TYPE=999;UNQ_UNIT=0;SCOPE='NOT_SPECIFIED';"
-     "SPATIAL_VARIATION='HORISONTAL_AND_VERTICAL';UNIT='-';FORMAT='INSTANTANEOUS';EXPRESSION='\"$V\"'"},
-    {"class.state", "STATE_VARIABLES", "S",
-     TESSAL_BASE "SPECIE=$N;UNIT='kg';DEFAULT_VALUE=1;MIN_VALUE=0;MAX_VALUE=10"},
-    {"class.constant", "CONSTANTS", "C",
-     TESSAL_BASE "SPATIAL_VARIATION='PER_SPECIE';UNIT='kg';DEFAULT_VALUE=$V;MIN_VALUE=0;MAX_VALUE=10"},
-    {"class.forcing", "FORCINGS", "F",
-     TESSAL_BASE "SCOPE='PER_SPECIE';SPATIAL_VARIATION='PER_SPECIE';UNIT='m';DEFAULT_VALUE=1;MIN_VALUE=0;"
-                 "MAX_VALUE=10"},
-    {"class.search", "SPATIAL_FUNCTIONS", "SPATIAL_FUNCTION_",
-     TESSAL_BASE "FUNCTION_ID=100;VARIABLE_ID=$V;SPECIE_ID=$N;RADIUS=5;DIMENSION=2;"
-                 "SPATIAL_VARIATION='PER_INDIVIDUAL';PURPOSE='MAGNITUDE';FRAMEWORK='EULER';PROPERTY='NONE';"
-                 "MATH='MIN';LOOKFOR=-1"},
-    {"class.expression", "ARITHMETICAL_EXPRESSIONS", "A",
-     TESSAL_BASE "EXPRESSION_TYPE='AUXILIARY_VARIABLE';SPECIE=$N;OUTPUT='YES';"
-                 "SPATIAL_VARIATION='PER_INDIVIDUAL';UNIT='-';EXPRESSION='\"$V\"'"},
-    {"class.movement", "", "H",
-     "EXPRESSION_HORIZONTAL_SPEED='\"$S\"';EXPRESSION_HORIZONTAL_DIRECTION='\"$V\"'"},
-    {"class.descent", "", "VERTICAL", "EXPRESSION_VERTICAL_SPEED='\"$V\"'"},
-    {"class", "", "SPECIE_",
-     "NAME='$S';" TESSAL_TEXTS "SCOPE='WC';PROJECTION_TIME=0;FIELD_OF_VIEW=180;TRANSPORT='USER_SPECIFIED'"},
-    {"settings", "", "MISC",
-     TESSAL_TEXTS "TESSAL_VERSION=2017.0014;PARSER_VERSION=2017.001;RANDSEED=0;DEBUG_LEVEL=0;DEBUG_LOG='';"
-                  "RANDOM_PARTICLE_DIR='NO';BUILD_SPATIAL_TREE='NO';CHECKSUM='0'"},
-    {"function", "EXTERNAL_FUNCTIONS", "EXTERNAL_FUNCTION_",
-     "SYMBOL='User $S';ID=1;" TESSAL_TEXTS "PUBLICNAME='$S';PARAMETERS=1;USED_AS='AS_MATH_FUNC';"
-     "DLL='plugin.dll';ENTRYPOINT='entry'"},
-    {"head", "", "", TESSAL_TEXTS},
-}};
-
-const KindRow& RowOf(std::string_view word) {
-  const auto* const row =
-      std::find_if(kKinds.begin(), kKinds.end(), [word](const KindRow& each) { return each.word == word; });
-  if (row == kKinds.end()) throw std::invalid_argument("no kind of line: " + std::string(word));
-  return *row;
-}
 
 std::string Replaced(std::string text, std::string_view part, const std::string& by) {
   for (std::size_t place = 0; (place = text.find(part, place)) != std::string::npos; place += by.size())
     text.replace(place, part.size(), by);
   return text;
+}
+
+std::map<std::string, KindRow> ReadKinds() {
+  std::map<std::string, KindRow> kinds;
+  std::istringstream rows(ReadFile(TESSAL_SOURCE_DIR "/tests/support/template_kinds.txt"));
+  for (std::string word; std::getline(rows, word, '|');) {
+    KindRow row;
+    if (word.starts_with('#')) word.erase(0, word.rfind('\n') + 1);
+    std::getline(std::getline(rows, row.section, '|'), row.prefix, '|');
+    std::getline(rows, row.keywords);
+    for (const auto& [set, its] : kinds) {
+      if (set.starts_with('@')) row.keywords = Replaced(row.keywords, set, its.keywords);
+    }
+    kinds.emplace(word, row);
+  }
+  return kinds;
+}
+
+const KindRow& RowOf(const std::string& word) {
+  static const std::map<std::string, KindRow> kKinds = ReadKinds();
+  const auto row = kKinds.find(word);
+  if (row == kKinds.end()) throw std::invalid_argument("no kind of line: " + word);
+  return row->second;
 }
 
 std::string Lines(const Keywords& keywords) {
@@ -101,7 +67,7 @@ TemplateText& TemplateText::Add(const std::string& kind, const std::string& symb
   Elements& elements = isInClass ? classes.back()[kind] : lists[kind == "head" ? symbol : kind];
   last = &elements.emplace_back();
   last->equation = Section("E", symbol + " = '\"" + value + "\"'\n");
-  std::istringstream rows{std::string(RowOf(kind).keywords)};
+  std::istringstream rows(RowOf(kind).keywords);
   for (std::string row; std::getline(rows, row, ';');) {
     const std::size_t equals = row.find('=');
     const std::string number = std::to_string(classes.size());
@@ -150,7 +116,7 @@ std::string TemplateText::Members(const Lists& from, std::string_view kind) {
   const auto elements = from.find(kind);
   std::string content;
   for (std::size_t place = 0; elements != from.end() && place < elements->second.size(); ++place) {
-    content += Section(std::string(RowOf(kind).prefix) + std::to_string(place + 1),
+    content += Section(RowOf(std::string(kind)).prefix + std::to_string(place + 1),
                        Lines(elements->second[place].keywords));
   }
   return content;
@@ -171,7 +137,7 @@ std::string TemplateText::HeadOf(std::string_view list) const {
 }
 
 std::string TemplateText::ListOf(const Lists& from, std::string_view kind) const {
-  const std::string section(RowOf(kind).section);
+  const std::string section(RowOf(std::string(kind)).section);
   const bool isInClass = kind.starts_with("class");
   return Section(section, HeadOf(isInClass ? "none" : section) + Members(from, kind));
 }
