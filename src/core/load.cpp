@@ -79,18 +79,19 @@ bool IsEmptyTarget(KvfNode target) {
          !HasKeyword(target, key::kOnlineHelp) && !HasKeyword(target, key::kDocumentation);
 }
 
-/// The reading of one file into a template that was cleared.
+/// The reading of one file into a template.
 class Reading final {
  public:
   Reading(TemplateCore& target, TemplateState& targetState) : core(target), state(targetState) {}
 
   /// False when the file could not be read; the registry then holds the reason.
+  bool Load(const std::string& path);
+
+ private:
   bool ReadFile(const std::string& path);
   /// Whether the numbers of all elements are among those of the records; one that is not gets the last of
   /// them.
   bool CheckIdRange();
-
- private:
   bool ReadSections(KvfHandle file, int targetNumber);
   void ReadSettings(KvfNode target, int& status);
   template <class Element>
@@ -182,21 +183,16 @@ bool Reading::CheckIdRange() {
   return good;
 }
 
-}  // namespace
-
-bool TemplateCore::LoadWrapper(const std::string& path) {
-  // A copy: the path may be the template's own file name, which the load empties first.
-  const std::string file = path;
+bool Reading::Load(const std::string& path) {
   const NotificationsOff silent;
   try {
-    Clear();
-    Reading reading(*this, state);
-    if (!reading.ReadFile(file)) return false;
-    if (!reading.CheckIdRange()) state.AssignIds();
-    RebuildSymbolTable();
-    state.flags.strictScopeRule ? CheckScopeRule() : CheckProcessRule();
-    ParseAllExpressions();
-    ValidateTemplate();
+    core.Clear();
+    if (!ReadFile(path)) return false;
+    if (!CheckIdRange()) state.AssignIds();
+    core.RebuildSymbolTable();
+    state.flags.strictScopeRule ? core.CheckScopeRule() : core.CheckProcessRule();
+    core.ParseAllExpressions();
+    core.ValidateTemplate();
     state.flags.modified = false;
     return true;
   } catch (const std::exception& failure) {
@@ -204,6 +200,13 @@ bool TemplateCore::LoadWrapper(const std::string& path) {
     Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});
     return false;
   }
+}
+
+}  // namespace
+
+bool TemplateCore::LoadWrapper(const std::string& path) {
+  // A copy: the path may be the template's own file name, which the load empties first.
+  return Reading(*this, state).Load(std::string(path));
 }
 
 }  // namespace tessal
