@@ -76,31 +76,31 @@ CEL_Element* TemplateCore::AddElement(ElementKind kind) {
 }
 
 CEL_StateVariable& TemplateCore::AddStateVariable() {
-  return static_cast<CEL_StateVariable&>(*AddElement(ElementKind::StateVariable));
+  return Add(std::get<Collection<CEL_StateVariable>>(kCollections));
 }
 
 CEL_Constant& TemplateCore::AddConstant() {
-  return static_cast<CEL_Constant&>(*AddElement(ElementKind::Constant));
+  return Add(std::get<Collection<CEL_Constant>>(kCollections));
 }
 
 CEL_Forcing& TemplateCore::AddForcing() {
-  return static_cast<CEL_Forcing&>(*AddElement(ElementKind::Forcing));
+  return Add(std::get<Collection<CEL_Forcing>>(kCollections));
 }
 
 CEL_Auxilliary_Variable& TemplateCore::AddAuxiliary() {
-  return static_cast<CEL_Auxilliary_Variable&>(*AddElement(ElementKind::Auxiliary));
+  return Add(std::get<Collection<CEL_Auxilliary_Variable>>(kCollections));
 }
 
 CEL_Process& TemplateCore::AddProcess() {
-  return static_cast<CEL_Process&>(*AddElement(ElementKind::Process));
+  return Add(std::get<Collection<CEL_Process>>(kCollections));
 }
 
 CEL_Derived_Output& TemplateCore::AddDerivedOutput() {
-  return static_cast<CEL_Derived_Output&>(*AddElement(ElementKind::DerivedOutput));
+  return Add(std::get<Collection<CEL_Derived_Output>>(kCollections));
 }
 
 CEL_Lagrange_Specie& TemplateCore::AddSpecie() {
-  return static_cast<CEL_Lagrange_Specie&>(*AddElement(ElementKind::Specie));
+  return Add(std::get<Collection<CEL_Lagrange_Specie>>(kCollections));
 }
 
 bool TemplateCore::CanDelete(Uid uid) const {

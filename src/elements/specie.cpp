@@ -129,27 +129,27 @@ CEL_Element* CEL_Lagrange_Specie::AddMember(ElementKind kind) {
 }
 
 CEL_Lagrange_StateVariable& CEL_Lagrange_Specie::AddStateVariable() {
-  return static_cast<CEL_Lagrange_StateVariable&>(*AddMember(ElementKind::SpecieStateVariable));
+  return Add(std::get<MemberList<CEL_Lagrange_StateVariable>>(kMemberLists));
 }
 
 CEL_Lagrange_Constant& CEL_Lagrange_Specie::AddConstant() {
-  return static_cast<CEL_Lagrange_Constant&>(*AddMember(ElementKind::SpecieConstant));
+  return Add(std::get<MemberList<CEL_Lagrange_Constant>>(kMemberLists));
 }
 
 CEL_Lagrange_Forcing& CEL_Lagrange_Specie::AddForcing() {
-  return static_cast<CEL_Lagrange_Forcing&>(*AddMember(ElementKind::SpecieForcing));
+  return Add(std::get<MemberList<CEL_Lagrange_Forcing>>(kMemberLists));
 }
 
 CEL_Lagrange_Spatial_Function& CEL_Lagrange_Specie::AddSpatialFunction() {
-  return static_cast<CEL_Lagrange_Spatial_Function&>(*AddMember(ElementKind::SpatialFunction));
+  return Add(std::get<MemberList<CEL_Lagrange_Spatial_Function>>(kMemberLists));
 }
 
 CEL_Lagrange_Arithmetical_Expression& CEL_Lagrange_Specie::AddArithmeticExpression() {
-  return static_cast<CEL_Lagrange_Arithmetical_Expression&>(*AddMember(ElementKind::ArithmeticExpression));
+  return Add(std::get<MemberList<CEL_Lagrange_Arithmetical_Expression>>(kMemberLists));
 }
 
 CEL_Lagrange_Horizontal_Vector& CEL_Lagrange_Specie::AddHorizontalVector() {
-  return static_cast<CEL_Lagrange_Horizontal_Vector&>(*AddMember(ElementKind::HorizontalVector));
+  return Add(std::get<MemberList<CEL_Lagrange_Horizontal_Vector>>(kMemberLists));
 }
 
 void CEL_Lagrange_Specie::StampMembers() {
