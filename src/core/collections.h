@@ -6,6 +6,7 @@
 #include <string_view>
 #include <tuple>
 
+#include "core/symbol_table.h"
 #include "elements/expression_elements.h"
 #include "elements/input_elements.h"
 #include "elements/sequence.h"
@@ -100,6 +101,11 @@ void ForEachNamedElement(const Collections& collections, Visitor visit) {
       for (const auto& member : (*specie).*list.members) visit(*member);
     });
   }
+}
+
+/// The particle class of a record of one, of its members or of its movements.
+inline CEL_Lagrange_Specie& ClassOf(const Collections& collections, const SymbolRecord& record) {
+  return At(collections.species, static_cast<std::size_t>(record.specieIndex));
 }
 
 template <class Visitor>

@@ -101,7 +101,7 @@ CreationOffer TemplateCore::OfferFor(const UndefinedSymbol& undefined) const {
     const SymbolRecord* record = FindRecordByUid(user);
     if (record == nullptr) continue;
     if (const auto mask = MaskForUser(record->element->Kind())) offer.mask = *mask;
-    if (record->specieIndex >= 0) specie = &At(Species(), static_cast<std::size_t>(record->specieIndex));
+    if (record->specieIndex >= 0) specie = &ClassOf(Elements(), *record);
   }
   for (std::size_t choice = 0; choice < kChoices.size(); ++choice) {
     const ChoiceRow& row = kChoices[choice];

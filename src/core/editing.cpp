@@ -35,7 +35,7 @@ bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operat
     return WithCollection(
         elementKind, [&collections, &operation](const auto& row) { operation(collections.*row.elements); });
   }
-  CEL_Lagrange_Specie& specie = At(collections.species, static_cast<std::size_t>(record.specieIndex));
+  CEL_Lagrange_Specie& specie = ClassOf(collections, record);
   return WithMemberList(elementKind,
                         [&specie, &operation](const auto& list) { operation(specie.*list.members); });
 }
@@ -108,7 +108,7 @@ bool TemplateCore::CanDelete(Uid uid) const {
   if (record == nullptr) return false;
   switch (record->element->Kind()) {
     case ElementKind::HorizontalVector:
-      return At(Species(), static_cast<std::size_t>(record->specieIndex)).horizontalVectors.size() > 1;
+      return ClassOf(Elements(), *record).horizontalVectors.size() > 1;
     case ElementKind::VerticalEquation:
       return false;
     default:
@@ -133,7 +133,7 @@ bool TemplateCore::DeleteElement(Uid uid) {
 }
 
 bool TemplateCore::EraseElement(const SymbolRecord& record) {
-  const auto index = static_cast<std::size_t>(record.index);
+  const std::size_t index = record.index;
   const ElementKind elementKind = record.element->Kind();
   // A class keeps its last horizontal movement.
   if (elementKind == ElementKind::HorizontalVector && !CanDelete(record.uid)) return false;
@@ -168,7 +168,7 @@ bool TemplateCore::MoveElement(Uid uid, Uid targetUid, bool before) {
   const SymbolRecord* target = FindRecordByUid(targetUid);
   if (moved == nullptr || target == nullptr || !AreSiblings(*moved, *target)) return false;
   if (moved->element->Kind() == ElementKind::VerticalEquation) return false;
-  MoveWithin(*moved, static_cast<std::size_t>(target->index) + (before ? 0 : 1));
+  MoveWithin(*moved, target->index + (before ? 0 : 1));
   state.flags.modified = true;
   RebuildSymbolTable();
   return true;
@@ -176,7 +176,7 @@ bool TemplateCore::MoveElement(Uid uid, Uid targetUid, bool before) {
 
 /// Moves the record's element so that it is where the one at `target` is, which makes room.
 void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t target) {
-  const auto from = static_cast<std::size_t>(record.index);
+  const std::size_t from = record.index;
   WithSequenceOf(state.collections, record, [from, target](auto& sequence) {
     const auto source = sequence.begin() + static_cast<std::ptrdiff_t>(from);
     const auto place = sequence.begin() + static_cast<std::ptrdiff_t>(std::min(target, sequence.size()));
@@ -203,7 +203,7 @@ bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
   const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());
   if (elementKind == ElementKind::StateVariable || IsOrdered(elementKind)) {
     // A place after the element's own leaves it where it is.
-    const auto place = static_cast<std::size_t>(std::min(last->index, record->index));
+    const std::size_t place = std::min(last->index, record->index);
     MoveWithin(*record, place);
     if (place > 0) {
       WithSequenceOf(state.collections, *record, [place, &predecessor](const auto& sequence) {

@@ -3,6 +3,7 @@
 // to the template.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -25,7 +26,7 @@ struct SymbolRecord {
   /// those of the record before them.
   Scope scope = Scope::Global;
   SpatialVariation spatial = SpatialVariation::None;
-  std::int32_t index = 0;         ///< place of the element in its own sequence, from 0
+  std::size_t index = 0;          ///< place of the element in its own sequence, from 0
   std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
   std::string text;               ///< the expression, or the number of an input as text
   /// The records that the expression uses and those that use this one: by sequence number and, in parallel,

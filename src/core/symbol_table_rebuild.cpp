@@ -86,7 +86,7 @@ SymbolRecord& SymbolTable::RebuildSteps::Append(CEL_Element& element, std::size_
   record.sequence = static_cast<std::uint32_t>(count);
   record.scope = before == nullptr ? Scope::Global : before->scope;
   record.spatial = before == nullptr ? SpatialVariation::None : before->spatial;
-  record.index = static_cast<std::int32_t>(index);
+  record.index = index;
   record.specieIndex = specieIndex;
   record.text = text;
   for (auto* list : {&record.references, &record.referencedBy}) list->clear();
