@@ -72,7 +72,7 @@ struct ExpressionToken {
 /// word EXCEEDANCE_FREQUENCY. A zero byte ends the text.
 bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& tokens);
 
-/// What stands between the first and the last double quote of a stored expression; with a single one all that
+/// What is between the first and the last double quote of a stored expression; with a single one all that
 /// follows it, without one the whole text.
 std::string_view StripExpressionQuotes(std::string_view stored);
 
