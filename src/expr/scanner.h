@@ -52,7 +52,7 @@ enum class TokenCode : std::int32_t {
   UMinus = 293,
 };
 
-/// The name of a token code ("IDENTIFIER"); "-" for a code outside the table.
+/// The name of a token code ("IDENTIFIER") in the grammar; "-" for a code that is no token's.
 std::string_view TokenName(TokenCode code);
 
 /// Whether a code is one of the vocabulary's, `Identifier` to `RvalId`; all others spoil a list of tokens.

@@ -8,7 +8,6 @@
 #include <memory>
 #include <set>
 #include <string>
-#include <string_view>
 #include <vector>
 
 #include "keyfile/kvf_value.h"
