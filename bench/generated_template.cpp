@@ -1,6 +1,5 @@
 #include "generated_template.h"
 
-#include <cstdlib>
 #include <random>
 #include <stdexcept>
 #include <utility>

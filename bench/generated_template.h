@@ -21,7 +21,7 @@ class ScratchFolder final {
   std::filesystem::path path;
 };
 
-/// Writes a template file of about that many elements and tells its path: of 100 elements 6 are state
+/// Writes a template file of about that many elements and returns its path: of 100 elements 6 are state
 /// variables, 30 constants, 14 forcings, 25 auxiliaries and 25 processes, whose expressions use four symbols
 /// each.
 std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements);

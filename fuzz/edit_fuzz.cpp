@@ -219,14 +219,15 @@ std::string StartText(const std::string& path) {
   return ReadWholeFile(path, failure).value_or("");
 }
 
-/// The sections that a template carries over for others, with comments wherever they may stand.
+/// The sections that a template carries over for others, with comments wherever they may be.
 void LoadFurtherSections(TemplateCore& core) {
   const std::string path = fuzz::ScratchFile("start.tessal");
   static const bool kWritten =
       TemplateCore().SaveWrapper(path) &&
-      WriteWholeFile(path, StartText(path) +
-                               "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // behind\r\n"
-                               "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")
+      WriteWholeFile(path,
+                     StartText(path) +
+                         "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // after it\r\n"
+                         "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")
           .empty();
   Require(kWritten && core.LoadWrapper(path), "the start is there");
   SetNotifyChanges(true);

@@ -1,5 +1,5 @@
 // Any text is read to a tree or refused with a message; what a tree writes reads back. Adjacent blocks of
-// comments become one on the way; behind that a tree writes the same for ever.
+// comments become one on the way; after that a tree always writes the same text.
 #include <cstdint>
 #include <cstdlib>
 #include <sstream>
@@ -14,7 +14,7 @@ void Require(bool holds) {
   if (!holds) std::abort();
 }
 
-/// A root without a comment ahead of its first section needs the blank line that every file has there.
+/// A root without a comment before its first section needs the blank line that every file has there.
 std::string Written(const tessal::CKvfSectionItem& tree) {
   std::ostringstream text;
   tree.Write(text);

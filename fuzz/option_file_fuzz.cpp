@@ -1,5 +1,5 @@
 // Any bytes are read as an option file: they leave settings that can be computed with, the same each time,
-// and the file itself as it was; a value that cannot be read is told and brings the defaults of a failed
+// and the file itself as it was; a value that cannot be read is reported and brings the defaults of a failed
 // reading.
 #include <algorithm>
 #include <array>

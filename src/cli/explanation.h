@@ -9,7 +9,7 @@
 
 namespace tessal::cli {
 
-/// The word that stands in place of a level for undefined symbols.
+/// The word printed in place of a level for undefined symbols.
 inline constexpr std::string_view kUndefinedWord = "Undefined";
 
 /// The level of a message as `check` prints it.

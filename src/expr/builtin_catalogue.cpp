@@ -146,7 +146,7 @@ std::string_view TextAt(const std::array<std::string_view, Count>& texts, std::i
 }  // namespace
 
 std::uint32_t GetBuiltinById(std::int32_t id, CatalogueBuiltin& record) {
-  // The rows stand in the order of their ids, which count from 1.
+  // The rows are in the order of their ids, which count from 1.
   if (id < 1 || static_cast<std::size_t>(id) > std::size(kRows)) return kCatalogueNotFound;
   record = kRows[id - 1];
   return 0;

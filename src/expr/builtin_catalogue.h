@@ -1,5 +1,5 @@
 // The quantities that the simulation engine supplies by itself, and that a template's constants and forcings
-// can stand for.
+// can represent.
 #pragma once
 
 #include <cstdint>

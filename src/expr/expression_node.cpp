@@ -124,8 +124,8 @@ void ExpressionNode::WalkInOrder(const Callback& before, const Callback& visit, 
     const std::int32_t here = depth + static_cast<std::int32_t>(path.size()) - 1;
     WalkStep& step = path.back();
     const ExpressionNode& node = *step.node;
-    const bool behindFirst = step.walked == 1 || (step.walked == 0 && node.ChildCount() == 0);
-    if (behindFirst) Call(visit, node, here);
+    const bool afterFirst = step.walked == 1 || (step.walked == 0 && node.ChildCount() == 0);
+    if (afterFirst) Call(visit, node, here);
     if (step.walked < node.ChildCount()) {
       const ExpressionNode* child = node.Child(++step.walked);
       if (child == nullptr) continue;

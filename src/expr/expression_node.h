@@ -1,4 +1,4 @@
-// The parse tree of an expression: one type of node, with the kind telling what its text and children mean.
+// The parse tree of an expression: one type of node, whose kind says what its text and children mean.
 // Trees of long chains are as deep as they are long, so nothing here recurses.
 #pragma once
 

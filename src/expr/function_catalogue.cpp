@@ -21,10 +21,8 @@ CatalogueFunction MakeFunction(const FunctionRow& row) {
   function.name = UpperCase(row.name);
   function.id = row.id;
   function.functionClass = row.functionClass;
-  function.firstFlag = row.firstFlag;
   function.argumentCount = static_cast<std::int32_t>(std::count_if(
       row.arguments.begin(), row.arguments.end(), [](std::string_view name) { return !name.empty(); }));
-  function.variant = row.variant;
   // Set-up overwrites the engine's name with the catalogue's own.
   function.internalName = function.name;
   function.evaluator = row.evaluator;
@@ -133,12 +131,6 @@ std::int32_t FunctionIdByName(std::string_view upperName) {
 bool IsFunctionName(std::string& name) {
   name = UpperCase(name);
   return FindExact(name) != nullptr;
-}
-
-bool IsDeprecatedFunction(std::int32_t id) {
-  return std::any_of(Functions().begin(), Functions().end(), [id](const CatalogueFunction& function) {
-    return function.id == id && function.traits.isDeprecated;
-  });
 }
 
 std::string JoinedArguments(const CatalogueFunction& function) {

@@ -3,7 +3,6 @@
 #pragma once
 
 #include <array>
-#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -32,11 +31,7 @@ struct CatalogueFunction {
   std::int32_t id = 0;
   /// 1 plain mathematics, 3 calendar of a time, 4 to 7 one each, 2 all others.
   std::int32_t functionClass = 0;
-  std::int32_t firstFlag = 1;
-  std::int32_t secondFlag = 1;
   std::int32_t argumentCount = 0;
-  std::int32_t thirdFlag = 0;
-  std::int32_t variant = 0;
   std::string internalName;       ///< in the catalogue as set up, the name again
   Evaluator evaluator = nullptr;  ///< none when the simulation engine alone computes it
   FunctionTraits traits;
@@ -79,7 +74,6 @@ std::uint32_t GetArgumentName(std::int32_t functionId, std::int32_t position, st
 std::int32_t FunctionIdByName(std::string_view upperName);
 /// Whether a name is a function's. Turns the ASCII letters of the given text into capitals.
 bool IsFunctionName(std::string& name);
-bool IsDeprecatedFunction(std::int32_t id);
 
 /// The argument names joined by commas, as messages show them.
 std::string JoinedArguments(const CatalogueFunction& function);

@@ -67,7 +67,7 @@ double SpecieOf(double ph, double dic, double alkalinity, double salinity, doubl
 // it was inserted. Functions without an evaluator are computed by the simulation engine alone.
 // clang-format off
 constexpr FunctionRow kRows[] = {
-    // id, name, name in the engine, class, evaluator, arguments; traits, first flag, variant
+    // id, name, name in the engine, class, evaluator, arguments; traits
     {1, "ABS", "fabs", 1, Of<OneArgument{std::fabs}>, {"x"}},
     {2, "ARCCOS", "acos", 1, Of<OneArgument{std::acos}>, {"x"}, {.givesAngle = true}},
     {3, "ARCSIN", "asin", 1, Of<OneArgument{std::asin}>, {"x"}, {.givesAngle = true}},
@@ -113,9 +113,9 @@ constexpr FunctionRow kRows[] = {
     {36, "MONTH", "Month", 3, Of<MonthOf>, {"Time"}},
     {37, "YEAR", "Year", 3, Of<YearOf>, {"Time"}},
     {38, "LAMBERT_BEER_1", "LambertBeer1", 2, Of<LightBelowLayer>,
-     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}, {}, 3, 1},
+     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
     {39, "LAMBERT_BEER_2", "LambertBeer2", 2, Of<LightBelowLayer>,
-     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}, {}, 3, 2},
+     {"Surface_Light", "Layer_Height", "Light_Extinction_Coefficient"}},
     {40, "OXYGENSATURATION_WEISS", "OxygenSaturation_Weiss", 2, Of<OxygenSaturationWeiss>,
      {"Salinity", "Temperature"}},
     {41, "RELATIVE_DAYLENGTH", "RelativeDaylength", 2, Of<RelativeDayLength>,

@@ -23,8 +23,6 @@ struct FunctionRow {
   Evaluator evaluator;
   std::array<std::string_view, kMostArguments> arguments;
   FunctionTraits traits = {};
-  std::int32_t firstFlag = 1;
-  std::int32_t variant = 0;
 };
 
 /// All rows, in catalogue order.

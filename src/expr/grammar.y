@@ -21,6 +21,12 @@ using NodeHandle = std::uint32_t;
 }
 
 %code {
+// The scanner's codes are the tokens declared here, in the same order.
+static_assert(static_cast<int>(tessal::TokenCode::Identifier) == IDENTIFIER &&
+              static_cast<int>(tessal::TokenCode::If) == IF &&
+              static_cast<int>(tessal::TokenCode::ExceedanceFrequency) == EXCEEDANCE_FREQUENCY &&
+              static_cast<int>(tessal::TokenCode::UMinus) == U_MINUS);
+
 static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value, tessal::ParseState& state);
 static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message);
 }
@@ -237,3 +243,13 @@ static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value,
 static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message) {
   state.FailAsParser(message);
 }
+
+namespace tessal {
+
+// The grammar's own list of its tokens holds their names.
+std::string_view TokenName(TokenCode code) {
+  if (code < TokenCode::Identifier || code > TokenCode::UMinus) return "-";
+  return yysymbol_name(YYTRANSLATE(static_cast<int>(code)));
+}
+
+}  // namespace tessal

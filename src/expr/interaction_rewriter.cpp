@@ -65,7 +65,7 @@ class Rewriter final {
       case NodeKind::Number:
       case NodeKind::Arithmetic:
       case NodeKind::Comparison:
-      // The target of a direct modification stands behind its value, with nothing between them.
+      // The target of a direct modification comes after its value, with nothing between them.
       case NodeKind::DirectAssign:
       case NodeKind::DirectPlus:
       case NodeKind::DirectMinus:

@@ -1,7 +1,6 @@
 #include "expr/scanner.h"
 
 #include <algorithm>
-#include <array>
 #include <limits>
 
 #include "expr/scanner_state.h"
@@ -9,43 +8,6 @@
 namespace tessal {
 
 namespace {
-
-constexpr std::array<std::string_view, 36> kTokenNames = {"IDENTIFIER",
-                                                          "INT_NUM",
-                                                          "FLOAT_NUM",
-                                                          "SCIENTIFIC_NUM",
-                                                          "ADD_OP_PLUS",
-                                                          "ADD_OP_MINUS",
-                                                          "MUL_OP_MULTIPLY",
-                                                          "MUL_OP_DIVIDE",
-                                                          "COMMA",
-                                                          "LEFT_BRACKET",
-                                                          "RIGHT_BRACKET",
-                                                          "LEFT_SQUARE",
-                                                          "RIGHT_SQUARE",
-                                                          "LEFT_CURLY",
-                                                          "RIGHT_CURLY",
-                                                          "EQUAL",
-                                                          "NOT_EQUAL",
-                                                          "BIGGER",
-                                                          "SMALLER",
-                                                          "BIGGER_OR_EQUAL",
-                                                          "SMALLER_OR_EQUAL",
-                                                          "IF",
-                                                          "THEN",
-                                                          "ELSE",
-                                                          "NOT_OP",
-                                                          "AND_OP",
-                                                          "OR_OP",
-                                                          "DIRECT_ASSIGN",
-                                                          "DIRECT_PLUS",
-                                                          "DIRECT_MINUS",
-                                                          "DIRECT_MULTIPLY",
-                                                          "DIRECT_DIVIDE",
-                                                          "RVAL_ID",
-                                                          "EXCEEDANCE_FREQUENCY",
-                                                          "U_PLUS",
-                                                          "U_MINUS"};
 
 ExpressionToken MakeToken(const ExpressionScan& scan, TokenCode code) {
   const std::string_view lexeme = scan.Lexeme();
@@ -66,11 +28,6 @@ ExpressionToken MakeToken(const ExpressionScan& scan, TokenCode code) {
 ScanPosition& ScannerCounters() {
   static ScanPosition counters;
   return counters;
-}
-
-std::string_view TokenName(TokenCode code) {
-  if (code < TokenCode::Identifier || code > TokenCode::UMinus) return "-";
-  return kTokenNames[static_cast<std::size_t>(code) - static_cast<std::size_t>(TokenCode::Identifier)];
 }
 
 bool IsPlainToken(TokenCode code) {

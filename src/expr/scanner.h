@@ -52,7 +52,7 @@ enum class TokenCode : std::int32_t {
   UMinus = 293,
 };
 
-/// The name of a token code ("IDENTIFIER"); "-" for a code outside the table.
+/// The name of a token code ("IDENTIFIER") in the grammar; "-" for a code that is no token's.
 std::string_view TokenName(TokenCode code);
 
 /// Whether a code is one of the vocabulary's, `Identifier` to `RvalId`; all others spoil a list of tokens.
@@ -72,7 +72,7 @@ struct ExpressionToken {
 /// word EXCEEDANCE_FREQUENCY. A zero byte ends the text.
 bool ScanExpressionTokens(std::string_view text, std::vector<ExpressionToken>& tokens);
 
-/// What stands between the first and the last double quote of a stored expression; with a single one all that
+/// What is between the first and the last double quote of a stored expression; with a single one all that
 /// follows it, without one the whole text.
 std::string_view StripExpressionQuotes(std::string_view stored);
 

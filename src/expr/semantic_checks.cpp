@@ -31,7 +31,7 @@ bool Holds(const Words& words, std::string_view text) {
 }
 
 /// Whether a text as a whole converts to a number by the rules of the "C" locale. The conversion of the empty
-/// text, and of nothing behind blanks, stops where it starts.
+/// text, and of blanks with nothing after them, stops where it starts.
 bool ReadsAsNumber(std::string_view text) {
   if (text.empty()) return true;
   constexpr std::string_view kBlanks = " \t\n\v\f\r";
@@ -69,7 +69,7 @@ class FunctionCheck final {
  private:
   void Visit(NodeKind kind, const std::string& text) {
     if (kind == NodeKind::Argument) {
-      // The walk comes to a list behind all calls in it, so this counts the arguments of one call only.
+      // The walk comes to a list after all calls in it, so this counts the arguments of one call only.
       ++arguments;
     } else if (kind == NodeKind::Property) {
       if (!IsPropertyName(text)) Report({"unknown-property", {text}});

@@ -26,8 +26,8 @@ bool IsConditionalWord(std::string_view text);
 /// A letter, then letters, digits and underscores.
 bool IsValidSymbolSpelling(std::string_view text);
 
-/// Spelt like a symbol and no user function's name, conditional word, verb or catalogue function, as they
-/// stand: `sin` passes where `SIN` fails.
+/// Spelt like a symbol and no user function's name, conditional word, verb or catalogue function, as
+/// written: `sin` passes where `SIN` fails.
 bool IsValidSymbol(std::string_view text);
 
 /// A catalogue function, conditional word or verb in any case, or a number; the empty text reads as one.

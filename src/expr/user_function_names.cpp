@@ -8,7 +8,7 @@ namespace tessal {
 
 namespace {
 
-/// The list, and where each name stands in it: every symbol of every check is looked up here.
+/// The list, and the place of each name in it: every symbol of every check is looked up here.
 struct Names {
   std::list<std::string> list;
   std::unordered_map<std::string_view, std::list<std::string>::iterator> places;

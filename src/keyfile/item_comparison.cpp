@@ -1,5 +1,5 @@
 // Comparing two item trees, with a report of what differs. Comments never count, and an item without a
-// partner makes no difference by itself: it is told only beside a real one.
+// partner makes no difference by itself: it is reported only together with a real one.
 #include <array>
 #include <ostream>
 #include <regex>
@@ -48,7 +48,7 @@ bool IsIgnored(const std::string& name, const std::vector<std::regex>& expressio
   return false;
 }
 
-void Tell(std::ostream* report, std::string_view first, std::string_view second) {
+void Report(std::ostream* report, std::string_view first, std::string_view second) {
   if (report != nullptr) *report << first << second << '\n';
 }
 
@@ -58,25 +58,25 @@ bool CKvfKeyItem::Compare(CKvfBaseItem& other, std::ostream* report, const Ignor
                           bool /*onlyKeywords*/) {
   if (other.ItemKind() != kKeyword) return false;
   if (ignoreNames != nullptr && IsIgnored(name, Compile(ignoreNames))) {
-    Tell(report, "ignored key name ", name);
+    Report(report, "ignored key name ", name);
     return true;
   }
   const auto& otherKey = static_cast<const CKvfKeyItem&>(other);
   if (name != otherKey.name) {
-    Tell(report, "Different key names " + name + "<>", otherKey.name);
+    Report(report, "Different key names " + name + "<>", otherKey.name);
     return false;
   }
   if (values.size() != otherKey.values.size()) {
-    Tell(report, name, " different value count");
+    Report(report, name, " different value count");
     return false;
   }
   if (values.empty()) return false;
   for (std::size_t place = 0; place < values.size(); ++place) {
     if (values[place] == otherKey.values[place]) continue;
-    Tell(report, name + " Value #" + std::to_string(place + 1), " is different");
+    Report(report, name + " Value #" + std::to_string(place + 1), " is different");
     return false;
   }
-  Tell(report, name, " matches");
+  Report(report, name, " matches");
   return true;
 }
 
@@ -200,10 +200,10 @@ void CKvfSectionItem::ReportDifferences(std::ostream& report, int side, bool onl
   constexpr std::array<std::string_view, 2> kUnmatchedTexts = {" is missing", " is extra"};
   for (const auto& child : children) {
     const Kind childKind = child->ItemKind();
-    const bool told = childKind != kComment && (childKind == kKeyword || !onlyKeywords);
-    if (told && child->mark == kUnmatched) {
+    const bool isReported = childKind != kComment && (childKind == kKeyword || !onlyKeywords);
+    if (isReported && child->mark == kUnmatched) {
       report << child->Describe() << kUnmatchedTexts.at(static_cast<std::size_t>(side)) << '\n';
-    } else if (told && child->mark == kDifferent && side == 0) {
+    } else if (isReported && child->mark == kDifferent && side == 0) {
       report << child->Describe() << " is different (line " << child->line << ")\n";
     }
     if (childKind == kSection) {

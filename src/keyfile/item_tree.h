@@ -8,7 +8,6 @@
 #include <memory>
 #include <set>
 #include <string>
-#include <string_view>
 #include <vector>
 
 #include "keyfile/kvf_value.h"
@@ -53,7 +52,7 @@ class CKvfBaseItem {
   std::string Indent() const;
 
   std::string name;                   ///< empty for a comment
-  std::string comment;                ///< behind a keyword, or behind a section's end
+  std::string comment;                ///< after a keyword, or after a section's end
   CKvfSectionItem* parent = nullptr;  ///< none for the root
   std::size_t depth = 0;              ///< root 0; a child is its parent's plus one
   Mark mark = kUnmatched;
@@ -115,14 +114,14 @@ class CKvfSectionItem final : public CKvfBaseItem {
   void AppendChild(std::unique_ptr<CKvfBaseItem> child);
   /// Takes an item in under construction: its depth is set later, with that of the whole tree.
   void AdoptChild(std::unique_ptr<CKvfBaseItem> child);
-  /// Takes the fields of another section and, behind the present children, its children themselves.
+  /// Takes the fields of another section and, after the present children, its children themselves.
   void TakeOver(CKvfSectionItem& source);
   std::size_t CountChildren(Kind childKind) const;
   /// The child with that place from 0 among those of its kind, or none.
   CKvfBaseItem* ChildByKind(std::size_t index, Kind childKind) const;
   /// Marks the section and everything below it.
   void SetMarks(Mark newMark);
-  /// Takes the fields of another section and, behind the present children, copies of its children.
+  /// Takes the fields of another section and, after the present children, copies of its children.
   void Assign(const CKvfSectionItem& source);
 
   std::string startComment;  ///< on the head line

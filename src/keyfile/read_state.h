@@ -48,7 +48,7 @@ class ReadState final {
   std::uint32_t EndKey(std::uint32_t key, std::uint32_t name, std::uint32_t comment);
   void Finish(std::uint32_t header, std::uint32_t targets);
 
-  /// The finished tree; none behind a failure.
+  /// The finished tree; none after a failure.
   std::unique_ptr<CKvfSectionItem>& Root() { return root; }
   const std::string& Message() const { return message; }
   std::int32_t Line() const { return position.lines; }

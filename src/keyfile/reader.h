@@ -9,7 +9,7 @@ namespace tessal {
 class CKvfSectionItem;
 
 /// Reads a file into a tree. 1 on success; on failure 0, with the target as it was, and `KeyFileFailureText`
-/// tells why.
+/// says why.
 int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target);
 
 /// The same from a text in memory.
@@ -18,7 +18,7 @@ int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target);
 /// The size of a file in bytes; 0 when it cannot be opened.
 std::uintmax_t KeyFileSize(const std::string& path);
 
-/// Why the last read failed; empty behind a good one.
+/// Why the last read failed; empty after a good one.
 const std::string& KeyFileFailureText();
 
 }  // namespace tessal

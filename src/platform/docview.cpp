@@ -24,9 +24,9 @@ void CDocument::RemoveView(CView& view) {
 }
 
 void CDocument::UpdateAllViews(const CView* sender, int hint, const UpdateHint* argument) {
-  // Over a copy: a view may go, or a new one come, while the others are told.
-  const std::vector<CView*> told = views;
-  for (CView* view : told) {
+  // Over a copy: a view may go, or a new one come, while the others are notified.
+  const std::vector<CView*> notified = views;
+  for (CView* view : notified) {
     const bool stillThere = std::find(views.begin(), views.end(), view) != views.end();
     if (view != sender && stillThere) view->OnUpdate(sender, hint, argument);
   }

@@ -1,4 +1,4 @@
-// Documents and their views: a document owns data and tells its views what happened through numbered hints;
+// Documents and their views: a document owns data and notifies its views of changes through numbered hints;
 // a view shows it. A document template makes documents and views of one kind for a host application.
 #pragma once
 
@@ -52,7 +52,7 @@ class CDocument {
   void RemoveView(CView& view);
   const std::vector<CView*>& Views() const { return views; }
 
-  /// Tells every view but the sender.
+  /// Notifies every view but the sender.
   void UpdateAllViews(const CView* sender, int hint = 0, const UpdateHint* argument = nullptr);
 
  private:
@@ -70,7 +70,7 @@ class CView {
   virtual ~CView() = default;
 
   virtual void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) = 0;
-  /// Builds what the view shows. Called once, when it stands in its frame.
+  /// Builds what the view shows. Called once, when it is in its frame.
   virtual void OnInitialUpdate() {}
   /// Puts what the user has entered and not yet committed into the document, before a save or a close.
   virtual void OnCommit() {}
@@ -79,7 +79,7 @@ class CView {
   /// The widget that a host puts into its frame; none for a view without a screen.
   virtual QWidget* Widget() { return nullptr; }
 
-  /// How a view has the frame around it show the document's title anew.
+  /// How a view has the frame around it show the document's title again.
   void SetFrameTitleUpdate(std::function<void()> update) { frameTitleUpdate = std::move(update); }
   void UpdateFrameTitle() {
     if (frameTitleUpdate) frameTitleUpdate();
@@ -95,8 +95,8 @@ class CMultiDocTemplate final {
   using DocumentFactory = std::function<std::unique_ptr<CDocument>()>;
   using ViewFactory = std::function<std::unique_ptr<CView>(CDocument&)>;
 
-  /// The resource text holds seven names, parted by line feeds: window title, document name, new-file name,
-  /// filter name, extension, and two identifiers of the file type.
+  /// The resource text holds seven names, separated by line feeds: window title, document name, new-file
+  /// name, filter name, extension, and two identifiers of the file type.
   CMultiDocTemplate(int resourceNumber, const std::string& resourceText, DocumentFactory documentFactory,
                     ViewFactory viewFactory);
 

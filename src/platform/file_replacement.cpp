@@ -24,7 +24,7 @@ std::string Reason(std::string_view what, const std::string& path, int error) {
   return text;
 }
 
-/// An open file descriptor. Closing it is a step that can fail, so it is told apart from letting go.
+/// An open file descriptor. Closing it is a step that can fail, so it is not left to the destructor.
 class Descriptor final {
  public:
   explicit Descriptor(int number) : descriptor(number) {}
@@ -54,12 +54,12 @@ bool WriteAll(int descriptor, std::string_view content) {
   return true;
 }
 
-/// Flushes to the disk. What has no disk behind it, a pipe or a terminal, is no failure.
+/// Flushes to the disk. What is on no disk, a pipe or a terminal, is no failure.
 bool Flush(int descriptor) {
   return fsync(descriptor) == 0 || errno == EINVAL || errno == ENOTSUP;
 }
 
-/// Writes everything and closes. The empty text, or what failed; `errno` then tells why.
+/// Writes everything and closes. The empty text, or what failed; `errno` then holds the cause.
 std::string_view WriteAndClose(Descriptor& file, std::string_view content) {
   if (!WriteAll(file.Number(), content)) return "can not write file";
   if (!Flush(file.Number())) return "can not flush file";
@@ -116,8 +116,8 @@ bool FlushFolder(const std::filesystem::path& folder) {
   return errno != EIO && errno != ENOSPC && errno != EDQUOT;
 }
 
-/// The file that a path means: where its symbolic links lead, also when nothing stands there yet. Nothing,
-/// with the error number, where that can not be told.
+/// The file that a path means: where its symbolic links lead, also when nothing is there yet. Nothing,
+/// with the error number, where that can not be found out.
 std::optional<std::filesystem::path> RealTarget(const std::string& path, int& error) {
   constexpr int kMostLinks = 40;
   std::filesystem::path real = path;
@@ -133,7 +133,7 @@ std::optional<std::filesystem::path> RealTarget(const std::string& path, int& er
   return std::nullopt;
 }
 
-/// Why what stands at the target may not be replaced, or the empty text. A rename would pass over a write
+/// Why what is at the target may not be replaced, or the empty text. A rename would pass over a write
 /// protection, and would put a plain file in the place of a pipe or a device.
 std::string Protection(const std::string& target) {
   struct stat old = {};

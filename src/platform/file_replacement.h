@@ -1,5 +1,5 @@
 // Whole files: reading them, writing them, and putting a new one in the place of an old one so that nobody
-// ever sees half of it. Every failure is told in words.
+// ever sees half of it. Every failure is reported in words.
 #pragma once
 
 #include <cstdint>
@@ -19,7 +19,7 @@ std::uintmax_t FileSize(const std::string& path);
 std::string WriteWholeFile(const std::string& path, std::string_view content);
 
 /// The same into a new file that only its owner may read, for what others shall not see half-done. A file or
-/// a link that stood there goes; what the link led to stays. After a failure nothing is left.
+/// a link that was there goes; what the link led to stays. After a failure nothing is left.
 std::string WriteFreshFile(const std::string& path, std::string_view content);
 
 /// Writes the content into a new file beside the target and, when every byte is on disk, lets it take the

@@ -1,4 +1,4 @@
-// What the host suite's installation tells: where it lies, and where its manuals are served.
+// What the host suite's installation says of itself: where it lies, and where its manuals are served.
 #pragma once
 
 #include <string>

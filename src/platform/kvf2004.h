@@ -14,7 +14,7 @@ using KvfHandle = std::uint32_t;
 struct KvfItem;
 using KvfNode = const KvfItem*;
 
-/// What went wrong, as `kvfGetErrorGlb` and the calls that return an int tell it.
+/// What went wrong, as `kvfGetErrorGlb` and the calls that return an int report it.
 enum KvfError : int {
   kKvfOk = 0,
   kKvfCannotOpen = 1001,
@@ -28,7 +28,7 @@ enum KvfError : int {
   kKvfWriteFailed = 1009,  ///< the file system refused a byte
 };
 
-/// Reads and parses a file. Gives 0 on failure; `kvfGetErrorGlb` then tells why. The mode is always 1.
+/// Reads and parses a file. Gives 0 on failure; `kvfGetErrorGlb` then says why. The mode is always 1.
 KvfHandle kvfLoadFile(const std::string& path, int mode);
 
 /// The same from bytes in memory.
@@ -64,7 +64,7 @@ KvfNode kvfParamByNum(KvfNode keyword, int number);
 int kvfGetInt(KvfNode parameter, std::int32_t& value);
 /// Takes integers too.
 int kvfGetDouble(KvfNode parameter, double& value);
-/// Quoted and path strings, and numbers and booleans as the text that stands in the file.
+/// Quoted and path strings, and numbers and booleans as the text that is in the file.
 int kvfGetString(KvfNode parameter, std::string& value);
 
 /// Writing: the image holds a stack of open sections; a keyword takes the parameters added after it.
@@ -79,9 +79,9 @@ int kvfAddDouble(KvfHandle handle, double value);
 /// Refuses a text that holds both ' and |, or a zero byte.
 int kvfAddString(KvfHandle handle, std::string_view value);
 
-/// Writes the image as text with CRLF line ends into a new file, in the place of what stood there; 0 when
-/// every byte reached the file and was flushed to it, else an error number; `kvfGetWriteFailure` then tells
-/// the reason in words.
+/// Writes the image as text with CRLF line ends into a new file, in the place of what was there; 0 when
+/// every byte reached the file and was flushed to it, else an error number; `kvfGetWriteFailure` then says
+/// why in words.
 int kvfWrite(KvfHandle handle, const std::string& path);
 /// The text that `kvfWrite` writes; empty for a bad handle.
 std::string kvfGetText(KvfHandle handle);

@@ -1,5 +1,5 @@
 // Reading and writing the images of the key-file library. Reading is milder than the grammar of the item
-// tree: no line feed is needed at either end, and comments may stand anywhere a line may.
+// tree: no line feed is needed at either end, and comments may be anywhere a line may.
 #include <algorithm>
 #include <utility>
 
@@ -79,7 +79,7 @@ class ImageReader final {
     }
   }
 
-  /// Behind an item only blanks and a comment may follow in its line.
+  /// After an item its line may hold only blanks and a comment.
   bool EndLine() {
     SkipBlanks();
     if (AtComment()) SkipComment();

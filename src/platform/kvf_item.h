@@ -1,4 +1,4 @@
-// The tree behind the handles and nodes of the key-file library.
+// The tree that the handles and nodes of the key-file library refer to.
 #pragma once
 
 #include <deque>
@@ -17,7 +17,7 @@ struct KvfItem {
   Type type = Type::Root;
   Value value = Value::Quoted;        ///< of a parameter
   int line = 0;                       ///< from 1; 0 for an item that was not read
-  std::string text;                   ///< the name, or a parameter's text as it stands
+  std::string text;                   ///< the name, or a parameter's text as written
   std::vector<KvfItem*> sections;     ///< sub-sections
   std::vector<KvfItem*> keywords;     ///< keywords, or a keyword's parameters
   std::vector<const KvfItem*> order;  ///< sections and keywords as they were added
@@ -50,7 +50,7 @@ struct KvfSyntaxError {
   std::string text;  ///< at most 40 bytes, one line
 };
 
-/// Reads a text that `KvfReadableText` has prepared. False, with the error told, when it is none.
+/// Reads a text that `KvfReadableText` has prepared. False, with the error filled in, when it is none.
 bool ReadKvfImage(std::string_view text, KvfImage& image, KvfSyntaxError& error);
 
 /// The text of an image: the library's header comment and all targets, with CRLF line ends.

@@ -9,7 +9,7 @@ namespace tessal {
 
 namespace {
 
-/// Whether a number too large or too small for 64 bits is too large: its first digit stands ahead of the
+/// Whether a number too large or too small for 64 bits is too large: its first digit is before the
 /// point, the exponent counted in.
 bool IsHuge(std::string_view digits) {
   const std::size_t exponentSign = digits.find_first_of("eE");

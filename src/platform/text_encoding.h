@@ -1,4 +1,4 @@
-// The encodings that bytes may stand in. Nothing in the core looks at one; what shows text to people takes
+// The encodings that bytes may be in. Nothing in the core looks at one; what shows text to people takes
 // bytes as UTF-8 when they are valid UTF-8, and as Windows-1252 otherwise.
 #pragma once
 
@@ -10,7 +10,7 @@ namespace tessal {
 
 bool IsUtf8(std::string_view bytes);
 
-/// The text in UTF-8, whichever of the two encodings it stands in.
+/// The text in UTF-8, whichever of the two encodings it is in.
 std::string ToUtf8(std::string_view bytes);
 
 /// A UTF-8 text in Windows-1252; nothing when it holds a character that the encoding lacks.

@@ -32,9 +32,7 @@ TEST_F(CheckValues, FormulaeGiveTheNumbersOfTheirAuthors) {
   const double log10 = std::numbers::ln10;
   const struct {
     std::string_view what;
-    double computed;
-    double published;
-    double halfDigit;
+    double computed, published, halfDigit;
   } rows[] = {
       {"ln K0", std::log(GetK0(35, 25)), -3.5617, 5e-5},
       {"K0 at 0, 20", GetK0(0, 20), 0.03916, 5e-6},
@@ -63,10 +61,7 @@ TEST_F(CheckValues, FormulaeGiveTheNumbersOfTheirAuthors) {
 
 TEST_F(CheckValues, EachOptionHasItsPairOfCarbonicAcidConstants) {
   const struct {
-    double publishedPK1;
-    double publishedPK2;
-    double k1;
-    double k2;
+    double publishedPK1, publishedPK2, k1, k2;
   } rows[] = {
       {5.856327, 8.924918, 1.39210753962e-06, 1.1887254858e-09},
       {5.850841, 8.925441, 1.37872989546e-06, 1.1611258437e-09},

@@ -1,4 +1,4 @@
-// What holds of the carbonate system for all waters and options.
+// What holds of the carbonate system for all waters and options, and what its setters leave in effect.
 
 #include <cmath>
 #include <string>
@@ -25,11 +25,7 @@ class CarbonateChemistry : public testing::Test {
 };
 
 struct Water {
-  double dic;
-  double alkalinity;
-  double salinity;
-  double temperature;
-  double depth;
+  double dic, alkalinity, salinity, temperature, depth;
 };
 
 std::string Text(const Water& water) {
@@ -161,39 +157,74 @@ TEST_F(CarbonateChemistry, PressureActsOnlyBelowTheSurface) {
 }
 
 TEST_F(CarbonateChemistry, PressureTermsFollowTheOptionOfTheirConstant) {
+  namespace sea = sea_water_pressure;
+  namespace geosecs = geosecs_pressure;
+  namespace fresh = fresh_water_pressure;
+  using Constants = EquilibriumConstants;
+  const struct {
+    const char* what;
+    double Constants::*constant;
+    const PressureCoefficients *seaWater, *ofGeosecs, *freshWater;  // none where the option has no such term
+  } rows[] = {{"K1", &Constants::k1, &sea::kK1, &geosecs::kK1, &fresh::kK1},
+              {"K2", &Constants::k2, &sea::kK2, &geosecs::kK2, &fresh::kK2},
+              {"KB", &Constants::kb, &sea::kKB, &geosecs::kKB, nullptr},
+              {"KW", &Constants::kw, &sea::kKW, &sea::kKW, &fresh::kKW},
+              {"KS", &Constants::ks, &sea::kKS, &sea::kKS, &sea::kKS},
+              {"KF", &Constants::kf, &sea::kKF, &sea::kKF, &sea::kKF},
+              {"KP1", &Constants::kp1, &sea::kKP1, &sea::kKP1, &sea::kKP1},
+              {"KP2", &Constants::kp2, &sea::kKP2, &sea::kKP2, &sea::kKP2},
+              {"KP3", &Constants::kp3, &sea::kKP3, &sea::kKP3, &sea::kKP3},
+              {"KSi", &Constants::ksi, &sea::kKSi, &sea::kKSi, &sea::kKSi}};
   const double depth = 10 * (101.698075458 - 1) / 100.698075458 * 100;
   const double pressure = DepthToPressure(depth, 35, 10) - 1;
   for (int option = 1; option <= 14; ++option) {
     SetCarbonateDefaults();
     SetKOption(option);
-    const EquilibriumConstants deep = ConstantsAt(35, 10, depth);
-    const EquilibriumConstants surface = ConstantsAt(35, 10, 0);
-    const bool geosecs = option == 6 || option == 7;
-    const bool fresh = option == 8;
-    const auto expect = [&](double ratio, const PressureCoefficients& coefficients, const char* what) {
-      EXPECT_NEAR(ratio, PressureFactor(coefficients, 10, pressure), 1e-12)
-          << what << " of option " << option;
-    };
-    expect(deep.k1 / surface.k1,
-           geosecs ? geosecs_pressure::kK1
-           : fresh ? fresh_water_pressure::kK1
-                   : sea_water_pressure::kK1,
-           "K1");
-    expect(deep.k2 / surface.k2,
-           geosecs ? geosecs_pressure::kK2
-           : fresh ? fresh_water_pressure::kK2
-                   : sea_water_pressure::kK2,
-           "K2");
-    if (!fresh) expect(deep.kb / surface.kb, geosecs ? geosecs_pressure::kKB : sea_water_pressure::kKB, "KB");
-    if (option != 6)
-      expect(deep.kw / surface.kw, fresh ? fresh_water_pressure::kKW : sea_water_pressure::kKW, "KW");
-    expect(deep.ks / surface.ks, sea_water_pressure::kKS, "KS");
-    expect(deep.kf / surface.kf, sea_water_pressure::kKF, "KF");
-    expect(deep.kp1 / surface.kp1, sea_water_pressure::kKP1, "KP1");
-    expect(deep.kp2 / surface.kp2, sea_water_pressure::kKP2, "KP2");
-    expect(deep.kp3 / surface.kp3, sea_water_pressure::kKP3, "KP3");
-    expect(deep.ksi / surface.ksi, sea_water_pressure::kKSi, "KSi");
+    const Constants deep = ConstantsAt(35, 10, depth);
+    const Constants surface = ConstantsAt(35, 10, 0);
+    for (const auto& row : rows) {
+      const PressureCoefficients* term = option == 8                  ? row.freshWater
+                                         : option == 6 || option == 7 ? row.ofGeosecs
+                                                                      : row.seaWater;
+      if (term == nullptr || (option == 6 && row.constant == &Constants::kw)) continue;
+      EXPECT_NEAR(deep.*row.constant / (surface.*row.constant), PressureFactor(*term, 10, pressure), 1e-12)
+          << row.what << " of option " << option;
+    }
   }
+}
+
+TEST_F(CarbonateChemistry, FactorsApplyOnTheWayInAndComeOffOnTheWayOut) {
+  SetSpeciesFactors(10, 20, 40, 5, 8);
+  SetSpecies(41.57, 3, 4, 0.4, 6.25);
+  for (const double salinity : {0.0, 35.0}) {
+    EXPECT_DOUBLE_EQ(TotalsInEffect(salinity).boron, 415.7e-6);
+    EXPECT_DOUBLE_EQ(TotalsInEffect(salinity).fluoride, 60e-6);
+    EXPECT_DOUBLE_EQ(TotalsInEffect(salinity).sulphate, 160e-6);
+    EXPECT_DOUBLE_EQ(TotalsInEffect(salinity).phosphate, 2e-6);
+    EXPECT_DOUBLE_EQ(TotalsInEffect(salinity).silicate, 50e-6);
+  }
+  // Totals that are set keep their amount when a factor changes.
+  SetSpeciesFactors(1, 1, 1, 1, 1);
+  EXPECT_DOUBLE_EQ(SetGetSpecie(1, -5), 415.7);
+  // A total that is no number shows in every result, until another one is set.
+  EXPECT_TRUE(std::isnan(SetGetSpecie(1, std::nan(""))));
+  EXPECT_TRUE(std::isnan(TotalsInEffect(35).boron));
+
+  SetDicAlkFactors(1000, 2000);
+  const Speciation& species = SpeciationOf({8, 2, 0, 35, 20, 0});
+  EXPECT_DOUBLE_EQ(species.dicEstimate, 2);
+  EXPECT_NEAR(species.bicarbonate, 1810, 20);
+}
+
+TEST_F(CarbonateChemistry, OneComputationServesAllSpeciesOfAWater) {
+  const std::uint64_t before = ComputedSpeciations();
+  for (const char* name :
+       {"GET_OH", "GET_HCO3", "GET_CO3", "GET_CO2", "GET_FCO2", "GET_DIC_EST", "GET_ALK_EST"}) {
+    test::Call(std::string(name) + "(8.1, 2050, 2300, 35, 20, 0)");
+  }
+  EXPECT_EQ(ComputedSpeciations(), before + 1);
+  test::Call("GET_OH(8.1, 2050, 2300, 35, 20, 1)");
+  EXPECT_EQ(ComputedSpeciations(), before + 2);
 }
 
 }  // namespace

@@ -1,18 +1,56 @@
-// The tool as people see it: shell sessions in files of cases, and the blocks of the project's front page.
+// The tool as people see it: shell sessions in files of cases, the blocks of the project's front page, and
+// the page of messages, which the tool writes.
 //
 // The input of a case gives files: `--- NAME`, and what is in it. After a command comes what it printed;
 // lines of standard error begin with `2> `, and an exit code other than 0 ends it, as `[1]`.
 #include <gtest/gtest.h>
+#include <sys/wait.h>
 
+#include <cstdlib>
 #include <filesystem>
+#include <nlohmann/json.hpp>
 #include <sstream>
 #include <vector>
 
-#include "cli/shell_session.h"
 #include "support/case_file.h"
+#include "support/temporary_folder.h"
 
 namespace tessal::test {
 namespace {
+
+struct ShellRun {
+  int exitCode = -1;
+  std::string output;
+  std::string errors;
+};
+
+/// A shell in which the tool is at hand: commands run in a folder of their own, beside a copy of the
+/// examples.
+class ShellSession final {
+ public:
+  ShellSession() {
+    std::filesystem::copy(TESSAL_SOURCE_DIR "/examples", folder.Path() / "examples");
+    std::filesystem::create_directory(folder.Path() / "build");
+  }
+
+  /// Makes a file in the session's folder.
+  void Write(const std::string& name, const std::string& content) const { folder.Write(name, content); }
+
+  /// Runs a command, pipes and redirections among it, with an empty standard input.
+  ShellRun Run(const std::string& command) const {
+    const std::string output = results.File("output");
+    const std::string errors = results.File("errors");
+    const std::string line = "unset NO_COLOR; export LC_ALL=C PATH='" TESSAL_TOOL_FOLDER "':\"$PATH\"; cd '" +
+                             folder.Path().string() + "' && (" + command + "\n) </dev/null >'" + output +
+                             "' 2>'" + errors + "'";
+    const int status = std::system(line.c_str());
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadFile(output), ReadFile(errors)};
+  }
+
+ private:
+  TemporaryFolder folder;
+  TemporaryFolder results;
+};
 
 void WriteFiles(const ShellSession& session, const std::string& input) {
   const std::string mark = "--- ";
@@ -78,6 +116,29 @@ std::vector<CaseCall> CallsOn(const std::string& page) {
     }
   }
   return calls;
+}
+
+TEST(Json, IsValidWhateverTheBytes) {
+  const ShellSession session;
+  // Every byte but the quote marks, in a name, an expression and a text.
+  std::string bytes;
+  for (int byte = 1; byte < 256; ++byte) {
+    if (byte != '\'' && byte != '"') bytes += static_cast<char>(byte);
+  }
+  std::string text = ReadFile(TESSAL_SOURCE_DIR "/examples/streeter_phelps.tessal");
+  for (const std::string place : {"k1_20'", "100*DO", "Water temperature"}) {
+    text.insert(text.find(place), bytes);
+  }
+  session.Write("odd \xE9 name.tessal", text);
+  for (const std::string command : {"check --format json", "check --format sarif", "symbols --format json"}) {
+    const ShellRun run = session.Run("tessal " + command + " *.tessal");
+    EXPECT_TRUE(nlohmann::json::accept(run.output)) << command << "\n" << run.errors;
+    EXPECT_GT(run.output.size(), 500U) << command;
+  }
+}
+
+TEST(MessagesPage, ShowsEveryRowOfTheTable) {
+  ExpectPage("../docs/messages.md", ShellSession().Run("tessal explain --markdown").output);
 }
 
 TEST(FrontPage, ShowsWhatTheToolPrints) {

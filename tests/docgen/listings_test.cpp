@@ -1,9 +1,6 @@
 // The page and the overview of every example, as files hold them.
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <vector>
-
 #include "core/template_core.h"
 #include "docgen/html_documentation.h"
 #include "docgen/overview.h"

@@ -1,38 +1,68 @@
 // The page as a browser lays it out, with the style block alone and with a local MathJax.
+// What a script in a page finds out reaches the test through the page's own document, which the browser
+// prints.
 #include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
+#include <array>
+#include <cstdio>
+#include <cstdlib>
 #include <filesystem>
-#include <vector>
+#include <optional>
+#include <sstream>
 
 #include "core/template_core.h"
-#include "docgen/browser.h"
 #include "docgen/html_documentation.h"
 #include "support/temporary_folder.h"
 
 namespace tessal {
 namespace {
 
-using test::BrowserRun;
-using test::FindBrowser;
-using test::RunBrowser;
 using test::TemporaryFolder;
 
-constexpr const char* kConstructs[] = {
-    "a+b",
-    "(a+b)/(c+d)/(e+f)",
-    "a/(b/(c/(d/(e/f))))",
-    "k*(a/(b+c) + 1)",
-    "POW(a+b, c/d)",
-    "SQRT(SQR(a/b) + EXP(-c))",
-    "MAX(a, b+c, d/e, MIN(f, g))",
-    "F()",
-    "IF a<=1 THEN b/c ELSE IF a>2 THEN x ELSE y+1",
-    "1 + IF NOT (a>1 AND b<2) OR c==3 THEN x ELSE y",
-    "Age ::+ 1",
-    "Age ::= IF a>1 THEN 2 ELSE 3",
-    "TRANSFER{(Fish, x>y), (Mass, [XPOS], a+b, c, d, e/f)}",
-    "-a*[YPOS]",
+struct BrowserRun {
+  bool started = false;  ///< whether a document came back
+  int exitCode = -1;
+  std::string document;  ///< after its scripts have run
 };
+
+/// The browser's program, or nothing where none is installed.
+std::optional<std::string> FindBrowser() {
+  const char* path = std::getenv("PATH");
+  std::istringstream folders(path == nullptr ? "" : path);
+  for (std::string folder; std::getline(folders, folder, ':');) {
+    for (const char* name : {"chromium", "chromium-browser", "google-chrome"}) {
+      const std::string program = (std::filesystem::path(folder) / name).string();
+      if (access(program.c_str(), X_OK) == 0) return program;
+    }
+  }
+  return std::nullopt;
+}
+
+/// Opens the page in a headless browser, with a profile of its own that goes when the run ends, and waits no
+/// longer than two minutes.
+BrowserRun RunBrowser(const std::string& browser, const std::string& page) {
+  const TemporaryFolder profile;
+  // The sandbox refuses to run as root.
+  const std::string sandbox = geteuid() == 0 ? " --no-sandbox" : "";
+  const std::string home = profile.Path().string();
+  const std::string line = "HOME='" + home + "' timeout -k 5 120 '" + browser +
+                           "' --headless --disable-gpu --disable-dev-shm-usage --no-first-run" + sandbox +
+                           " --allow-file-access-from-files --virtual-time-budget=20000 --user-data-dir='" +
+                           home + "/profile' --dump-dom 'file://" + page + "' 2>/dev/null </dev/null";
+  BrowserRun run;
+  FILE* pipe = popen(line.c_str(), "r");
+  if (pipe == nullptr) return run;
+  std::array<char, 1U << 14U> buffer{};
+  for (std::size_t count = 0; (count = fread(buffer.data(), 1, buffer.size(), pipe)) > 0;) {
+    run.document.append(buffer.data(), count);
+  }
+  const int status = pclose(pipe);
+  run.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+  run.started = run.exitCode == 0 && run.document.find("</html>") != std::string::npos;
+  return run;
+}
 
 std::size_t CountOf(const std::string& text, const std::string& part) {
   std::size_t count = 0;
@@ -41,9 +71,11 @@ std::size_t CountOf(const std::string& text, const std::string& part) {
   return count;
 }
 
+/// A page with every construct of the language, one of each line of a file.
 std::string PageOfConstructs(bool mathJax) {
   TemplateCore core;
-  for (const char* expression : kConstructs) core.AddAuxiliary().expression.SetText(expression);
+  std::istringstream constructs(test::ReadFile(TESSAL_SOURCE_DIR "/tests/docgen/constructs.txt"));
+  for (std::string line; std::getline(constructs, line);) core.AddAuxiliary().expression.SetText(line);
   core.AddStateVariable().equation.SetText("a+b/c");
   core.RebuildSymbolTable();
   return HtmlDocumentation(core, mathJax, {});

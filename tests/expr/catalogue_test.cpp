@@ -28,9 +28,8 @@ TEST(Catalogues, FunctionsAreTheListing) {
   std::ostringstream listing;
   for (const CatalogueFunction& each : Functions()) {
     listing << each.id << ' ' << each.name << ' ' << each.internalName << " class " << each.functionClass
-            << " flags " << each.firstFlag << each.secondFlag << each.thirdFlag << each.variant << " ("
-            << JoinedArguments(each) << ')' << (each.evaluator == nullptr ? " without evaluator" : "")
-            << (IsDeprecatedFunction(each.id) ? " deprecated" : "");
+            << " (" << JoinedArguments(each) << ')' << (each.evaluator == nullptr ? " without evaluator" : "")
+            << (each.traits.isDeprecated ? " deprecated" : "");
     const std::string counts = CountsComputed(each.name);
     listing << (counts.empty() ? "" : " computed from" + counts) << '\n';
     EXPECT_EQ(FindFunction(each.name), &each);

@@ -4,9 +4,10 @@
 #include <gtest/gtest.h>
 
 #include <functional>
-#include <memory>
 #include <map>
+#include <memory>
 #include <random>
+#include <sstream>
 
 #include "core/error_registry.h"
 #include "docgen/mathml.h"
@@ -170,21 +171,20 @@ INSTANTIATE_TEST_SUITE_P(Cases, Language,
                          testing::Values("scanning.txt", "trees.txt", "failures.txt", "checks.txt",
                                          "output.txt"));
 
+/// What the bars of a text separate.
+std::vector<std::string> PartsOf(const std::string& text) {
+  std::vector<std::string> parts;
+  std::istringstream rest(text);
+  for (std::string part; std::getline(rest, part, '|');) parts.push_back(part);
+  return parts;
+}
+
 /// A random expression: a shape whose @ are expressions and whose # are leaves.
 std::string RandomExpression(std::mt19937& random, int depth) {
-  static const std::vector<std::string> leaves = {"a",    "Kd",     "x_1", "2",   "0.5",
-                                                  "1e-3", "[XPOS]", "$r",  "PI()"};
-  static const std::vector<std::string> shapes = {"@ + @",
-                                                  "@-@",
-                                                  "(@)*#",
-                                                  "(@)/(@)",
-                                                  "-(@)",
-                                                  "MAX(@, @)",
-                                                  "(IF @ >= # THEN @ ELSE @)",
-                                                  "IF(@ >= #;@;@)",
-                                                  "(IF @ >= # AND # != # THEN @ ELSE @)",
-                                                  "IF(NOT (@ >= # OR # < #);@;@)",
-                                                  "#"};
+  static const std::vector<std::string> leaves = PartsOf("a|Kd|x_1|2|0.5|1e-3|[XPOS]|$r|PI()");
+  static const std::vector<std::string> shapes = PartsOf(
+      "@ + @|@-@|(@)*#|(@)/(@)|-(@)|MAX(@, @)|(IF @ >= # THEN @ ELSE @)|IF(@ >= #;@;@)|"
+      "(IF @ >= # AND # != # THEN @ ELSE @)|IF(NOT (@ >= # OR # < #);@;@)|#");
   std::string text;
   for (const char mark : depth == 0 ? "#" : shapes[random() % shapes.size()]) {
     text += mark == '@'   ? RandomExpression(random, depth - 1)

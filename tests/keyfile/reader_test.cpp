@@ -1,7 +1,8 @@
-// Key files as trees: what the reader makes of a text, where it finds each item, and how two trees compare.
-// In the files of cases ^ is a line's end; a comparison has a line for each side.
+// Key files as trees: what the reader makes of a text, where it finds each item, how two trees compare, and
+// the items by themselves. In the files of cases ^ is a line's end; a comparison has a line for each side.
 #include "keyfile/reader.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <random>
@@ -17,13 +18,16 @@ namespace {
 
 using test::TemporaryFolder;
 
+std::string Written(const CKvfBaseItem& item) {
+  std::ostringstream stream;
+  item.Write(stream);
+  return stream.str();
+}
+
 /// The tree of a text, written again; or the reader's failure text.
 std::string Read(const std::string& text) {
   CKvfSectionItem tree;
-  if (ParseKeyFileTree(text, tree) == 0) return KeyFileFailureText();
-  std::ostringstream written;
-  tree.Write(written);
-  return written.str();
+  return ParseKeyFileTree(text, tree) == 0 ? KeyFileFailureText() : Written(tree);
 }
 
 std::string Exchanged(std::string text, char from, char to) {
@@ -156,6 +160,81 @@ TEST(Comparison, RefusesAFaultyOrEndlessExpression) {
   }
   const IgnoredNames backtracking = {"(a+)+b"};
   EXPECT_TRUE(tree.Compare(tree, nullptr, &backtracking, false)) << "too many ways, and no name is ignored";
+}
+
+TEST(KvfValue, ChecksItsTypeAndComparesExactly) {
+  EXPECT_EQ(KvfValue::Integer(1), KvfValue::Integer(1));
+  EXPECT_FALSE(KvfValue::Integer(1) == KvfValue::Real(1.0));
+  EXPECT_FALSE(KvfValue::Quoted("a") == KvfValue::Path("a"));
+  EXPECT_EQ(KvfValue::Path("a").AsString(), "a");
+  EXPECT_THAT([] { KvfValue::Quoted("1").AsInteger(); },
+              testing::ThrowsMessage<std::exception>("Incompatible type!"));
+}
+
+TEST(ItemTree, WritesValuesAndBlocks) {
+  CKvfKeyItem key;
+  key.name = "K";
+  key.values = {KvfValue::Integer(1),     KvfValue::Real(2.5),   KvfValue::Real(0.1),
+                KvfValue::Boolean(false), KvfValue::Quoted("q"), KvfValue::Path("p")};
+  key.comment = " c";
+  EXPECT_EQ(Written(key), "K = 1,2.5,0.1,false,'q',|p| // c\n");
+  CKvfCommentItem block;
+  block.lines = {" one"};
+  EXPECT_EQ(Written(block), "// one\n");
+  block.lines = {"1", "2", "3"};
+  EXPECT_EQ(Written(block), "//1\n//2\n//3\n\n");
+  CKvfSectionItem root;
+  root.AppendChild(block.Copy());
+  EXPECT_EQ(Written(root), "//1\n//2\n//3\n\n\n\n");
+}
+
+TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
+  CKvfSectionItem root;
+  ASSERT_EQ(ParseKeyFileTree("\n[S] //s\nK = 1\nEndSect //e\n", root), 1);
+  CKvfSectionItem other;
+  other.Assign(root);
+  other.Assign(root);
+  other.Assign(other);
+  EXPECT_EQ(other.CountChildren(CKvfBaseItem::kSection), 2U);
+  const auto& copy = static_cast<const CKvfSectionItem&>(*other.ChildByKind(1, CKvfBaseItem::kSection));
+  EXPECT_EQ(copy.parent, &other);
+  EXPECT_EQ(copy.depth, 1U);
+  EXPECT_EQ(copy.Children()[0]->depth, 2U);
+  EXPECT_EQ(copy.Children()[0]->line, 3);
+  EXPECT_EQ(Written(copy), "[S] //s\n   K = 1\nEndSect //e\n\n");
+  EXPECT_EQ(other.ChildByKind(2, CKvfBaseItem::kSection), nullptr);
+  other.startComment = "kept";
+  other.Clear();
+  EXPECT_EQ(other.startComment, "kept");
+  EXPECT_TRUE(other.Children().empty());
+  EXPECT_EQ(other.ItemKind(), CKvfBaseItem::kNone);
+  other.Assign(root);
+  EXPECT_EQ(other.ItemKind(), CKvfBaseItem::kSection);
+  EXPECT_EQ(other.startComment, "");
+}
+
+TEST(ItemTree, KeywordsSayHowTheyDiffer) {
+  const auto key = [](std::vector<std::int32_t> numbers, const char* name = "K") {
+    CKvfKeyItem item;
+    item.name = name;
+    for (const std::int32_t number : numbers) item.values.push_back(KvfValue::Integer(number));
+    return item;
+  };
+  const IgnoredNames ignored = {"K"};
+  const auto compare = [](CKvfKeyItem left, CKvfKeyItem right, const IgnoredNames* names = nullptr) {
+    std::ostringstream report;
+    const bool same = left.Compare(right, &report, names, false);
+    return (same ? "same " : "different ") + report.str();
+  };
+  EXPECT_EQ(compare(key({1, 2}), key({1, 2})), "same K matches\n");
+  EXPECT_EQ(compare(key({1, 2}), key({1, 3})), "different K Value #2 is different\n");
+  EXPECT_EQ(compare(key({1}), key({1, 2})), "different K different value count\n");
+  EXPECT_EQ(compare(key({}), key({})), "different ");
+  EXPECT_EQ(compare(key({1}), key({1}, "L")), "different Different key names K<>L\n");
+  EXPECT_EQ(compare(key({1}), key({1, 2}), &ignored), "same ignored key name K\n");
+  CKvfSectionItem section;
+  EXPECT_FALSE(section.Compare(*key({1}).Copy(), nullptr, nullptr, false));
+  EXPECT_FALSE(key({1}).Copy()->Compare(section, nullptr, nullptr, false));
 }
 
 }  // namespace

@@ -19,10 +19,7 @@ using std::chrono::sys_days;
 using std::chrono::year_month_day;
 
 struct Date {
-  double year;
-  double month;
-  double day;
-
+  double year, month, day;
   bool operator==(const Date&) const = default;
 };
 
@@ -43,28 +40,18 @@ Date TrueDate(int daysAfterEndOf1899) {
           static_cast<double>(static_cast<unsigned>(date.day()))};
 }
 
-TEST(Calendar, AgreesWithTheTrueCalendarForTwoCyclesOfCenturies) {
+TEST(Calendar, AgreesWithTheTrueOneForTwoCyclesOfCenturiesButFor29February1900) {
   constexpr int kDaysIn400Years = 146097;
-  for (int serial = 61; serial <= 61 + 2 * kDaysIn400Years; ++serial) {
-    const Date date = TrueDate(serial);
+  for (int serial = 1 - 2 * kDaysIn400Years; serial <= 61 + 2 * kDaysIn400Years; ++serial) {
+    // Day 60 is one that the true calendar lacks.
+    const Date date = serial == 60 ? Date{1900, 2, 29} : TrueDate(serial < 60 ? serial + 1 : serial);
     ASSERT_EQ(DateOf(serial), date) << serial;
     ASSERT_EQ(SerialDay(date), serial);
+    if (serial <= 60) continue;
+    // Day 60 counts in the serial number only.
+    const double fromJanuary = serial - SerialDay({date.year, 1, 1}) + (date.year == 1900 ? 0 : 1);
+    ASSERT_EQ(DayNumber(date.year, date.month, date.day), fromJanuary) << serial;
   }
-  for (int serial = 59; serial > -2 * kDaysIn400Years; --serial) {
-    const Date date = TrueDate(serial + 1);
-    ASSERT_EQ(DateOf(serial), date) << serial;
-    ASSERT_EQ(SerialDay(date), serial);
-  }
-}
-
-TEST(Calendar, CountsThe29February1900) {
-  EXPECT_EQ(SerialDay({1900, 2, 28}), 59);
-  EXPECT_EQ(SerialDay({1900, 2, 29}), 60);
-  EXPECT_EQ(SerialDay({1900, 3, 1}), 61);
-  EXPECT_EQ(SerialDay({1900, 1, 1}), 1);
-  EXPECT_EQ(DateOf(60.99), (Date{1900, 2, 29}));
-  EXPECT_EQ(SerialDay({2000, 1, 1}), 36526);
-  EXPECT_EQ(SerialDay({2024, 2, 29}), 45351);
 }
 
 TEST(Calendar, FloorsDatesAndRunsOnIntoTheNextYear) {
@@ -95,10 +82,6 @@ TEST(Calendar, TimeOfDayIsCutOffWithinASecond) {
     ASSERT_TRUE(read == second || read == second - 1) << second << " reads " << read;
     ASSERT_EQ(DayOf(time), 17);
   }
-  EXPECT_EQ(HourOf(45000.75), 18);
-  EXPECT_EQ(MinuteOf(45000.0 + 1.0 / 64), 22);
-  EXPECT_EQ(SecondOf(45000.0 + 1.0 / 64), 30);
-  EXPECT_EQ(HourOf(-0.25), 18);
 }
 
 TEST(Calendar, FieldsStayWithinTheirRangesForEveryFraction) {
@@ -128,27 +111,12 @@ TEST(Calendar, WhatIsNoDateGivesNaN) {
         << value;
     EXPECT_TRUE(std::isnan(DayNumber(2000, value, 1))) << value;
   }
-  EXPECT_TRUE(std::isnan(DayNumber(2000, 13, 1)));
-  EXPECT_TRUE(std::isnan(DayNumber(2000, 0, 1)));
-}
-
-TEST(Calendar, DayNumberCountsFromTheFirstOfJanuary) {
-  for (int serial = 61; serial <= 146157; ++serial) {
-    const Date date = TrueDate(serial);
-    const double fromJanuary = SerialDay(date) - SerialDay({date.year, 1, 1}) + 1;
-    // The serial count has one day too many in 1900, before March.
-    const double counted = date.year == 1900 ? fromJanuary - 1 : fromJanuary;
-    ASSERT_EQ(DayNumber(date.year, date.month, date.day), counted) << serial;
-  }
-  EXPECT_EQ(DayNumber(2024, 3.7, 1.5), 61.5);
 }
 
 TEST(Daylight, DayLengthFollowsSeasonAndLatitude) {
   const struct {
     Date date;
-    double latitude;
-    double hours;
-    double tolerance;
+    double latitude, hours, tolerance;
   } rows[] = {
       // Almanacs give the day with refraction and the sun's disc, 10 to 20 minutes longer; the formula
       // stretches the latitude a little.
@@ -173,14 +141,11 @@ TEST(Daylight, DayLengthFollowsSeasonAndLatitude) {
     EXPECT_NEAR(set - rise, 24 * length, 1e-12);
     EXPECT_NEAR((set + rise) / 2, 13, 1e-12);
   }
-  // The formula itself, on day 172 at latitude 52.
-  EXPECT_NEAR(RelativeDayLength(2023, 6, 21, 52), 0.6944563617057338, 1e-12);
 }
 
 TEST(Daylight, MoonIsFullOnTheDaysOfFullMoon) {
   const struct {
-    double year, month, day, hour, minute;
-    double phase;
+    double year, month, day, hour, minute, phase;
   } rows[] = {
       {2010, 1, 30, 6, 18, 1},   {2012, 5, 6, 3, 35, 1},     {2015, 9, 28, 2, 50, 1},
       {2018, 1, 31, 13, 27, 1},  {2023, 8, 31, 1, 35, 1},    {2017, 8, 21, 18, 30, 0.5},
@@ -191,7 +156,6 @@ TEST(Daylight, MoonIsFullOnTheDaysOfFullMoon) {
     // The true moon is up to 14 hours off the mean one.
     EXPECT_NEAR(phase, row.phase, 0.03) << row.year << " " << row.month;
   }
-  EXPECT_EQ(MoonPhase(2009, 12, 31, 20, 12, 36), 1);
   EXPECT_DOUBLE_EQ(MoonPhase(2009, 12, 21, 20, 12, 36), MoonPhase(2010, 1, 10, 20, 12, 36));
 }
 

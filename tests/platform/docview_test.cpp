@@ -35,7 +35,7 @@ TEST(DocView, HintsReachEveryViewButTheSender) {
   document.UpdateAllViews(nullptr, 5);
   EXPECT_EQ(first.hints, (std::vector<int>{5}));
   EXPECT_EQ(second.hints, (std::vector<int>{4, 5}));
-  // A view that goes while the others are told hears no more.
+  // A view that goes while the others are notified hears no more.
   first.leaves = &second;
   document.UpdateAllViews(nullptr, 7);
   EXPECT_EQ(second.hints.size(), 2U);

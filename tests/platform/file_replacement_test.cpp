@@ -79,7 +79,7 @@ TEST(FileReplacement, MakesANewFileWithTheUsualPermissions) {
   EXPECT_EQ(FileSize(folder.File("fresh")), 100'000U);
 }
 
-TEST(FileReplacement, TellsWhyItFails) {
+TEST(FileReplacement, SaysWhyItFails) {
   const TemporaryFolder folder;
   EXPECT_NE(ReplaceFile(folder.Path().string(), "x").find("directory"), std::string::npos);
   EXPECT_NE(ReplaceFile(folder.File("no/such/folder"), "x"), "");

@@ -171,7 +171,7 @@ void ReportFailure(const std::string& path, const ReadingFailure& failure) {
   log.WriteLine("Last read option   " + failure.keyword);
   log.WriteLine("Exception          " + failure.reason);
   log.WriteLine("Using default settings!");
-  NoteCarbonateProblem("Error reading file '" + path + "' at byte " + position + ", behind '" +
+  NoteCarbonateProblem("Error reading file '" + path + "' at byte " + position + ", after '" +
                        failure.keyword + "': " + failure.reason + "; default settings are used");
 }
 
@@ -202,7 +202,7 @@ void ApplyOptions(const OptionRecord& record) {
   }
 }
 
-/// Factors stand before the totals, which are stored times their factor.
+/// Factors come before the totals, which are stored times their factor.
 void ApplyNumbers(const OptionRecord& record) {
   const PerSpecie& factors = record.factors;
   const PerSpecie& totals = record.totals;

@@ -16,7 +16,7 @@ namespace {
 
 constexpr double kNoSuchSpecie = -1;
 
-/// One total: where it stands and how the log calls it. The log has no line for the factor of silicate.
+/// One total: where it is kept and how the log calls it. The log has no line for the factor of silicate.
 struct SpecieRow {
   double PerSpecie::*specie;
   bool comesFromSalinity;

@@ -15,7 +15,7 @@ void SetCarbonateDefaults();
 
 /// Reads settings from a text file of keywords and values, and applies them. A file that isn't there changes
 /// nothing. A faulty one is read up to its fault; then the defaults for a failed reading take the place of
-/// the factors, the totals and the common option. `CarbonateProblem` tells what was wrong.
+/// the factors, the totals and the common option. `CarbonateProblem` says what was wrong.
 void ReadOptionFile(const std::string& path);
 
 /// What the last reading of the option file, or writing of the log since, met with; empty if nothing.

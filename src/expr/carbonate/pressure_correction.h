@@ -15,7 +15,8 @@ struct PressureCoefficients {
 };
 
 /// Sea water. Millero 1995, Geochim. Cosmochim. Acta 59:661-677, table 9, with the misprints corrected as in
-/// Lewis and Wallace 1998, ORNL/CDIAC-105. For silicic acid nothing is published; boric acid stands in.
+/// Lewis and Wallace 1998, ORNL/CDIAC-105. For silicic acid nothing is published; the values of boric acid
+/// are used.
 namespace sea_water_pressure {
 inline constexpr PressureCoefficients kK1{-25.50, 0.1271, 0, -3.08, 0.0877};
 inline constexpr PressureCoefficients kK2{-15.82, -0.0219, 0, 1.13, -0.1475};

@@ -39,7 +39,7 @@ const CarbonateSettings& Carbonate();
 /// The same, to be changed. Each call begins a new revision.
 CarbonateSettings& ChangeCarbonate();
 
-/// Tells whether settings may have changed since a result was computed from them.
+/// Grows whenever settings may have changed: a result computed at an earlier revision may be out of date.
 std::uint64_t CarbonateRevision();
 
 }  // namespace tessal

@@ -29,7 +29,7 @@ class SettingsLog final {
 /// The log of the process. Once opened it stays open until the process ends or another file takes its place.
 SettingsLog& CarbonateLog();
 
-/// Adds to what `CarbonateProblem` tells.
+/// Adds to what `CarbonateProblem` says.
 void NoteCarbonateProblem(std::string_view problem);
 
 /// Forgets the problems of an earlier reading.

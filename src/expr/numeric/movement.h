@@ -1,5 +1,5 @@
 // Movement of particles in the plane. Speeds in any unit; directions are compass directions in degrees,
-// clockwise from north, unless told otherwise.
+// clockwise from north, unless stated otherwise.
 #pragma once
 
 namespace tessal {

@@ -30,7 +30,7 @@ constexpr double kGammaRejectionFrom = 6;
 constexpr double kBinomialRejectionFrom = 25;
 
 /// Rejection takes two or three rounds on the average. It can only come to this many where arguments are so
-/// large that the acceptance has lost its digits; the mean then stands.
+/// large that the acceptance has lost its digits; the mean is then the result.
 constexpr int kMostRejections = 10000;
 
 /// What depends on the mean of the last Poisson deviate only; no mean equals that of a fresh cache.
