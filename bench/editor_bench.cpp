@@ -48,10 +48,10 @@ void FirstPaint(benchmark::State& state) {
 BENCHMARK(FirstPaint)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
 /// Selects an element and commits a changed field of its form over and over.
-void CommitIn(benchmark::State& state, std::uint32_t (*uidOf)(TemplateCore& core)) {
+void CommitIn(benchmark::State& state, Uid (*uidOf)(TemplateCore& core)) {
   const ScratchFolder folder;
   const OpenEditor editor(FileOfSize(folder, state.range(0)));
-  editor.view->SelectById(static_cast<std::int32_t>(uidOf(editor.view->Document().Core())));
+  editor.view->SelectById(uidOf(editor.view->Document().Core()));
   auto* field = editor.view->Form()->findChild<QLineEdit*>("1079");
   int turn = 0;
   for ([[maybe_unused]] auto iteration : state) {
@@ -60,11 +60,11 @@ void CommitIn(benchmark::State& state, std::uint32_t (*uidOf)(TemplateCore& core
   }
 }
 
-std::uint32_t MiddleProcess(TemplateCore& core) {
+Uid MiddleProcess(TemplateCore& core) {
   return core.GetProcess(core.GetProcessCount() / 2).GetUid();
 }
 
-std::uint32_t FirstConstant(TemplateCore& core) {
+Uid FirstConstant(TemplateCore& core) {
   return core.GetConstant(0).GetUid();
 }
 

@@ -54,7 +54,7 @@ bool EditorModule::Load(const QStringList& places) {
   std::string text;
   if (count == nullptr || name == nullptr || !library.resolve("CvGetDocTemplatePtr") || count() < 1 ||
       name(&text) == 0) {
-    failure = QStringLiteral("This file is no module of an editor:\n\n%1").arg(*file);
+    failure = QStringLiteral("This file is not an editor module:\n\n%1").arg(*file);
     return false;
   }
   editorName = QString::fromStdString(text);

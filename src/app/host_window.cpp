@@ -155,7 +155,7 @@ void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
   documents.push_back(std::move(opened));
   OpenDocument& shown = *documents.back();
   {
-    // The view is empty yet, and its messages are the newest.
+    // The view is still empty, and its messages are the newest.
     const QSignalBlocker quiet(tabs);
     tabs->setCurrentIndex(tabs->addTab(shown.Widget(), shown.Title()));
   }
@@ -223,7 +223,7 @@ bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
 }
 
 bool HostWindow::Save(OpenDocument& saved, const QString& path) {
-  // What is being entered belongs into the file, and its messages to the question before it is written.
+  // What is being entered belongs in the file, and its messages to the question before it is written.
   saved.View().OnCommit();
   const bool done = saved.Save(path);
   UpdateTitles();
@@ -268,7 +268,7 @@ void HostWindow::UpdateTitles() {
   for (const auto& open : documents) {
     const int tab = tabs->indexOf(open->Widget());
     if (tab < 0) continue;
-    // An ampersand in a file's name is no mark of a key.
+    // An ampersand in a file's name marks no shortcut key.
     tabs->setTabText(tab, open->Title().replace(u'&', QStringLiteral("&&")));
     tabs->setTabToolTip(tab, open->Path());
   }

@@ -24,7 +24,7 @@ class HostWindow final : public QMainWindow {
 
   void NewDocument();
   /// Opens a file in a tab of its own, or shows the tab that has it already. False when it did not load; the
-  /// document has told why.
+  /// document has then shown why.
   bool OpenFile(const QString& path);
   void OpenFiles(const QStringList& paths);
   /// The document in front; none when no document is open.
@@ -32,8 +32,8 @@ class HostWindow final : public QMainWindow {
   int DocumentCount() const;
   bool SaveCurrent();
   bool SaveCurrentAs();
-  /// Closes the document in front, and asks first when it holds unsaved work. False when the user would
-  /// rather not.
+  /// Closes the document in front, and asks first when it holds unsaved work. False when the user
+  /// declines.
   bool CloseCurrent();
 
  protected:

@@ -46,7 +46,7 @@ int RunHost(QApplication& application) {
 
 int main(int count, char** arguments) {
   QApplication application(count, arguments);
-  // The application takes the user's language along; numbers of templates are read and written without it.
+  // The application sets the user's locale; the numbers of templates are read and written without it.
   std::setlocale(LC_NUMERIC, "C");
   QApplication::setOrganizationName(QStringLiteral("Tessal"));
   QApplication::setApplicationName(QStringLiteral("tessal-editor"));

@@ -15,12 +15,12 @@ constexpr const char* kDocumentText =
     "\nTessal\nTessal\nTESSAL Files (*.tessal)\n.tessal\nTessal.Document\nTessal Setup.Document";
 constexpr const char* kEditorName = "Tessal";
 
-/// The first template of the process reads the option file; what is wrong with that is told once.
+/// The first template of the process reads the option file; what is wrong with that is reported once.
 std::unique_ptr<tessal::CDocument> MakeDocument() {
-  const bool isTold = !tessal::CarbonateProblem().empty();
+  const bool wasReported = !tessal::CarbonateProblem().empty();
   auto made = std::make_unique<tessal::CTessalDoc>(tessal::ScreenDialogs());
   const std::string& problem = tessal::CarbonateProblem();
-  if (!problem.empty() && !isTold) tessal::ScreenDialogs().ShowMessage(problem);
+  if (!problem.empty() && !wasReported) tessal::ScreenDialogs().ShowMessage(problem);
   return made;
 }
 

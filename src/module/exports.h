@@ -1,4 +1,4 @@
-// What the module gives a host: eight functions of the C linkage, found by name. A host asks for the document
+// What the module gives a host: eight functions with C linkage, found by name. A host asks for the document
 // template and drives everything else through it.
 #pragma once
 

@@ -1,7 +1,6 @@
 #include "ui/auto_create_dialog.h"
 
 #include <QDialogButtonBox>
-#include <QPushButton>
 #include <QRadioButton>
 #include <QVBoxLayout>
 

@@ -1,4 +1,4 @@
-// The numbers of the controls that more than one place speaks of. They are the controls' object names too.
+// The numbers of the controls that more than one place names. They are the controls' object names too.
 #pragma once
 
 namespace tessal::control_id {

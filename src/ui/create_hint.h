@@ -1,6 +1,8 @@
 // The argument of the hint that asks the main view to create an element.
 #pragma once
 
+#include <cstdint>
+#include <string>
 #include <utility>
 
 #include "core/creation.h"

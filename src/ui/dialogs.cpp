@@ -56,7 +56,7 @@ class BoxDialogs final : public UserDialogs {
   }
 
   bool OpenWithSystem(const QString& target) override {
-    // Templates travel: a path may stand as another system writes it.
+    // Templates travel: a path may be written as on another system.
     QString path = target;
     if (!QFileInfo::exists(path)) path.replace(u'\\', u'/');
     const QUrl url = QFileInfo::exists(path) ? QUrl::fromLocalFile(QFileInfo(path).absoluteFilePath())

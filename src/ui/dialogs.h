@@ -1,9 +1,8 @@
-// The questions and boxes of the editor. The real ones stand on the screen; tests answer in their place.
+// The questions and boxes of the editor. The real ones appear on the screen; tests answer in their place.
 #pragma once
 
 #include <QString>
 #include <cstdint>
-#include <string>
 
 #include "core/document.h"
 
@@ -22,7 +21,7 @@ class UserDialogs : public DocumentDialogs {
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
   /// Lets the user choose a documentation file; empty when declined.
   virtual QString ChooseDocumentationFile(QWidget* parent, const QString& start) = 0;
-  /// Asks the system to open a file or an address; false when it can not.
+  /// Asks the system to open a file or an address; false when it cannot.
   virtual bool OpenWithSystem(const QString& target) = 0;
   /// Opens the help at the topic with this number.
   virtual void ShowHelp(QWidget* parent, int topic) = 0;

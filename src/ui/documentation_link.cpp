@@ -15,7 +15,7 @@ constexpr int kFileNotFound = 2;
 constexpr int kNoManualsAddress = -100;
 const QString kManualsFolder = QStringLiteral("Corvane/Manuals/CORVANE");
 
-/// The name behind the last folder, of whichever system the path is.
+/// The name after the last folder, whichever system the path comes from.
 QString BareName(const QString& path) {
   return path.sliced(std::max(path.lastIndexOf(u'/'), path.lastIndexOf(u'\\')) + 1);
 }

@@ -7,8 +7,8 @@ namespace tessal {
 
 class UserDialogs;
 
-/// Opens the text as it stands, then below the manuals folder, then behind the manuals address. Empty when
-/// one of them opened, or when the text is empty; otherwise what the user is told.
+/// Opens the text as it is, then below the manuals folder, then below the manuals address. Empty when
+/// one of them opened, or when the text is empty; otherwise the message for the user.
 QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs);
 
 }  // namespace tessal

@@ -315,7 +315,7 @@ void CElementForm::FormToItem() {
     if (control.field->editor != FieldEditor::Symbol || !IsEdited(control)) continue;
     const std::string edited = FromScreen(TextIn(*control.editor), element->symbol.Text());
     const std::string entered(CleanText(edited));
-    // Blanks around the symbol that it has already go without a rename.
+    // Blanks around the present symbol are dropped without a rename.
     isStale = entered == element->symbol.Text();
     if (isStale) continue;
     // The other fields are not written in this commit.
@@ -359,7 +359,7 @@ bool CElementForm::Store(const Control& control, CEL_Element& element) {
 bool CElementForm::StoreText(const QString& text, CEL_Property& property) {
   const std::string entered = FromScreen(text, property.Text());
   property.SetText(CleanText(entered));
-  // The form is filled anew even when blanks were all that changed.
+  // The form is filled again even when blanks were all that changed.
   return true;
 }
 

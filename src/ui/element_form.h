@@ -15,7 +15,6 @@ class QLineEdit;
 
 namespace tessal {
 
-class CAutoRichEditCtrl;
 class CEL_Property;
 
 enum class FieldEditor {
@@ -68,7 +67,7 @@ class CElementForm : public CRightPaneBase {
     const FormField* field = nullptr;
     QWidget* editor = nullptr;
     QLabel* label = nullptr;
-    QWidget* cell = nullptr;  ///< the editor with what stands beside it
+    QWidget* cell = nullptr;  ///< the editor with what lies beside it
     QLabel* note = nullptr;   ///< under an expression: what the parser says
     QString shown;            ///< the text that the last load gave a line
   };
@@ -80,7 +79,7 @@ class CElementForm : public CRightPaneBase {
   void AddField(const FormField& field);
   /// Lays the fields out; short ones share a row when there are two columns.
   void Arrange(int columnCount);
-  /// Makes the editor of a field. The cell that it stands in may hold more beside it.
+  /// Makes the editor of a field. The cell that it lies in may hold more beside it.
   QWidget* MakeEditor(const FormField& field, Control& control);
   QLineEdit* MakeLine(const FormField& field, QWidget* parent);
   QWidget* MakeLines();

@@ -16,7 +16,7 @@ namespace {
 
 constexpr int kIndent = 14;
 
-/// A node with what stands behind it.
+/// A node with its data.
 class ElementItem final : public QTreeWidgetItem {
  public:
   CItemData data;
@@ -53,21 +53,18 @@ QTreeWidgetItem* CElementTree::InsertFixed(QTreeWidgetItem& parent, int place, U
 }
 
 template <class Elements>
-void CElementTree::InsertFolder(Uid id, const Elements& elements) {
-  QTreeWidgetItem* folder = InsertFixed(*RootItem(), RootItem()->childCount(), id);
-  for (const auto& element : elements) InsertElement(*folder, *element, folder->childCount());
+void CElementTree::InsertAll(QTreeWidgetItem& folder, const Elements& elements) {
+  for (const auto& element : elements) InsertElement(folder, *element, folder.childCount());
 }
 
 void CElementTree::Build(TemplateCore& core) {
   clear();
   groupItems.clear();
   QTreeWidgetItem* root = InsertFixed(*invisibleRootItem(), 0, folder_id::kRoot);
-  InsertFolder(folder_id::kStateVariables, core.StateVariables());
-  InsertFolder(folder_id::kConstants, core.Constants());
-  InsertFolder(folder_id::kForcings, core.Forcings());
-  InsertFolder(folder_id::kAuxiliaries, core.Auxiliaries());
-  InsertFolder(folder_id::kProcesses, core.Processes());
-  InsertFolder(folder_id::kDerivedOutputs, core.DerivedOutputs());
+  ForEachHeadedCollection([this, root, &core](const auto& collection) {
+    const Uid id = NodeRowOfElements(collection.kind).folder;
+    InsertAll(*InsertFixed(*root, root->childCount(), id), core.Elements().*collection.elements);
+  });
   if (core.GetMisc() != nullptr) ShowMisc(core);
   if (core.GetSpecieCount() > 0) ShowParticles(core);
   root->setExpanded(true);
@@ -87,34 +84,26 @@ QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_
 
 QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie) {
   QTreeWidgetItem* branch = InsertElement(folder, specie, folder.childCount());
-  const auto addFolder = [this, branch, &specie](ElementKind listKind, const auto& members) {
-    const CEL_Element& head = specie.Head(listKind);
-    QTreeWidgetItem* list =
-        Insert(*branch, branch->childCount(), listKind, head.GetUid(), head.symbol.Text());
-    for (const auto& member : members) InsertElement(*list, *member, list->childCount());
+  const auto addList = [this, branch, &specie](ElementKind listKind) {
+    return InsertElement(*branch, specie.Head(listKind), branch->childCount());
   };
-  // The forcings of a class are kept out on purpose.
-  addFolder(ElementKind::SpecieStateVariableList, specie.stateVariables);
-  addFolder(ElementKind::SpecieConstantList, specie.constants);
-  addFolder(ElementKind::SpatialFunctionList, specie.spatialFunctions);
-  addFolder(ElementKind::ArithmeticExpressionList, specie.arithmeticExpressions);
-  addFolder(ElementKind::HorizontalVectorList, specie.horizontalVectors);
-  addFolder(ElementKind::VerticalEquationList,
-            std::vector<const CEL_Element*>{specie.verticalEquation.get()});
+  ForEachMemberList([this, &specie, &addList](const auto& list) {
+    // The forcings of a class are kept out on purpose.
+    if (list.kind == ElementKind::SpecieForcing) return;
+    InsertAll(*addList(list.listKind), specie.*list.members);
+  });
+  InsertElement(*addList(ElementKind::VerticalEquationList), *specie.verticalEquation, 0);
   return branch;
 }
 
 void CElementTree::ShowMisc(TemplateCore& core) {
   if (FindById(folder_id::kMiscellaneous) != nullptr || core.GetMisc() == nullptr) return;
-  // Behind the collections and ahead of the particle classes.
+  // After the collections and before the particle classes.
   QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses);
   const int place = particles == nullptr ? RootItem()->childCount() : RootItem()->indexOfChild(particles);
   QTreeWidgetItem* settings = InsertFixed(*RootItem(), place, folder_id::kMiscellaneous);
   const auto& functions = core.GetMisc()->ExternalFunctions();
-  if (!functions.empty()) {
-    QTreeWidgetItem* list = InsertFixed(*settings, 0, folder_id::kPluginFunctions);
-    for (const auto& function : functions) InsertElement(*list, *function, list->childCount());
-  }
+  if (!functions.empty()) InsertAll(*InsertFixed(*settings, 0, folder_id::kPluginFunctions), functions);
   InsertFixed(*settings, settings->childCount(), folder_id::kVisibilityGroups);
   for (const VisibilityGroup& group : core.GetMisc()->Visibilities().groups) AddGroup(group.name);
 }

@@ -1,8 +1,8 @@
-// The tree of a template: a node for each collection and each element, with what stands behind it.
+// The tree of a template: a node for each collection and each element, with its data.
 #pragma once
 
 #include <QTreeWidget>
-#include <cstdint>
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -38,10 +38,10 @@ class CElementTree final : public QTreeWidget {
   void ShowMisc(TemplateCore& core);
   void ShowParticles(TemplateCore& core);
   void RemoveBranch(Uid folderId);
-  /// Removes a node and what stands behind it; the root stays.
+  /// Removes a node with its branch; the root stays.
   static void RemoveNode(QTreeWidgetItem& item);
   void AddGroup(const std::string& name);
-  /// Removes the node of the group at a position from 0; the groups behind it move up by one number.
+  /// Removes the node of the group at a position from 0; the groups after it move up by one number.
   void RemoveGroup(std::size_t position);
   /// Exchanges a node with a neighbour; nothing happens without one.
   void MoveNode(QTreeWidgetItem& item, int step);
@@ -52,7 +52,7 @@ class CElementTree final : public QTreeWidget {
   /// Inserts the node that is no element and has this id.
   QTreeWidgetItem* InsertFixed(QTreeWidgetItem& parent, int place, Uid id);
   template <class Elements>
-  void InsertFolder(Uid id, const Elements& elements);
+  void InsertAll(QTreeWidgetItem& folder, const Elements& elements);
 
   std::vector<QTreeWidgetItem*> groupItems;
 };

@@ -1,6 +1,5 @@
 #include "ui/error_list.h"
 
-#include <QHeaderView>
 #include <QSignalBlocker>
 #include <algorithm>
 
@@ -28,7 +27,7 @@ CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
   setUniformRowHeights(true);
   setAllColumnsShowFocus(true);
   setAccessibleName(strings::kMessages);
-  // A choice makes the list anew: where a click also activates, the second signal finds its row gone.
+  // A choice fills the list again: where a click also activates, the second signal finds its row gone.
   const auto choose = [this](const QTreeWidgetItem* row) {
     if (row != nullptr) emit ElementChosen(Uid{row->data(0, kUidRole).toInt()});
   };
@@ -38,8 +37,8 @@ CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
 
 std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
   std::vector<Row> rows;
-  // The users of the undefined symbols stand on top, the last ones first: each is put at the place of its
-  // symbol, ahead of what stands there.
+  // The users of the undefined symbols lie on top, the last ones first: each is put at the place of its
+  // symbol, before what lies there.
   std::size_t place = 0;
   for (const auto& undefined : core.UndefinedSymbols()) {
     const QString message = strings::kUndefinedSymbol + ToScreen(undefined->symbol);

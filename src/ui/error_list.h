@@ -16,7 +16,8 @@ class CErrorList final : public QTreeWidget {
  public:
   explicit CErrorList(QWidget* parent);
 
-  /// Validates the template anew and fills the list. The selected row stays selected where it is still there.
+  /// Validates the template again and fills the list. The selected row stays selected where it is still
+  /// there.
   void RefreshErrorList(TemplateCore& core);
 
  signals:

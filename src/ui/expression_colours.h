@@ -2,7 +2,6 @@
 #pragma once
 
 #include <QColor>
-#include <cstdint>
 
 namespace tessal {
 
@@ -19,7 +18,7 @@ struct TokenStyle {
 
 TokenStyle StyleOfToken(const ExpressionToken& token, const TemplateCore& core);
 
-/// A told colour, made for a light ground, as it reads on the ground at hand: unchanged on a light one,
+/// A colour that is made for a light ground, as it is shown on a given one: unchanged on a light one,
 /// lightened on a dark one.
 QColor ReadableColour(const QColor& colour, const QColor& ground);
 

@@ -16,7 +16,7 @@ namespace tessal {
 
 namespace {
 
-/// Where the bytes of a text stand on the screen. A comment may hold characters of several bytes.
+/// Where the bytes of a text lie on the screen. A comment may hold characters of several bytes.
 class ScreenPositions final {
  public:
   explicit ScreenPositions(const std::string& text)
@@ -38,7 +38,7 @@ class ScreenPositions final {
   int position = 0;
 };
 
-/// A look at a text neither takes over nor leaves behind the comment that another text has left open.
+/// A comment that one text leaves open must not reach the next that is scanned for its looks.
 class ScannerRest final {
  public:
   ScannerRest() { ResetExpressionScanner(); }
@@ -108,8 +108,8 @@ Uid CAutoRichEditCtrl::LinkAtCaret() const {
   QTextCursor caret = textCursor();
   const QString before = caret.charFormat().anchorHref();
   caret.movePosition(QTextCursor::NextCharacter);
-  const QString behind = caret.charFormat().anchorHref();
-  return ElementNamed(behind.isEmpty() ? before : behind);
+  const QString after = caret.charFormat().anchorHref();
+  return ElementNamed(after.isEmpty() ? before : after);
 }
 
 Uid CAutoRichEditCtrl::ElementNamed(const QString& name) const {

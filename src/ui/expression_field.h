@@ -17,7 +17,7 @@ class CAutoRichEditCtrl final : public CPlainTextField {
  public:
   CAutoRichEditCtrl(const TemplateCore& templateCore, QWidget* parent);
 
-  /// Replaces the content, and colours it when it scans cleanly. The caret stands at the start.
+  /// Replaces the content, and colours it when it scans cleanly. The caret is at the start.
   void SetColouredText(const std::string& text);
 
   /// The parser's message on the present content; empty when it parses. Leaves no trace in the scanner.
@@ -29,7 +29,7 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   QString TipOf(Uid uid) const;
 
  signals:
-  /// A link was clicked with the right button, or the menu was asked for while the caret stood on it.
+  /// A link was clicked with the right button, or the menu was asked for while the caret was on it.
   void LinkActivated(Uid uid);
 
  protected:

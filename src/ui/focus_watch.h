@@ -1,4 +1,4 @@
-// What widgets do not tell of themselves, or do too eagerly.
+// What widgets do not report by themselves, or do too eagerly.
 #pragma once
 
 #include <functional>

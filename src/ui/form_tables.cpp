@@ -3,7 +3,7 @@
 #include <QLabel>
 #include <QVBoxLayout>
 
-#include "core/document.h"
+#include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
 #include "ui/strings.h"

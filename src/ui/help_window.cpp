@@ -36,8 +36,7 @@ QTextBrowser& HelpWindowOf(QWidget& owner) {
   return *window;
 }
 
-}  // namespace
-
+/// The path of the page, or of the first place where it was looked for when it lies nowhere.
 QString HelpPagePath() {
   const QDir programs(QCoreApplication::applicationDirPath());
   for (const char* folder : kFolders) {
@@ -46,6 +45,8 @@ QString HelpPagePath() {
   }
   return programs.filePath(kPage);
 }
+
+}  // namespace
 
 void OpenHelp(QWidget* parent, int topic) {
   const QString path = HelpPagePath();

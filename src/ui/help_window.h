@@ -2,19 +2,14 @@
 // folder of shared files, with an anchor for each topic.
 #pragma once
 
-#include <QString>
-
 class QWidget;
 
 namespace tessal {
 
-/// Topics stand in the page under their help number plus this.
+/// The anchor of a topic is its help number plus this.
 inline constexpr int kFirstHelpTopic = 131072;
 
-/// The path of the page, or of the first place where it was looked for when it lies nowhere.
-QString HelpPagePath();
-
-/// Shows the page at a topic, in one window beside the asking one; tells the user when there is no page.
+/// Shows the page at a topic, in one window beside the asking one; says so when there is no page.
 void OpenHelp(QWidget* parent, int topic);
 
 }  // namespace tessal

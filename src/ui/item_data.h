@@ -1,10 +1,9 @@
-// What stands behind each node of the element tree, and the history of the nodes that were visited.
+// The data of each node of the element tree, and the history of the nodes that were visited.
 #pragma once
 
 #include <cstddef>
 #include <cstdint>
 #include <list>
-#include <map>
 #include <string>
 
 #include "elements/element_kind.h"
@@ -38,8 +37,6 @@ struct CItemData {
   Uid id = Uid::None;           ///< the element's identity, or a folder's
   std::int32_t groupIndex = 0;  ///< the number from 1 of a visibility group's node, else 0
   ElementKind kind = ElementKind::None;
-  std::map<std::string, std::string>
-      viewState;  ///< what a form keeps for the node while the document is open
 };
 
 struct CHistoryData {

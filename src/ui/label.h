@@ -11,7 +11,7 @@ class CLabel final : public QLabel {
  public:
   explicit CLabel(QWidget* parent) : QLabel(parent) { setTextFormat(Qt::PlainText); }
 
-  /// A height that hung on the width would keep a form from shrinking to what its fields need.
+  /// A height that depended on the width would keep a form from shrinking to what its fields need.
   bool hasHeightForWidth() const override { return false; }
 
   /// The weight on the scale from 1 to 1000 (400 normal, 700 bold), and the height in pixels.

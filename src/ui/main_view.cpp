@@ -11,7 +11,6 @@
 #include <QToolButton>
 #include <QVBoxLayout>
 #include <algorithm>
-#include <array>
 
 #include "core/document.h"
 #include "ui/child.h"
@@ -139,7 +138,7 @@ QWidget* CMainView::MakeTitleDetail() {
   title = MakeChild<CLabel>(this);
   title->setObjectName(QString::number(control_id::kTitle));
   title->SetFontWeight(kTitleWeight);
-  // Where the user's font is larger than usual, the title is no smaller than what stands under it.
+  // Where the user's font is larger than usual, the title is no smaller than the text under it.
   title->SetFontHeight(std::max(kTitleHeight, QFontInfo(font()).pixelSize() + 2));
 
   auto* area = MakeChild<QScrollArea>(this);

@@ -11,7 +11,6 @@
 
 class QAction;
 class QMenu;
-class QSplitter;
 class QToolBar;
 class QTreeWidgetItem;
 class QVBoxLayout;
@@ -46,7 +45,6 @@ class CMainView final : public QWidget, public CView {
   CErrorList& ErrorList() const { return *errorList; }
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
-  const CNavigationHistory& History() const { return history; }
   /// The number of the help topic for the selected node.
   int HelpNumber() const { return helpNumber; }
   QMenu& HistoryMenu() const { return *historyMenu; }

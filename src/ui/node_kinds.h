@@ -2,7 +2,6 @@
 // rows. A new kind of node is a row here, with a form of its own where it has one.
 #pragma once
 
-#include <cstdint>
 #include <memory>
 #include <string>
 

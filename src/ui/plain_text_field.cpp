@@ -1,7 +1,6 @@
 #include "ui/plain_text_field.h"
 
 #include <QMimeData>
-#include <QSignalBlocker>
 #include <algorithm>
 
 namespace tessal {
@@ -33,7 +32,7 @@ QString CPlainTextField::ContentText() const {
 }
 
 void CPlainTextField::TakeOutExcess() {
-  // Behind the last character stands the end of the document.
+  // After the last character comes the end of the document.
   const int excess = document()->characterCount() - 1 - limit;
   if (excess <= 0) return;
   const int end = std::min(changedAt + changedCount, document()->characterCount() - 1);

@@ -15,16 +15,16 @@ class CPlainTextField : public QTextEdit {
  public:
   explicit CPlainTextField(QWidget* parent);
 
-  /// Replaces the content. The caret stands at the start, and nothing is left to undo.
+  /// Replaces the content. The caret is at the start, and nothing is left to undo.
   void ShowText(const QString& text);
-  /// The content to the letter, lines parted by line feeds.
+  /// The content to the letter, lines separated by line feeds.
   QString ContentText() const;
   /// Whether the content is another than the one shown last.
   bool IsEdited() const { return ContentText() != shown; }
 
  protected:
   void insertFromMimeData(const QMimeData* source) override;
-  /// Typing behind a word must not take over that word's looks.
+  /// Typing after a word must not take over that word's looks.
   void keyPressEvent(QKeyEvent* key) override;
 
  private:

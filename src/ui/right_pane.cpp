@@ -79,7 +79,7 @@ void CRightPaneBase::RequestCommit() {
   Document().UpdateAllViews(nullptr, hint::kCommit);
 }
 
-bool CRightPaneBase::Rename(const std::string& newSymbol) {
+void CRightPaneBase::Rename(const std::string& newSymbol) {
   const CEL_Element* element = Element();
   const std::string oldSymbol = element->symbol.Text();
   std::string refusal = RenameRefusal(Core(), newSymbol);
@@ -89,9 +89,7 @@ bool CRightPaneBase::Rename(const std::string& newSymbol) {
                                                       newSymbol + "'?"));
     if (!Core().RenameSymbol(oldSymbol, newSymbol, rewrite)) refusal = RenameFailure(newSymbol);
   }
-  if (refusal.empty()) return true;
-  Dialogs().Warn(this, ToScreen(refusal));
-  return false;
+  if (!refusal.empty()) Dialogs().Warn(this, ToScreen(refusal));
 }
 
 }  // namespace tessal

@@ -3,10 +3,8 @@
 #pragma once
 
 #include <QWidget>
-#include <cstdint>
 #include <string>
 
-#include "core/creation.h"
 #include "ui/item_data.h"
 
 namespace tessal {
@@ -32,14 +30,12 @@ class CRightPaneBase : public QWidget {
 
   /// Fills the form from its element. No control counts as edited meanwhile.
   void Load();
-  /// Writes the form to its element, offers to create undefined symbols, and loads anew what has changed.
+  /// Writes the form to its element, offers to create undefined symbols, and loads again what has changed.
   /// A commit that comes while one is running does nothing.
   void Commit();
 
-  /// Turns the form deaf for good: its node may go before it does.
+  /// From now on nothing that its controls report counts: its node may go before it does.
   void Close() { closed = true; }
-
-  bool IsDirty() const { return dirty; }
 
  protected:
   virtual void ItemToForm() {}
@@ -48,7 +44,6 @@ class CRightPaneBase : public QWidget {
   CTessalDoc& Document() const { return where.document; }
   TemplateCore& Core() const;
   UserDialogs& Dialogs() const { return where.dialogs; }
-  CItemData& Item() const { return where.item; }
   CEL_Element* Element() const;
 
   // What controls report. Nothing counts while the form is being filled or written.
@@ -56,8 +51,8 @@ class CRightPaneBase : public QWidget {
   void NoteFocusLost();
   void NoteChosen();
 
-  /// Asks what a new symbol needs asking, and renames. False, with a message shown, when the name is refused.
-  bool Rename(const std::string& newSymbol);
+  /// Asks what a new symbol needs asking, and renames; shows a message when the name is refused.
+  void Rename(const std::string& newSymbol);
 
  private:
   /// Asks about each undefined symbol that was not asked about yet; true when an element was created.

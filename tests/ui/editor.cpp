@@ -4,18 +4,13 @@
 
 #include <QApplication>
 #include <QInputMethodEvent>
-#include <QLabel>
 #include <QMenu>
 #include <QTest>
 #include <QTimer>
 #include <QTreeWidgetItemIterator>
-#include <iterator>
-#include <map>
-#include <sstream>
 #include <stdexcept>
 
 #include "support/template_text.h"
-#include "ui/text_bytes.h"
 
 namespace tessal::test {
 
@@ -23,22 +18,21 @@ namespace {
 
 constexpr const char* kSmallModel = "state S p\nconstant k 1\nforcing f\nauxiliary a k*f\nprocess p a*S";
 
+template <class Value>
+Value TakeFirst(QList<Value>& values, Value whenUsedUp) {
+  return values.isEmpty() ? whenUsedUp : values.takeFirst();
+}
+
 }  // namespace
 
 bool ScriptedUser::Ask(QWidget* /*parent*/, const QString& question) {
   log.append(question);
-  if (answers.empty()) return true;
-  const bool answer = answers.front();
-  answers.pop_front();
-  return answer;
+  return TakeFirst(answers, true);
 }
 
 int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::uint32_t mask) {
   log.append(QStringLiteral("kind of %1 in %2").arg(symbol).arg(mask));
-  if (choices.empty()) return -1;
-  const int choice = choices.front();
-  choices.pop_front();
-  return choice;
+  return TakeFirst(choices, -1);
 }
 
 bool ScriptedUser::OpenWithSystem(const QString& target) {
@@ -49,33 +43,7 @@ bool ScriptedUser::OpenWithSystem(const QString& target) {
 std::string ModelText(std::string lines) {
   constexpr std::string_view kSmall = "small";
   if (lines.starts_with(kSmall)) lines.replace(0, kSmall.size(), kSmallModel);
-  using Words = std::vector<std::string>;
-  static const std::map<std::string, void (*)(TemplateText&, const Words&)> kLines = {
-      {"state", [](auto& text, auto& words) { text.StateVariable(words.at(1), words.at(2)); }},
-      {"constant", [](auto& text, auto& words) { text.Constant(words.at(1), words.at(2)); }},
-      {"forcing", [](auto& text, auto& words) { text.Forcing(words.at(1)); }},
-      {"auxiliary", [](auto& text, auto& words) { text.Auxiliary(words.at(1), words.at(2)); }},
-      {"process", [](auto& text, auto& words) { text.Process(words.at(1), words.at(2)); }},
-      {"output", [](auto& text, auto& words) { text.DerivedOutput(words.at(1)); }},
-      {"class",
-       [](auto& text, auto& words) {
-         text.Specie(words.at(1), words.at(2), {{words.at(2), words.at(3)}});
-       }},
-      {"with", [](auto& text, auto& words) { text.With(words.at(1), words.at(2)); }},
-      {"without", [](auto& text, auto& words) { text.Without(words.at(1)); }},
-      {"settings",
-       [](auto& text, auto& words) {
-         text.Misc(words.size() < 2 ? "" : words[1] + " = " + words.at(2) + "\n");
-       }},
-  };
-  TemplateText text;
-  std::istringstream input(lines);
-  for (std::string line; std::getline(input, line);) {
-    std::istringstream parts(line);
-    const Words words(std::istream_iterator<std::string>(parts), {});
-    kLines.at(words.at(0))(text, words);
-  }
-  return text.Text();
+  return TemplateFromNotation(lines);
 }
 
 Editor::Editor(const std::string& templateText)

@@ -7,7 +7,6 @@
 #include <QStringList>
 #include <QTreeWidgetItem>
 #include <cstdint>
-#include <deque>
 #include <memory>
 #include <string>
 #include <utility>
@@ -44,8 +43,8 @@ class ScriptedUser final : public UserDialogs {
   /// What was asked and shown since the last call.
   QStringList TakeLog() { return std::exchange(log, {}); }
 
-  std::deque<bool> answers;  ///< to questions; Yes when used up
-  std::deque<int> choices;   ///< of kinds; skips when used up
+  QList<bool> answers;  ///< to questions; Yes when used up
+  QList<int> choices;   ///< of kinds; skips when used up
   QString documentationFile;
   QStringList openable;  ///< what the system can open
 
@@ -53,16 +52,14 @@ class ScriptedUser final : public UserDialogs {
   QStringList log;
 };
 
-/// Builds a template from lines such as "constant k 2" or "auxiliary a k*f"; "small" at the start is one
-/// element of each kind with a symbol: a uses k and f, p uses a, and S is made of p.
+/// Builds a template from its notation; "small" at the start is one element of each kind with a symbol: a
+/// uses k and f, p uses a, and S is made of p.
 std::string ModelText(std::string lines);
 
 class Editor final {
  public:
   /// Opens a template; one that does not open throws.
   explicit Editor(const std::string& templateText);
-  Editor(const Editor&) = delete;
-  Editor& operator=(const Editor&) = delete;
   ~Editor();
 
   TemplateCore& Core() { return document->Core(); }
@@ -87,7 +84,6 @@ class Editor final {
   }
   /// What a control shows.
   static QString TextOf(const QWidget& control);
-  QString Text(const QString& label) { return TextOf(Labelled(label)); }
   /// Types over what a field holds; the focus stays there.
   void Type(const QString& label, const QString& text);
   void LeaveField() { Tree().setFocus(); }

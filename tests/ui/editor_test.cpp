@@ -8,7 +8,9 @@
 #include <QRadioButton>
 #include <QTest>
 #include <filesystem>
+#include <map>
 
+#include "support/case_file.h"
 #include "ui/auto_create_dialog.h"
 #include "ui/documentation_link.h"
 #include "ui/editor.h"
@@ -55,12 +57,12 @@ TEST(Texts, WhatIsPastedArrivesAsPlainTextWithinTheLimit) {
 
 TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
   const std::string longText(5000, 'x');
-  Editor editor(ModelText("small\nconstant long 1\nwith DESCRIPTION |" + longText + "|\nwith ONLINE_HELP |" +
-                          longText + "|"));
+  Editor editor(
+      ModelText("constant long 1 | DESCRIPTION=|" + longText + "|; ONLINE_HELP=|" + longText + "|"));
   editor.Select("long");
   editor.Type("Unit", "kg");
   editor.LeaveField();
-  const CEL_Constant& constant = editor.Core().GetConstant(1);
+  const CEL_Constant& constant = editor.Core().GetConstant(0);
   EXPECT_EQ(constant.unit.Text(), "kg");
   EXPECT_EQ(constant.description.Text(), longText);
   EXPECT_EQ(constant.onlineHelp.Text(), longText);
@@ -76,18 +78,14 @@ TEST(Colours, StayReadableOnADarkGround) {
 }
 
 TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
-  struct Row {
-    const char* button;
-    int chosen;
-  };
-  for (const Row& row : {Row{"OK", 6}, Row{"Skip", -1}, Row{"", -1}}) {
+  for (const auto& [caption, chosen] : std::map<QString, int>{{"OK", 6}, {"Skip", -1}, {"", -1}}) {
     CAutoCreateDlg dialog("rate", 486, nullptr);
     dialog.Radios()[6]->click();
     for (QPushButton* button : dialog.findChildren<QPushButton*>()) {
-      if (button->text().remove(u'&') == row.button) button->click();
+      if (button->text().remove(u'&') == caption) button->click();
     }
-    if (*row.button == '\0') dialog.accept();
-    EXPECT_EQ(dialog.ChosenIndex(), row.chosen) << row.button;
+    if (caption.isEmpty()) dialog.accept();
+    EXPECT_EQ(dialog.ChosenIndex(), chosen) << caption.toStdString();
   }
 }
 
@@ -108,36 +106,21 @@ TEST(History, KeepsThirtyNodesNewestFirst) {
 TEST(Documentation, IsLookedForInThreePlaces) {
   test::ScriptedUser user;
   const test::TemporaryFolder root;
-  std::filesystem::create_directories(root.Path() / "Corvane/Manuals/CORVANE");
-  root.Write("Corvane/Manuals/CORVANE/there.pdf", "x");
+  const std::string folder = "Corvane/Manuals/CORVANE";
+  std::filesystem::create_directories(root.Path() / folder);
+  user.openable = {"here.pdf", QString::fromStdString(root.Write(folder + "/there.pdf", "x")),
+                   "http://manuals.example/2017/General/known.pdf"};
   qputenv("TESSAL_INSTALL_ROOT", root.Path().string().c_str());
-  const QString manual = QString::fromStdString(root.File("Corvane/Manuals/CORVANE/there.pdf"));
-  const QString address = "http://manuals.example/2017/General/known.pdf";
-  user.openable = {"here.pdf", manual, address};
-  struct Row {
-    const char* text;
-    const char* manuals;
-    QStringList tried;
-    const char* failure;
-  };
-  const Row rows[] = {
-      {"", "", {}, ""},
-      {"here.pdf", "", {"open here.pdf"}, ""},
-      {"there.pdf", "", {"open there.pdf", "open " + manual}, ""},
-      {"gone.pdf", "", {"open gone.pdf"}, "Failed to open\ngone.pdf\n\nReturn code -100 (0xff9c)"},
-      {"docs/known.pdf", "http://manuals.example", {"open docs/known.pdf", "open " + address}, ""},
-      {"docs\\gone.pdf",
-       "http://manuals.example",
-       {"open docs\\gone.pdf", "open http://manuals.example/2017/General/gone.pdf"},
-       "Failed to open\ndocs\\gone.pdf\n\nReturn code 2 (0x0002)"},
-  };
-  for (const Row& row : rows) {
-    qputenv("TESSAL_MANUALS_URI", row.manuals);
-    EXPECT_EQ(OpenDocumentationFile(row.text, user), row.failure);
-    EXPECT_EQ(user.TakeLog(), row.tried) << row.text;
+  QString text;
+  for (const QString name : {"", "here.pdf", "there.pdf", "gone.pdf", "docs/known.pdf", "docs\\gone.pdf"}) {
+    qputenv("TESSAL_MANUALS_URI", name.startsWith("docs") ? "http://manuals.example" : "");
+    const QString failure = OpenDocumentationFile(name, user);
+    text += "== " + name + '\n' + user.TakeLog().join(u'\n') + '\n' + failure + '\n';
   }
   qunsetenv("TESSAL_MANUALS_URI");
   qunsetenv("TESSAL_INSTALL_ROOT");
+  text.replace(QString::fromStdString(root.Path().string()), "ROOT");
+  test::ExpectListing("ui/cases/documentation.txt", text.toStdString());
 }
 
 }  // namespace

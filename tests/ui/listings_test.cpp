@@ -4,6 +4,7 @@
 
 #include <QComboBox>
 #include <QPushButton>
+#include <iterator>
 #include <map>
 
 #include "support/case_file.h"
@@ -43,7 +44,7 @@ std::string NodeText(Editor& editor, const QTreeWidgetItem& item, const CItemDat
   return text + (item.isExpanded() ? ", open\n" : "\n");
 }
 
-/// A line for the contents of a form. A control is described ahead of it where it is not as it was the last
+/// A line for the contents of a form. A control is described before it where it is not as it was the last
 /// time in a form for that kind: number, class, label, state and choices.
 std::string FormText(const QWidget& form, ElementKind kindOfNode, std::map<std::string, std::string>& seen) {
   std::string descriptions;
@@ -73,7 +74,7 @@ TEST(Examples, ShowTheirNodesAndFormsAndAreNotChangedByALook) {
        {"eutrophication", "fasham", "faults", "fish_larvae", "lake_management", "streeter_phelps"}) {
     Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/" + name + ".tessal"));
     // The names that a template leaves undefined are asked about once, and here with No.
-    editor.User().answers.assign(editor.Core().UndefinedSymbols().size(), false);
+    editor.User().answers = QList<bool>(std::ssize(editor.Core().UndefinedSymbols()), false);
     nodes += "== " + name + "\n";
     forms += "== " + name + "\n";
     for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {

@@ -13,7 +13,6 @@
 #include <QToolBar>
 #include <set>
 
-#include "core/error_registry.h"
 #include "ui/create_hint.h"
 #include "ui/text_bytes.h"
 
@@ -25,10 +24,8 @@ namespace {
 struct Words {
   explicit Words(const std::string& text)
       : all(text),
-        first(ToScreen(text.substr(0, text.find(": ")))),
-        second(ToScreen(first.size() == static_cast<qsizetype>(ToScreen(text).size())
-                            ? ""
-                            : text.substr(text.find(": ") + 2))) {}
+        first(ToScreen(text).section(QStringLiteral(": "), 0, 0)),
+        second(ToScreen(text).section(QStringLiteral(": "), 1)) {}
   int Number() const { return first.toInt(); }
 
   std::string all;
@@ -93,10 +90,10 @@ void UseMenuKey(Editor& editor, const Words& words) {
   QApplication::sendEvent(editor.Field<CAutoRichEditCtrl>(words.first).viewport(), &byKey);
 }
 
-/// The parts of an expression that look alike, each with its looks.
+/// The parts of an expression, a given one or the one shown, that look alike, each with its looks.
 std::string Colours(Editor& editor, const Words& words) {
   auto& field = editor.Field<CAutoRichEditCtrl>("Expression");
-  field.SetColouredText(ToScreen(words.all).replace("\\n", "\n").toStdString());
+  if (!words.all.empty()) field.SetColouredText(ToScreen(words.all).replace("\\n", "\n").toStdString());
   std::string text;
   for (auto block = field.document()->begin(); block.isValid(); block = block.next()) {
     for (auto part = block.begin(); !part.atEnd(); ++part) {
