@@ -30,10 +30,6 @@ ScanPosition& ScannerCounters() {
   return counters;
 }
 
-bool IsPlainToken(TokenCode code) {
-  return code >= TokenCode::Identifier && code <= TokenCode::RvalId;
-}
-
 ExpressionScan::ExpressionScan(std::string_view text) {
   constexpr auto kLongest = static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() - 2);
   text = text.substr(0, std::min(text.find('\0'), kLongest));

@@ -56,7 +56,9 @@ enum class TokenCode : std::int32_t {
 std::string_view TokenName(TokenCode code);
 
 /// Whether a code is one of the vocabulary's, `Identifier` to `RvalId`; all others spoil a list of tokens.
-bool IsPlainToken(TokenCode code);
+constexpr bool IsPlainToken(TokenCode code) {
+  return code >= TokenCode::Identifier && code <= TokenCode::RvalId;
+}
 
 struct ExpressionToken {
   std::string text;          ///< the lexeme as written
