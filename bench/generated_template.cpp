@@ -91,7 +91,7 @@ class TemplateWriter final {
 
   void Base(const std::string& symbol) {
     text += "SYMBOL = '" + symbol + "'\r\nID = " + std::to_string(++id) + "\r\n";
-    Head("What " + symbol + " stands for in the model");
+    Head("What " + symbol + " means in the model");
     text += "UNQ_TYPE = 999\r\nUNQ_UNIT = 0\r\n";
   }
 

@@ -44,7 +44,7 @@ TEST(KeptContent, NothingOfOneFileGetsIntoTheNext) {
           .Misc("[EXTERNAL_FUNCTIONS]\nDESCRIPTION = 'leak'\nONLINE_HELP = ''\nDOCUMENTATION = ''\n"
                 "EndSect\n[VISIBILITY_GROUPS]\nDESCRIPTION = 'leak'\nONLINE_HELP = ''\n"
                 "DOCUMENTATION = ''\nGROUPS = 0\nEndSect\n")
-          .Behind("[EXTRA]\nA = 'leak'\nEndSect\n")
+          .After("[EXTRA]\nA = 'leak'\nEndSect\n")
           .Text());
   for (const auto& head : full->ListHeads()) head->description.SetText("leak");
   ASSERT_TRUE(full.Loaded());

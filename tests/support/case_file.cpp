@@ -79,7 +79,7 @@ std::string Unescaped(std::string_view shown) {
   return line;
 }
 
-/// A file of cases as it stands: what is written again keeps its remarks, titles, inputs and calls.
+/// A file of cases as it is: what is written again keeps its remarks, titles, inputs and calls.
 struct CaseFile {
   std::string remarks;
   std::vector<Case> cases;

@@ -4,7 +4,7 @@
 //
 // A file of cases:
 //
-//     # What stands before the first case is a remark.
+//     # What comes before the first case is a remark.
 //     == The title of a case
 //     input, as many lines as it has
 //     > call with its words

@@ -183,7 +183,7 @@ std::string TemplateText::Text() const {
     species += ClassText(classes[place], std::to_string(place + 1));
   }
   if (!species.empty()) content += Section("LAGRANGE", species);
-  return "\n" + before + Section("TESSAL_SETUP", content) + behind;
+  return "\n" + before + Section("TESSAL_SETUP", content) + after;
 }
 
 namespace {
@@ -212,8 +212,8 @@ void AddLine(TemplateText& text, const std::string& kind, std::string rest) {
     text.Misc(Replaced(rest, " ", "\n") + "\n");
   } else if (kind == "before") {
     text.Before(rest + "\n");
-  } else if (kind == "behind") {
-    text.Behind(rest + "\n");
+  } else if (kind == "after") {
+    text.After(rest + "\n");
   } else if (kind == "group") {
     text.Group(rest);
   } else if (kind == "output" || kind == "class.descent") {
@@ -270,7 +270,7 @@ std::string RandomTemplate(unsigned seed, int elements) {
   }
   text.DerivedOutput("S0 + c0");
   text.Specie("Fish", "Fish_grow", {{"Fish_aux", "c0*2"}, {"Fish_grow", "Fish_aux + Fish_Mass"}});
-  text.Behind("[EXTRA] // kept\n// remark\nA = 1, 0.1, 'x', |y|\nEndSect // EXTRA\n");
+  text.After("[EXTRA] // kept\n// remark\nA = 1, 0.1, 'x', |y|\nEndSect // EXTRA\n");
   return text.Text();
 }
 

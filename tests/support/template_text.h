@@ -10,7 +10,7 @@
 
 namespace tessal::test {
 
-/// Keywords of a section: name and value, the value as it stands in the file.
+/// Keywords of a section: name and value, the value as it is in the file.
 using Keywords = std::vector<std::pair<std::string, std::string>>;
 
 /// Builds a file whose elements have every keyword; `With` (which adds what is not there) and `Without`
@@ -39,7 +39,7 @@ class TemplateText final {
     furtherSettings = content;
     return Add("settings", "");
   }
-  TemplateText& Behind(const std::string& text) { return behind += text, *this; }
+  TemplateText& After(const std::string& text) { return after += text, *this; }
   TemplateText& Before(const std::string& text) { return before += text, *this; }
   /// A visibility group and a level of it, for settings that hold them.
   TemplateText& Group(const std::string& name);
@@ -71,7 +71,7 @@ class TemplateText final {
   Element* last = nullptr;
   std::string furtherSettings;
   std::string before;
-  std::string behind;
+  std::string after;
 };
 
 /// Builds a template from lines such as
@@ -81,8 +81,8 @@ class TemplateText final {
 ///     class Fish
 ///     class.expression Fish_e a + 1
 ///
-/// Each line is a kind, a symbol where the kind has one, and what it holds; behind the bar are keywords that
-/// are set (`NAME=VALUE`) or left out (`-NAME`). A line that begins with `behind ` or `before ` is text
+/// Each line is a kind, a symbol where the kind has one, and what it holds; after the bar are keywords that
+/// are set (`NAME=VALUE`) or left out (`-NAME`). A line that begins with `after ` or `before ` is text
 /// around the template's own section.
 std::string TemplateFromNotation(const std::string& lines);
 
