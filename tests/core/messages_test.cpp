@@ -125,6 +125,7 @@ TEST(Messages, TheListCountsAndFormatsItsRecords) {
   registry.AddError(9, "odd", Uid{0}, "level");
   registry.ReportElementError("K", Uid{5}, "again");
   registry.ReportInFile("LOAD ", 7, {"load-failed", {"early"}});
+  EXPECT_EQ(registry.Records().front().code, "other");
   EXPECT_EQ(registry.GetErrorCount(2), 2U);
   EXPECT_EQ(registry.GetErrorCount(3), 1U);
   EXPECT_EQ(registry.GetErrorCount(0), 5U);

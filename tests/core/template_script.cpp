@@ -407,7 +407,7 @@ CEL_Lagrange_Specie* TemplateScript::ClassIn(const Words& words, std::size_t pla
 }
 
 std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
-  Uid predecessor{4711};
+  Uid predecessor = UidOf(name);
   const bool moved = core.MoveBeforeFirstUser(UidOf(name), predecessor);
   return YesNo(moved) + " after " + SymbolOf(predecessor);
 }
