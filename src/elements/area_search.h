@@ -32,7 +32,8 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   /// Whether it looks at the values of the grid.
   bool SearchesGrid() const;
 
-  /// The name of the element that `variableId` means. It carries the link through a renumbering, see the symbol references.
+  /// The name of the element that `variableId` means. It carries the link through a renumbering, see the
+  /// symbol references.
   const std::string& VariableName() const { return variableName; }
   void SetVariableName(std::string_view name) { variableName = name; }
 

@@ -1,5 +1,6 @@
-// The identity of an element: a number that no other element of the process has or will have, the same through renames
-// and moves, never stored in a file. Records, messages, views and requests keep identities, never pointers.
+// The identity of an element: a number that no other element of the process has or will have, the same
+// through renames and moves, never stored in a file. Records, messages, views and requests keep identities,
+// never pointers.
 #pragma once
 
 #include <cstdint>

@@ -39,9 +39,11 @@ TEST(Document, AsksBeforeItSavesWhatHasMessages) {
   const std::string path = folder.Write("m.tessal", TemplateText().Constant("k", "-1").Text());
   ScriptedDialogs dialogs;
   CTessalDoc document(dialogs);
+  document.visibilityGroup = document.visibilityLevel = 2;
   ASSERT_TRUE(document.OnOpenDocument(path));
   document.SetPathName(path);
   EXPECT_TRUE(document.visibilityRecursive);
+  EXPECT_EQ(document.visibilityGroup + document.visibilityLevel, 0) << "the filter of another file";
   const std::string before = ReadFile(path);
   document.Core().GetConstant(0).unit.SetText("kg");
   document.SetModifiedFlag(document.Core().Modified());

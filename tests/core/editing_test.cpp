@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "core/loaded_template.h"
+#include "expr/carbonate/options.h"
 #include "support/template_text.h"
 
 namespace tessal {
@@ -17,6 +18,41 @@ TEST(Editing, IdentitiesAreNeverReused) {
   first.DeleteElement(uid);
   EXPECT_GT(first.AddConstant().GetUid(), uid);
   EXPECT_EQ(first.GetElement(uid), nullptr);
+}
+
+TEST(Editing, AHeadIsOfItsKindAndMarksItsTemplate) {
+  TemplateCore core;
+  core.SetModified(false);
+  core.Root().description.SetText("a model");
+  EXPECT_TRUE(core.Modified());
+  EXPECT_EQ(core.ListHead(ElementKind::DerivedOutputList).Kind(), ElementKind::DerivedOutputList);
+  EXPECT_THROW(core.ListHead(ElementKind::SpecieStateVariableList), std::out_of_range);
+}
+
+TEST(Editing, TheLastTemplateTakesTheCarbonateSettingsWithIt) {
+  {
+    const TemplateCore last;
+    SetGetSpecie(5.0, 7.0);
+  }
+  const TemplateCore fresh;
+  EXPECT_EQ(SetGetSpecie(5.0, -2.0), 0.0) << "the silicate that was stored before";
+}
+
+TEST(Editing, AnElementOfTheTemplateIsMadeForAnyOwner) {
+  LoadedTemplate loaded(TemplateText().Specie("A", "0", {}).Text());
+  const Uid list = loaded->GetSpecie(0).Head(ElementKind::SpecieConstantList).GetUid();
+  const CreatedElement created = loaded->CreateElement({"k", ElementKind::Constant, list});
+  EXPECT_EQ(loaded->GetConstant(0).GetUid(), created.uid);
+  SetNotifyChanges(false);
+}
+
+TEST(Editing, ARefreshedSearchShowsItsValuesAsSelected) {
+  LoadedTemplate loaded(TemplateText().Specie("A", "0", {}).Specie("B", "0", {}).Text());
+  CEL_Lagrange_Spatial_Function& search = loaded->GetSpecie(1).AddSpatialFunction();
+  loaded->RefreshSearchFunctionChoices();
+  EXPECT_EQ(search.specieId.Selected(), 1) << "its own class";
+  EXPECT_EQ(search.variableId.Selected(), 0) << "no variable";
+  EXPECT_EQ(search.lookFor.Selected(), 0) << "its own class";
 }
 
 TEST(Editing, ABuiltinTakesItsFieldsAlongAndLocksThem) {

@@ -141,6 +141,7 @@ TEST(Messages, TheListCountsAndFormatsItsRecords) {
   std::uint32_t level = 0;
   registry.GetErrorForList(2, symbol, uid, text);
   EXPECT_EQ(symbol + std::to_string(static_cast<int>(uid)) + text, "odd-1: level");
+  uid = Uid{7};
   registry.GetErrorForList(5, symbol, uid, text);
   EXPECT_EQ(symbol + std::to_string(static_cast<int>(uid)) + text, "-1no errors");
   EXPECT_FALSE(registry.FormatError(5, text));

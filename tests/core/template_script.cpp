@@ -372,7 +372,8 @@ std::string TemplateScript::State() const {
        << core.GetSpecieCount() << " classes " << core.GetExternalFunctionCount() << " functions, named "
        << core.CountNamedElements() << ", revision " << core.GetDocumentRevision() << "\nfile '"
        << core.TemplateFileName() << "' saved to '" << core.SaveFileName() << "' kept "
-       << core.KeptTree().Children().size() << (core.Modified() ? " modified" : "");
+       << core.KeptTree().Children().size() << (core.Modified() ? " modified" : "")
+       << (core.GetMisc() == nullptr ? " without settings" : "");
   return text.str();
 }
 
