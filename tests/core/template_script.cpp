@@ -188,14 +188,15 @@ std::string TemplateScript::Table() const {
   std::string text;
   for (const SymbolRecord& record : core.SymbolTable()) {
     const auto symbols = [this](const std::vector<std::uint32_t>& sequences) {
-      std::vector<std::string> names;
-      for (const std::uint32_t sequence : sequences)
-        names.push_back(core.RecordSymbol(*core.FindRecordBySequence(sequence)));
+      std::vector<std::string> names(sequences.size());
+      std::transform(sequences.begin(), sequences.end(), names.begin(), [this](std::uint32_t sequence) {
+        return core.RecordSymbol(*core.FindRecordBySequence(sequence));
+      });
       return names;
     };
     const auto bySymbols = [this](const auto& uids) {
-      std::vector<std::string> names;
-      for (const auto uid : uids) names.push_back(SymbolOf(uid));
+      std::vector<std::string> names(uids.size());
+      std::transform(uids.begin(), uids.end(), names.begin(), [this](Uid uid) { return SymbolOf(uid); });
       return names;
     };
     const CEL_Element& element = *record.element;

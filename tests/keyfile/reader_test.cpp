@@ -214,7 +214,7 @@ TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
 }
 
 TEST(ItemTree, KeywordsSayHowTheyDiffer) {
-  const auto key = [](std::vector<std::int32_t> numbers, const char* name = "K") {
+  const auto key = [](const std::vector<std::int32_t>& numbers, const char* name = "K") {
     CKvfKeyItem item;
     item.name = name;
     for (const std::int32_t number : numbers) item.values.push_back(KvfValue::Integer(number));
