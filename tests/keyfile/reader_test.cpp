@@ -234,7 +234,7 @@ TEST(ItemTree, KeywordsSayHowTheyDiffer) {
   EXPECT_EQ(compare(key({1}), key({1, 2}), &ignored), "same ignored key name K\n");
   CKvfSectionItem section;
   EXPECT_FALSE(section.Compare(*key({1}).Copy(), nullptr, nullptr, false));
-  EXPECT_FALSE(key({1}).Copy()->Compare(section, nullptr, nullptr, false));
+  EXPECT_FALSE(key({1}).Copy()->Compare(section, nullptr, &ignored, false));
 }
 
 }  // namespace
