@@ -5,6 +5,7 @@
 #include "core/search_functions.h"
 #include "core/template_core.h"
 #include "core/visibility_groups.h"
+#include "elements/free_name.h"
 
 namespace tessal {
 
@@ -40,18 +41,14 @@ bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operat
                         [&specie, &operation](const auto& list) { operation(specie.*list.members); });
 }
 
-std::string UnusedSymbol(const TemplateCore& core, std::string_view prefix, std::size_t number) {
-  std::string symbol = std::string(prefix) + std::to_string(number);
-  while (core.SymbolExists(symbol)) symbol = std::string(prefix) + std::to_string(++number);
-  return symbol;
-}
-
 }  // namespace
 
 template <class Element>
 Element& TemplateCore::Add(const Collection<Element>& row) {
   auto& elements = state.collections.*row.elements;
-  auto element = std::make_unique<Element>(UnusedSymbol(*this, row.symbolPrefix, elements.size() + 1));
+  auto element = std::make_unique<Element>(
+      FirstFreeName(row.symbolPrefix, elements.size() + 1,
+                    [this](const std::string& symbol) { return SymbolExists(symbol); }));
   if constexpr (std::is_same_v<Element, CEL_Lagrange_Specie>) {
     element->SetIndex(static_cast<std::int32_t>(elements.size() + 1));
     Adopt(*element, state.root);

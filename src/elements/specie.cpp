@@ -5,6 +5,7 @@
 
 #include "core/error_registry.h"
 #include "elements/element_owner.h"
+#include "elements/free_name.h"
 #include "expr/semantic_checks.h"
 #include "keyfile/keywords.h"
 #include "keyfile/water_body.h"
@@ -89,31 +90,23 @@ void CEL_Lagrange_Specie::Adopt(CEL_Element& member, ElementKind listKind) {
   member.SetModifiedFlag(templateModified);
 }
 
-std::string CEL_Lagrange_Specie::UnusedSymbol(std::string_view word, std::size_t number) const {
-  const std::string prefix = symbol.Text() + "_" + std::string(word);
-  std::string candidate = prefix + std::to_string(number);
-  while (Owner() != nullptr && Owner()->SymbolExists(candidate)) {
-    candidate = prefix + std::to_string(++number);
+std::string CEL_Lagrange_Specie::NewName(ElementKind kind, std::string_view word, std::size_t number) const {
+  if (kind == ElementKind::HorizontalVector) {
+    // Movements have captions of their own, which the class's name does not begin.
+    return FirstFreeName(word, number, [this](const std::string& caption) {
+      return std::any_of(horizontalVectors.begin(), horizontalVectors.end(),
+                         [&caption](const auto& vector) { return vector->symbol.Text() == caption; });
+    });
   }
-  return candidate;
-}
-
-std::string CEL_Lagrange_Specie::UnusedCaption(std::string_view word, std::size_t number) const {
-  std::string candidate = std::string(word) + std::to_string(number);
-  while (std::any_of(horizontalVectors.begin(), horizontalVectors.end(),
-                     [&candidate](const auto& vector) { return vector->symbol.Text() == candidate; })) {
-    candidate = std::string(word) + std::to_string(++number);
-  }
-  return candidate;
+  return FirstFreeName(symbol.Text() + "_" + std::string(word), number, [this](const std::string& name) {
+    return Owner() != nullptr && Owner()->SymbolExists(name);
+  });
 }
 
 template <class Member>
 Member& CEL_Lagrange_Specie::Add(const MemberList<Member>& list) {
   auto& members = this->*list.members;
-  // Movements have captions of their own, which the class's name does not begin.
-  const bool isMovement = list.kind == ElementKind::HorizontalVector;
-  members.push_back(std::make_unique<Member>(isMovement ? UnusedCaption(list.word, members.size() + 1)
-                                                        : UnusedSymbol(list.word, members.size() + 1)));
+  members.push_back(std::make_unique<Member>(NewName(list.kind, list.word, members.size() + 1)));
   Member& member = *members.back();
   Adopt(member, list.listKind);
   if constexpr (requires { member.specie; }) member.specie.SetInt(index);

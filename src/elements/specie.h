@@ -96,8 +96,7 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   template <class Member>
   Member& Add(const MemberList<Member>& list);
   void Adopt(CEL_Element& member, ElementKind listKind);
-  std::string UnusedSymbol(std::string_view word, std::size_t number) const;
-  std::string UnusedCaption(std::string_view word, std::size_t number) const;
+  std::string NewName(ElementKind kind, std::string_view word, std::size_t number) const;
 
   void DropMembers();
   bool CheckMemberReferences(const CEL_Element& member) const;
