@@ -22,6 +22,12 @@ namespace tessal {
 /// The symbol of the message that a load leaves when it could not keep the file's further top-level sections.
 inline constexpr std::string_view kNotKeptSymbol = "could not read template: ";
 
+/// The elements of a template as one level sees them: by the number of the first record of each, in order.
+struct LevelItems {
+  std::vector<std::int32_t> included;
+  std::vector<std::int32_t> available;
+};
+
 class TemplateCore final : public ElementOwner {
  public:
   TemplateCore();
@@ -167,7 +173,15 @@ class TemplateCore final : public ElementOwner {
   /// Makes a group with a name that is not in use; its number.
   std::int32_t AddVisibilityGroup();
   void RemoveVisibilityGroup(std::int32_t group);
-  /// Makes a level with a default name; its number, 0 for a group that does not exist.
+  /// Each returns false, and changes nothing, for an empty name and for one that another group, or another
+  /// level of the group, has.
+  bool SetGroupName(std::int32_t group, std::string_view name);
+  bool SetLevelName(std::int32_t group, std::int32_t level, std::string_view name);
+  void SetGroupDescription(std::int32_t group, std::string_view text);
+  void SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text);
+  LevelItems ItemsOfLevel(std::int32_t group, std::int32_t level) const;
+  /// Makes a level with a default name that no level of the group has; its number, 0 for a group that does
+  /// not exist.
   std::int32_t CreateLevel(std::int32_t group);
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItemToLevel(std::int32_t group, std::int32_t level, std::uint32_t sequence);

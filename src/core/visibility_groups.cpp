@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "core/template_core.h"
+#include "elements/free_name.h"
 
 namespace tessal {
 
@@ -25,6 +26,15 @@ template <class State>
 auto LevelOf(State& state, std::int32_t group, std::int32_t level) {
   auto* found = GroupOf(state, group);
   return found == nullptr ? nullptr : Numbered(found->levels, level);
+}
+
+/// Whether a group, or a level, other than the one of a number has a name already.
+template <class Values>
+bool IsTaken(const Values& values, std::int32_t except, std::string_view name) {
+  std::int32_t number = 0;
+  return std::any_of(values.begin(), values.end(), [&number, except, name](const auto& value) {
+    return ++number != except && value.name == name;
+  });
 }
 
 std::string NamedGroup(const TemplateState& state, std::int32_t group, std::string_view all) {
@@ -74,16 +84,12 @@ void VisibilityGroups::Leave(CEL_Element& element) {
 std::int32_t VisibilityGroups::AddGroup() {
   if (!state.hasMisc) return 0;
   auto& groups = Groups();
-  const auto taken = [&groups](const std::string& name) {
-    return std::any_of(groups.begin(), groups.end(),
-                       [&name](const auto& group) { return group.name == name; });
-  };
   const auto nameOf = [](std::uint32_t number) { return "Group_" + std::to_string(number); };
   if (state.groupCounter > 0 || groups.empty()) {
     ++state.groupCounter;
   } else {
     state.groupCounter = static_cast<std::uint32_t>(groups.size());
-    while (taken(nameOf(state.groupCounter))) ++state.groupCounter;
+    while (IsTaken(groups, 0, nameOf(state.groupCounter))) ++state.groupCounter;
   }
   groups.push_back({nameOf(state.groupCounter), "", {}});
   state.flags.modified = true;
@@ -100,13 +106,42 @@ void VisibilityGroups::RemoveGroup(std::int32_t group) {
   state.flags.modified = true;
 }
 
+bool VisibilityGroups::Change(std::string& text, std::string_view changed) {
+  if (text == changed) return false;
+  text = changed;
+  state.flags.modified = true;
+  return true;
+}
+
+bool VisibilityGroups::SetGroupName(std::int32_t group, std::string_view name) {
+  VisibilityGroup* found = GroupOf(state, group);
+  return found != nullptr && !name.empty() && !IsTaken(Groups(), group, name) && Change(found->name, name);
+}
+
+void VisibilityGroups::SetGroupDescription(std::int32_t group, std::string_view text) {
+  if (VisibilityGroup* found = GroupOf(state, group)) Change(found->description, text);
+}
+
+bool VisibilityGroups::SetLevelName(std::int32_t group, std::int32_t level, std::string_view name) {
+  VisibilityLevel* found = LevelOf(state, group, level);
+  return found != nullptr && !name.empty() && !IsTaken(GroupOf(state, group)->levels, level, name) &&
+         Change(found->name, name);
+}
+
+void VisibilityGroups::SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text) {
+  if (VisibilityLevel* found = LevelOf(state, group, level)) Change(found->description, text);
+}
+
 std::int32_t VisibilityGroups::CreateLevel(std::int32_t group) {
   VisibilityGroup* found = GroupOf(state, group);
   if (found == nullptr) return 0;
-  const std::size_t number = found->levels.size() + 1;
-  found->levels.push_back({"Level_" + std::to_string(number), "", {}, {}});
+  const auto number = static_cast<std::int32_t>(found->levels.size() + 1);
+  const std::string name =
+      FirstFreeName("Level_", static_cast<std::size_t>(number),
+                    [found](const std::string& each) { return IsTaken(found->levels, 0, each); });
+  found->levels.push_back({name, "", {}, {}});
   state.flags.modified = true;
-  return static_cast<std::int32_t>(number);
+  return number;
 }
 
 void VisibilityGroups::DeleteLevel(std::int32_t group, std::int32_t level) {
@@ -142,6 +177,33 @@ std::int32_t TemplateCore::AddVisibilityGroup() {
 
 void TemplateCore::RemoveVisibilityGroup(std::int32_t group) {
   VisibilityGroups(state).RemoveGroup(group);
+}
+
+bool TemplateCore::SetGroupName(std::int32_t group, std::string_view name) {
+  return VisibilityGroups(state).SetGroupName(group, name);
+}
+
+void TemplateCore::SetGroupDescription(std::int32_t group, std::string_view text) {
+  VisibilityGroups(state).SetGroupDescription(group, text);
+}
+
+bool TemplateCore::SetLevelName(std::int32_t group, std::int32_t level, std::string_view name) {
+  return VisibilityGroups(state).SetLevelName(group, level, name);
+}
+
+void TemplateCore::SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text) {
+  VisibilityGroups(state).SetLevelDescription(group, level, text);
+}
+
+LevelItems TemplateCore::ItemsOfLevel(std::int32_t group, std::int32_t level) const {
+  LevelItems items;
+  const VisibilityLevel* found = LevelOf(state, group, level);
+  if (found == nullptr) return items;
+  state.table.ForEachElement([found, &items](const SymbolRecord& record) {
+    const bool isIncluded = found->items.contains(record.uid);
+    (isIncluded ? items.included : items.available).push_back(static_cast<std::int32_t>(record.sequence));
+  });
+  return items;
 }
 
 std::int32_t TemplateCore::CreateLevel(std::int32_t group) {

@@ -18,6 +18,10 @@ class VisibilityGroups final {
   void TakeRecordNumbers();
   std::int32_t AddGroup();
   void RemoveGroup(std::int32_t group);
+  bool SetGroupName(std::int32_t group, std::string_view name);
+  void SetGroupDescription(std::int32_t group, std::string_view text);
+  bool SetLevelName(std::int32_t group, std::int32_t level, std::string_view name);
+  void SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text);
   std::int32_t CreateLevel(std::int32_t group);
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
@@ -27,6 +31,9 @@ class VisibilityGroups final {
 
  private:
   std::vector<VisibilityGroup>& Groups() { return state.misc.Visibilities().groups; }
+
+  /// Changes a text of a group or a level; false when it is the same already.
+  bool Change(std::string& text, std::string_view changed);
 
   TemplateState& state;
 };

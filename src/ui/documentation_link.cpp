@@ -29,8 +29,9 @@ QString FailureText(const QString& text, int code) {
 
 }  // namespace
 
-QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs) {
-  if (text.isEmpty() || dialogs.OpenWithSystem(text)) return {};
+QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs, const QString& folder) {
+  const bool isRelative = !folder.isEmpty() && QFileInfo(text).isRelative();
+  if (text.isEmpty() || dialogs.OpenWithSystem(isRelative ? QDir(folder).filePath(text) : text)) return {};
   const QString root = QString::fromStdString(InstallRoot());
   if (!root.isEmpty()) {
     const QString manual = QDir(root).filePath(kManualsFolder + u'/' + text);

@@ -7,8 +7,9 @@ namespace tessal {
 
 class UserDialogs;
 
-/// Opens the text as it is, then below the manuals folder, then below the manuals address. Empty when
-/// one of them opened, or when the text is empty; otherwise the message for the user.
-QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs);
+/// Opens the text as it is (a relative path in the folder first, if one is given), then below the manuals
+/// folder, then below the manuals address. Empty when one of them opened, or when the text is empty;
+/// otherwise the message for the user.
+QString OpenDocumentationFile(const QString& text, UserDialogs& dialogs, const QString& folder = {});
 
 }  // namespace tessal

@@ -3,14 +3,17 @@
 #include <QComboBox>
 #include <QFileInfo>
 #include <QGridLayout>
+#include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QSplitter>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <limits>
 #include <memory>
+#include <utility>
 
 #include "core/document.h"
 #include "elements/property_io.h"
@@ -31,6 +34,8 @@ namespace {
 
 constexpr int kFewestLines = 2;
 constexpr int kMostLines = 4;
+/// A label and its editor, twice.
+constexpr int kGridColumns = 4;
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
@@ -80,6 +85,14 @@ void LimitHeight(QWidget& editor) {
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
+  const auto expressionCount = std::count_if(fields.begin(), fields.end(), [](const FormField& field) {
+    return field.editor == FieldEditor::Expression;
+  });
+  if (expressionCount > 1) {
+    expressions = MakeChild<QSplitter>(Qt::Vertical, this);
+    expressions->setObjectName(QStringLiteral("Split"));
+    expressions->setChildrenCollapsible(false);
+  }
   for (const FormField& field : fields) AddField(field);
   Arrange(1);
   narrowWidth = layout->minimumSize().width();
@@ -95,6 +108,37 @@ void CElementForm::AddField(const FormField& field) {
   control.label = MakeChild<QLabel>(QString::fromLatin1(field.label), this);
   control.label->setBuddy(control.editor);
   controls.push_back(control);
+  if (expressions != nullptr && field.editor == FieldEditor::Expression) {
+    auto* half = MakeChild<QWidget>(expressions);
+    auto* rows = MakeChild<QVBoxLayout>(half);
+    rows->setContentsMargins(0, 0, 0, 0);
+    rows->addWidget(control.label);
+    rows->addWidget(control.cell, 1);
+    expressions->addWidget(half);
+  }
+}
+
+void CElementForm::AddUnder(QWidget* widget) {
+  under.push_back(widget);
+  const int present = std::exchange(columns, 0);
+  Arrange(present);
+}
+
+void CElementForm::ArrangeCounts() {
+  constexpr int kPairsPerRow = 2;
+  if (counts == nullptr) {
+    counts = MakeChild<QGroupBox>(strings::kGeneralOverview, this);
+    counts->setObjectName(QStringLiteral("1102"));
+    auto* grid = MakeChild<QGridLayout>(counts);
+    int place = 0;
+    for (const Control& control : controls) {
+      if (control.field->editor != FieldEditor::Count) continue;
+      const int column = 2 * (place % kPairsPerRow);
+      grid->addWidget(control.label, place / kPairsPerRow, column);
+      grid->addWidget(control.cell, place / kPairsPerRow, column + 1);
+      ++place;
+    }
+  }
 }
 
 void CElementForm::Arrange(int columnCount) {
@@ -102,11 +146,20 @@ void CElementForm::Arrange(int columnCount) {
   columns = columnCount;
   while (const std::unique_ptr<QLayoutItem> gone{layout->takeAt(0)}) continue;
   for (int row = 0; row < layout->rowCount(); ++row) layout->setRowStretch(row, 0);
-  constexpr int kGridColumns = 4;
   int row = -1;
   int column = kGridColumns;
   bool grows = false;
+  const auto addWide = [this, &row, &column](QWidget* widget) {
+    layout->addWidget(widget, ++row, 0, 1, kGridColumns);
+    column = kGridColumns;
+  };
+  bool hasCounts = false;
   for (const Control& control : controls) {
+    if (control.field->editor == FieldEditor::Count) {
+      hasCounts = true;
+      continue;
+    }
+    if (expressions != nullptr && control.field->editor == FieldEditor::Expression) continue;
     const bool isShort = columns > 1 && IsShort(control.field->editor);
     if (!isShort || column >= kGridColumns) {
       ++row;
@@ -120,6 +173,16 @@ void CElementForm::Arrange(int columnCount) {
     layout->setRowStretch(row, 1);
     grows = true;
   }
+  if (hasCounts) {
+    ArrangeCounts();
+    addWide(counts);
+  }
+  if (expressions != nullptr) {
+    addWide(expressions);
+    layout->setRowStretch(row, 1);
+    grows = true;
+  }
+  for (QWidget* widget : under) addWide(widget);
   layout->setColumnStretch(1, 1);
   layout->setColumnStretch(3, columns > 1 ? 1 : 0);
   if (!grows) layout->setRowStretch(row + 1, 1);
@@ -155,7 +218,7 @@ QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
 
 QLineEdit* CElementForm::MakeLine(const FormField& field, QWidget* parent) {
   auto* line = MakeChild<QLineEdit>(parent);
-  line->setReadOnly(field.editor == FieldEditor::Shown);
+  line->setReadOnly(field.editor == FieldEditor::Shown || field.editor == FieldEditor::Count);
   connect(line, &QLineEdit::textEdited, this, [this] { NoteEdited(); });
   connect(line, &QLineEdit::editingFinished, this, [this] { NoteFocusLost(); });
   return line;
@@ -218,13 +281,13 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
-  keypad->setObjectName(QString::number(control_id::kKeypad));
+  keypad->setObjectName(QString::number(field.button));
   keypad->setAccessibleName(strings::kExpressionEditor);
-  auto* under = MakeChild<QHBoxLayout>();
-  under->addWidget(note, 1);
-  under->addWidget(keypad, 0, Qt::AlignTop);
+  auto* foot = MakeChild<QHBoxLayout>();
+  foot->addWidget(note, 1);
+  foot->addWidget(keypad, 0, Qt::AlignTop);
   rows->addWidget(edit, 1);
-  rows->addLayout(under);
+  rows->addLayout(foot);
   connect(edit, &QTextEdit::textChanged, note, [edit, note] { note->setText(edit->ParserMessage()); });
   connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
   WatchFocusLoss(*edit, [this] { NoteFocusLost(); });
@@ -232,11 +295,6 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   control.editor = edit;
   control.note = note;
   return cell;
-}
-
-void CElementForm::JumpTo(Uid uid) {
-  const NumberHint argument(NumberOf(uid));
-  Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 
 bool CElementForm::IsEnabled(const FormField& field, const CEL_Property& property) const {
@@ -254,6 +312,10 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
   if (field.editor == FieldEditor::ReferencedIn) {
     qobject_cast<CAutoRichEditCtrl*>(control.editor)->SetColouredText(ReferrerText(element));
+    return;
+  }
+  if (field.editor == FieldEditor::Count) {
+    qobject_cast<QLineEdit*>(control.editor)->setText(QString::number(field.count(Core(), element)));
     return;
   }
   const CEL_Property& property = field.property(element);
@@ -335,6 +397,12 @@ bool CElementForm::StoreFields(CEL_Element& element) {
   return !changed.empty();
 }
 
+bool CElementForm::StoreField(int control, CEL_Element& element) {
+  const auto field = std::find_if(controls.begin(), controls.end(),
+                                  [control](const Control& each) { return each.field->control == control; });
+  return field != controls.end() && Store(*field, element);
+}
+
 bool CElementForm::IsEdited(const Control& control) {
   const auto* field = qobject_cast<const CPlainTextField*>(control.editor);
   return field != nullptr ? field->IsEdited() : TextIn(*control.editor) != control.shown;
@@ -343,7 +411,7 @@ bool CElementForm::IsEdited(const Control& control) {
 bool CElementForm::Store(const Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
   const bool isStored = field.editor != FieldEditor::Symbol && field.editor != FieldEditor::Shown &&
-                        field.editor != FieldEditor::ReferencedIn;
+                        field.editor != FieldEditor::ReferencedIn && field.editor != FieldEditor::Count;
   if (!isStored) return false;
   CEL_Property& property = field.property(element);
   if (field.onlyWhileEnabled && !IsEnabled(field, property)) return false;
@@ -379,8 +447,18 @@ bool CElementForm::StoreNumber(const QString& text, CEL_Property& property) {
 bool CElementForm::StoreChoice(const QComboBox& combo, CEL_Property& property) {
   const QVariant entry = combo.currentData();
   if (!entry.isValid() || !property.Editable()) return false;
+  // Another field of the same commit may have changed what is offered: the caption decides then.
+  const auto& choices = property.Choices();
+  const auto isShown = [caption = combo.currentText()](const CEL_Choice& choice) {
+    return ToScreen(choice.display) == caption;
+  };
+  auto index = static_cast<std::size_t>(entry.toInt());
+  if (index >= choices.size() || !isShown(choices[index])) {
+    index = static_cast<std::size_t>(std::find_if(choices.begin(), choices.end(), isShown) - choices.begin());
+  }
+  if (index >= choices.size()) return false;
   const std::string former = property.TextOf();
-  property.SelectIndex(entry.toInt());
+  property.SelectIndex(static_cast<std::int32_t>(index));
   property.ApplySelection();
   return property.TextOf() != former;
 }
@@ -390,11 +468,11 @@ void CElementForm::BrowseDocumentation(QLineEdit& line) {
   if (chosen.isEmpty()) return;
   if (QFileInfo(chosen).suffix().isEmpty()) chosen += QStringLiteral(".pdf");
   line.setText(chosen);
-  NoteEdited();
+  OnDocumentationChosen();
 }
 
 void CElementForm::OpenDocumentation(const QString& text) {
-  const QString failure = OpenDocumentationFile(text, Dialogs());
+  const QString failure = OpenDocumentationFile(text, Dialogs(), DocumentationFolder());
   if (!failure.isEmpty()) Dialogs().ShowFailure(this, failure);
 }
 

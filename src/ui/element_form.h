@@ -6,10 +6,13 @@
 #include <string>
 #include <vector>
 
+#include "ui/control_ids.h"
 #include "ui/right_pane.h"
 
 class QComboBox;
 class QGridLayout;
+class QGroupBox;
+class QSplitter;
 class QLabel;
 class QLineEdit;
 
@@ -26,6 +29,7 @@ enum class FieldEditor {
   Number,         ///< a real
   Integer,
   Shown,          ///< a value that is shown and never stored
+  Count,          ///< how many there are of something; in the box of the counts
   SortedChoice,   ///< a combo box, its entries by caption
   OrderedChoice,  ///< a combo box, its entries in the order of the choices
   Expression,     ///< a coloured field, with the parser's message under it
@@ -44,7 +48,18 @@ struct FormField {
   int follows = 0;
   /// Whether the field may be used in a template; without it the property says so.
   bool (*isOpen)(const TemplateCore& core) = nullptr;
+  /// What a count counts.
+  std::size_t (*count)(const TemplateCore& core, const CEL_Element& element) = nullptr;
+  /// The button under an expression.
+  int button = control_id::kKeypad;
 };
+
+constexpr FormField CountField(int control, const char* label,
+                               std::size_t (*count)(const TemplateCore& core, const CEL_Element& element)) {
+  FormField field{control, label, FieldEditor::Count, nullptr};
+  field.count = count;
+  return field;
+}
 
 /// The fields of a form, in the order in which they are loaded.
 using FormTable = std::span<const FormField>;
@@ -62,6 +77,16 @@ class CElementForm : public CRightPaneBase {
   void ItemToForm() override;
   void FormToItem() override;
 
+  /// Writes the fields after the symbol; true when any has changed.
+  virtual bool StoreFields(CEL_Element& element);
+  /// Writes the field with the number of its control; true when it has changed.
+  bool StoreField(int control, CEL_Element& element);
+  /// Puts a widget under the fields.
+  void AddUnder(QWidget* widget);
+  /// The folder in which a relative path of a documentation file is looked for first; empty for none.
+  virtual QString DocumentationFolder() const { return {}; }
+  virtual void OnDocumentationChosen() { NoteEdited(); }
+
  private:
   struct Control {
     const FormField* field = nullptr;
@@ -73,10 +98,10 @@ class CElementForm : public CRightPaneBase {
   };
 
   bool IsEnabled(const FormField& field, const CEL_Property& property) const;
-  /// Writes the fields after the symbol; true when any has changed.
-  bool StoreFields(CEL_Element& element);
   bool Store(const Control& control, CEL_Element& element);
   void AddField(const FormField& field);
+  /// Lays out the counts side by side in their box.
+  void ArrangeCounts();
   /// Lays the fields out; short ones share a row when there are two columns.
   void Arrange(int columnCount);
   /// Makes the editor of a field. The cell that it lies in may hold more beside it.
@@ -91,7 +116,6 @@ class CElementForm : public CRightPaneBase {
   void Show(Control& control, CEL_Element& element);
   static void FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property, bool enabled);
   std::string ReferrerText(const CEL_Element& element) const;
-  void JumpTo(Uid uid);
   static bool IsEdited(const Control& control);
   static bool StoreText(const QString& text, CEL_Property& property);
   static bool StoreNumber(const QString& text, CEL_Property& property);
@@ -101,6 +125,9 @@ class CElementForm : public CRightPaneBase {
   void OpenDocumentation(const QString& text);
 
   std::vector<Control> controls;
+  std::vector<QWidget*> under;
+  QGroupBox* counts = nullptr;       ///< holds the counts, in a form that has some
+  QSplitter* expressions = nullptr;  ///< holds the expressions, in a form with more than one
   QGridLayout* layout;
   int columns = 0;
   int narrowWidth = 0;  ///< what one column needs

@@ -6,35 +6,14 @@
 #include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
+#include "ui/form_fields.h"
 #include "ui/strings.h"
 
 namespace tessal {
 
 namespace {
 
-template <class Owner>
-Owner OwnerOf(CEL_Property Owner::*);
-
-/// The property of an element as a field's table names it.
-template <auto Member>
-CEL_Property& Of(CEL_Element& element) {
-  using Owner = decltype(OwnerOf(Member));
-  return static_cast<Owner&>(element).*Member;
-}
-
 using enum FieldEditor;
-
-constexpr FormField kSymbol{control_id::kSymbol, "Symbol", Symbol, Of<&CEL_Element::symbol>};
-constexpr FormField kDescription{control_id::kDescription, "Description", Lines,
-                                 Of<&CEL_Element::description>};
-constexpr FormField kOnlineHelp{control_id::kOnlineHelp, "Online help", Line, Of<&CEL_Element::onlineHelp>};
-constexpr FormField kDocumentation{control_id::kDocumentation, "Documentation", Documentation,
-                                   Of<&CEL_Element::documentation>};
-constexpr FormField kReferencedIn{control_id::kReferencedIn, "Referenced in", ReferencedIn, nullptr};
-constexpr FormField kUnitType{1045, "Unq type", SortedChoice, Of<&CEL_Element::unqType>};
-
-constexpr int kScopeControl = 1055;
-constexpr int kSpatialControl = 1056;
 
 constexpr FormField kStateVariableFields[] = {
     kSymbol,
@@ -48,7 +27,7 @@ constexpr FormField kStateVariableFields[] = {
     {1071, "Default value", Number, Of<&CEL_StateVariable::defaultValue>},
     {1085, "Minimum value", Number, Of<&CEL_StateVariable::minValue>},
     {1084, "Maximum value", Number, Of<&CEL_StateVariable::maxValue>},
-    {1115, "Expression", Expression, Of<&CEL_StateVariable::equation>},
+    {kExpressionControl, "Expression", Expression, Of<&CEL_StateVariable::equation>},
     kReferencedIn,
 };
 
@@ -93,7 +72,7 @@ constexpr FormField kAuxiliaryFields[] = {
     kFollowingSpatialVariation,
     {1050, "Output", SortedChoice, Of<&CEL_Auxilliary_Variable::output>},
     {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
-    {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
+    {kExpressionControl, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
     kReferencedIn,
 };
 
@@ -106,8 +85,10 @@ constexpr FormField kProcessFields[] = {
     kFollowingSpatialVariation,
     {1050, "Output", SortedChoice, Of<&CEL_Process::output>},
     {1052, "Process type", SortedChoice, Of<&CEL_Process::processType>},
+    {1202, "Control ID", Integer, Of<&CEL_Process::controlId>},
+    {1203, "Control value", Number, Of<&CEL_Process::controlValue>},
     {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
-    {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
+    {kExpressionControl, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
     kReferencedIn,
 };
 
@@ -120,7 +101,7 @@ constexpr FormField kDerivedOutputFields[] = {
     {1046, "Format", SortedChoice, Of<&CEL_Derived_Output::format>},
     {kSpatialControl, "Spatial var.", SortedChoice, Of<&CEL_ExpressionElement::spatialVariation>},
     {1079, "Unit", ShortLine, Of<&CEL_ExpressionElement::unit>},
-    {1115, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
+    {kExpressionControl, "Expression", Expression, Of<&CEL_ExpressionElement::expression>},
 };
 
 bool HasParticleClass(const TemplateCore& core) {
@@ -149,6 +130,36 @@ constexpr FormField kMiscFields[] = {
     {1060, "Angle Unit", SortedChoice, Of<&CEL_Miscanellous::trigonometrics>},
 };
 
+constexpr FormField kExternalFunctionFields[] = {
+    kDescription,
+    kOnlineHelp,
+    kDocumentation,
+    {1092, "Public name", Line, Of<&CEL_ExternalFunction::publicName>},
+    {1051, "Parameter count", SortedChoice, Of<&CEL_ExternalFunction::parameters>},
+    {1061, "Used as", SortedChoice, Of<&CEL_ExternalFunction::usedAs>},
+    {1075, "DLL", Line, Of<&CEL_ExternalFunction::dll>},
+    {1078, "Entry point", Line, Of<&CEL_ExternalFunction::entryPoint>},
+};
+
+template <auto Members>
+std::size_t CountOf(const TemplateCore& core, const CEL_Element& /*element*/) {
+  return (core.Elements().*Members).size();
+}
+
+constexpr FormField kGeneralFields[] = {
+    kDescription,
+    kOnlineHelp,
+    kDocumentation,
+    CountField(1096, "State variables", CountOf<&Collections::stateVariables>),
+    CountField(1069, "Constants", CountOf<&Collections::constants>),
+    CountField(1081, "Forcings", CountOf<&Collections::forcings>),
+    // Spelt as they have always been.
+    CountField(1067, "Auxilary variables", CountOf<&Collections::auxiliaries>),
+    CountField(1090, "Processes", CountOf<&Collections::processes>),
+    CountField(1073, "Derived ouputs", CountOf<&Collections::derivedOutputs>),
+    CountField(1088, "Particle classes", CountOf<&Collections::species>),
+};
+
 }  // namespace
 
 constexpr FormTable kStateVariableForm = kStateVariableFields;
@@ -157,6 +168,8 @@ constexpr FormTable kAuxiliaryForm = kAuxiliaryFields;
 constexpr FormTable kProcessForm = kProcessFields;
 constexpr FormTable kDerivedOutputForm = kDerivedOutputFields;
 constexpr FormTable kMiscForm = kMiscFields;
+constexpr FormTable kExternalFunctionForm = kExternalFunctionFields;
+constexpr FormTable kGeneralForm = kGeneralFields;
 
 CNoView::CNoView(const FormContext& context, QWidget* parent) : CRightPaneBase(context, parent) {
   auto* layout = MakeChild<QVBoxLayout>(this);

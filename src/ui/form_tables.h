@@ -18,6 +18,8 @@ extern const FormTable kAuxiliaryForm;
 extern const FormTable kProcessForm;
 extern const FormTable kDerivedOutputForm;
 extern const FormTable kMiscForm;
+extern const FormTable kExternalFunctionForm;
+extern const FormTable kGeneralForm;
 
 using CStateVariableView = CTableForm<kStateVariableForm>;
 using CConstantView = CTableForm<kInputForm>;
@@ -27,6 +29,7 @@ using CProcessView = CTableForm<kProcessForm>;
 using CDerviedView = CTableForm<kDerivedOutputForm>;
 /// The settings. The two fields about particles are open exactly while the template has a particle class.
 using CMiscView = CTableForm<kMiscForm>;
+using CExternalFunctionView = CTableForm<kExternalFunctionForm>;
 
 /// What the right pane shows for a node that has no form.
 class CNoView final : public CRightPaneBase {

@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <list>
+#include <map>
 #include <string>
 
 #include "elements/element_kind.h"
@@ -37,6 +38,8 @@ struct CItemData {
   Uid id = Uid::None;           ///< the element's identity, or a folder's
   std::int32_t groupIndex = 0;  ///< the number from 1 of a visibility group's node, else 0
   ElementKind kind = ElementKind::None;
+  /// What a form keeps for its next visit, such as the page that was open; gone with the document.
+  std::map<std::string, std::string> viewState{};
 };
 
 struct CHistoryData {

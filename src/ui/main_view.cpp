@@ -377,6 +377,21 @@ void CMainView::CreateFromMenu(const CItemData& clicked) {
   MarkDocument();
 }
 
+void CMainView::MoveSelected(int step) {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr || item->parent() == nullptr) return;
+  Commit();
+  const QTreeWidgetItem* folder = item->parent();
+  QTreeWidgetItem* neighbour = folder->child(folder->indexOfChild(item) + step);
+  if (neighbour == nullptr) return;
+  const CItemData& moved = CElementTree::DataOf(*item);
+  const CItemData& target = CElementTree::DataOf(*neighbour);
+  if (moved.kind != target.kind || !Core().MoveElement(moved.id, target.id, step < 0)) return;
+  tree->MoveNode(*item, step);
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
+}
+
 void CMainView::DeleteNode(QTreeWidgetItem& item) {
   if (tree->currentItem() == &item) {
     QTreeWidgetItem* parent = item.parent();
@@ -417,6 +432,10 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
     const auto* key = static_cast<QKeyEvent*>(happened);
     if (key->key() == Qt::Key_Tab && key->modifiers() == Qt::NoModifier) {
       FocusForm();
+      return true;
+    }
+    if (key->modifiers() == Qt::AltModifier && (key->key() == Qt::Key_Up || key->key() == Qt::Key_Down)) {
+      MoveSelected(key->key() == Qt::Key_Up ? -1 : 1);
       return true;
     }
   }

@@ -79,6 +79,8 @@ class CMainView final : public QWidget, public CView {
   void OpenContextMenu(const QPoint& point);
   void CreateFromMenu(const CItemData& clicked);
   void DeleteFromMenu(Uid id, std::int32_t groupIndex);
+  /// Moves the selected element past its neighbour in the template and in the tree, where that is allowed.
+  void MoveSelected(int step);
   void DeleteNode(QTreeWidgetItem& item);
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;

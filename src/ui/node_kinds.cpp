@@ -5,6 +5,12 @@
 
 #include "core/template_core.h"
 #include "ui/form_tables.h"
+#include "ui/generic_list_view.h"
+#include "ui/plugin_functions_page.h"
+#include "ui/specie_forms.h"
+#include "ui/tessal_view.h"
+#include "ui/visibility_group_page.h"
+#include "ui/visibility_groups_page.h"
 
 namespace tessal {
 
@@ -33,15 +39,19 @@ using Kind = ElementKind;
 
 // kind, id, folder, help, creates, owner, offers Delete, form, caption, caption of an element
 constexpr NodeRow kNodeRows[] = {
-    {node_kind::kRoot, fixed::kRoot, kNone, kOtherHelp, Kind::None, Node, false, nullptr, "Tessal Setup"},
+    {node_kind::kRoot, fixed::kRoot, kNone, kOtherHelp, Kind::None, Node, false, Form<CTessalView>,
+     "Tessal Setup"},
 
-    {Kind::StateVariableList, fixed::kStateVariables, kNone, 100, Kind::StateVariable, Node, false},
-    {Kind::ConstantList, fixed::kConstants, kNone, 102, Kind::Constant, Node, false},
-    {Kind::ForcingList, fixed::kForcings, kNone, 106, Kind::Forcing, Node, false},
-    {Kind::AuxiliaryList, fixed::kAuxiliaries, kNone, 101, Kind::Auxiliary, Node, false},
-    {Kind::ProcessList, fixed::kProcesses, kNone, 119, Kind::Process, Node, false},
-    {Kind::DerivedOutputList, fixed::kDerivedOutputs, kNone, 120, Kind::DerivedOutput, Node, false},
-    {Kind::Specie, fixed::kParticleClasses, kNone, 114, Kind::Specie, Node, false, nullptr,
+    {Kind::StateVariableList, fixed::kStateVariables, kNone, 100, Kind::StateVariable, Node, false,
+     Form<CGenericListView>},
+    {Kind::ConstantList, fixed::kConstants, kNone, 102, Kind::Constant, Node, false, Form<CGenericListView>},
+    {Kind::ForcingList, fixed::kForcings, kNone, 106, Kind::Forcing, Node, false, Form<CGenericListView>},
+    {Kind::AuxiliaryList, fixed::kAuxiliaries, kNone, 101, Kind::Auxiliary, Node, false,
+     Form<CGenericListView>},
+    {Kind::ProcessList, fixed::kProcesses, kNone, 119, Kind::Process, Node, false, Form<CGenericListView>},
+    {Kind::DerivedOutputList, fixed::kDerivedOutputs, kNone, 120, Kind::DerivedOutput, Node, false,
+     Form<CGenericListView>},
+    {Kind::Specie, fixed::kParticleClasses, kNone, 114, Kind::Specie, Node, false, Form<CGenericListView>,
      "Particle Classes"},
 
     {Kind::StateVariable, kNone, fixed::kStateVariables, 100, Kind::StateVariable, ListHead, true,
@@ -52,32 +62,42 @@ constexpr NodeRow kNodeRows[] = {
     {Kind::Process, kNone, fixed::kProcesses, 119, Kind::Process, ListHead, true, Form<CProcessView>},
     {Kind::DerivedOutput, kNone, fixed::kDerivedOutputs, 120, Kind::DerivedOutput, Folder, true,
      Form<CDerviedView>, nullptr, DescriptionOf},
-    {Kind::Specie, kNone, fixed::kParticleClasses, 114, Kind::Specie, Folder, true},
+    {Kind::Specie, kNone, fixed::kParticleClasses, 114, Kind::Specie, Folder, true, Form<CSpecieGeneralView>},
 
-    {Kind::SpecieStateVariableList, kNone, kNone, 116, Kind::SpecieStateVariable, Node, false},
-    {Kind::SpecieConstantList, kNone, kNone, 113, Kind::SpecieConstant, Node, false},
+    {Kind::SpecieStateVariableList, kNone, kNone, 116, Kind::SpecieStateVariable, Node, false,
+     Form<CGenericListView>},
+    {Kind::SpecieConstantList, kNone, kNone, 113, Kind::SpecieConstant, Node, false, Form<CGenericListView>},
     {Kind::SpecieForcingList, kNone, kNone, kOtherHelp, Kind::SpecieForcing, Node, false},
-    {Kind::SpatialFunctionList, kNone, kNone, 115, Kind::SpatialFunction, Node, false},
-    {Kind::ArithmeticExpressionList, kNone, kNone, 112, Kind::ArithmeticExpression, Node, false},
-    {Kind::HorizontalVectorList, kNone, kNone, 117, Kind::HorizontalVector, Node, false},
-    {Kind::VerticalEquationList, kNone, kNone, 118, Kind::None, Node, false},
+    {Kind::SpatialFunctionList, kNone, kNone, 115, Kind::SpatialFunction, Node, false,
+     Form<CGenericListView>},
+    {Kind::ArithmeticExpressionList, kNone, kNone, 112, Kind::ArithmeticExpression, Node, false,
+     Form<CGenericListView>},
+    {Kind::HorizontalVectorList, kNone, kNone, 117, Kind::HorizontalVector, Node, false,
+     Form<CGenericListView>},
+    {Kind::VerticalEquationList, kNone, kNone, 118, Kind::None, Node, false, Form<CGenericListView>},
 
-    {Kind::SpecieStateVariable, kNone, kNone, 116, Kind::SpecieStateVariable, ListHead, true},
-    {Kind::SpecieConstant, kNone, kNone, 113, Kind::SpecieConstant, ListHead, true},
+    {Kind::SpecieStateVariable, kNone, kNone, 116, Kind::SpecieStateVariable, ListHead, true,
+     Form<CSpecieStateVariableView>},
+    {Kind::SpecieConstant, kNone, kNone, 113, Kind::SpecieConstant, ListHead, true,
+     Form<CSpecieConstantView>},
     {Kind::SpecieForcing, kNone, kNone, kOtherHelp, Kind::SpecieForcing, ListHead, true},
-    {Kind::SpatialFunction, kNone, kNone, 115, Kind::SpatialFunction, ListHead, true},
-    {Kind::ArithmeticExpression, kNone, kNone, 112, Kind::ArithmeticExpression, ListHead, true},
-    {Kind::HorizontalVector, kNone, kNone, 117, Kind::HorizontalVector, ListHead, true},
-    {Kind::VerticalEquation, kNone, kNone, 118, Kind::None, Node, false},
+    {Kind::SpatialFunction, kNone, kNone, 115, Kind::SpatialFunction, ListHead, true,
+     Form<CSpecieSpatialFunctionView>},
+    {Kind::ArithmeticExpression, kNone, kNone, 112, Kind::ArithmeticExpression, ListHead, true,
+     Form<CSpecieArithmeticExprView>},
+    {Kind::HorizontalVector, kNone, kNone, 117, Kind::HorizontalVector, ListHead, true,
+     Form<CSpecieVectorHView>},
+    {Kind::VerticalEquation, kNone, kNone, 118, Kind::None, Node, false, Form<CSpecieVectorVView>},
 
     {Kind::Miscellaneous, fixed::kMiscellaneous, kNone, 110, Kind::None, Node, false, Form<CMiscView>},
     {node_kind::kPluginFunctions, fixed::kPluginFunctions, kNone, kOtherHelp, Kind::None, Node, false,
-     nullptr, "Plug-in Functions"},
+     Form<CPluginFunctionsDlg>, "Plug-in Functions"},
     {Kind::ExternalFunction, kNone, fixed::kPluginFunctions, kOtherHelp, Kind::ExternalFunction, Folder, true,
-     nullptr, nullptr, PublicNameOf},
-    {Kind::VisibilityGroups, fixed::kVisibilityGroups, kNone, kOtherHelp, Kind::VisibilityGroups, Node,
-     false},
-    {Kind::VisibilityGroup, fixed::kVisibilityGroup, kNone, kOtherHelp, Kind::VisibilityGroup, Node, true},
+     Form<CExternalFunctionView>, nullptr, PublicNameOf},
+    {Kind::VisibilityGroups, fixed::kVisibilityGroups, kNone, kOtherHelp, Kind::VisibilityGroups, Node, false,
+     Form<CVisibilityGroupsDlg>},
+    {Kind::VisibilityGroup, fixed::kVisibilityGroup, kNone, kOtherHelp, Kind::VisibilityGroup, Node, true,
+     Form<CVisibilityGroupDlg>},
 };
 
 constexpr NodeRow kUnknownNode{Kind::Unknown, kNone, kNone, kOtherHelp, Kind::None, Node, false};

@@ -79,6 +79,11 @@ void CRightPaneBase::RequestCommit() {
   Document().UpdateAllViews(nullptr, hint::kCommit);
 }
 
+void CRightPaneBase::JumpTo(Uid uid) {
+  const NumberHint argument(NumberOf(uid));
+  Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
+}
+
 void CRightPaneBase::Rename(const std::string& newSymbol) {
   const CEL_Element* element = Element();
   const std::string oldSymbol = element->symbol.Text();

@@ -41,15 +41,22 @@ class CRightPaneBase : public QWidget {
   virtual void ItemToForm() {}
   virtual void FormToItem() {}
 
+  const FormContext& Context() const { return where; }
   CTessalDoc& Document() const { return where.document; }
   TemplateCore& Core() const;
   UserDialogs& Dialogs() const { return where.dialogs; }
-  CEL_Element* Element() const;
+  /// The node that the form shows.
+  CItemData& Item() const { return where.item; }
+  /// The element of the node; none for a node that is no element.
+  virtual CEL_Element* Element() const;
 
   // What controls report. Nothing counts while the form is being filled or written.
   void NoteEdited();
   void NoteFocusLost();
   void NoteChosen();
+  /// Has the main view commit the form, and show what follows from it.
+  void RequestCommit();
+  void JumpTo(Uid uid);
 
   /// Asks what a new symbol needs asking, and renames; shows a message when the name is refused.
   void Rename(const std::string& newSymbol);
@@ -58,7 +65,6 @@ class CRightPaneBase : public QWidget {
   /// Asks about each undefined symbol that was not asked about yet; true when an element was created.
   bool OfferUndefinedSymbols();
   bool IsDeaf() const { return loading || committing || closed; }
-  void RequestCommit();
 
   FormContext where;
   bool dirty = false;

@@ -14,6 +14,46 @@ inline const QString kNavigateBack = QStringLiteral("Navigate back");
 inline const QString kNavigateForward = QStringLiteral("Navigate forward");
 inline const QString kNavigationHistory = QStringLiteral("Navigation history");
 
+// The commands of the list pages.
+inline const QString kNew = QStringLiteral("New");
+inline const QString kEditRow = QStringLiteral("Edit");
+inline const QString kMoveDown = QStringLiteral("Move down");
+inline const QString kMoveUp = QStringLiteral("Move up");
+inline const QString kListCommands = QStringLiteral("Commands of the list");
+inline const QString kNumberColumn = QStringLiteral("No.");
+inline const QString kDescriptionColumn = QStringLiteral("Description");
+inline const QString kVisibilityGroup = QStringLiteral("Visibility group");
+inline const QString kLevel = QStringLiteral("Level");
+inline const QString kExpand = QStringLiteral("expand");
+
+// The pages of the root.
+inline const QString kGeneralPage = QStringLiteral("General");
+inline const QString kOverviewPage = QStringLiteral("Overview");
+inline const QString kGeneralOverview = QStringLiteral("General overview");
+inline const QString kEnableMisc = QStringLiteral("Enable miscellaneous features");
+inline const QString kEnableParticles = QStringLiteral("Enable particle class/species");
+inline const QString kShowAllBuiltIns = QStringLiteral("Show all built-in constants/forcing");
+inline const QString kToClipboard = QStringLiteral("to clipboard");
+inline constexpr const char* kClipboardDone = "Overview data exported to clipboard!";
+inline const QString kExportHtml = QStringLiteral("export HTML");
+inline const QString kAskMathJax = QStringLiteral(
+    "Export template as HTML documentation.\n\nEmbedd MathJax (jscript MathML render) for equations ?");
+inline const QString kPageExported = QStringLiteral("Template documentation exported to '%1'");
+
+// The visibility pages.
+inline const QString kDefinedLevels = QStringLiteral("Defined levels");
+inline const QString kGroupName = QStringLiteral("Group Name:");
+inline const QString kGroupDescription = QStringLiteral("Description:");
+inline const QString kLevelName = QStringLiteral("Level name");
+inline const QString kAvailableItems = QStringLiteral("Available items");
+inline const QString kIncludedItems = QStringLiteral("Include items");
+inline const QString kInclude = QStringLiteral("-->");
+inline const QString kExclude = QStringLiteral("<--");
+inline const QString kAddLevel = QStringLiteral("Add a level");
+inline const QString kDeleteLevel = QStringLiteral("Delete the level");
+inline const QString kIncludeItem = QStringLiteral("Include the item in the level");
+inline const QString kExcludeItem = QStringLiteral("Take the item out of the level");
+
 // The main view.
 inline const QString kElements = QStringLiteral("Elements of the template");
 inline const QString kMessages = QStringLiteral("Messages");

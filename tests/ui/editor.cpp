@@ -11,6 +11,7 @@
 #include <stdexcept>
 
 #include "support/template_text.h"
+#include "ui/row_table.h"
 
 namespace tessal::test {
 
@@ -98,8 +99,22 @@ QWidget& Editor::Labelled(const QString& label) {
 
 QString Editor::TextOf(const QWidget& control) {
   if (const auto* field = qobject_cast<const CPlainTextField*>(&control)) return field->ContentText();
+  if (const auto* table = qobject_cast<const CRowTable*>(&control)) return RowsOf(*table).join(u'\n');
   const auto* combo = qobject_cast<const QComboBox*>(&control);
   return combo != nullptr ? combo->currentText() : control.property("text").toString();
+}
+
+QStringList Editor::RowsOf(const CRowTable& table) {
+  QStringList rows;
+  const CRowModel& model = table.Model();
+  for (int row = 0; row < model.rowCount(); ++row) {
+    QStringList cells;
+    for (int column = 0; column < model.columnCount(); ++column) {
+      cells.append(model.index(row, column).data().toString());
+    }
+    rows.append((row == table.CurrentRow() ? "> " : "  ") + cells.join(QStringLiteral(" | ")));
+  }
+  return rows;
 }
 
 void Editor::Type(const QString& label, const QString& text) {

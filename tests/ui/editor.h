@@ -21,6 +21,10 @@
 #include "ui/main_view.h"
 #include "ui/right_pane.h"
 
+namespace tessal {
+class CRowTable;
+}
+
 namespace tessal::test {
 
 /// Answers every question, and notes what was asked and shown, in order.
@@ -84,6 +88,8 @@ class Editor final {
   }
   /// What a control shows.
   static QString TextOf(const QWidget& control);
+  /// The rows of a list page, the selected one with a mark.
+  static QStringList RowsOf(const CRowTable& table);
   /// Types over what a field holds; the focus stays there.
   void Type(const QString& label, const QString& text);
   void LeaveField() { Tree().setFocus(); }

@@ -12,6 +12,7 @@
 #include "ui/editor.h"
 #include "ui/expression_editor_dialog.h"
 #include "ui/node_kinds.h"
+#include "ui/row_table.h"
 
 namespace tessal {
 namespace {
@@ -49,9 +50,10 @@ std::string NodeText(Editor& editor, const QTreeWidgetItem& item, const CItemDat
 std::string FormText(const QWidget& form, ElementKind kindOfNode, std::map<std::string, std::string>& seen) {
   std::string descriptions;
   std::string contents;
+  std::string rows;
   for (const QWidget* control : form.findChildren<QWidget*>()) {
     const std::string id = control->objectName().toStdString();
-    if (id.empty() || id.starts_with("qt_")) continue;
+    if (id.empty() || id.starts_with("qt_") || id.starts_with("Scroll")) continue;
     std::string text =
         id + " " + control->metaObject()->className() + " " + control->accessibleName().toStdString();
     if (!control->isEnabled()) text += " (locked)";
@@ -59,11 +61,21 @@ std::string FormText(const QWidget& form, ElementKind kindOfNode, std::map<std::
     if (const auto* combo = qobject_cast<const QComboBox*>(control)) {
       text += ": " + Editor::Offered(*combo).join(QStringLiteral(" | ")).toStdString();
     }
+    if (const auto* table = qobject_cast<const CRowTable*>(control)) {
+      for (int column = 0; column < table->Model().columnCount(); ++column) {
+        text += (column == 0 ? ": " : " | ") +
+                table->Model().headerData(column, Qt::Horizontal, Qt::DisplayRole).toString().toStdString();
+      }
+    }
     const std::string key = std::to_string(NumberOf(kindOfNode)) + " " + id;
     if (std::exchange(seen[key], text) != text) descriptions += "  " + text + "\n";
+    if (const auto* table = qobject_cast<const CRowTable*>(control)) {
+      rows += Editor::RowsOf(*table).join(u'\n').toStdString() + "\n";
+      continue;
+    }
     contents += (contents.empty() ? "" : " | ") + Editor::TextOf(*control).toStdString();
   }
-  return descriptions + contents + "\n";
+  return descriptions + contents + "\n" + rows;
 }
 
 TEST(Examples, ShowTheirNodesAndFormsAndAreNotChangedByALook) {

@@ -1,0 +1,16 @@
+// The elements that a folder of the tree holds.
+#pragma once
+
+#include <vector>
+
+#include "ui/item_data.h"
+
+namespace tessal {
+
+class CEL_Element;
+class TemplateCore;
+
+/// In the order of the template; none for a node that is no folder.
+std::vector<const CEL_Element*> ElementsOfFolder(const TemplateCore& core, const CItemData& folder);
+
+}  // namespace tessal

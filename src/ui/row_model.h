@@ -1,0 +1,61 @@
+// A table whose texts are looked up when they are shown: a page over a large template holds no copy of it.
+#pragma once
+
+#include <QAbstractTableModel>
+#include <QIcon>
+#include <QStringList>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "platform/uid.h"
+
+namespace tessal {
+
+class CRowModel final : public QAbstractTableModel {
+  Q_OBJECT
+
+ public:
+  struct Row {
+    Uid uid = Uid::None;      ///< the element that the row shows, where it shows one
+    std::int32_t key = 0;     ///< what its text is looked up by: a place or a number
+    std::int32_t number = 0;  ///< what the first column shows
+  };
+  using TextOf = std::function<std::string(const Row& row, int column)>;
+  /// Takes over what was entered in a cell.
+  using StoreText = std::function<void(int row, int column, const QString& text)>;
+
+  explicit CRowModel(QObject* parent) : QAbstractTableModel(parent) {}
+
+  void Fill(QStringList columnTitles, std::vector<Row> shownRows, TextOf lookUp);
+  /// The columns that can be edited in place.
+  void AllowEditing(std::vector<int> columns, StoreText store);
+  /// The column whose cells carry an icon, and which.
+  void ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf);
+
+  const std::vector<Row>& Rows() const { return rows; }
+  std::string TextAt(int row, int column) const;
+  void RemoveRowAt(int row);
+  /// Exchanges two neighbouring rows, with their numbers.
+  void ExchangeRows(int row, int other);
+  void RefreshRow(int row);
+
+  int rowCount(const QModelIndex& parent = {}) const override;
+  int columnCount(const QModelIndex& parent = {}) const override;
+  QVariant data(const QModelIndex& index, int role) const override;
+  bool setData(const QModelIndex& index, const QVariant& value, int role) override;
+  QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+  Qt::ItemFlags flags(const QModelIndex& index) const override;
+
+ private:
+  QStringList titles;
+  std::vector<Row> rows;
+  TextOf textOf;
+  std::vector<int> editableColumns;
+  StoreText storeText;
+  int iconColumn = -1;
+  std::function<QIcon(const Row&)> icon;
+};
+
+}  // namespace tessal
