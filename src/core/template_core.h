@@ -22,12 +22,6 @@ namespace tessal {
 /// The symbol of the message that a load leaves when it could not keep the file's further top-level sections.
 inline constexpr std::string_view kNotKeptSymbol = "could not read template: ";
 
-/// The elements of a template as one level sees them: by the number of the first record of each, in order.
-struct LevelItems {
-  std::vector<std::int32_t> included;
-  std::vector<std::int32_t> available;
-};
-
 class TemplateCore final : public ElementOwner {
  public:
   TemplateCore();
@@ -173,16 +167,16 @@ class TemplateCore final : public ElementOwner {
   /// Makes a group with a name that is not in use; its number.
   std::int32_t AddVisibilityGroup();
   void RemoveVisibilityGroup(std::int32_t group);
-  /// Each returns false, and changes nothing, for an empty name and for one that another group, or another
-  /// level of the group, has.
+  /// False, and nothing changes, for an empty name, one of another group, or a group that does not exist.
   bool SetGroupName(std::int32_t group, std::string_view name);
-  bool SetLevelName(std::int32_t group, std::int32_t level, std::string_view name);
   void SetGroupDescription(std::int32_t group, std::string_view text);
-  void SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text);
-  LevelItems ItemsOfLevel(std::int32_t group, std::int32_t level) const;
-  /// Makes a level with a default name that no level of the group has; its number, 0 for a group that does
-  /// not exist.
+  /// Makes a level with a name that is not in use in the group; its number, 0 for a group that does not
+  /// exist.
   std::int32_t CreateLevel(std::int32_t group);
+  /// False, and nothing changes, for an empty name, one of another level of the group, or a level that does
+  /// not exist.
+  bool SetLevelName(std::int32_t group, std::int32_t level, std::string_view name);
+  void SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text);
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItemToLevel(std::int32_t group, std::int32_t level, std::uint32_t sequence);
   void RemoveItemFromLevel(std::int32_t group, std::int32_t level, std::uint32_t sequence);
@@ -190,6 +184,11 @@ class TemplateCore final : public ElementOwner {
   /// table for a group below 1. With `recursive`, the levels down to the first are taken in.
   void CollectItems(std::int32_t group, std::int32_t level, std::vector<std::int32_t>& items,
                     bool recursive) const;
+  /// Record numbers of the elements that belong to a level, in the order of the table and each element once:
+  /// a movement by the first of its two records. None for a level that does not exist.
+  std::vector<std::int32_t> IncludedItems(std::int32_t group, std::int32_t level) const;
+  /// The same of all elements that do not belong to it.
+  std::vector<std::int32_t> AvailableItems(std::int32_t group, std::int32_t level) const;
   /// Names for people; a number below 1 has a word for "all".
   std::string GroupText(std::int32_t group) const;
   std::string GroupListText(std::int32_t group) const;

@@ -28,13 +28,11 @@ auto LevelOf(State& state, std::int32_t group, std::int32_t level) {
   return found == nullptr ? nullptr : Numbered(found->levels, level);
 }
 
-/// Whether a group, or a level, other than the one of a number has a name already.
-template <class Values>
-bool IsTaken(const Values& values, std::int32_t except, std::string_view name) {
-  std::int32_t number = 0;
-  return std::any_of(values.begin(), values.end(), [&number, except, name](const auto& value) {
-    return ++number != except && value.name == name;
-  });
+/// Whether a group or a level of this name is among the siblings, the excepted one aside.
+template <class Named>
+bool HasName(const std::vector<Named>& siblings, std::string_view name, const Named* except = nullptr) {
+  return std::any_of(siblings.begin(), siblings.end(),
+                     [name, except](const Named& each) { return &each != except && each.name == name; });
 }
 
 std::string NamedGroup(const TemplateState& state, std::int32_t group, std::string_view all) {
@@ -50,6 +48,20 @@ std::string NamedLevel(const TemplateState& state, std::int32_t group, std::int3
   if (group < 1 || level < 1) return std::string(all);
   const VisibilityLevel* found = LevelOf(state, group, level);
   return found == nullptr ? std::string() : found->name;
+}
+
+/// The record numbers of the elements that belong to a level, or of those that do not.
+std::vector<std::int32_t> ItemsOfLevel(const TemplateState& state, std::int32_t group, std::int32_t level,
+                                       bool belongs) {
+  std::vector<std::int32_t> numbers;
+  const VisibilityLevel* found = LevelOf(state, group, level);
+  if (found == nullptr) return numbers;
+  state.table.ForEachElement([found, belongs, &numbers](const SymbolRecord& record) {
+    if (found->items.contains(record.uid) == belongs) {
+      numbers.push_back(static_cast<std::int32_t>(record.sequence));
+    }
+  });
+  return numbers;
 }
 
 }  // namespace
@@ -89,7 +101,7 @@ std::int32_t VisibilityGroups::AddGroup() {
     ++state.groupCounter;
   } else {
     state.groupCounter = static_cast<std::uint32_t>(groups.size());
-    while (IsTaken(groups, 0, nameOf(state.groupCounter))) ++state.groupCounter;
+    while (HasName(groups, nameOf(state.groupCounter))) ++state.groupCounter;
   }
   groups.push_back({nameOf(state.groupCounter), "", {}});
   state.flags.modified = true;
@@ -106,42 +118,50 @@ void VisibilityGroups::RemoveGroup(std::int32_t group) {
   state.flags.modified = true;
 }
 
-bool VisibilityGroups::Change(std::string& text, std::string_view changed) {
-  if (text == changed) return false;
-  text = changed;
+std::int32_t VisibilityGroups::CreateLevel(std::int32_t group) {
+  VisibilityGroup* found = GroupOf(state, group);
+  if (found == nullptr) return 0;
+  auto& levels = found->levels;
+  levels.push_back({FirstFreeName("Level_", levels.size() + 1,
+                                  [&levels](const std::string& name) { return HasName(levels, name); }),
+                    "",
+                    {},
+                    {}});
+  state.flags.modified = true;
+  return static_cast<std::int32_t>(levels.size());
+}
+
+template <class Named>
+bool VisibilityGroups::Rename(const std::vector<Named>& siblings, Named& renamed, std::string_view name) {
+  if (renamed.name == name) return true;
+  if (name.empty() || HasName(siblings, name, &renamed)) return false;
+  renamed.name = name;
   state.flags.modified = true;
   return true;
 }
 
+void VisibilityGroups::Describe(std::string& description, std::string_view text) {
+  if (description == text) return;
+  description = text;
+  state.flags.modified = true;
+}
+
 bool VisibilityGroups::SetGroupName(std::int32_t group, std::string_view name) {
   VisibilityGroup* found = GroupOf(state, group);
-  return found != nullptr && !name.empty() && !IsTaken(Groups(), group, name) && Change(found->name, name);
+  return found != nullptr && Rename(Groups(), *found, name);
 }
 
 void VisibilityGroups::SetGroupDescription(std::int32_t group, std::string_view text) {
-  if (VisibilityGroup* found = GroupOf(state, group)) Change(found->description, text);
+  if (VisibilityGroup* found = GroupOf(state, group)) Describe(found->description, text);
 }
 
 bool VisibilityGroups::SetLevelName(std::int32_t group, std::int32_t level, std::string_view name) {
   VisibilityLevel* found = LevelOf(state, group, level);
-  return found != nullptr && !name.empty() && !IsTaken(GroupOf(state, group)->levels, level, name) &&
-         Change(found->name, name);
+  return found != nullptr && Rename(GroupOf(state, group)->levels, *found, name);
 }
 
 void VisibilityGroups::SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text) {
-  if (VisibilityLevel* found = LevelOf(state, group, level)) Change(found->description, text);
-}
-
-std::int32_t VisibilityGroups::CreateLevel(std::int32_t group) {
-  VisibilityGroup* found = GroupOf(state, group);
-  if (found == nullptr) return 0;
-  const auto number = static_cast<std::int32_t>(found->levels.size() + 1);
-  const std::string name =
-      FirstFreeName("Level_", static_cast<std::size_t>(number),
-                    [found](const std::string& each) { return IsTaken(found->levels, 0, each); });
-  found->levels.push_back({name, "", {}, {}});
-  state.flags.modified = true;
-  return number;
+  if (VisibilityLevel* found = LevelOf(state, group, level)) Describe(found->description, text);
 }
 
 void VisibilityGroups::DeleteLevel(std::int32_t group, std::int32_t level) {
@@ -187,27 +207,16 @@ void TemplateCore::SetGroupDescription(std::int32_t group, std::string_view text
   VisibilityGroups(state).SetGroupDescription(group, text);
 }
 
+std::int32_t TemplateCore::CreateLevel(std::int32_t group) {
+  return VisibilityGroups(state).CreateLevel(group);
+}
+
 bool TemplateCore::SetLevelName(std::int32_t group, std::int32_t level, std::string_view name) {
   return VisibilityGroups(state).SetLevelName(group, level, name);
 }
 
 void TemplateCore::SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text) {
   VisibilityGroups(state).SetLevelDescription(group, level, text);
-}
-
-LevelItems TemplateCore::ItemsOfLevel(std::int32_t group, std::int32_t level) const {
-  LevelItems items;
-  const VisibilityLevel* found = LevelOf(state, group, level);
-  if (found == nullptr) return items;
-  state.table.ForEachElement([found, &items](const SymbolRecord& record) {
-    const bool isIncluded = found->items.contains(record.uid);
-    (isIncluded ? items.included : items.available).push_back(static_cast<std::int32_t>(record.sequence));
-  });
-  return items;
-}
-
-std::int32_t TemplateCore::CreateLevel(std::int32_t group) {
-  return VisibilityGroups(state).CreateLevel(group);
 }
 
 void TemplateCore::DeleteLevel(std::int32_t group, std::int32_t level) {
@@ -244,6 +253,14 @@ void TemplateCore::CollectItems(std::int32_t group, std::int32_t level, std::vec
   }
   const std::set<std::int32_t> numbers = ItemsToRecordNumbers(uids);
   items.assign(numbers.begin(), numbers.end());
+}
+
+std::vector<std::int32_t> TemplateCore::IncludedItems(std::int32_t group, std::int32_t level) const {
+  return ItemsOfLevel(state, group, level, true);
+}
+
+std::vector<std::int32_t> TemplateCore::AvailableItems(std::int32_t group, std::int32_t level) const {
+  return ItemsOfLevel(state, group, level, false);
 }
 
 std::string TemplateCore::GroupText(std::int32_t group) const {

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <cstdint>
+#include <string_view>
 #include <vector>
 
 #include "core/template_state.h"
@@ -20,9 +21,9 @@ class VisibilityGroups final {
   void RemoveGroup(std::int32_t group);
   bool SetGroupName(std::int32_t group, std::string_view name);
   void SetGroupDescription(std::int32_t group, std::string_view text);
+  std::int32_t CreateLevel(std::int32_t group);
   bool SetLevelName(std::int32_t group, std::int32_t level, std::string_view name);
   void SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text);
-  std::int32_t CreateLevel(std::int32_t group);
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
   void RemoveItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
@@ -30,10 +31,10 @@ class VisibilityGroups final {
   void Leave(CEL_Element& element);
 
  private:
+  template <class Named>
+  bool Rename(const std::vector<Named>& siblings, Named& renamed, std::string_view name);
+  void Describe(std::string& description, std::string_view text);
   std::vector<VisibilityGroup>& Groups() { return state.misc.Visibilities().groups; }
-
-  /// Changes a text of a group or a level; false when it is the same already.
-  bool Change(std::string& text, std::string_view changed);
 
   TemplateState& state;
 };

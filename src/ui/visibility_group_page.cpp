@@ -202,9 +202,8 @@ void CVisibilityGroupDlg::ShowLevelFields() {
 }
 
 void CVisibilityGroupDlg::FillItems() {
-  const LevelItems items = Core().ItemsOfLevel(Number(), current);
-  FillItemTable(*available, items.available);
-  FillItemTable(*included, items.included);
+  FillItemTable(*available, Core().AvailableItems(Number(), current));
+  FillItemTable(*included, Core().IncludedItems(Number(), current));
   UpdateButtons();
 }
 

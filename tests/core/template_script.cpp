@@ -337,6 +337,17 @@ std::string TemplateScript::Items(const Words& words) {
   return text;
 }
 
+/// What a level includes, and what could be added to it.
+std::string TemplateScript::LevelItems(const Words& words) {
+  const std::int32_t group = Number(words.at(0));
+  const std::int32_t level = Number(words.at(1));
+  std::string text = "included";
+  for (const std::int32_t item : core.IncludedItems(group, level)) text += " " + std::to_string(item);
+  text += ", available";
+  for (const std::int32_t item : core.AvailableItems(group, level)) text += " " + std::to_string(item);
+  return text;
+}
+
 std::string TemplateScript::Lookups(const std::string& name) {
   const CEL_Element& element = Element(name);
   const auto uid = element.GetUid();
@@ -436,6 +447,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"look", [](S s, W w) { return s.Lookups(w.at(0)); }},
       {"groups", [](S s, W) { return s.Groups(); }},
       {"items", [](S s, W w) { return s.Items(w); }},
+      {"level-items", [](S s, W w) { return s.LevelItems(w); }},
       {"modified", [](S s, W) { return YesNo(s.core.Modified()); }},
       {"mark", [](S s, W) { return s.core.SetModified(true), ""; }},
       {"clear", [](S s, W) { return s.core.Clear(), ""; }},
@@ -481,6 +493,12 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},
       {"add-group", [](S s, W) { return std::to_string(s.core.AddVisibilityGroup()); }},
       {"remove-group", [](S s, W w) { return s.core.RemoveVisibilityGroup(Number(w.at(0))), ""; }},
+      {"name-group", [](S s, W w) { return YesNo(s.core.SetGroupName(Number(w.at(0)), w.at(1))); }},
+      {"describe-group", [](S s, W w) { return s.core.SetGroupDescription(Number(w.at(0)), w.at(1)), ""; }},
+      {"name-level",
+       [](S s, W w) { return YesNo(s.core.SetLevelName(Number(w.at(0)), Number(w.at(1)), w.at(2))); }},
+      {"describe-level",
+       [](S s, W w) { return s.core.SetLevelDescription(Number(w.at(0)), Number(w.at(1)), w.at(2)), ""; }},
       {"add-level", [](S s, W w) { return std::to_string(s.core.CreateLevel(Number(w.at(0)))); }},
       {"delete-level", [](S s, W w) { return s.core.DeleteLevel(Number(w.at(0)), Number(w.at(1))), ""; }},
       {"add-item",
