@@ -3,9 +3,11 @@
 #include <QComboBox>
 #include <QFileInfo>
 #include <QGridLayout>
+#include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QSplitter>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
@@ -15,7 +17,6 @@
 #include "core/document.h"
 #include "elements/property_io.h"
 #include "ui/child.h"
-#include "ui/control_ids.h"
 #include "ui/dialogs.h"
 #include "ui/documentation_link.h"
 #include "ui/expression_editor_dialog.h"
@@ -54,11 +55,25 @@ bool IsShort(FieldEditor editor) {
     case FieldEditor::Number:
     case FieldEditor::Integer:
     case FieldEditor::Shown:
+    case FieldEditor::Count:
     case FieldEditor::SortedChoice:
     case FieldEditor::OrderedChoice:
       return true;
     default:
       return false;
+  }
+}
+
+/// Whether a commit writes the field. A symbol is renamed in a way of its own.
+bool IsStored(FieldEditor editor) {
+  switch (editor) {
+    case FieldEditor::Symbol:
+    case FieldEditor::Shown:
+    case FieldEditor::Count:
+    case FieldEditor::ReferencedIn:
+      return false;
+    default:
+      return true;
   }
 }
 
@@ -81,6 +96,8 @@ void LimitHeight(QWidget& editor) {
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
   for (const FormField& field : fields) AddField(field);
+  SplitExpressions();
+  BoxCounts();
   Arrange(1);
   narrowWidth = layout->minimumSize().width();
   Arrange(2);
@@ -97,6 +114,49 @@ void CElementForm::AddField(const FormField& field) {
   controls.push_back(control);
 }
 
+void CElementForm::SplitExpressions() {
+  constexpr int kSameShare = 1000;
+  const auto isExpression = [](const Control& control) {
+    return control.field->editor == FieldEditor::Expression;
+  };
+  const auto expressionCount = std::count_if(controls.begin(), controls.end(), isExpression);
+  if (expressionCount < 2) return;
+  split = MakeChild<QSplitter>(Qt::Vertical, this);
+  split->setObjectName(QStringLiteral("Split"));
+  split->setChildrenCollapsible(false);
+  for (Control& control : controls) {
+    if (!isExpression(control)) continue;
+    auto* panel = MakeChild<QWidget>(split);
+    panel->setObjectName(split->count() == 0 ? QStringLiteral("Top") : QStringLiteral("Bottom"));
+    auto* parts = MakeChild<QHBoxLayout>(panel);
+    parts->setContentsMargins(0, 0, 0, 0);
+    parts->addWidget(control.label, 0, Qt::AlignTop);
+    parts->addWidget(control.cell, 1);
+    split->addWidget(panel);
+    control.isInBlock = true;
+  }
+  split->setSizes(QList<int>(split->count(), kSameShare));
+}
+
+void CElementForm::BoxCounts() {
+  constexpr int kCountsPerRow = 2;
+  QGridLayout* cells = nullptr;
+  int place = 0;
+  for (Control& control : controls) {
+    if (control.field->editor != FieldEditor::Count) continue;
+    if (cells == nullptr) {
+      overview = MakeChild<QGroupBox>(strings::kGeneralOverview, this);
+      overview->setObjectName(QString::number(control_id::kOverviewBox));
+      cells = MakeChild<QGridLayout>(overview);
+    }
+    const int column = 2 * (place % kCountsPerRow);
+    cells->addWidget(control.label, place / kCountsPerRow, column);
+    cells->addWidget(control.cell, place / kCountsPerRow, column + 1);
+    control.isInBlock = true;
+    ++place;
+  }
+}
+
 void CElementForm::Arrange(int columnCount) {
   if (columnCount == columns) return;
   columns = columnCount;
@@ -105,8 +165,9 @@ void CElementForm::Arrange(int columnCount) {
   constexpr int kGridColumns = 4;
   int row = -1;
   int column = kGridColumns;
-  bool grows = false;
+  bool grows = split != nullptr;
   for (const Control& control : controls) {
+    if (control.isInBlock) continue;
     const bool isShort = columns > 1 && IsShort(control.field->editor);
     if (!isShort || column >= kGridColumns) {
       ++row;
@@ -119,6 +180,11 @@ void CElementForm::Arrange(int columnCount) {
     if (control.field->editor != FieldEditor::Expression) continue;
     layout->setRowStretch(row, 1);
     grows = true;
+  }
+  if (overview != nullptr) layout->addWidget(overview, ++row, 0, 1, kGridColumns);
+  if (split != nullptr) {
+    layout->addWidget(split, ++row, 0, 1, kGridColumns);
+    layout->setRowStretch(row, 1);
   }
   layout->setColumnStretch(1, 1);
   layout->setColumnStretch(3, columns > 1 ? 1 : 0);
@@ -155,7 +221,7 @@ QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
 
 QLineEdit* CElementForm::MakeLine(const FormField& field, QWidget* parent) {
   auto* line = MakeChild<QLineEdit>(parent);
-  line->setReadOnly(field.editor == FieldEditor::Shown);
+  line->setReadOnly(field.editor == FieldEditor::Shown || field.editor == FieldEditor::Count);
   connect(line, &QLineEdit::textEdited, this, [this] { NoteEdited(); });
   connect(line, &QLineEdit::editingFinished, this, [this] { NoteFocusLost(); });
   return line;
@@ -218,7 +284,7 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
-  keypad->setObjectName(QString::number(control_id::kKeypad));
+  keypad->setObjectName(QString::number(field.keypad));
   keypad->setAccessibleName(strings::kExpressionEditor);
   auto* under = MakeChild<QHBoxLayout>();
   under->addWidget(note, 1);
@@ -254,6 +320,10 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
   if (field.editor == FieldEditor::ReferencedIn) {
     qobject_cast<CAutoRichEditCtrl*>(control.editor)->SetColouredText(ReferrerText(element));
+    return;
+  }
+  if (field.editor == FieldEditor::Count) {
+    qobject_cast<QLineEdit*>(control.editor)->setText(QString::number(field.count(element)));
     return;
   }
   const CEL_Property& property = field.property(element);
@@ -335,6 +405,12 @@ bool CElementForm::StoreFields(CEL_Element& element) {
   return !changed.empty();
 }
 
+bool CElementForm::StoreField(int control, CEL_Element& element) {
+  const auto stored = std::find_if(controls.begin(), controls.end(),
+                                   [control](const Control& each) { return each.field->control == control; });
+  return stored != controls.end() && Store(*stored, element);
+}
+
 bool CElementForm::IsEdited(const Control& control) {
   const auto* field = qobject_cast<const CPlainTextField*>(control.editor);
   return field != nullptr ? field->IsEdited() : TextIn(*control.editor) != control.shown;
@@ -342,9 +418,7 @@ bool CElementForm::IsEdited(const Control& control) {
 
 bool CElementForm::Store(const Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
-  const bool isStored = field.editor != FieldEditor::Symbol && field.editor != FieldEditor::Shown &&
-                        field.editor != FieldEditor::ReferencedIn;
-  if (!isStored) return false;
+  if (!IsStored(field.editor)) return false;
   CEL_Property& property = field.property(element);
   if (field.onlyWhileEnabled && !IsEnabled(field, property)) return false;
   if (const auto* combo = qobject_cast<const QComboBox*>(control.editor))

@@ -27,6 +27,7 @@ inline const QString kDelete = QStringLiteral("Delete");
 // The forms.
 inline const QString kNoView = QStringLiteral("There is no view for current selectoin.");
 inline constexpr const char* kNotUsed = "Not used !";
+inline const QString kGeneralOverview = QStringLiteral("General overview");
 inline const QString kBrowse = QStringLiteral("...");
 inline const QString kView = QStringLiteral("view");
 inline const QString kEdit = QStringLiteral("Edit...");
