@@ -11,6 +11,7 @@ inline constexpr int kDocumentation = 1076;
 inline constexpr int kNoView = 1086;
 inline constexpr int kReferencedIn = 1094;
 inline constexpr int kSymbol = 1097;
+inline constexpr int kOverviewBox = 1102;
 inline constexpr int kErrorList = 1103;
 inline constexpr int kList = 1103;
 inline constexpr int kListCommands = 678;

@@ -18,7 +18,6 @@
 #include "core/document.h"
 #include "elements/property_io.h"
 #include "ui/child.h"
-#include "ui/control_ids.h"
 #include "ui/dialogs.h"
 #include "ui/documentation_link.h"
 #include "ui/expression_editor_dialog.h"
@@ -34,8 +33,6 @@ namespace {
 
 constexpr int kFewestLines = 2;
 constexpr int kMostLines = 4;
-/// A label and its editor, twice.
-constexpr int kGridColumns = 4;
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
@@ -59,11 +56,25 @@ bool IsShort(FieldEditor editor) {
     case FieldEditor::Number:
     case FieldEditor::Integer:
     case FieldEditor::Shown:
+    case FieldEditor::Count:
     case FieldEditor::SortedChoice:
     case FieldEditor::OrderedChoice:
       return true;
     default:
       return false;
+  }
+}
+
+/// Whether a commit writes the field. A symbol is renamed in a way of its own.
+bool IsStored(FieldEditor editor) {
+  switch (editor) {
+    case FieldEditor::Symbol:
+    case FieldEditor::Shown:
+    case FieldEditor::Count:
+    case FieldEditor::ReferencedIn:
+      return false;
+    default:
+      return true;
   }
 }
 
@@ -85,15 +96,9 @@ void LimitHeight(QWidget& editor) {
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
-  const auto expressionCount = std::count_if(fields.begin(), fields.end(), [](const FormField& field) {
-    return field.editor == FieldEditor::Expression;
-  });
-  if (expressionCount > 1) {
-    expressions = MakeChild<QSplitter>(Qt::Vertical, this);
-    expressions->setObjectName(QStringLiteral("Split"));
-    expressions->setChildrenCollapsible(false);
-  }
   for (const FormField& field : fields) AddField(field);
+  SplitExpressions();
+  BoxCounts();
   Arrange(1);
   narrowWidth = layout->minimumSize().width();
   Arrange(2);
@@ -108,13 +113,48 @@ void CElementForm::AddField(const FormField& field) {
   control.label = MakeChild<QLabel>(QString::fromLatin1(field.label), this);
   control.label->setBuddy(control.editor);
   controls.push_back(control);
-  if (expressions != nullptr && field.editor == FieldEditor::Expression) {
-    auto* half = MakeChild<QWidget>(expressions);
-    auto* rows = MakeChild<QVBoxLayout>(half);
-    rows->setContentsMargins(0, 0, 0, 0);
-    rows->addWidget(control.label);
-    rows->addWidget(control.cell, 1);
-    expressions->addWidget(half);
+}
+
+void CElementForm::SplitExpressions() {
+  constexpr int kSameShare = 1000;
+  const auto isExpression = [](const Control& control) {
+    return control.field->editor == FieldEditor::Expression;
+  };
+  const auto expressionCount = std::count_if(controls.begin(), controls.end(), isExpression);
+  if (expressionCount < 2) return;
+  split = MakeChild<QSplitter>(Qt::Vertical, this);
+  split->setObjectName(QStringLiteral("Split"));
+  split->setChildrenCollapsible(false);
+  for (Control& control : controls) {
+    if (!isExpression(control)) continue;
+    auto* panel = MakeChild<QWidget>(split);
+    panel->setObjectName(split->count() == 0 ? QStringLiteral("Top") : QStringLiteral("Bottom"));
+    auto* parts = MakeChild<QHBoxLayout>(panel);
+    parts->setContentsMargins(0, 0, 0, 0);
+    parts->addWidget(control.label, 0, Qt::AlignTop);
+    parts->addWidget(control.cell, 1);
+    split->addWidget(panel);
+    control.isInBlock = true;
+  }
+  split->setSizes(QList<int>(split->count(), kSameShare));
+}
+
+void CElementForm::BoxCounts() {
+  constexpr int kCountsPerRow = 2;
+  QGridLayout* cells = nullptr;
+  int place = 0;
+  for (Control& control : controls) {
+    if (control.field->editor != FieldEditor::Count) continue;
+    if (cells == nullptr) {
+      overview = MakeChild<QGroupBox>(strings::kGeneralOverview, this);
+      overview->setObjectName(QString::number(control_id::kOverviewBox));
+      cells = MakeChild<QGridLayout>(overview);
+    }
+    const int column = 2 * (place % kCountsPerRow);
+    cells->addWidget(control.label, place / kCountsPerRow, column);
+    cells->addWidget(control.cell, place / kCountsPerRow, column + 1);
+    control.isInBlock = true;
+    ++place;
   }
 }
 
@@ -124,42 +164,17 @@ void CElementForm::AddUnder(QWidget* widget) {
   Arrange(present);
 }
 
-void CElementForm::ArrangeCounts() {
-  constexpr int kPairsPerRow = 2;
-  if (counts == nullptr) {
-    counts = MakeChild<QGroupBox>(strings::kGeneralOverview, this);
-    counts->setObjectName(QStringLiteral("1102"));
-    auto* grid = MakeChild<QGridLayout>(counts);
-    int place = 0;
-    for (const Control& control : controls) {
-      if (control.field->editor != FieldEditor::Count) continue;
-      const int column = 2 * (place % kPairsPerRow);
-      grid->addWidget(control.label, place / kPairsPerRow, column);
-      grid->addWidget(control.cell, place / kPairsPerRow, column + 1);
-      ++place;
-    }
-  }
-}
-
 void CElementForm::Arrange(int columnCount) {
   if (columnCount == columns) return;
   columns = columnCount;
   while (const std::unique_ptr<QLayoutItem> gone{layout->takeAt(0)}) continue;
   for (int row = 0; row < layout->rowCount(); ++row) layout->setRowStretch(row, 0);
+  constexpr int kGridColumns = 4;
   int row = -1;
   int column = kGridColumns;
-  bool grows = false;
-  const auto addWide = [this, &row, &column](QWidget* widget) {
-    layout->addWidget(widget, ++row, 0, 1, kGridColumns);
-    column = kGridColumns;
-  };
-  bool hasCounts = false;
+  bool grows = split != nullptr;
   for (const Control& control : controls) {
-    if (control.field->editor == FieldEditor::Count) {
-      hasCounts = true;
-      continue;
-    }
-    if (expressions != nullptr && control.field->editor == FieldEditor::Expression) continue;
+    if (control.isInBlock) continue;
     const bool isShort = columns > 1 && IsShort(control.field->editor);
     if (!isShort || column >= kGridColumns) {
       ++row;
@@ -173,16 +188,12 @@ void CElementForm::Arrange(int columnCount) {
     layout->setRowStretch(row, 1);
     grows = true;
   }
-  if (hasCounts) {
-    ArrangeCounts();
-    addWide(counts);
-  }
-  if (expressions != nullptr) {
-    addWide(expressions);
+  if (overview != nullptr) layout->addWidget(overview, ++row, 0, 1, kGridColumns);
+  if (split != nullptr) {
+    layout->addWidget(split, ++row, 0, 1, kGridColumns);
     layout->setRowStretch(row, 1);
-    grows = true;
   }
-  for (QWidget* widget : under) addWide(widget);
+  for (QWidget* widget : under) layout->addWidget(widget, ++row, 0, 1, kGridColumns);
   layout->setColumnStretch(1, 1);
   layout->setColumnStretch(3, columns > 1 ? 1 : 0);
   if (!grows) layout->setRowStretch(row + 1, 1);
@@ -281,7 +292,7 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
-  keypad->setObjectName(QString::number(field.button));
+  keypad->setObjectName(QString::number(field.keypad));
   keypad->setAccessibleName(strings::kExpressionEditor);
   auto* foot = MakeChild<QHBoxLayout>();
   foot->addWidget(note, 1);
@@ -315,7 +326,7 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
     return;
   }
   if (field.editor == FieldEditor::Count) {
-    qobject_cast<QLineEdit*>(control.editor)->setText(QString::number(field.count(Core(), element)));
+    qobject_cast<QLineEdit*>(control.editor)->setText(QString::number(field.count(element)));
     return;
   }
   const CEL_Property& property = field.property(element);
@@ -398,9 +409,9 @@ bool CElementForm::StoreFields(CEL_Element& element) {
 }
 
 bool CElementForm::StoreField(int control, CEL_Element& element) {
-  const auto field = std::find_if(controls.begin(), controls.end(),
-                                  [control](const Control& each) { return each.field->control == control; });
-  return field != controls.end() && Store(*field, element);
+  const auto stored = std::find_if(controls.begin(), controls.end(),
+                                   [control](const Control& each) { return each.field->control == control; });
+  return stored != controls.end() && Store(*stored, element);
 }
 
 bool CElementForm::IsEdited(const Control& control) {
@@ -410,9 +421,7 @@ bool CElementForm::IsEdited(const Control& control) {
 
 bool CElementForm::Store(const Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
-  const bool isStored = field.editor != FieldEditor::Symbol && field.editor != FieldEditor::Shown &&
-                        field.editor != FieldEditor::ReferencedIn && field.editor != FieldEditor::Count;
-  if (!isStored) return false;
+  if (!IsStored(field.editor)) return false;
   CEL_Property& property = field.property(element);
   if (field.onlyWhileEnabled && !IsEnabled(field, property)) return false;
   if (const auto* combo = qobject_cast<const QComboBox*>(control.editor))

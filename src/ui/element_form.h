@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QString>
+#include <cstddef>
 #include <span>
 #include <string>
 #include <vector>
@@ -12,9 +13,9 @@
 class QComboBox;
 class QGridLayout;
 class QGroupBox;
-class QSplitter;
 class QLabel;
 class QLineEdit;
+class QSplitter;
 
 namespace tessal {
 
@@ -29,14 +30,14 @@ enum class FieldEditor {
   Number,         ///< a real
   Integer,
   Shown,          ///< a value that is shown and never stored
-  Count,          ///< how many there are of something; in the box of the counts
+  Count,          ///< a size, read-only, in the box "General overview"
   SortedChoice,   ///< a combo box, its entries by caption
   OrderedChoice,  ///< a combo box, its entries in the order of the choices
-  Expression,     ///< a coloured field, with the parser's message under it
+  Expression,     ///< a coloured field, with the parser's message under it; several share the form's height
   ReferencedIn    ///< the names of the users, as links
 };
 
-/// One field: the number of its control, its label, and the property that it shows.
+/// One field: the number of its control, its label, and the property that it shows; a count has none.
 struct FormField {
   int control;
   const char* label;
@@ -48,14 +49,14 @@ struct FormField {
   int follows = 0;
   /// Whether the field may be used in a template; without it the property says so.
   bool (*isOpen)(const TemplateCore& core) = nullptr;
-  /// What a count counts.
-  std::size_t (*count)(const TemplateCore& core, const CEL_Element& element) = nullptr;
-  /// The button under an expression.
-  int button = control_id::kKeypad;
+  /// The control of an expression's "Edit..." button.
+  int keypad = control_id::kKeypad;
+  /// What a count shows.
+  std::size_t (*count)(const CEL_Element& element) = nullptr;
 };
 
 constexpr FormField CountField(int control, const char* label,
-                               std::size_t (*count)(const TemplateCore& core, const CEL_Element& element)) {
+                               std::size_t (*count)(const CEL_Element& element)) {
   FormField field{control, label, FieldEditor::Count, nullptr};
   field.count = count;
   return field;
@@ -76,10 +77,10 @@ class CElementForm : public CRightPaneBase {
   void resizeEvent(QResizeEvent* resize) override;
   void ItemToForm() override;
   void FormToItem() override;
-
-  /// Writes the fields after the symbol; true when any has changed.
+  /// Writes the fields after the symbol, in the table's order; true when any has changed. A form whose fields
+  /// depend on each other writes them one by one.
   virtual bool StoreFields(CEL_Element& element);
-  /// Writes the field with the number of its control; true when it has changed.
+  /// Writes the field with a control number; true when it has changed.
   bool StoreField(int control, CEL_Element& element);
   /// Puts a widget under the fields.
   void AddUnder(QWidget* widget);
@@ -94,14 +95,17 @@ class CElementForm : public CRightPaneBase {
     QLabel* label = nullptr;
     QWidget* cell = nullptr;  ///< the editor with what lies beside it
     QLabel* note = nullptr;   ///< under an expression: what the parser says
+    bool isInBlock = false;   ///< lies in a block of its own under the rows
     QString shown;            ///< the text that the last load gave a line
   };
 
   bool IsEnabled(const FormField& field, const CEL_Property& property) const;
   bool Store(const Control& control, CEL_Element& element);
   void AddField(const FormField& field);
-  /// Lays out the counts side by side in their box.
-  void ArrangeCounts();
+  /// Puts several expressions into a splitter, each with the same share of the height.
+  void SplitExpressions();
+  /// Puts the counts into a box of their own.
+  void BoxCounts();
   /// Lays the fields out; short ones share a row when there are two columns.
   void Arrange(int columnCount);
   /// Makes the editor of a field. The cell that it lies in may hold more beside it.
@@ -126,9 +130,9 @@ class CElementForm : public CRightPaneBase {
 
   std::vector<Control> controls;
   std::vector<QWidget*> under;
-  QGroupBox* counts = nullptr;       ///< holds the counts, in a form that has some
-  QSplitter* expressions = nullptr;  ///< holds the expressions, in a form with more than one
   QGridLayout* layout;
+  QSplitter* split = nullptr;     ///< of a form with more than one expression
+  QGroupBox* overview = nullptr;  ///< of a form with counts
   int columns = 0;
   int narrowWidth = 0;  ///< what one column needs
 };

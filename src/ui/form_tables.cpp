@@ -142,8 +142,8 @@ constexpr FormField kExternalFunctionFields[] = {
 };
 
 template <auto Members>
-std::size_t CountOf(const TemplateCore& core, const CEL_Element& /*element*/) {
-  return (core.Elements().*Members).size();
+std::size_t CountOf(const CEL_Element& root) {
+  return (static_cast<const TemplateCore&>(*root.Owner()).Elements().*Members).size();
 }
 
 constexpr FormField kGeneralFields[] = {

@@ -16,12 +16,12 @@ const CEL_Lagrange_Specie& Class(const CEL_Element& element) {
 }
 
 template <auto Members>
-std::size_t CountOf(const TemplateCore& /*core*/, const CEL_Element& element) {
+std::size_t CountOf(const CEL_Element& element) {
   return (Class(element).*Members).size();
 }
 
 /// Each class has its one downward movement.
-std::size_t OneOf(const TemplateCore& /*core*/, const CEL_Element& /*element*/) {
+std::size_t OneOf(const CEL_Element& /*element*/) {
   return 1;
 }
 
@@ -90,12 +90,12 @@ constexpr FormField kHorizontalVectorFields[] = {
      .label = "Direction",
      .editor = Expression,
      .property = Of<&CEL_Lagrange_Horizontal_Vector::direction>,
-     .button = 1019},
+     .keypad = 1019},
     {.control = kSpeedControl,
      .label = "Speed",
      .editor = Expression,
      .property = Of<&CEL_Lagrange_Horizontal_Vector::speed>,
-     .button = kSpeedButton},
+     .keypad = kSpeedButton},
 };
 
 constexpr FormField kVerticalEquationFields[] = {
@@ -103,7 +103,7 @@ constexpr FormField kVerticalEquationFields[] = {
      .label = "Speed",
      .editor = Expression,
      .property = Of<&CEL_Lagrange_Vertical_Equation::speed>,
-     .button = kSpeedButton},
+     .keypad = kSpeedButton},
 };
 
 constexpr int kPurposeControl = 1053;

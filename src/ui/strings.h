@@ -29,7 +29,6 @@ inline const QString kExpand = QStringLiteral("expand");
 // The pages of the root.
 inline const QString kGeneralPage = QStringLiteral("General");
 inline const QString kOverviewPage = QStringLiteral("Overview");
-inline const QString kGeneralOverview = QStringLiteral("General overview");
 inline const QString kEnableMisc = QStringLiteral("Enable miscellaneous features");
 inline const QString kEnableParticles = QStringLiteral("Enable particle class/species");
 inline const QString kShowAllBuiltIns = QStringLiteral("Show all built-in constants/forcing");
@@ -67,6 +66,7 @@ inline const QString kDelete = QStringLiteral("Delete");
 // The forms.
 inline const QString kNoView = QStringLiteral("There is no view for current selectoin.");
 inline constexpr const char* kNotUsed = "Not used !";
+inline const QString kGeneralOverview = QStringLiteral("General overview");
 inline const QString kBrowse = QStringLiteral("...");
 inline const QString kView = QStringLiteral("view");
 inline const QString kEdit = QStringLiteral("Edit...");

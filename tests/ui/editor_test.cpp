@@ -6,6 +6,7 @@
 #include <QMimeData>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QSplitter>
 #include <QTest>
 #include <filesystem>
 #include <map>
@@ -14,6 +15,7 @@
 #include "ui/auto_create_dialog.h"
 #include "ui/documentation_link.h"
 #include "ui/editor.h"
+#include "ui/element_form.h"
 #include "ui/expression_colours.h"
 
 namespace tessal {
@@ -66,6 +68,47 @@ TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
   EXPECT_EQ(constant.unit.Text(), "kg");
   EXPECT_EQ(constant.description.Text(), longText);
   EXPECT_EQ(constant.onlineHelp.Text(), longText);
+}
+
+TEST(Forms, ShareTheirHeightBetweenExpressionsAndBoxTheirCounts) {
+  constexpr FormField kFields[] = {
+      {.control = 1114,
+       .label = "Direction",
+       .editor = FieldEditor::Expression,
+       .property = [](CEL_Element& element) -> CEL_Property& { return element.description; },
+       .keypad = 1019},
+      {.control = 1116,
+       .label = "Speed",
+       .editor = FieldEditor::Expression,
+       .property = [](CEL_Element& element) -> CEL_Property& { return element.onlineHelp; },
+       .keypad = 1034},
+      {.control = 1096,
+       .label = "Letters",
+       .editor = FieldEditor::Count,
+       .property = nullptr,
+       .count = [](const CEL_Element& element) { return element.description.Text().size(); }},
+  };
+  Editor editor(ModelText("constant k 1 | DESCRIPTION=|1+2|"));
+  CItemData item = CElementTree::DataOf(*editor.Node("k"));
+  CElementForm form(kFields, {editor.Document(), editor.User(), item}, nullptr);
+  constexpr QSize kSize(500, 400);
+  form.resize(kSize);
+  form.show();
+  form.Load();
+  EXPECT_TRUE(QTest::qWaitForWindowExposed(&form));
+  const QList<int> heights = form.findChild<QSplitter*>("Split")->sizes();
+  EXPECT_LE(std::abs(heights.at(0) - heights.at(1)), 1);
+  EXPECT_TRUE(form.findChild<QPushButton*>("1019") != nullptr &&
+              form.findChild<QPushButton*>("1034") != nullptr);
+  auto* count = form.findChild<QWidget*>("1102")->findChild<QLineEdit*>("1096");
+  EXPECT_EQ(count->text(), "3");
+  EXPECT_TRUE(count->isReadOnly());
+  form.findChild<CAutoRichEditCtrl*>("1114")->setPlainText("k");
+  form.findChild<CAutoRichEditCtrl*>("1116")->setPlainText("k+k");
+  form.Commit();
+  EXPECT_EQ(editor.Core().GetConstant(0).description.Text(), "k");
+  EXPECT_EQ(editor.Core().GetConstant(0).onlineHelp.Text(), "k+k");
+  EXPECT_EQ(count->text(), "1");
 }
 
 TEST(Colours, StayReadableOnADarkGround) {
