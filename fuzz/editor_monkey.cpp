@@ -6,6 +6,7 @@
 #include <QApplication>
 #include <QCheckBox>
 #include <QComboBox>
+#include <QInputMethodEvent>
 #include <QMenu>
 #include <QPushButton>
 #include <QStandardPaths>
@@ -53,12 +54,12 @@ constexpr const char* kWords[] = {"a",
                                   "2,5",
                                   "Fish::Age"};
 
-/// The whole table as text.
+/// The whole table as text, but for the numbers of inputs: a value is shown as it was at the last rebuild.
 std::string TableText(const TemplateCore& core) {
   std::ostringstream text;
   for (const SymbolRecord& record : core.SymbolTable()) {
     text << record.sequence << ' ' << core.RecordSymbol(record) << ' ' << NumberOf(record.uid) << ' '
-         << record.text << ':';
+         << (record.element->HasExpression() ? record.text : std::string()) << ':';
     for (const std::uint32_t used : record.references) text << ' ' << used;
     text << " by";
     for (const std::uint32_t user : record.referencedBy) text << ' ' << user;
@@ -66,6 +67,16 @@ std::string TableText(const TemplateCore& core) {
   }
   for (const auto& undefined : core.UndefinedSymbols()) text << "? " << undefined->symbol << '\n';
   return text.str();
+}
+
+/// A folder's children and elements, side by side.
+std::string ListOrders(const QTreeWidgetItem& folder, const std::vector<const CEL_Element*>& elements) {
+  std::string text;
+  for (int place = 0; place < folder.childCount(); ++place) {
+    text += "\n  " + folder.child(place)->text(0).toStdString() + " | " +
+            elements[static_cast<std::size_t>(place)]->symbol.Text();
+  }
+  return text + "\n";
 }
 
 class Monkey final {
@@ -159,7 +170,10 @@ std::string Monkey::TypeText() {
   if (field == nullptr) return "nothing to type into";
   field->setFocus();
   if (Sometimes(2)) QTest::keyClick(field, Qt::Key_A, Qt::ControlModifier);
-  QTest::keyClicks(field, Word());
+  // As an input method does it: the keys of a test know no letters but those of ASCII.
+  QInputMethodEvent typed;
+  typed.setCommitString(Word());
+  QApplication::sendEvent(field, &typed);
   return "type into " + field->objectName().toStdString();
 }
 
@@ -264,6 +278,11 @@ std::string Monkey::Act() {
 
 std::string Monkey::Fault() {
   TemplateCore& core = editor->Core();
+  if (!NotifyChanges()) {
+    // A group that was made from the menu leaves the listeners off until the next element is made.
+    SetNotifyChanges(true);
+    core.RebuildSymbolTable();
+  }
   const std::string table = TableText(core);
   core.RebuildSymbolTable();
   const std::string fresh = TableText(core);
@@ -278,7 +297,8 @@ std::string Monkey::Fault() {
     for (int place = 0; place < (*item)->childCount(); ++place) {
       if (CElementTree::DataOf(*(*item)->child(place)).id !=
           elements[static_cast<std::size_t>(place)]->GetUid())
-        return "the tree has another order in " + (*item)->text(0).toStdString();
+        return "the tree has another order in " + (*item)->text(0).toStdString() +
+               ListOrders(**item, elements);
     }
   }
   return {};

@@ -127,8 +127,10 @@ void CElementForm::SplitExpressions() {
   split->setChildrenCollapsible(false);
   for (Control& control : controls) {
     if (!isExpression(control)) continue;
+    // A splitter takes a child in as soon as it has it as its parent.
+    const bool isFirst = split->count() == 0;
     auto* panel = MakeChild<QWidget>(split);
-    panel->setObjectName(split->count() == 0 ? QStringLiteral("Top") : QStringLiteral("Bottom"));
+    panel->setObjectName(isFirst ? QStringLiteral("Top") : QStringLiteral("Bottom"));
     auto* parts = MakeChild<QHBoxLayout>(panel);
     parts->setContentsMargins(0, 0, 0, 0);
     parts->addWidget(control.label, 0, Qt::AlignTop);
