@@ -220,7 +220,7 @@ void CMainView::OnActivate() {
 
 void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*previous*/) {
   // The form still shows the node that is being left: its entries are written before it goes.
-  Commit();
+  CommitAll();
   RefreshCaption(current);
   ReplaceForm(current);
   if (current != nullptr) {
@@ -258,6 +258,11 @@ void CMainView::Commit() {
   }
   RefreshCaption(shown);
   errorList->RefreshErrorList(Core());
+}
+
+void CMainView::CommitAll() {
+  Commit();
+  if (form && form->HasUnwritten()) Commit();
 }
 
 void CMainView::RefreshCaption(QTreeWidgetItem* item) {
@@ -393,7 +398,7 @@ void CMainView::DeleteFromMenu(Uid id, std::int32_t groupIndex) {
     DeleteGroup(groupIndex - 1);
   } else {
     // A form with something unwritten may use the element by now.
-    Commit();
+    CommitAll();
     QTreeWidgetItem* item = tree->FindById(id);
     if (item == nullptr || !Core().CanDelete(id)) return;
     DeleteNode(*item);

@@ -35,7 +35,7 @@ class CMainView final : public QWidget, public CView {
   void OnInitialUpdate() override;
   void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) override;
   /// Commits the open form.
-  void OnCommit() override { Commit(); }
+  void OnCommit() override { CommitAll(); }
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
   QWidget* Widget() override { return this; }
@@ -68,6 +68,8 @@ class CMainView final : public QWidget, public CView {
   void ReplaceForm(QTreeWidgetItem* item);
   void CloseForm();
   void Commit();
+  /// Commits until nothing is left unwritten, for when the form goes or the document is saved.
+  void CommitAll();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
   void ShowHelp();
