@@ -93,10 +93,11 @@ class Monkey final {
 
   std::size_t Pick(std::size_t count) { return count == 0 ? 0 : random() % count; }
   bool Sometimes(std::size_t oneIn) { return Pick(oneIn) == 0; }
+  Answer AnyAnswer() { return static_cast<Answer>(Pick(4)); }
   QString Word() { return QString::fromUtf8(kWords[Pick(std::size(kWords))]); }
   template <class Widget>
   Widget* AnyOf();
-  void Answer();
+  void PrepareAnswers();
   void CloseWhatOpens();
 
   std::string SelectNode();
@@ -124,8 +125,8 @@ Widget* Monkey::AnyOf() {
                            : fitting[static_cast<qsizetype>(Pick(static_cast<std::size_t>(fitting.size())))];
 }
 
-void Monkey::Answer() {
-  editor->User().answers = {Sometimes(2), Sometimes(2), Sometimes(2)};
+void Monkey::PrepareAnswers() {
+  editor->User().answers = {AnyAnswer(), AnyAnswer(), AnyAnswer()};
   editor->User().choices = {static_cast<int>(Pick(10)) - 1, static_cast<int>(Pick(10)) - 1};
   editor->User().TakeLog();
 }
@@ -257,13 +258,13 @@ std::string Monkey::UseErrorList() {
 std::string Monkey::Save() {
   const std::string path = editor->Path() + ".saved";
   editor->View().OnCommit();
-  editor->User().answers = {true};
+  editor->User().answers = {Answer::Yes};
   if (!editor->Document().OnSaveDocument(path)) return "save refused";
   return "save";
 }
 
 std::string Monkey::Act() {
-  Answer();
+  PrepareAnswers();
   std::string (Monkey::*const kActions[])() = {
       &Monkey::SelectNode, &Monkey::SelectNode,  &Monkey::UseNodeMenu, &Monkey::TypeText,
       &Monkey::TypeText,   &Monkey::ChooseEntry, &Monkey::ChooseEntry, &Monkey::ClickButton,

@@ -1,6 +1,7 @@
 #include "core/document.h"
 
 #include "core/error_registry.h"
+#include "platform/file_replacement.h"
 
 namespace tessal {
 
@@ -12,10 +13,17 @@ std::string FailureText(std::string_view what, const std::string& path) {
   return "Failed to " + std::string(what) + " file '" + path + "'\n\n" + Errors().JoinErrors() + ".";
 }
 
+/// A file that cannot be read is reported by the load.
+TextEncoding EncodingOfFile(const std::string& path) {
+  std::string failure;
+  return EncodingOf(ReadWholeFile(path, failure).value_or(std::string()));
+}
+
 }  // namespace
 
 bool CTessalDoc::OnOpenDocument(const std::string& path) {
   if (!CDocument::OnOpenDocument(path)) return false;
+  encoding = EncodingOfFile(path);
   const bool loaded = core.LoadWrapper(path);
   if (loaded) {
     visibilityGroup = 0;

@@ -7,6 +7,7 @@
 
 #include "core/template_core.h"
 #include "platform/docview.h"
+#include "platform/text_encoding.h"
 
 namespace tessal {
 
@@ -58,6 +59,8 @@ class CTessalDoc final : public CDocument {
 
   TemplateCore& Core() { return core; }
   const TemplateCore& Core() const { return core; }
+  /// The encoding of the file that was opened, in which new texts are written; UTF-8 for a new document.
+  TextEncoding Encoding() const { return encoding; }
 
   /// The filter of the overview page: group and level from 1, 0 for all, and whether lower levels count in.
   std::int32_t visibilityGroup = 0;
@@ -67,6 +70,7 @@ class CTessalDoc final : public CDocument {
  private:
   DocumentDialogs& dialogs;
   TemplateCore core;
+  TextEncoding encoding = TextEncoding::Utf8;
 };
 
 }  // namespace tessal

@@ -9,17 +9,6 @@
 
 namespace tessal {
 
-namespace {
-
-/// Rewrites an expression in its stored form, between quotes: the word rule knows the opening one.
-std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
-                                std::string_view newWord) {
-  const std::string rewritten = ReplaceWord('"' + std::string(expression) + '"', oldWord, newWord);
-  return std::string(StripExpressionQuotes(rewritten));
-}
-
-}  // namespace
-
 std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord) {
   if (oldWord.empty()) return std::string(text);
   std::string result;
@@ -46,6 +35,12 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
   }
   result += text.substr(copied);
   return result;
+}
+
+std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
+                                std::string_view newWord) {
+  const std::string rewritten = ReplaceWord('"' + std::string(expression) + '"', oldWord, newWord);
+  return std::string(StripExpressionQuotes(rewritten));
 }
 
 std::string RenameRefusal(const TemplateCore& core, std::string_view newSymbol) {

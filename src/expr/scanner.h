@@ -88,6 +88,16 @@ void SetExpressionScannerStart(ScannerStart start);
 /// Back to plain text, for tests and for looks at a text that must leave no trace.
 void ResetExpressionScanner();
 
+/// A look at a text that nobody has committed: it starts in plain text, and what the text leaves open reaches
+/// no later scan.
+class ScannerRest final {
+ public:
+  ScannerRest() { ResetExpressionScanner(); }
+  ScannerRest(const ScannerRest&) = delete;
+  ScannerRest& operator=(const ScannerRest&) = delete;
+  ~ScannerRest() { ResetExpressionScanner(); }
+};
+
 /// The scanner as the parser and the lists pull from it. One scan at a time.
 class ExpressionScan final {
  public:

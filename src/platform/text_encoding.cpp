@@ -84,6 +84,10 @@ bool IsUtf8(std::string_view bytes) {
   return true;
 }
 
+TextEncoding EncodingOf(std::string_view bytes) {
+  return IsUtf8(bytes) ? TextEncoding::Utf8 : TextEncoding::Windows1252;
+}
+
 std::string ToUtf8(std::string_view bytes) {
   if (IsUtf8(bytes)) return std::string(bytes);
   std::string text;

@@ -2,13 +2,19 @@
 // bytes as UTF-8 when they are valid UTF-8, and as Windows-1252 otherwise.
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
 
 namespace tessal {
 
+enum class TextEncoding : std::uint8_t { Utf8, Windows1252 };
+
 bool IsUtf8(std::string_view bytes);
+
+/// The encoding that bytes are in as a whole.
+TextEncoding EncodingOf(std::string_view bytes);
 
 /// The text in UTF-8, whichever of the two encodings it is in.
 std::string ToUtf8(std::string_view bytes);

@@ -1,9 +1,11 @@
 #include "ui/dialogs.h"
 
 #include <QApplication>
+#include <QCloseEvent>
 #include <QDesktopServices>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QKeyEvent>
 #include <QMessageBox>
 #include <QUrl>
 
@@ -16,32 +18,66 @@ namespace tessal {
 
 namespace {
 
-QMessageBox::StandardButton ShowBox(QWidget* parent, QMessageBox::Icon icon, const QString& title,
-                                    const QString& text, QMessageBox::StandardButtons buttons) {
-  QMessageBox box(icon, title, text, buttons, parent);
+void ShowBox(QWidget* parent, const QString& title, const QString& text) {
+  QMessageBox box(QMessageBox::Warning, title, text, QMessageBox::Ok, parent);
   box.setTextFormat(Qt::PlainText);
-  return static_cast<QMessageBox::StandardButton>(box.exec());
+  box.exec();
 }
+
+/// A question whose escape key and close button are no answer, where the toolkit takes them for a No.
+class QuestionBox final : public QMessageBox {
+ public:
+  QuestionBox(QWidget* parent, const QString& question, StandardButtons buttons)
+      : QMessageBox(Question, strings::kEditorName, question, buttons, parent) {
+    setTextFormat(Qt::PlainText);
+  }
+
+  Answer Run() {
+    switch (exec()) {
+      case Yes:
+        return Answer::Yes;
+      case No:
+        return Answer::No;
+      case NoToAll:
+        return Answer::NoToAll;
+      default:
+        return Answer::Cancelled;
+    }
+  }
+
+ protected:
+  void keyPressEvent(QKeyEvent* key) override {
+    if (key->matches(QKeySequence::Cancel)) {
+      done(Cancel);
+    } else {
+      QMessageBox::keyPressEvent(key);
+    }
+  }
+
+  void closeEvent(QCloseEvent* closing) override {
+    done(Cancel);
+    closing->accept();
+  }
+};
 
 class BoxDialogs final : public UserDialogs {
  public:
   void ShowMessage(const std::string& text) override { Warn(QApplication::activeWindow(), ToScreen(text)); }
 
   bool AskYesNo(const std::string& question) override {
-    return Ask(QApplication::activeWindow(), ToScreen(question));
+    return Ask(QApplication::activeWindow(), ToScreen(question)) == Answer::Yes;
   }
 
-  void Warn(QWidget* parent, const QString& text) override {
-    ShowBox(parent, QMessageBox::Warning, strings::kEditorName, text, QMessageBox::Ok);
+  void Warn(QWidget* parent, const QString& text) override { ShowBox(parent, strings::kEditorName, text); }
+
+  void ShowFailure(QWidget* parent, const QString& text) override { ShowBox(parent, strings::kError, text); }
+
+  Answer Ask(QWidget* parent, const QString& question) override {
+    return QuestionBox(parent, question, QMessageBox::Yes | QMessageBox::No).Run();
   }
 
-  void ShowFailure(QWidget* parent, const QString& text) override {
-    ShowBox(parent, QMessageBox::Warning, strings::kError, text, QMessageBox::Ok);
-  }
-
-  bool Ask(QWidget* parent, const QString& question) override {
-    return ShowBox(parent, QMessageBox::Question, strings::kEditorName, question,
-                   QMessageBox::Yes | QMessageBox::No) == QMessageBox::Yes;
+  Answer AskOneOfMany(QWidget* parent, const QString& question) override {
+    return QuestionBox(parent, question, QMessageBox::Yes | QMessageBox::No | QMessageBox::NoToAll).Run();
   }
 
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override {

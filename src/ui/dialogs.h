@@ -10,13 +10,19 @@ class QWidget;
 
 namespace tessal {
 
+/// What a question was answered with. A box that is closed without an answer counts as cancelled.
+enum class Answer : std::uint8_t { Yes, No, NoToAll, Cancelled };
+
 class UserDialogs : public DocumentDialogs {
  public:
   /// Shows a text in a box with an exclamation icon.
   virtual void Warn(QWidget* parent, const QString& text) = 0;
   /// Shows what could not be done, in a box titled "Error".
   virtual void ShowFailure(QWidget* parent, const QString& text) = 0;
-  virtual bool Ask(QWidget* parent, const QString& question) = 0;
+  /// Asks with Yes and No.
+  virtual Answer Ask(QWidget* parent, const QString& question) = 0;
+  /// Asks one of several questions of a kind, with No to all of them as a further answer.
+  virtual Answer AskOneOfMany(QWidget* parent, const QString& question) = 0;
   /// Lets the user choose what an undefined symbol shall become; -1 when it is skipped.
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
   /// Lets the user choose a documentation file; empty when declined.

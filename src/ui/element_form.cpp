@@ -16,6 +16,7 @@
 #include <utility>
 
 #include "core/document.h"
+#include "core/rename.h"
 #include "elements/property_io.h"
 #include "ui/child.h"
 #include "ui/dialogs.h"
@@ -256,7 +257,7 @@ QWidget* CElementForm::MakeCombo() {
 }
 
 QWidget* CElementForm::MakeReferences() {
-  auto* names = MakeChild<CAutoRichEditCtrl>(Core(), this);
+  auto* names = MakeChild<CAutoRichEditCtrl>(Document(), this);
   names->setReadOnly(true);
   LimitHeight(*names);
   connect(names, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
@@ -288,7 +289,7 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   auto* cell = MakeChild<QWidget>(this);
   auto* rows = MakeChild<QVBoxLayout>(cell);
   rows->setContentsMargins(0, 0, 0, 0);
-  auto* edit = MakeChild<CAutoRichEditCtrl>(Core(), cell);
+  auto* edit = MakeChild<CAutoRichEditCtrl>(Document(), cell);
   edit->setMinimumHeight(HeightOf(*edit, kMostLines));
   auto* note = MakeChild<CLabel>(cell);
   note->setWordWrap(true);
@@ -302,6 +303,9 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   rows->addWidget(edit, 1);
   rows->addLayout(foot);
   connect(edit, &QTextEdit::textChanged, note, [edit, note] { note->setText(edit->ParserMessage()); });
+  connect(edit, &QTextEdit::textChanged, this, [this, edit] {
+    if (edit->IsEdited()) NoteTyped();
+  });
   connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
   WatchFocusLoss(*edit, [this] { NoteFocusLost(); });
   connect(keypad, &QPushButton::clicked, this, [this] { CExpressionEditorDlg(this).exec(); });
@@ -345,6 +349,8 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
     line->setCursorPosition(0);
     control.shown = line->text();
   } else if (auto* expression = qobject_cast<CAutoRichEditCtrl*>(control.editor)) {
+    // What was typed and is not written yet stays.
+    if (expression->IsEdited()) return;
     expression->SetColouredText(property.TextOf());
     control.note->setText(expression->ParserMessage());
   } else if (auto* lines = qobject_cast<CPlainTextField*>(control.editor)) {
@@ -388,17 +394,35 @@ void CElementForm::FormToItem() {
   bool isStale = false;
   for (const Control& control : controls) {
     if (control.field->editor != FieldEditor::Symbol || !IsEdited(control)) continue;
-    const std::string edited = FromScreen(TextIn(*control.editor), element->symbol.Text());
+    const std::string edited =
+        FromScreen(TextIn(*control.editor), element->symbol.Text(), Document().Encoding());
     const std::string entered(CleanText(edited));
     // Blanks around the present symbol are dropped without a rename.
     isStale = entered == element->symbol.Text();
     if (isStale) continue;
     // The other fields are not written in this commit.
-    Rename(entered);
+    const std::string former = element->symbol.Text();
+    if (Rename(entered)) RenameInTyped(former, entered);
     ItemToForm();
     return;
   }
   if (StoreFields(*element) || isStale) ItemToForm();
+}
+
+void CElementForm::RenameInTyped(const std::string& former, const std::string& present) {
+  for (const Control& control : controls) {
+    if (control.field->editor != FieldEditor::Expression || !IsEdited(control)) continue;
+    auto* expression = qobject_cast<CAutoRichEditCtrl*>(control.editor);
+    const QString typed = expression->ContentText();
+    const QString renamed = ToScreen(ReplaceInExpression(typed.toStdString(), former, present));
+    if (renamed != typed) expression->Retype(renamed);
+  }
+}
+
+bool CElementForm::HasUnwritten() const {
+  return std::any_of(controls.begin(), controls.end(), [](const Control& control) {
+    return control.field->editor == FieldEditor::Expression && IsEdited(control);
+  });
 }
 
 bool CElementForm::StoreFields(CEL_Element& element) {
@@ -432,11 +456,13 @@ bool CElementForm::Store(const Control& control, CEL_Element& element) {
   if (!IsEdited(control)) return false;
   const QString text = TextIn(*control.editor);
   const bool isNumber = field.editor == FieldEditor::Number || field.editor == FieldEditor::Integer;
-  return isNumber ? StoreNumber(text, property) : StoreText(text, property);
+  const bool isStored = isNumber ? StoreNumber(text, property) : StoreText(text, property);
+  if (auto* lines = qobject_cast<CPlainTextField*>(control.editor)) lines->TakeAsShown();
+  return isStored;
 }
 
-bool CElementForm::StoreText(const QString& text, CEL_Property& property) {
-  const std::string entered = FromScreen(text, property.Text());
+bool CElementForm::StoreText(const QString& text, CEL_Property& property) const {
+  const std::string entered = FromScreen(text, property.Text(), Document().Encoding());
   property.SetText(CleanText(entered));
   // The form is filled again even when blanks were all that changed.
   return true;

@@ -72,6 +72,7 @@ class CElementForm : public CRightPaneBase {
   CElementForm(FormTable fields, const FormContext& context, QWidget* parent);
 
   QSize minimumSizeHint() const override;
+  bool HasUnwritten() const override;
 
  protected:
   void resizeEvent(QResizeEvent* resize) override;
@@ -100,6 +101,8 @@ class CElementForm : public CRightPaneBase {
   };
 
   bool IsEnabled(const FormField& field, const CEL_Property& property) const;
+  /// An expression that was typed and is not written yet follows a rename of its own element.
+  void RenameInTyped(const std::string& former, const std::string& present);
   bool Store(const Control& control, CEL_Element& element);
   void AddField(const FormField& field);
   /// Puts several expressions into a splitter, each with the same share of the height.
@@ -121,7 +124,7 @@ class CElementForm : public CRightPaneBase {
   static void FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property, bool enabled);
   std::string ReferrerText(const CEL_Element& element) const;
   static bool IsEdited(const Control& control);
-  static bool StoreText(const QString& text, CEL_Property& property);
+  bool StoreText(const QString& text, CEL_Property& property) const;
   static bool StoreNumber(const QString& text, CEL_Property& property);
   static bool StoreChoice(const QComboBox& combo, CEL_Property& property);
 

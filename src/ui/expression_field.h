@@ -9,21 +9,23 @@
 
 namespace tessal {
 
-class TemplateCore;
+class CExpressionHighlighter;
+class CTessalDoc;
 
 class CAutoRichEditCtrl final : public CPlainTextField {
   Q_OBJECT
 
  public:
-  CAutoRichEditCtrl(const TemplateCore& templateCore, QWidget* parent);
+  CAutoRichEditCtrl(const CTessalDoc& shownDocument, QWidget* parent);
 
-  /// Replaces the content, and colours it when it scans cleanly. The caret is at the start.
+  /// Replaces the content; the caret is at the start. The colours follow the text, for as long as it scans
+  /// cleanly.
   void SetColouredText(const std::string& text);
 
   /// The parser's message on the present content; empty when it parses. Leaves no trace in the scanner.
   QString ParserMessage() const;
 
-  /// The identity of the element whose link lies at a point of the viewport, 0 for none.
+  /// The identity of the element that the text under a point of the viewport names, 0 for none.
   Uid LinkAt(const QPoint& point) const;
   /// What is shown while the pointer rests on an element's link: its kind and its description.
   QString TipOf(Uid uid) const;
@@ -39,13 +41,17 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   void changeEvent(QEvent* change) override;
 
  private:
-  void Colour();
+  /// Colours the text again when it has changed.
+  void FollowText();
   Uid LinkAtCaret() const;
   /// The identity of the element with a symbol, 0 for none.
-  Uid ElementNamed(const QString& name) const;
+  Uid ElementNamed(const std::string& name) const;
 
-  const TemplateCore& core;
-  std::string content;
+  const CTessalDoc& source;
+  CExpressionHighlighter* highlighter;
+  std::string content;   ///< the bytes that were shown last
+  QString coloured;      ///< the text that the colours belong to
+  bool isStale = false;  ///< the colours may be others though the text is the same
 };
 
 }  // namespace tessal

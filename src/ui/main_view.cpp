@@ -19,6 +19,7 @@
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
+#include "ui/folder_elements.h"
 #include "ui/help_window.h"
 #include "ui/label.h"
 #include "ui/node_kinds.h"
@@ -220,7 +221,7 @@ void CMainView::OnActivate() {
 
 void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*previous*/) {
   // The form still shows the node that is being left: its entries are written before it goes.
-  Commit();
+  CommitAll();
   RefreshCaption(current);
   ReplaceForm(current);
   if (current != nullptr) {
@@ -258,6 +259,11 @@ void CMainView::Commit() {
   }
   RefreshCaption(shown);
   errorList->RefreshErrorList(Core());
+}
+
+void CMainView::CommitAll() {
+  Commit();
+  if (form && form->HasUnwritten()) Commit();
 }
 
 void CMainView::RefreshCaption(QTreeWidgetItem* item) {
@@ -337,16 +343,15 @@ void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement
   if (item == nullptr && element->Kind() == ElementKind::Specie) {
     item = tree->InsertSpecie(*folder, static_cast<const CEL_Lagrange_Specie&>(*element));
   } else if (item == nullptr) {
-    item = tree->InsertElement(*folder, *element, PlaceOf(created, *folder));
+    item = tree->InsertElement(*folder, *element, PlaceOf(*element, *folder));
   }
   item->setText(0, ToScreen(MarkedCaption(*element)));
 }
 
-int CMainView::PlaceOf(const CreatedElement& created, const QTreeWidgetItem& folder) const {
-  if (!created.placed) return folder.childCount();
-  if (created.predecessor == Uid::None) return 0;
-  QTreeWidgetItem* before = tree->FindById(created.predecessor);
-  return before == nullptr ? 0 : folder.indexOfChild(before) + 1;
+int CMainView::PlaceOf(const CEL_Element& element, QTreeWidgetItem& folder) const {
+  // Where it is in the template, which may not be at the end: a new element is put before its users.
+  const auto elements = ElementsOfFolder(Core(), CElementTree::DataOf(folder));
+  return static_cast<int>(std::find(elements.begin(), elements.end(), &element) - elements.begin());
 }
 
 void CMainView::OpenContextMenu(const QPoint& point) {
@@ -408,7 +413,7 @@ void CMainView::DeleteFromMenu(Uid id, std::int32_t groupIndex) {
     DeleteGroup(groupIndex - 1);
   } else {
     // A form with something unwritten may use the element by now.
-    Commit();
+    CommitAll();
     QTreeWidgetItem* item = tree->FindById(id);
     if (item == nullptr || !Core().CanDelete(id)) return;
     DeleteNode(*item);

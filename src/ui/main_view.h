@@ -17,6 +17,7 @@ class QVBoxLayout;
 
 namespace tessal {
 
+class CEL_Element;
 class CElementTree;
 class CErrorList;
 class CLabel;
@@ -35,7 +36,7 @@ class CMainView final : public QWidget, public CView {
   void OnInitialUpdate() override;
   void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) override;
   /// Commits the open form.
-  void OnCommit() override { Commit(); }
+  void OnCommit() override { CommitAll(); }
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
   QWidget* Widget() override { return this; }
@@ -68,6 +69,8 @@ class CMainView final : public QWidget, public CView {
   void ReplaceForm(QTreeWidgetItem* item);
   void CloseForm();
   void Commit();
+  /// Commits until nothing is left unwritten, for when the form goes or the document is saved.
+  void CommitAll();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
   void ShowHelp();
@@ -85,7 +88,7 @@ class CMainView final : public QWidget, public CView {
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;
   void InsertCreated(const CreateRequest& request, const CreatedElement& created);
-  int PlaceOf(const CreatedElement& created, const QTreeWidgetItem& folder) const;
+  int PlaceOf(const CEL_Element& element, QTreeWidgetItem& folder) const;
 
   CTessalDoc& document;
   UserDialogs& dialogs;

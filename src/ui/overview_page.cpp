@@ -73,7 +73,8 @@ void COverviewPpg::CopyToClipboard() {
 
 void COverviewPpg::ExportPage() {
   const std::string path = PrepareUsualPagePath(Core().TemplateFileName());
-  const bool embedMathJax = Dialogs().Ask(this, strings::kAskMathJax);
+  // There is no way to cancel.
+  const bool embedMathJax = Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes;
   std::string failure;
   if (!ExportHtmlDocumentation(Core(), path, embedMathJax, failure)) {
     Dialogs().ShowFailure(this, ToScreen(failure));

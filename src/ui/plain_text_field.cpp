@@ -1,6 +1,7 @@
 #include "ui/plain_text_field.h"
 
 #include <QMimeData>
+#include <QSignalBlocker>
 #include <algorithm>
 
 namespace tessal {
@@ -17,11 +18,24 @@ CPlainTextField::CPlainTextField(QWidget* parent) : QTextEdit(parent) {
 
 void CPlainTextField::ShowText(const QString& text) {
   limit = std::max(kMostCharacters, static_cast<int>(text.size()));
-  setPlainText(text);
-  shown = ContentText();
+  {
+    // Who hears of the change finds it as the one shown.
+    const QSignalBlocker quiet(this);
+    setPlainText(text);
+    TakeAsShown();
+  }
   moveCursor(QTextCursor::Start);
   document()->clearUndoRedoStacks();
-  document()->setModified(false);
+  emit textChanged();
+}
+
+void CPlainTextField::Retype(const QString& text) {
+  QTextCursor caret = textCursor();
+  const int place = caret.position();
+  caret.select(QTextCursor::Document);
+  caret.insertText(text);
+  caret.setPosition(std::min(place, static_cast<int>(text.size())));
+  setTextCursor(caret);
 }
 
 QString CPlainTextField::ContentText() const {
@@ -50,11 +64,6 @@ void CPlainTextField::insertFromMimeData(const QMimeData* source) {
   const qsizetype room = limit - (document()->characterCount() - 1) + textCursor().selectedText().size();
   textCursor().insertText(text.left(std::max<qsizetype>(room, 0)), QTextCharFormat());
   ensureCursorVisible();
-}
-
-void CPlainTextField::keyPressEvent(QKeyEvent* key) {
-  if (!isReadOnly() && !textCursor().hasSelection()) setCurrentCharFormat(QTextCharFormat());
-  QTextEdit::keyPressEvent(key);
 }
 
 }  // namespace tessal

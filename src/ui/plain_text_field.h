@@ -21,11 +21,13 @@ class CPlainTextField : public QTextEdit {
   QString ContentText() const;
   /// Whether the content is another than the one shown last.
   bool IsEdited() const { return ContentText() != shown; }
+  /// From now on the present content is the one that counts as shown.
+  void TakeAsShown() { shown = ContentText(); }
+  /// Replaces the content as the user could, with the caret where it was.
+  void Retype(const QString& text);
 
  protected:
   void insertFromMimeData(const QMimeData* source) override;
-  /// Typing after a word must not take over that word's looks.
-  void keyPressEvent(QKeyEvent* key) override;
 
  private:
   void TakeOutExcess();

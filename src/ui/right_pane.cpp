@@ -1,5 +1,6 @@
 #include "ui/right_pane.h"
 
+#include <algorithm>
 #include <optional>
 
 #include "core/document.h"
@@ -9,6 +10,15 @@
 #include "ui/text_bytes.h"
 
 namespace tessal {
+
+namespace {
+
+/// What was not asked about counts as asked from now on.
+void DeclineOffers(TemplateCore& core) {
+  while (core.NextOffer()) continue;
+}
+
+}  // namespace
 
 CRightPaneBase::CRightPaneBase(const FormContext& formContext, QWidget* parent)
     : QWidget(parent), where(formContext) {}
@@ -47,10 +57,20 @@ void CRightPaneBase::Commit() {
   if (created && !loading) Load();
 }
 
+Answer CRightPaneBase::AskAbout(const CreationOffer& offer) {
+  const auto& undefined = Core().UndefinedSymbols();
+  const bool isLast =
+      std::all_of(undefined.begin(), undefined.end(), [](const auto& each) { return each->asked; });
+  const QString question = ToScreen(offer.question);
+  return isLast ? Dialogs().Ask(this, question) : Dialogs().AskOneOfMany(this, question);
+}
+
 bool CRightPaneBase::OfferUndefinedSymbols() {
   bool created = false;
   while (const std::optional<CreationOffer> offer = Core().NextOffer()) {
-    if (!Dialogs().Ask(this, ToScreen(offer->question))) continue;
+    const Answer answer = AskAbout(*offer);
+    if (answer == Answer::NoToAll) DeclineOffers(Core());
+    if (answer != Answer::Yes) continue;
     const int choice = Dialogs().ChooseKind(this, ToScreen(offer->symbol), offer->mask);
     const CreateRequest* request = offer->RequestOf(choice);
     if (request == nullptr) continue;
@@ -63,6 +83,10 @@ bool CRightPaneBase::OfferUndefinedSymbols() {
 
 void CRightPaneBase::NoteEdited() {
   if (!IsDeaf()) dirty = true;
+}
+
+void CRightPaneBase::NoteTyped() {
+  if (!IsDeaf()) Document().SetModifiedFlag(true);
 }
 
 void CRightPaneBase::NoteFocusLost() {
@@ -84,17 +108,22 @@ void CRightPaneBase::JumpTo(Uid uid) {
   Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 
-void CRightPaneBase::Rename(const std::string& newSymbol) {
+bool CRightPaneBase::Rename(const std::string& newSymbol) {
   const CEL_Element* element = Element();
   const std::string oldSymbol = element->symbol.Text();
   std::string refusal = RenameRefusal(Core(), newSymbol);
+  Answer replaces = Answer::Yes;
   if (refusal.empty()) {
-    const bool rewrite = Core().IsReferenced(element->GetUid()) &&
-                         Dialogs().Ask(this, ToScreen("Replace all occurence of '" + oldSymbol + "' with '" +
-                                                      newSymbol + "'?"));
-    if (!Core().RenameSymbol(oldSymbol, newSymbol, rewrite)) refusal = RenameFailure(newSymbol);
+    if (Core().IsReferenced(element->GetUid())) {
+      replaces = Dialogs().Ask(
+          this, ToScreen("Replace all occurence of '" + oldSymbol + "' with '" + newSymbol + "'?"));
+    }
+    if (replaces == Answer::Cancelled) return false;
+    if (!Core().RenameSymbol(oldSymbol, newSymbol, replaces == Answer::Yes))
+      refusal = RenameFailure(newSymbol);
   }
   if (!refusal.empty()) Dialogs().Warn(this, ToScreen(refusal));
+  return refusal.empty() && replaces == Answer::Yes;
 }
 
 }  // namespace tessal

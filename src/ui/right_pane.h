@@ -3,6 +3,7 @@
 #pragma once
 
 #include <QWidget>
+#include <cstdint>
 #include <string>
 
 #include "ui/item_data.h"
@@ -13,6 +14,8 @@ class CEL_Element;
 class CTessalDoc;
 class TemplateCore;
 class UserDialogs;
+enum class Answer : std::uint8_t;
+struct CreationOffer;
 
 /// What a form works on: the document, the node that it shows, and who speaks with the user.
 struct FormContext {
@@ -33,6 +36,8 @@ class CRightPaneBase : public QWidget {
   /// Writes the form to its element, offers to create undefined symbols, and loads again what has changed.
   /// A commit that comes while one is running does nothing.
   void Commit();
+  /// Whether the commit has left something to the next one: a rename leaves what was typed into expressions.
+  virtual bool HasUnwritten() const { return false; }
 
   /// From now on nothing that its controls report counts: its node may go before it does.
   void Close() { closed = true; }
@@ -52,18 +57,22 @@ class CRightPaneBase : public QWidget {
 
   // What controls report. Nothing counts while the form is being filled or written.
   void NoteEdited();
+  /// Something was typed where leaving the field writes nothing: only the document's mark shows it.
+  void NoteTyped();
   void NoteFocusLost();
   void NoteChosen();
   /// Has the main view commit the form, and show what follows from it.
   void RequestCommit();
   void JumpTo(Uid uid);
 
-  /// Asks what a new symbol needs asking, and renames; shows a message when the name is refused.
-  void Rename(const std::string& newSymbol);
+  /// Asks what a new symbol needs asking, and renames; shows a message when the name is refused. True when
+  /// what uses the element follows to the new name.
+  bool Rename(const std::string& newSymbol);
 
  private:
   /// Asks about each undefined symbol that was not asked about yet; true when an element was created.
   bool OfferUndefinedSymbols();
+  Answer AskAbout(const CreationOffer& offer);
   bool IsDeaf() const { return loading || committing || closed; }
 
   FormContext where;

@@ -6,12 +6,15 @@
 #include <string>
 #include <string_view>
 
+#include "platform/text_encoding.h"
+
 namespace tessal {
 
 QString ToScreen(std::string_view bytes);
 
 /// The bytes of an edited text. A text that shows as the former bytes do gives them back; another is written
-/// in the encoding of the former bytes where that can hold it, else in UTF-8. Zero bytes are dropped.
-std::string FromScreen(const QString& text, std::string_view former);
+/// in the document's encoding, or in UTF-8 where its bytes in that encoding would not show as the same text.
+/// Zero bytes are dropped.
+std::string FromScreen(const QString& text, std::string_view former, TextEncoding encoding);
 
 }  // namespace tessal

@@ -28,8 +28,8 @@ constexpr int kDescriptionColumn = 2;
 constexpr int kRowsBeyond = 5;
 
 /// What a line holds as bytes, when it was edited; the former bytes otherwise.
-std::string Entered(const QLineEdit& line, const std::string& former) {
-  const std::string entered = FromScreen(line.text(), former);
+std::string Entered(const QLineEdit& line, const std::string& former, TextEncoding encoding) {
+  const std::string entered = FromScreen(line.text(), former, encoding);
   return line.text() == ToScreen(former) ? former : std::string(CleanText(entered));
 }
 
@@ -241,18 +241,19 @@ void CVisibilityGroupDlg::StoreGroup() {
   const VisibilityGroup* group = Group();
   if (group == nullptr) return;
   // A name that another group has is refused without a word: the line goes back to the true one.
-  const std::string entered = Entered(*name, group->name);
+  const std::string entered = Entered(*name, group->name, Document().Encoding());
   if (entered != group->name) Core().SetGroupName(Number(), entered);
-  Core().SetGroupDescription(Number(), Entered(*description, group->description));
+  Core().SetGroupDescription(Number(), Entered(*description, group->description, Document().Encoding()));
   ShowLine(*name, group->name);
 }
 
 void CVisibilityGroupDlg::StoreLevel() {
   const VisibilityLevel* level = Level();
   if (level == nullptr) return;
-  const std::string entered = Entered(*levelName, level->name);
+  const std::string entered = Entered(*levelName, level->name, Document().Encoding());
   if (entered != level->name) Core().SetLevelName(Number(), current, entered);
-  Core().SetLevelDescription(Number(), current, Entered(*levelDescription, level->description));
+  Core().SetLevelDescription(Number(), current,
+                             Entered(*levelDescription, level->description, Document().Encoding()));
   ShowLine(*levelName, level->name);
   levels->Model().RefreshRow(current - 1);
 }
@@ -262,7 +263,8 @@ void CVisibilityGroupDlg::StoreLevelCell(int row, int column, const QString& tex
   const auto place = static_cast<std::size_t>(row);
   if (group == nullptr || place >= group->levels.size()) return;
   const VisibilityLevel& level = group->levels[place];
-  const std::string entered = FromScreen(text, column == kNameColumn ? level.name : level.description);
+  const std::string entered =
+      FromScreen(text, column == kNameColumn ? level.name : level.description, Document().Encoding());
   if (column == kNameColumn) {
     Core().SetLevelName(Number(), row + 1, CleanText(entered));
   } else {

@@ -26,9 +26,15 @@ Value TakeFirst(QList<Value>& values, Value whenUsedUp) {
 
 }  // namespace
 
-bool ScriptedUser::Ask(QWidget* /*parent*/, const QString& question) {
+tessal::Answer ScriptedUser::Ask(QWidget* /*parent*/, const QString& question) {
   log.append(question);
-  return TakeFirst(answers, true);
+  return TakeFirst(answers, tessal::Answer::Yes);
+}
+
+tessal::Answer ScriptedUser::AskOneOfMany(QWidget* parent, const QString& question) {
+  const tessal::Answer answer = Ask(parent, question);
+  log.append(QStringLiteral("(or No to All)"));
+  return answer;
 }
 
 int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::uint32_t mask) {

@@ -32,11 +32,12 @@ class ScriptedUser final : public UserDialogs {
  public:
   void ShowMessage(const std::string& text) override { log.append(QString::fromStdString(text)); }
   bool AskYesNo(const std::string& question) override {
-    return Ask(nullptr, QString::fromStdString(question));
+    return Ask(nullptr, QString::fromStdString(question)) == tessal::Answer::Yes;
   }
   void Warn(QWidget* /*parent*/, const QString& text) override { log.append(text); }
   void ShowFailure(QWidget* /*parent*/, const QString& text) override { log.append(text); }
-  bool Ask(QWidget* parent, const QString& question) override;
+  tessal::Answer Ask(QWidget* parent, const QString& question) override;
+  tessal::Answer AskOneOfMany(QWidget* parent, const QString& question) override;
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override;
   QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
     return documentationFile;
@@ -47,8 +48,8 @@ class ScriptedUser final : public UserDialogs {
   /// What was asked and shown since the last call.
   QStringList TakeLog() { return std::exchange(log, {}); }
 
-  QList<bool> answers;  ///< to questions; Yes when used up
-  QList<int> choices;   ///< of kinds; skips when used up
+  QList<tessal::Answer> answers;  ///< to questions; Yes when used up
+  QList<int> choices;             ///< of kinds; skips when used up
   QString documentationFile;
   QStringList openable;  ///< what the system can open
 

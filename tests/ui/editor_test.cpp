@@ -8,6 +8,7 @@
 #include <QRadioButton>
 #include <QSplitter>
 #include <QTest>
+#include <QTimer>
 #include <filesystem>
 #include <map>
 
@@ -129,6 +130,25 @@ TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
     }
     if (caption.isEmpty()) dialog.accept();
     EXPECT_EQ(dialog.ChosenIndex(), chosen) << caption.toStdString();
+  }
+}
+
+TEST(Questions, AreNotAnsweredByEscapeOrTheCloseButton) {
+  const std::map<QString, Answer> answers = {{"&Yes", Answer::Yes},
+                                             {"&No", Answer::No},
+                                             {"N&o to All", Answer::NoToAll},
+                                             {"Escape", Answer::Cancelled},
+                                             {"close", Answer::Cancelled}};
+  for (const auto& [action, answer] : answers) {
+    QTimer::singleShot(0, qApp, [&action] {
+      QWidget* box = QApplication::activeModalWidget();
+      for (QPushButton* button : box->findChildren<QPushButton*>()) {
+        if (button->text() == action) return button->click();
+      }
+      if (action == "close") return static_cast<void>(box->close());
+      QTest::keyClick(box->findChild<QPushButton*>(), Qt::Key_Escape);
+    });
+    EXPECT_EQ(ScreenDialogs().AskOneOfMany(nullptr, "Really?"), answer) << action.toStdString();
   }
 }
 

@@ -86,7 +86,7 @@ TEST(Examples, ShowTheirNodesAndFormsAndAreNotChangedByALook) {
        {"eutrophication", "fasham", "faults", "fish_larvae", "lake_management", "streeter_phelps"}) {
     Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/" + name + ".tessal"));
     // The names that a template leaves undefined are asked about once, and here with No.
-    editor.User().answers = QList<bool>(std::ssize(editor.Core().UndefinedSymbols()), false);
+    editor.User().answers = QList<Answer>(std::ssize(editor.Core().UndefinedSymbols()), Answer::No);
     nodes += "== " + name + "\n";
     forms += "== " + name + "\n";
     for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {

@@ -11,6 +11,7 @@
 #include <QTextBlock>
 #include <QTimer>
 #include <QToolBar>
+#include <algorithm>
 #include <set>
 
 #include "ui/create_hint.h"
@@ -85,9 +86,31 @@ void RightClick(Editor& editor, const Words& words) {
   QApplication::sendEvent(field.viewport(), &click);
 }
 
+/// "Expression: 2-5" marks the text between two places, and leaves the focus there.
+void Mark(Editor& editor, const Words& words) {
+  auto& field = editor.Field<CPlainTextField>(words.first);
+  const QStringList places = words.second.split(u'-');
+  QTextCursor cursor(field.document());
+  cursor.setPosition(places[0].toInt());
+  cursor.setPosition(places[1].toInt(), QTextCursor::KeepAnchor);
+  field.setTextCursor(cursor);
+  field.setFocus();
+}
+
 void UseMenuKey(Editor& editor, const Words& words) {
   QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
   QApplication::sendEvent(editor.Field<CAutoRichEditCtrl>(words.first).viewport(), &byKey);
+}
+
+std::string Looks(const QTextCharFormat& looks) {
+  std::string text;
+  if (looks.hasProperty(QTextFormat::ForegroundBrush)) {
+    text += " " + looks.foreground().color().name().toStdString();
+  }
+  if (looks.fontWeight() == QFont::Bold) text += " bold";
+  if (looks.fontItalic()) text += " italic";
+  if (looks.fontUnderline()) text += " link";
+  return text;
 }
 
 /// The parts of an expression, a given one or the one shown, that look alike, each with its looks.
@@ -96,19 +119,25 @@ std::string Colours(Editor& editor, const Words& words) {
   if (!words.all.empty()) field.SetColouredText(ToScreen(words.all).replace("\\n", "\n").toStdString());
   std::string text;
   for (auto block = field.document()->begin(); block.isValid(); block = block.next()) {
-    for (auto part = block.begin(); !part.atEnd(); ++part) {
-      const QTextCharFormat looks = part.fragment().charFormat();
-      text += part.fragment().text().toStdString();
-      if (looks.hasProperty(QTextFormat::ForegroundBrush)) {
-        text += " " + looks.foreground().color().name().toStdString();
-      }
-      if (looks.fontWeight() == QFont::Bold) text += " bold";
-      if (looks.fontItalic()) text += " italic";
-      if (looks.isAnchor() && looks.fontUnderline()) text += " link";
-      text += "\n";
+    QString shown = block.text();
+    shown.insert(block.layout()->preeditAreaPosition(), block.layout()->preeditAreaText());
+    QList<QTextLayout::FormatRange> ranges = block.layout()->formats();
+    std::sort(ranges.begin(), ranges.end(), [](auto& left, auto& right) { return left.start < right.start; });
+    int reached = 0;
+    const auto append = [&text, &shown, &reached](int end, const QTextCharFormat& looks) {
+      if (end <= reached) return;
+      text += shown.mid(reached, end - reached).toStdString() + Looks(looks) + "\n";
+      reached = end;
+    };
+    for (const QTextLayout::FormatRange& range : ranges) {
+      append(range.start, {});
+      append(range.start + range.length, range.format);
     }
+    append(static_cast<int>(shown.size()), {});
+    // Looks that were part of the text would be taken over by what is typed.
+    for (auto part = block.begin(); !part.atEnd(); ++part) text += Looks(part.fragment().charFormat());
   }
-  return text + (field.textCursor().position() == 0 ? "" : "the caret is elsewhere\n");
+  return text + (words.all.empty() || field.textCursor().position() == 0 ? "" : "the caret is elsewhere\n");
 }
 
 /// Presses Tab as often as asked, and names what has the focus after each.
@@ -171,12 +200,26 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"press", Press},
     {"key",
      [](auto& /*editor*/, auto& words) {
-       QTest::keyClick(QApplication::focusWidget(), QKeySequence(words.first)[0].key());
+       const QKeyCombination keys = QKeySequence(words.first)[0];
+       QTest::keyClick(QApplication::focusWidget(), keys.key(), keys.keyboardModifiers());
+     }},
+    {"keys",
+     [](auto& /*editor*/, auto& words) { QTest::keyClicks(QApplication::focusWidget(), words.first); }},
+    {"mark", Mark},
+    // What an input method shows before it is sure.
+    {"compose",
+     [](auto& /*editor*/, auto& words) {
+       QInputMethodEvent unsure(words.first, {});
+       QApplication::sendEvent(QApplication::focusWidget(), &unsure);
      }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
     {"answer",
      [](Editor& editor, auto& words) {
-       for (const char letter : words.all) editor.User().answers.push_back(letter == 'y');
+       const std::map<char, tessal::Answer> letters = {{'y', tessal::Answer::Yes},
+                                                       {'n', tessal::Answer::No},
+                                                       {'a', tessal::Answer::NoToAll},
+                                                       {'c', tessal::Answer::Cancelled}};
+       for (const char letter : words.all) editor.User().answers.push_back(letters.at(letter));
      }},
     {"pick", [](Editor& editor, auto& words) { editor.User().choices.push_back(words.Number()); }},
     {"browse", [](Editor& editor, auto& words) { editor.User().documentationFile = words.first; }},
