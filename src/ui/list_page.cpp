@@ -63,6 +63,10 @@ void CListPage::BuildToolBar() {
   layout->addWidget(bar);
 }
 
+void CListPage::OnStructureChanged() {
+  Reload(table->CurrentRow());
+}
+
 void CListPage::Reload(int row) {
   table->setUpdatesEnabled(false);
   Load();

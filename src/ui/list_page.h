@@ -18,6 +18,7 @@ class CListPage : public CRightPaneBase {
 
  public:
   CRowTable& Table() const { return *table; }
+  void OnStructureChanged() override;
 
  protected:
   enum Command { New, Edit, Delete, MoveDown, MoveUp };

@@ -419,6 +419,7 @@ void CMainView::DeleteFromMenu(Uid id, std::int32_t groupIndex) {
     DeleteNode(*item);
     Core().DeleteElement(id);
   }
+  if (form) form->OnStructureChanged();
   errorList->RefreshErrorList(Core());
   MarkDocument();
 }

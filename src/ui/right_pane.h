@@ -39,6 +39,9 @@ class CRightPaneBase : public QWidget {
   /// Whether the commit has left something to the next one: a rename leaves what was typed into expressions.
   virtual bool HasUnwritten() const { return false; }
 
+  /// Elements or groups were made, moved or deleted elsewhere: a page that lists them shows them again.
+  virtual void OnStructureChanged() {}
+
   /// From now on nothing that its controls report counts: its node may go before it does.
   void Close() { closed = true; }
 

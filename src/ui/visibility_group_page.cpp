@@ -4,7 +4,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QSplitter>
+#include <QStyledItemDelegate>
 #include <QVBoxLayout>
 #include <algorithm>
 
@@ -37,6 +37,20 @@ void ShowLine(QLineEdit& line, const std::string& text) {
   line.setText(ToScreen(text));
   line.setCursorPosition(0);
 }
+
+/// Gives the line in which a cell is edited its number and a name for screen readers.
+class CellDelegate final : public QStyledItemDelegate {
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+
+  QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem& option,
+                        const QModelIndex& cell) const override {
+    QWidget* editor = QStyledItemDelegate::createEditor(parent, option, cell);
+    editor->setObjectName(QStringLiteral("1143"));
+    editor->setAccessibleName(cell.model()->headerData(cell.column(), Qt::Horizontal).toString());
+    return editor;
+  }
+};
 
 }  // namespace
 
@@ -93,6 +107,7 @@ void CVisibilityGroupDlg::BuildLevels() {
       {kNameColumn, kDescriptionColumn},
       [this](int row, int column, const QString& text) { StoreLevelCell(row, column, text); });
   caption->setBuddy(levels);
+  levels->setItemDelegate(MakeChild<CellDelegate>(levels));
   connect(levels, &CRowTable::RowSelected, this, &CVisibilityGroupDlg::SelectLevel);
   deleteLevel =
       AddButton(1135, QStringLiteral("-"), strings::kDeleteLevel, &CVisibilityGroupDlg::DeleteLevel);

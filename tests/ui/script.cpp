@@ -4,6 +4,7 @@
 
 #include <QAction>
 #include <QApplication>
+#include <QClipboard>
 #include <QContextMenuEvent>
 #include <QMenu>
 #include <QPushButton>
@@ -15,6 +16,7 @@
 #include <set>
 
 #include "ui/create_hint.h"
+#include "ui/page_actions.h"
 #include "ui/text_bytes.h"
 
 namespace tessal::test {
@@ -180,6 +182,11 @@ void Revisit(Editor& editor, const Words& words) {
   editor.View().HistoryMenu().actions().at(words.Number())->trigger();
 }
 
+std::string Clipboard(Editor& editor, const Words& /*words*/) {
+  QString text = QApplication::clipboard()->text();
+  return text.replace(QString::fromStdString(editor.Path()), QStringLiteral("PATH")).toStdString() + '\n';
+}
+
 std::string Save(Editor& editor, const Words& words) {
   return editor.Document().OnSaveDocument(editor.Path() + words.all) ? "saved\n" : "not saved\n";
 }
@@ -258,6 +265,8 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"colours", Colours},
     {"tabs", PressTab},
     {"save", Save},
+    {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},
+    {"clipboard", Clipboard},
 };
 
 /// The lines that went, then those that came.
@@ -300,7 +309,7 @@ std::string Script::Answer(const CaseCall& call) {
   try {
     if (const auto look = kLooks.find(verb); look != kLooks.end()) {
       answer = look->second(*editor, words);
-    } else {
+    } else if (!ActOnPage(*editor, verb, words.first, words.second)) {
       kActions.at(verb)(*editor, words);
     }
   } catch (const std::exception& problem) {
