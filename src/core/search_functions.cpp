@@ -87,9 +87,9 @@ class SearchChoices final {
   const NumberChoices& ValuesFor(const CEL_Lagrange_Spatial_Function& function, std::int32_t specie) const {
     if (function.SearchesGrid()) return gridValues;
     if (!function.SearchesParticles()) return noValues;
-    constexpr std::int32_t kOwnSpecie = -1;
     const std::int32_t sought = function.lookFor.IntValue();
-    const auto values = particleValues.find(sought == kOwnSpecie ? specie : sought);
+    const auto values =
+        particleValues.find(sought == CEL_Lagrange_Spatial_Function::kOwnSpecie ? specie : sought);
     return values == particleValues.end() ? noValues : values->second;
   }
 

@@ -18,8 +18,8 @@ constexpr std::string_view kLagrange = "LAGRANGE";
 constexpr std::string_view kOilspill = "OILSPILL";
 constexpr std::string_view kNone = "NONE";
 
-constexpr std::int32_t kOwnSpecie = -1;
-constexpr std::int32_t kAnyParticle = -2;
+constexpr std::int32_t kOwnSpecie = CEL_Lagrange_Spatial_Function::kOwnSpecie;
+constexpr std::int32_t kAnyParticle = CEL_Lagrange_Spatial_Function::kAnyParticle;
 constexpr std::int32_t kLargestVariableId = 999999;
 
 constexpr std::array<std::string_view, 2> kFrameworks = {kEuler, kLagrange};

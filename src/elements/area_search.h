@@ -11,6 +11,10 @@ namespace tessal {
 
 class CEL_Lagrange_Spatial_Function final : public CEL_Element {
  public:
+  /// Values of `lookFor` that mean no class by its number.
+  static constexpr std::int32_t kOwnSpecie = -1;
+  static constexpr std::int32_t kAnyParticle = -2;
+
   explicit CEL_Lagrange_Spatial_Function(std::string_view caption);
 
   void Read(KvfNode section, int& status) override;

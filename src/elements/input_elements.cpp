@@ -139,7 +139,10 @@ void CEL_Input::ApplyBuiltin() {
     return;
   }
   const auto found = BuiltinInUse(input, builtInId.IntValue());
-  if (!found) return;
+  if (!found) {
+    UpdateLocks();
+    return;
+  }
   const CatalogueBuiltin& row = *found;
   {
     // As one change: the rules for a unit type that a modeller chooses are not for the catalogue's.
