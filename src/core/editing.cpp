@@ -124,6 +124,7 @@ bool TemplateCore::DeleteElement(Uid uid) {
   // With a search function the need for a spatial tree may go.
   if (elementKind == ElementKind::SpatialFunction || elementKind == ElementKind::Specie) {
     RefreshSearchFunctionChoices();
+    if (Species().empty()) state.SetSpatialTree(false);
   }
   state.flags.modified = true;
   return true;

@@ -1,5 +1,7 @@
 // Looking elements and symbols up. The searches are linear, see the symbol table.
 #include <algorithm>
+#include <iterator>
+#include <unordered_set>
 
 #include "core/template_core.h"
 
@@ -106,16 +108,16 @@ std::vector<const CEL_Element*> TemplateCore::ReferencedElements(const CEL_Eleme
   std::vector<const CEL_Element*> elements;
   const SymbolRecord* record = RecordOfElement(element);
   if (record == nullptr) return elements;
-  elements.reserve(record->references.size());
-  for (const std::uint32_t used : record->references) elements.push_back(state.table.Used(used).element);
+  std::vector<std::uint32_t> numbers = record->references;
+  const SymbolRecord* next = FindRecordBySequence(record->sequence + 1);
+  if (next != nullptr && next->element == &element) {
+    std::unordered_set<std::uint32_t> known(numbers.begin(), numbers.end());
+    std::copy_if(next->references.begin(), next->references.end(), std::back_inserter(numbers),
+                 [&known](std::uint32_t number) { return known.insert(number).second; });
+  }
+  elements.reserve(numbers.size());
+  for (const std::uint32_t used : numbers) elements.push_back(state.table.Used(used).element);
   return elements;
-}
-
-std::vector<NamedNumber> TemplateCore::SpecieNames() const {
-  std::vector<NamedNumber> names;
-  names.reserve(Species().size());
-  for (const auto& specie : Species()) names.push_back({specie->symbol.Text(), specie->Index()});
-  return names;
 }
 
 std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<Uid>& uids) const {

@@ -190,6 +190,7 @@ bool Reading::Load(const std::string& path) {
     if (!ReadFile(path)) return false;
     if (!CheckIdRange()) state.AssignIds();
     core.RebuildSymbolTable();
+    state.SettleSpatialTree();
     state.flags.strictScopeRule ? core.CheckScopeRule() : core.CheckProcessRule();
     core.ParseAllExpressions();
     core.ValidateTemplate();

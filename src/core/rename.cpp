@@ -58,7 +58,7 @@ std::string RenameFailure(std::string_view newSymbol) {
 bool TemplateCore::RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol,
                                 bool replaceInExpressions) {
   const SymbolRecord* renamed = state.table.BySymbol(oldSymbol);
-  if (renamed == nullptr || SymbolExists(newSymbol)) return false;
+  if (renamed == nullptr || !renamed->element->symbol.Editable() || SymbolExists(newSymbol)) return false;
   state.flags.modified = true;
   {
     // The rewrites must not change the table under the walk.

@@ -188,6 +188,7 @@ std::string Writing::KeptSectionsText() const {
 bool Writing::WriteSections(KvfHandle file) {
   int status = 0;
   state.AssignIds();
+  state.SettleSpatialTree();
   kvfAddTarget(file, section::kTarget);
   state.root.Write(file, status);
   if (state.hasMisc) {

@@ -19,16 +19,86 @@ bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
                      [](const auto& specie) { return !specie->spatialFunctions.empty(); });
 }
 
-std::vector<CEL_Choice> NoVariable() {
-  return {CEL_Choice::Number("NONE", -1)};
-}
+/// Numbered choices that many properties share, and where the choice of a number is among them.
+class NumberChoices final {
+ public:
+  explicit NumberChoices(std::vector<CEL_Choice> choices) : list(ShareChoices(std::move(choices))) {
+    std::int32_t place = 0;
+    // The first choice of a number is the one that counts.
+    for (const CEL_Choice& choice : *list) places.emplace(choice.intValue, place++);
+  }
+
+  void OfferTo(CEL_Property& property) const {
+    property.SetChoices(list);
+    const auto place = places.find(property.IntValue());
+    property.SelectIndex(place == places.end() ? -1 : place->second);
+  }
+
+ private:
+  ChoiceList list;
+  std::unordered_map<std::int32_t, std::int32_t> places;
+};
 
 template <class Elements>
-void Offer(std::vector<CEL_Choice>& choices, const Elements& elements) {
+void Append(std::vector<CEL_Choice>& choices, const Elements& elements) {
   for (const auto& element : elements) {
     choices.push_back(CEL_Choice::Number(element->symbol.Text(), element->id.IntValue()));
   }
 }
+
+/// Values that a search may look at, after the choice of none.
+template <class... Lists>
+NumberChoices ValueChoices(const Lists&... lists) {
+  std::vector<CEL_Choice> choices = {CEL_Choice::Number("NONE", -1)};
+  (Append(choices, lists), ...);
+  return NumberChoices(std::move(choices));
+}
+
+/// The particle classes by their numbers, after the choices that are there already.
+NumberChoices ClassChoices(const Collections& collections, std::vector<CEL_Choice> choices) {
+  for (const auto& specie : collections.species) {
+    choices.push_back(CEL_Choice::Number(specie->symbol.Text(), specie->Index()));
+  }
+  return NumberChoices(std::move(choices));
+}
+
+/// What the template offers to its searches. Each list is made once: their lengths and their number both grow
+/// with the template.
+class SearchChoices final {
+ public:
+  explicit SearchChoices(const Collections& collections)
+      : owners(ClassChoices(collections, {})),
+        lookedFor(ClassChoices(collections, FirstLookForChoices())),
+        gridValues(ValueChoices(collections.stateVariables, collections.constants, collections.forcings)) {
+    for (const auto& specie : collections.species) {
+      particleValues.emplace(specie->Index(), ValueChoices(specie->stateVariables));
+    }
+  }
+
+  /// Offers to a search of the class of that number, to which it belongs from now on.
+  void OfferTo(CEL_Lagrange_Spatial_Function& function, std::int32_t specie) const {
+    function.specieId.SetInt(specie);
+    owners.OfferTo(function.specieId);
+    lookedFor.OfferTo(function.lookFor);
+    ValuesFor(function, specie).OfferTo(function.variableId);
+  }
+
+ private:
+  const NumberChoices& ValuesFor(const CEL_Lagrange_Spatial_Function& function, std::int32_t specie) const {
+    if (function.SearchesGrid()) return gridValues;
+    if (!function.SearchesParticles()) return noValues;
+    const std::int32_t sought = function.lookFor.IntValue();
+    const auto values =
+        particleValues.find(sought == CEL_Lagrange_Spatial_Function::kOwnSpecie ? specie : sought);
+    return values == particleValues.end() ? noValues : values->second;
+  }
+
+  NumberChoices owners;
+  NumberChoices lookedFor;
+  NumberChoices gridValues;
+  NumberChoices noValues = ValueChoices();
+  std::unordered_map<std::int32_t, NumberChoices> particleValues;  ///< by the number of the class
+};
 
 }  // namespace
 
@@ -85,41 +155,19 @@ void ResolveNamesToReferences(const Collections& collections) {
   });
 }
 
-bool OfferSearchChoices(const Collections& collections) {
-  const auto& species = collections.species;
-  std::vector<NamedNumber> names;
-  for (const auto& specie : species) names.push_back({specie->symbol.Text(), specie->Index()});
-  std::vector<CEL_Choice> grid = NoVariable();
-  Offer(grid, collections.stateVariables);
-  Offer(grid, collections.constants);
-  Offer(grid, collections.forcings);
-  const ChoiceList gridValues = ShareChoices(std::move(grid));
-  const ChoiceList noValues = ShareChoices(NoVariable());
-  std::map<std::int32_t, ChoiceList> particleValues;  // by the number of the class
-  for (const auto& specie : species) {
-    std::vector<CEL_Choice> values = NoVariable();
-    Offer(values, specie->stateVariables);
-    particleValues.emplace(specie->Index(), ShareChoices(std::move(values)));
-  }
-
+bool NeedSpatialTree(const Collections& collections) {
   bool needTree = false;
-  for (const auto& specie : species) {
-    for (const auto& function : specie->spatialFunctions) {
-      function->OfferSpecies(names);
-      function->specieId.SetInt(specie->Index());
-      function->variableId.SetChoices(noValues);
-      if (function->SearchesGrid()) {
-        function->variableId.SetChoices(gridValues);
-      } else if (function->SearchesParticles()) {
-        needTree = true;
-        const std::int32_t sought = function->lookFor.IntValue();
-        const auto values = particleValues.find(sought == -1 ? specie->Index() : sought);
-        if (values != particleValues.end()) function->variableId.SetChoices(values->second);
-      }
-      function->SelectPresentValues();
-    }
-  }
+  ForEachSearchFunction(collections, [&needTree](const CEL_Lagrange_Spatial_Function& function) {
+    needTree = needTree || function.SearchesParticles();
+  });
   return needTree;
+}
+
+void OfferSearchChoices(const Collections& collections) {
+  const SearchChoices choices(collections);
+  for (const auto& specie : collections.species) {
+    for (const auto& function : specie->spatialFunctions) choices.OfferTo(*function, specie->Index());
+  }
 }
 
 }  // namespace tessal

@@ -18,8 +18,10 @@ void NumberSpecies(const Collections& collections);
 /// Searches for the class of that number look for none from now on: the number goes to another class.
 void ForgetSpecie(const Collections& collections, std::int32_t number);
 
-/// Fills the choice lists of all searches from the present classes and their values. Whether one of them
-/// looks at particles, and so needs the spatial tree.
-bool OfferSearchChoices(const Collections& collections);
+/// Fills the choice lists of all searches from the present classes and their values, and gives each search to
+/// the class that holds it.
+void OfferSearchChoices(const Collections& collections);
+/// Whether a search looks at particles, and so needs the spatial tree.
+bool NeedSpatialTree(const Collections& collections);
 
 }  // namespace tessal

@@ -8,10 +8,6 @@ namespace tessal {
 
 namespace {
 
-bool IsMovement(const CEL_Element& element) {
-  return element.Kind() == ElementKind::HorizontalVector || element.Kind() == ElementKind::VerticalEquation;
-}
-
 template <class Matches>
 const SymbolRecord* FindRecord(const std::vector<SymbolRecord>& records, Matches matches) {
   const auto hit = std::find_if(records.begin(), records.end(), matches);
@@ -20,17 +16,8 @@ const SymbolRecord* FindRecord(const std::vector<SymbolRecord>& records, Matches
 
 }  // namespace
 
-void AppendRecordSymbol(const SymbolRecord& record, std::string& text) {
-  if (IsMovement(*record.element)) {
-    text += "(" + record.element->ListHeader()->Parent()->symbol.Text() + ")";
-  }
-  text += record.element->symbol.Text();
-}
-
 std::string RecordSymbol(const SymbolRecord& record) {
-  std::string symbol;
-  AppendRecordSymbol(record, symbol);
-  return symbol;
+  return record.element->FullSymbol();
 }
 
 void SymbolTable::Clear() {
@@ -58,9 +45,9 @@ const SymbolRecord* SymbolTable::OfElement(const CEL_Element& element) const {
 }
 
 const SymbolRecord* SymbolTable::BySymbol(std::string_view symbol) const {
+  // The full symbol ends in the element's own, so that few have to be made.
   return FindRecord(records, [symbol](const SymbolRecord& record) {
-    const bool isPlain = !IsMovement(*record.element);
-    return isPlain ? record.element->symbol.Text() == symbol : RecordSymbol(record) == symbol;
+    return symbol.ends_with(record.element->symbol.Text()) && record.element->FullSymbol() == symbol;
   });
 }
 

@@ -49,7 +49,6 @@ struct UndefinedSymbol {
 
 /// The symbol of a record: the element's, composed with the class's for movements.
 std::string RecordSymbol(const SymbolRecord& record);
-void AppendRecordSymbol(const SymbolRecord& record, std::string& text);
 
 class SymbolTable final {
  public:

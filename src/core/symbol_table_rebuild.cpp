@@ -152,7 +152,7 @@ void SymbolTable::RebuildSteps::ExtractReferences() {
   SymbolIndex symbols(records.size());
   lastUser.assign(records.size() + 1, 0);
   for (const SymbolRecord& record : records) {
-    AppendRecordSymbol(record, symbols.NextName());
+    record.element->AppendFullSymbol(symbols.NextName());
     symbols.AddNext(record.uid);
   }
   for (const auto& name : undefined) undefinedByName.emplace(name->symbol, name.get());

@@ -23,6 +23,16 @@ void TemplateState::AssignIds() {
   flags.modified = true;
 }
 
+void TemplateState::SetSpatialTree(bool needed) {
+  misc.buildSpatialTree.SetBool(needed);
+  // A form opens on the selection.
+  misc.SelectPresentValues();
+}
+
+void TemplateState::SettleSpatialTree() {
+  if (!collections.species.empty()) SetSpatialTree(NeedSpatialTree(collections));
+}
+
 TemplateCore::TemplateCore() {
   InitCatalogues();
   for (std::size_t place = 0; place < state.listHeads.size(); ++place) {
@@ -90,8 +100,8 @@ void TemplateCore::RebuildSymbolTable() {
 }
 
 void TemplateCore::RefreshSearchFunctionChoices() {
-  if (Species().empty()) return;
-  state.misc.buildSpatialTree.SetBool(OfferSearchChoices(Elements()));
+  OfferSearchChoices(Elements());
+  state.SettleSpatialTree();
 }
 
 }  // namespace tessal

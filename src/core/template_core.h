@@ -148,7 +148,8 @@ class TemplateCore final : public ElementOwner {
   /// now on; none when nothing is left to ask. An answer may change the list: each call looks at it afresh.
   std::optional<CreationOffer> NextOffer();
   /// Gives an element a new symbol and, if asked to, rewrites every expression that uses it. False, with
-  /// nothing changed, when the new symbol exists or the old one does not.
+  /// nothing changed, when the new symbol exists, or the old one does not or is not editable: derived outputs
+  /// and movements have captions, no symbols that a file holds.
   bool RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol, bool replaceInExpressions);
 
   // The structural pass and the check pass.
@@ -197,7 +198,7 @@ class TemplateCore final : public ElementOwner {
 
   // What elements ask of their template.
   std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const override;
-  std::vector<NamedNumber> SpecieNames() const override;
+  std::size_t SpecieCount() const override { return Species().size(); }
   std::set<std::int32_t> ItemsToRecordNumbers(const std::set<Uid>& uids) const override;
   void RefreshSearchFunctionChoices() override;
 

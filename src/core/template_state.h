@@ -31,6 +31,10 @@ struct TemplateState {
   CEL_ListHead& ListHead(ElementKind listKind) const;
   /// Writes the numbers of the records into the elements and renumbers the classes, with what refers to them.
   void AssignIds();
+  /// Has the settings ask for a spatial tree exactly when a search needs it. Without particle classes the
+  /// choice is the modeller's.
+  void SettleSpatialTree();
+  void SetSpatialTree(bool needed);
 
   TemplateFlags flags;
   bool hasMisc = true;

@@ -1,9 +1,12 @@
 #include "elements/area_search.h"
 
 #include <array>
+#include <map>
+#include <span>
 
 #include "core/error_registry.h"
 #include "elements/element_checks.h"
+#include "elements/element_owner.h"
 #include "keyfile/keywords.h"
 
 namespace tessal {
@@ -15,8 +18,8 @@ constexpr std::string_view kLagrange = "LAGRANGE";
 constexpr std::string_view kOilspill = "OILSPILL";
 constexpr std::string_view kNone = "NONE";
 
-constexpr std::int32_t kOwnSpecie = -1;
-constexpr std::int32_t kAnyParticle = -2;
+constexpr std::int32_t kOwnSpecie = CEL_Lagrange_Spatial_Function::kOwnSpecie;
+constexpr std::int32_t kAnyParticle = CEL_Lagrange_Spatial_Function::kAnyParticle;
 constexpr std::int32_t kLargestVariableId = 999999;
 
 constexpr std::array<std::string_view, 2> kFrameworks = {kEuler, kLagrange};
@@ -68,6 +71,19 @@ constexpr std::array<PropertyRow, 11> kRows = {{
     {key::kLookFor, "Lookfor", ValueType::Integer, nullptr, "", kOwnSpecie},
 }};
 
+const ChoiceList& OilspillChoices() {
+  static const ChoiceList kList = ShareChoices({CEL_Choice::Text("Oilspill(deprecated)", kOilspill)});
+  return kList;
+}
+
+/// One list for each of the arrays above.
+const ChoiceList& ChoicesOf(std::span<const std::string_view> texts) {
+  static std::map<const std::string_view*, ChoiceList> lists;
+  ChoiceList& list = lists[texts.data()];
+  if (!list) list = MakeTextChoices(texts);
+  return list;
+}
+
 /// Selects the choice that stores the property's text; without one the first choice takes its place.
 void SelectOrTakeFirst(CEL_Property& property) {
   property.SelectIndex(property.PresentChoice());
@@ -88,7 +104,8 @@ CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view ca
   Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
                &framework, &property, &math, &lookFor});
   ListenTo({&variableId, &lookFor, &purpose, &framework});
-  lookFor.SetChoices(ShareChoices(FirstLookForChoices()));
+  static const ChoiceList kWithoutClasses = ShareChoices(FirstLookForChoices());
+  lookFor.SetChoices(kWithoutClasses);
   CEL_Lagrange_Spatial_Function::Reset();
 }
 
@@ -116,16 +133,16 @@ bool CEL_Lagrange_Spatial_Function::SearchesParticles() const {
 void CEL_Lagrange_Spatial_Function::RebuildChoices() {
   if (framework.Text() == kEuler && purpose.Text() == kOilspill) {
     // No longer offered, but kept where a file has it.
-    purpose.SetChoices(ShareChoices({CEL_Choice::Text("Oilspill(deprecated)", kOilspill)}));
+    purpose.SetChoices(OilspillChoices());
     purpose.SelectIndex(0);
   } else if (framework.Text() == kEuler) {
-    purpose.SetChoices(MakeTextChoices(kEulerPurposes));
+    purpose.SetChoices(ChoicesOf(kEulerPurposes));
     purpose.SelectChoice("DIRECTION");
-    math.SetChoices(MakeTextChoices(kEulerMath));
+    math.SetChoices(ChoicesOf(kEulerMath));
     math.SelectChoice("MIN");
   } else if (framework.Text() == kLagrange) {
-    purpose.SetChoices(MakeTextChoices(kLagrangePurposes));
-    math.SetChoices(MakeTextChoices(LagrangeMath(purpose.Text())));
+    purpose.SetChoices(ChoicesOf(kLagrangePurposes));
+    math.SetChoices(ChoicesOf(LagrangeMath(purpose.Text())));
   }
 }
 
@@ -137,18 +154,6 @@ void CEL_Lagrange_Spatial_Function::RestoreSelections() {
   property.ApplySelection();
 }
 
-void CEL_Lagrange_Spatial_Function::OfferSpecies(const std::vector<NamedNumber>& species) {
-  std::vector<CEL_Choice> owners;
-  std::vector<CEL_Choice> lookedFor = FirstLookForChoices();
-  for (const NamedNumber& specie : species) {
-    owners.push_back(CEL_Choice::Number(specie.name, specie.number));
-    lookedFor.push_back(CEL_Choice::Number(specie.name, specie.number));
-  }
-  specieId.SetChoices(ShareChoices(std::move(owners)));
-  lookFor.SetChoices(ShareChoices(std::move(lookedFor)));
-  SelectPresentValues();
-}
-
 bool CEL_Lagrange_Spatial_Function::Check() {
   bool good = CheckTextContent(*this);
   const auto report = [this, &good](Message message) {
@@ -158,7 +163,7 @@ bool CEL_Lagrange_Spatial_Function::Check() {
   const bool lagrange = framework.Text() == kLagrange;
   const std::int32_t sought = lookFor.IntValue();
   const std::int32_t variable = variableId.IntValue();
-  const auto species = static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieNames().size());
+  const auto species = static_cast<std::int32_t>(Owner() == nullptr ? 0 : Owner()->SpecieCount());
   if (lagrange && (sought < kAnyParticle || sought == 0 || sought > species)) report("search-without-class");
   if (purpose.Text() != kOilspill) {
     const bool needsVariable = !lagrange || property.Text() == kNone;
@@ -184,9 +189,9 @@ void CEL_Lagrange_Spatial_Function::OnFrameworkChanged() {
     property.ApplySelection();
     property.SetEditable(true);
   }
-  if (Owner() != nullptr) OfferSpecies(Owner()->SpecieNames());
   RebuildChoices();
   RestoreSelections();
+  // Offers the classes too.
   if (Owner() != nullptr) Owner()->RefreshSearchFunctionChoices();
 }
 

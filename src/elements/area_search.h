@@ -6,12 +6,15 @@
 #include <string>
 
 #include "elements/element.h"
-#include "elements/element_owner.h"
 
 namespace tessal {
 
 class CEL_Lagrange_Spatial_Function final : public CEL_Element {
  public:
+  /// Values of `lookFor` that mean no class by its number.
+  static constexpr std::int32_t kOwnSpecie = -1;
+  static constexpr std::int32_t kAnyParticle = -2;
+
   explicit CEL_Lagrange_Spatial_Function(std::string_view caption);
 
   void Read(KvfNode section, int& status) override;
@@ -24,9 +27,6 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   void RebuildChoices();
   /// Selects the present texts among the choices; a text that is no choice gives way to the first one.
   void RestoreSelections();
-  /// Offers the particle classes as owner and as what to look for.
-  void OfferSpecies(const std::vector<NamedNumber>& species);
-
   /// Whether it looks at particles and so needs the spatial tree: framework "LAGRANGE", or an oil spill.
   bool SearchesParticles() const;
   /// Whether it looks at the values of the grid.
@@ -55,7 +55,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   std::string variableName;
 };
 
-/// The first choices of what a search looks for.
+/// The first choices of what a search looks for; the particle classes come after them.
 std::vector<CEL_Choice> FirstLookForChoices();
 
 }  // namespace tessal

@@ -29,6 +29,7 @@ constexpr std::array<DisplayedText, 3> kSpatialVariations = {{
 
 constexpr std::array<UnitTypeRow, 1> kPlainRows = {{{kUserDefined, kUserDefinedUnit, 0, "undefined"}}};
 
+// A type without a known unit number has 0.
 constexpr std::array<UnitTypeRow, 2> kInputRows = {{
     {"Process rate", 100150, 0, "/d"},
     {kUserDefined, kUserDefinedUnit, 0, ""},
@@ -46,8 +47,8 @@ constexpr std::array<UnitTypeRow, 6> kStateVariableRows = {{
 constexpr std::array<UnitTypeRow, 14> kParticleRows = {{
     {"Mass", 100039, 0, "kg"},
     {kUserDefined, kUserDefinedUnit, 0, "undefined"},
-    {"Concentration", 100404, 0, "mg/l"},
-    {"Mass per Area", 100437, 0, "g/m2"},
+    {"Concentration", 100404, 2205, "mg/l"},
+    {"Mass per Area", 100437, 4400, "g/m2"},
     {"Density", 100017, 0, "kg/m3"},
     {"Temperature", 100006, 0, "degree Celsius"},
     {"Surface Area", 100135, 0, "m2"},
@@ -56,8 +57,8 @@ constexpr std::array<UnitTypeRow, 14> kParticleRows = {{
     {"Wind Speed", 100274, 0, "meter/sec"},
     {"Current Speed", 100242, 0, "meter/sec"},
     {"Attenuation", 100317, 0, "per meter"},
-    {"Volume", 110230, 0, "m3"},
-    {"Length", 110220, 0, "m"},
+    {"Volume", 110230, 1600, "m3"},
+    {"Length", 110220, 1000, "m"},
 }};
 
 }  // namespace

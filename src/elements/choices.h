@@ -28,8 +28,8 @@ ChoiceList ShareChoices(std::vector<CEL_Choice> choices);
 /// A list of text choices whose display is their stored text.
 ChoiceList MakeTextChoices(std::span<const std::string_view> texts);
 
-/// A unit type: its number, the unit number that goes with it and the unit text that it brings; an
-/// empty text leaves the unit as it is.
+/// A unit type: its number, the unit number that goes with it (0 where none is known) and the unit text that
+/// it brings; an empty text leaves the unit as it is.
 struct UnitTypeRow {
   std::string_view display;
   std::int32_t unqType;

@@ -84,20 +84,24 @@ void CEL_Element::OfferUnitTypes(const UnitTypes& types) {
 }
 
 void CEL_Element::ApplyUnitType(const UnitTypes& types, CEL_Property& unit) {
-  const UnitTypeRow* row = FindUnitType(types, unqType.IntValue());
-  if (row == nullptr) {
-    if (!types.keepsUnknown) {
-      unqType.SetInt(kUserDefinedUnit);
-      SelectPresentValues();
-    }
-    unit.SetEditable(true);
-    return;
+  if (const UnitTypeRow* row = FindUnitType(types, unqType.IntValue())) {
+    if (!row->unit.empty()) unit.SetText(row->unit);
+    unqUnit.SetInt(row->unqUnit);
+  } else if (!types.keepsUnknown) {
+    // Calls this again, with the row of "User defined".
+    unqType.SetInt(kUserDefinedUnit);
   }
-  if (!row->unit.empty()) unit.SetText(row->unit);
-  unit.SetEditable(row->unqType == kUserDefinedUnit);
+  SelectPresentValues();
+  UpdateLocks();
+}
+
+bool CEL_Element::LeavesUnitOpen(const UnitTypes& types) const {
+  const UnitTypeRow* row = FindUnitType(types, unqType.IntValue());
+  return row == nullptr || row->unqType == kUserDefinedUnit;
 }
 
 void CEL_Element::ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation) {
+  const NotificationsOff silent;
   const std::string_view variation = VariationOfScope(scope.Text());
   if (!variation.empty()) spatialVariation.SetText(variation);
   // A form opens on the selection, and would store it over the new variation.
@@ -175,6 +179,7 @@ void CEL_Element::Read(KvfNode section, int& status) {
   if (!kvfIsSection(section)) return;
   ReadBase(section, status);
   ReadOwn(section, status);
+  UpdateLocks();
 }
 
 void CEL_Element::Write(KvfHandle file, int& status) {
@@ -347,6 +352,12 @@ bool CEL_Element::ParseExpression() {
 
 void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) {
   RebuildOwner();
+}
+
+std::string CEL_Element::FullSymbol() const {
+  std::string text;
+  AppendFullSymbol(text);
+  return text;
 }
 
 void CEL_Element::RebuildOwner() {

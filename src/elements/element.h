@@ -84,6 +84,10 @@ class CEL_Element : public PropertyListener {
 
   void OnPropertyChanged(CEL_Property& changed) override;
 
+  /// Makes editable what the present values leave to the modeller, and locks what they fix: after a load, a
+  /// reset, and a change of what decides it. Values stay as they are.
+  virtual void UpdateLocks() {}
+
   /// Calls the visitor with each expression, its row and its property, in the order of the class's table.
   template <class Visitor>
   void ForEachExpression(Visitor visit) const {
@@ -106,6 +110,10 @@ class CEL_Element : public PropertyListener {
   /// The identity: never 0, never reused, not stored, the same through renames and moves.
   Uid GetUid() const { return uid; }
 
+  /// Appends what the symbol table and messages call the element: its symbol, for a movement with its class.
+  virtual void AppendFullSymbol(std::string& text) const { text += symbol.Text(); }
+  std::string FullSymbol() const;
+
   ElementKind Kind() const { return elementKind; }
   std::string_view KindText() const { return tessal::KindText(elementKind); }
 
@@ -121,6 +129,9 @@ class CEL_Element : public PropertyListener {
   /// Stores the reference in the element and in all its properties.
   virtual void SetModifiedFlag(bool* flag);
   void MarkModified();
+
+  /// Has the template, if there is one, bring its symbol table up to date.
+  void RebuildOwner();
 
   /// Whether the element was read from a file or shown in a form.
   bool Loaded() const { return loaded; }
@@ -177,13 +188,13 @@ class CEL_Element : public PropertyListener {
 
   /// Offers the unit types, and selects the one of the present number.
   void OfferUnitTypes(const UnitTypes& types);
-  /// What a new unit type does to the unit: a type that fixes it sets it and locks it. A number without a
-  /// type counts as "User defined", and becomes it unless the family keeps it.
+  /// What a new unit type does to the unit: a type that fixes it sets its text and its number and locks it. A
+  /// number without a type counts as "User defined", and becomes it unless the family keeps it.
   void ApplyUnitType(const UnitTypes& types, CEL_Property& unit);
-  /// What a new scope does to the spatial variation.
+  /// Whether the present unit type leaves the unit to the modeller.
+  bool LeavesUnitOpen(const UnitTypes& types) const;
+  /// What a new scope does to the spatial variation. The caller brings the symbol table up to date.
   void ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation);
-
-  void RebuildOwner();
 
  private:
   std::vector<CEL_Property*> BaseProperties();
@@ -205,6 +216,17 @@ class CEL_Element : public PropertyListener {
   // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
   std::uint8_t firstExpression = 0;
   std::uint8_t endOfExpressions = 0;
+};
+
+/// Follows properties into the symbol table and no further, where a change passed to the element itself would
+/// do more.
+class TableListener final : public PropertyListener {
+ public:
+  explicit TableListener(CEL_Element& listening) : element(listening) {}
+  void OnPropertyChanged(CEL_Property& /*changed*/) override { element.RebuildOwner(); }
+
+ private:
+  CEL_Element& element;
 };
 
 /// A list head or the root: an element that carries the descriptive texts of a collection.

@@ -14,7 +14,7 @@ namespace tessal {
 namespace {
 
 void Report(const CEL_Element& element, const Finding& finding) {
-  Errors().ReportCheck(element.symbol.Text(), element.GetUid(), finding);
+  Errors().ReportCheck(element.FullSymbol(), element.GetUid(), finding);
 }
 
 }  // namespace
@@ -57,7 +57,7 @@ bool CheckTextContent(const CEL_Element& element) {
 bool CheckExpressions(const CEL_Element& element) {
   bool good = true;
   element.ForEachExpression([&element, &good](const PropertyRow&, const CEL_Property& expression) {
-    good = CheckFunctions(element.symbol.Text(), element.GetUid(), expression.Parsed()) && good;
+    good = CheckFunctions(element.FullSymbol(), element.GetUid(), expression.Parsed()) && good;
   });
   return good;
 }

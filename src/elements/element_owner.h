@@ -4,7 +4,6 @@
 #include <cstddef>
 #include <cstdint>
 #include <set>
-#include <string>
 #include <string_view>
 #include <vector>
 
@@ -13,12 +12,6 @@
 namespace tessal {
 
 class CEL_Element;
-
-/// A name that a choice list offers, with the number that the choice stores.
-struct NamedNumber {
-  std::string name;
-  std::int32_t number;
-};
 
 class ElementOwner {
  public:
@@ -33,12 +26,12 @@ class ElementOwner {
   /// Whether an element other than the one with this identity has this symbol.
   virtual bool IsSymbolTakenByOther(Uid uid, std::string_view symbol) const = 0;
 
-  /// The elements that the element's expression uses, in the order of their first use. For an element with
-  /// two expressions, those of the first record.
+  /// The elements that the element's expressions use, each once, in the order of their first use. For a
+  /// horizontal movement, those of its direction come first.
   virtual std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const = 0;
 
-  /// The particle classes, each with its number from 1.
-  virtual std::vector<NamedNumber> SpecieNames() const = 0;
+  /// How many particle classes there are.
+  virtual std::size_t SpecieCount() const = 0;
 
   /// The numbers of the symbol records of elements, given by their identities; an identity without a record
   /// is left out.

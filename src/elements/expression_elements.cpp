@@ -73,17 +73,15 @@ bool CEL_ExpressionElement::Check() {
 }
 
 void CEL_ExpressionElement::OnPropertyChanged(CEL_Property& changed) {
-  if (&changed == &scope) {
-    ApplyScope(scope, spatialVariation);
-  } else {
-    RebuildOwner();
-  }
+  if (&changed == &scope) ApplyScope(scope, spatialVariation);
+  RebuildOwner();
 }
 
 CEL_Auxilliary_Variable::CEL_Auxilliary_Variable(std::string_view caption)
     : CEL_ExpressionElement(ElementKind::Auxiliary, caption) {
   Bind(kAuxiliaryRows, {&output, &scope, &spatialVariation, &unit, &expression});
   ListenTo({&symbol, &spatialVariation, &expression});
+  scope.AddListener(scopeListener);
 }
 
 CEL_Process::CEL_Process(std::string_view caption) : CEL_ExpressionElement(ElementKind::Process, caption) {
@@ -95,8 +93,10 @@ CEL_Process::CEL_Process(std::string_view caption) : CEL_ExpressionElement(Eleme
 CEL_Derived_Output::CEL_Derived_Output(std::string_view caption)
     : CEL_ExpressionElement(ElementKind::DerivedOutput, caption) {
   SetFileFlags(false, true, true);
+  symbol.SetEditable(false);
   Bind(kDerivedOutputRows, {&scope, &spatialVariation, &unit, &format, &expression});
   ListenTo({&spatialVariation, &expression});
+  scope.AddListener(scopeListener);
 }
 
 }  // namespace tessal

@@ -50,27 +50,27 @@ CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Eleme
 
 void CEL_ExternalFunction::Reset() {
   ResetOwn();
-  EnableParameters();
+  UpdateLocks();
   claim.Claim(publicName.Text());
 }
 
 void CEL_ExternalFunction::Read(KvfNode section, int& status) {
   CEL_Element::Read(section, status);
-  EnableParameters();
   claim.Claim(publicName.Text());
 }
 
 void CEL_ExternalFunction::OnPropertyChanged(CEL_Property& changed) {
   if (&changed == &publicName) {
     claim.Claim(publicName.Text());
+    RebuildOwner();
   } else if (&changed == &usedAs) {
-    EnableParameters();
+    UpdateLocks();
   } else {
     RebuildOwner();
   }
 }
 
-void CEL_ExternalFunction::EnableParameters() {
+void CEL_ExternalFunction::UpdateLocks() {
   // The engine fixes the argument count of its hooks.
   parameters.SetEditable(usedAs.Text() == kMathFunction);
 }

@@ -14,6 +14,7 @@ class CEL_ExternalFunction final : public CEL_Element {
   void Read(KvfNode section, int& status) override;
   void Reset() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  void UpdateLocks() override;
 
   CEL_Property publicName{ValueType::Text};
   CEL_Property dll{ValueType::Text};
@@ -22,8 +23,6 @@ class CEL_ExternalFunction final : public CEL_Element {
   CEL_Property usedAs{ValueType::Text};
 
  private:
-  void EnableParameters();
-
   UserFunctionClaim claim;
 };
 

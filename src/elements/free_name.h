@@ -7,12 +7,21 @@
 
 namespace tessal {
 
-/// The prefix with the first number from `number` up whose name is not taken.
+inline std::string NumberedName(std::string_view prefix, std::size_t number) {
+  return std::string(prefix) + std::to_string(number);
+}
+
+/// The first number from `number` up whose name after the prefix is not taken.
+template <class IsTaken>
+std::size_t FirstFreeNumber(std::string_view prefix, std::size_t number, IsTaken isTaken) {
+  while (isTaken(NumberedName(prefix, number))) ++number;
+  return number;
+}
+
+/// The prefix with that number.
 template <class IsTaken>
 std::string FirstFreeName(std::string_view prefix, std::size_t number, IsTaken isTaken) {
-  std::string name = std::string(prefix) + std::to_string(number);
-  while (isTaken(name)) name = std::string(prefix) + std::to_string(++number);
-  return name;
+  return NumberedName(prefix, FirstFreeNumber(prefix, number, isTaken));
 }
 
 }  // namespace tessal

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <limits>
+#include <optional>
 #include <utility>
 
 #include "core/error_registry.h"
@@ -41,6 +42,13 @@ ChoiceList BuiltinChoices(const InputKind& input, bool withDeprecated, std::int3
   return ShareChoices(std::move(choices));
 }
 
+/// The row that an input of the kind is bound to by this id; none for an id that binds to nothing.
+std::optional<CatalogueBuiltin> BuiltinInUse(const InputKind& input, std::int32_t builtinId) {
+  CatalogueBuiltin row;
+  const bool isBound = builtinId >= 1 && GetBuiltinById(builtinId, row) == 0 && row.kind == input.builtinKind;
+  return isBound ? std::optional(row) : std::nullopt;
+}
+
 /// The list of an element that shows no deprecated row is the same for all of its kind.
 const ChoiceList& UsualBuiltinChoices(const InputKind& input) {
   static const ChoiceList kConstants = BuiltinChoices(kConstantKind, false, kNoBuiltin);
@@ -58,6 +66,7 @@ CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
   Bind(kRows,
        {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
   ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
+  scope.AddListener(scopeListener);
   CEL_Input::Reset();
 }
 
@@ -71,6 +80,7 @@ void CEL_Input::Reset() {
   unqType.SelectChoice(kUserDefined);
   unqUnit.SetInt(0);
   RebuildBuiltInChoices(false);
+  CEL_Input::UpdateLocks();
 }
 
 void CEL_Input::Read(KvfNode section, int& status) {
@@ -106,29 +116,34 @@ void CEL_Input::OnPropertyChanged(CEL_Property& changed) {
     ApplyBuiltin();
   } else if (&changed == &unqType) {
     ApplyUnitType(kInputUnitTypes, unit);
-  } else if (&changed == &scope) {
-    ApplyScope(scope, spatialVariation);
   } else {
+    if (&changed == &scope) ApplyScope(scope, spatialVariation);
     RebuildOwner();
   }
 }
 
-void CEL_Input::SetDataEditable(bool editable) {
+void CEL_Input::UpdateLocks() {
+  const bool isOpen = !BuiltinInUse(input, builtInId.IntValue());
   for (CEL_Property* property :
        {&scope, &spatialVariation, &unqType, &unqUnit, &unit, &defaultValue, &minValue, &maxValue}) {
-    property->SetEditable(editable);
+    property->SetEditable(isOpen);
   }
+  if (!LeavesUnitOpen(kInputUnitTypes)) unit.SetEditable(false);
 }
 
 void CEL_Input::ApplyBuiltin() {
   if (builtInId.IntValue() < 1) {
     isUserSpecified.SetBool(true);
-    SetDataEditable(true);
+    UpdateLocks();
     SelectPresentValues();
     return;
   }
-  CatalogueBuiltin row;
-  if (GetBuiltinById(builtInId.IntValue(), row) != 0 || row.kind != input.builtinKind) return;
+  const auto found = BuiltinInUse(input, builtInId.IntValue());
+  if (!found) {
+    UpdateLocks();
+    return;
+  }
+  const CatalogueBuiltin& row = *found;
   {
     // As one change: the rules for a unit type that a modeller chooses are not for the catalogue's.
     const NotificationsOff silent;
@@ -136,6 +151,7 @@ void CEL_Input::ApplyBuiltin() {
     scope.SetText(LayerText(row.layer));
     spatialVariation.SetText(VariationText(row.variation));
     unqType.SetInt(row.unitType);
+    unqUnit.SetInt(0);  // the catalogue has no unit numbers
     unit.SetText(row.unit);
     // Wide open first, so that no limit is in the way of the default.
     minValue.SetReal(std::numeric_limits<double>::lowest());
@@ -144,7 +160,7 @@ void CEL_Input::ApplyBuiltin() {
     minValue.SetReal(row.minimum);
     maxValue.SetReal(row.maximum);
   }
-  SetDataEditable(false);
+  UpdateLocks();
   SelectPresentValues();
   RebuildOwner();
 }

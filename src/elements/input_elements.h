@@ -20,6 +20,7 @@ class CEL_Input : public CEL_Element {
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  void UpdateLocks() override;
   std::string RecordText() const override;
 
   /// Fills the choices of the built-in id: the catalogue's rows of this kind by name, deprecated ones only
@@ -40,9 +41,10 @@ class CEL_Input : public CEL_Element {
 
  private:
   void ApplyBuiltin();
-  void SetDataEditable(bool editable);
 
   const InputKind& input;
+  /// The scope of an input that a modeller chooses leaves the variation alone.
+  TableListener scopeListener{*this};
   bool showDeprecated = false;
 };
 

@@ -57,6 +57,7 @@ constexpr std::array<PropertyRow, 11> kRows = {{
 
 CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
   SetKind(ElementKind::Miscellaneous);
+  symbol.SetEditable(false);
   Bind(kRows, {&tessalVersion, &parserVersion, &documentRevision, &randSeed, &debugLevel, &debugLog,
                &randomParticleDir, &buildSpatialTree, &checksum, &optimise, &trigonometrics});
   CEL_Miscanellous::Reset();
@@ -128,6 +129,8 @@ CEL_ExternalFunction& CEL_Miscanellous::AddExternalFunction() {
   function->SetParent(this);
   function->SetModifiedFlag(templateModified);
   functions.push_back(std::move(function));
+  MarkModified();
+  RebuildOwner();
   return *functions.back();
 }
 
@@ -135,6 +138,7 @@ bool CEL_Miscanellous::RemoveExternalFunction(std::size_t index) {
   if (index >= functions.size()) return false;
   functions.erase(functions.begin() + static_cast<std::ptrdiff_t>(index));
   MarkModified();
+  RebuildOwner();
   return true;
 }
 

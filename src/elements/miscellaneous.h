@@ -25,7 +25,8 @@ class CEL_Miscanellous final : public CEL_Element {
   /// Changes of settings touch no symbol.
   void OnPropertyChanged(CEL_Property& /*changed*/) override {}
 
-  /// Makes a user function with the caption "External User Function" and its number, and appends it.
+  /// Makes a user function with the caption "External User Function" and its number, and appends it. This and
+  /// the removal bring the symbol table up to date: the public name is in use, or no longer is.
   CEL_ExternalFunction& AddExternalFunction();
   /// Removes the function at the place (from 0) and its public name; false when there is no such place.
   bool RemoveExternalFunction(std::size_t index);

@@ -72,6 +72,7 @@ bool CEL_Lagrange_Specie::Owns(const CEL_Element& element) const {
 
 void CEL_Lagrange_Specie::DropMembers() {
   ForEachMemberList([this](const auto& list) { (this->*list.members).clear(); });
+  highestCaption = 0;
   verticalEquation = std::make_unique<CEL_Lagrange_Vertical_Equation>("Downward Velocity");
   Adopt(*verticalEquation, ElementKind::VerticalEquationList);
 }
@@ -90,14 +91,21 @@ void CEL_Lagrange_Specie::Adopt(CEL_Element& member, ElementKind listKind) {
   member.SetModifiedFlag(templateModified);
 }
 
-std::string CEL_Lagrange_Specie::NewName(ElementKind kind, std::string_view word, std::size_t number) const {
-  if (kind == ElementKind::HorizontalVector) {
-    // Movements have captions of their own, which the class's name does not begin.
-    return FirstFreeName(word, number, [this](const std::string& caption) {
+std::string CEL_Lagrange_Specie::NewCaption(std::string_view word, std::size_t number) {
+  // A number above all that were given so far is free. Only after a deletion may one below them not be.
+  if (number <= highestCaption) {
+    number = FirstFreeNumber(word, number, [this](const std::string& caption) {
       return std::any_of(horizontalVectors.begin(), horizontalVectors.end(),
                          [&caption](const auto& vector) { return vector->symbol.Text() == caption; });
     });
   }
+  highestCaption = std::max(highestCaption, number);
+  return NumberedName(word, number);
+}
+
+std::string CEL_Lagrange_Specie::NewName(ElementKind kind, std::string_view word, std::size_t number) {
+  // Movements have captions of their own, which the class's name does not begin.
+  if (kind == ElementKind::HorizontalVector) return NewCaption(word, number);
   return FirstFreeName(symbol.Text() + "_" + std::string(word), number, [this](const std::string& name) {
     return Owner() != nullptr && Owner()->SymbolExists(name);
   });
@@ -110,6 +118,9 @@ Member& CEL_Lagrange_Specie::Add(const MemberList<Member>& list) {
   Member& member = *members.back();
   Adopt(member, list.listKind);
   if constexpr (requires { member.specie; }) member.specie.SetInt(index);
+  // A class's parent is the template's root, whose text every new element starts with.
+  if (Parent() != nullptr) member.documentation.SetText(Parent()->documentation.Text());
+  if (templateModified != nullptr) *templateModified = true;
   return member;
 }
 

@@ -96,12 +96,14 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   template <class Member>
   Member& Add(const MemberList<Member>& list);
   void Adopt(CEL_Element& member, ElementKind listKind);
-  std::string NewName(ElementKind kind, std::string_view word, std::size_t number) const;
+  std::string NewName(ElementKind kind, std::string_view word, std::size_t number);
+  std::string NewCaption(std::string_view word, std::size_t number);
 
   void DropMembers();
   bool CheckMemberReferences(const CEL_Element& member) const;
 
   std::int32_t index = 0;
+  std::size_t highestCaption = 0;  ///< the highest number of a movement's caption so far
   bool* templateModified = nullptr;
   std::array<std::unique_ptr<CEL_ListHead>, kListCount> heads;
 };

@@ -74,10 +74,16 @@ void CEL_Lagrange_Arithmetical_Expression::Classify(bool isProcess) {
 CEL_Movement::CEL_Movement(ElementKind kind, std::string_view caption) : CEL_Element(caption) {
   SetKind(kind);
   SetFileFlags(false, false, false);
+  symbol.SetEditable(false);
 }
 
 bool CEL_Movement::Check() {
   return CheckExpressions(*this);
+}
+
+void CEL_Movement::AppendFullSymbol(std::string& text) const {
+  if (ListHeader() != nullptr) text += "(" + ListHeader()->Parent()->symbol.Text() + ")";
+  text += symbol.Text();
 }
 
 void CEL_Movement::GetFields(std::vector<ElementField>& fields) const {

@@ -32,6 +32,7 @@ class CEL_Movement : public CEL_Element {
   bool Check() override;
   void GetFields(std::vector<ElementField>& fields) const override;
   int SetFields(const std::vector<ElementField>& fields) override { return SetOwnFields(fields); }
+  void AppendFullSymbol(std::string& text) const override;
 
  protected:
   CEL_Movement(ElementKind kind, std::string_view caption);

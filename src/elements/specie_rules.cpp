@@ -42,8 +42,10 @@ std::optional<Finding> FindEquationFault(const CEL_Element& used, const CEL_Lagr
 }
 
 std::optional<Finding> FindExpressionFault(const CEL_Element& used, const CEL_Lagrange_Specie& specie) {
+  // A class may be named as the target of an interaction; one that comes later is a fault of order.
   const bool isOpenToAll = used.Kind() == ElementKind::StateVariable ||
-                           used.Kind() == ElementKind::Constant || used.Kind() == ElementKind::Forcing;
+                           used.Kind() == ElementKind::Constant || used.Kind() == ElementKind::Forcing ||
+                           used.Kind() == ElementKind::Specie;
   if (isOpenToAll || specie.Owns(used)) return std::nullopt;
   if (used.Kind() == ElementKind::SpecieStateVariable) {
     return Finding("foreign-state-variable", {used.symbol.Text(), specie.symbol.Text()});
@@ -86,10 +88,10 @@ bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const
     auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
     // Equations use what they use regardless of order: state variables are integrated.
     if (!isEquation && IsDeclaredAfter(*used, member, *this)) {
-      finding = Finding("order-violated", {used->symbol.Text(), member.symbol.Text()});
+      finding = Finding("order-violated", {used->symbol.Text(), member.FullSymbol()});
     }
     if (!finding) continue;
-    Errors().Report(member.symbol.Text(), member.GetUid(), *finding);
+    Errors().Report(member.FullSymbol(), member.GetUid(), *finding);
     good = false;
   }
   return good;

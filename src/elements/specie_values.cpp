@@ -44,7 +44,14 @@ constexpr std::array<PropertyRow, 5> kForcingRows = {{
 
 void CEL_SpecieValue::Reset() {
   unqType.SetInt(kUserDefinedUnit);
+  unqUnit.SetInt(0);
   ResetOwn();
+  UpdateLocks();
+}
+
+void CEL_SpecieValue::UpdateLocks() {
+  // A forcing has no unit type, and so the one that leaves the unit open.
+  unit.SetEditable(LeavesUnitOpen(kParticleUnitTypes));
 }
 
 std::string CEL_SpecieValue::RecordText() const {

@@ -11,6 +11,7 @@ class CEL_SpecieValue : public CEL_Element {
  public:
   void Reset() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  void UpdateLocks() override;
   std::string RecordText() const override;
 
   CEL_Property unit{ValueType::Text};

@@ -45,6 +45,11 @@ void CEL_StateVariable::Reset() {
   unqType.SelectChoice(kUserDefined);
   unqUnit.SetInt(0);
   ResetOwn();
+  CEL_StateVariable::UpdateLocks();
+}
+
+void CEL_StateVariable::UpdateLocks() {
+  unit.SetEditable(LeavesUnitOpen(kStateVariableUnitTypes));
 }
 
 void CEL_StateVariable::Read(KvfNode section, int& status) {
@@ -61,6 +66,7 @@ void CEL_StateVariable::Read(KvfNode section, int& status) {
   ReadProperty(maxValue, section, key::kMaxValue, status);
   ReadProperty(defaultValue, section, key::kDefaultValue, status);
   SelectPresentValues();
+  UpdateLocks();
 }
 
 bool CEL_StateVariable::Check() {

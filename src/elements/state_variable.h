@@ -13,6 +13,7 @@ class CEL_StateVariable final : public CEL_Element {
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
+  void UpdateLocks() override;
 
   CEL_Property scope{ValueType::Text};
   CEL_Property transport{ValueType::Text};

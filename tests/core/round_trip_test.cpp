@@ -246,8 +246,9 @@ std::optional<std::string> Altered(const std::string& line) {
 
 TEST(RoundTrip, AnyValueThatIsLostIsNoticed) {
   // Counts, positions, and what follows from the rest; choices that fall back to their first.
-  const std::set<std::string> unnoticed = {"DOCUMENT_REVISION", "ID",        "ITEMCOUNT", "GROUPS", "LEVELS",
-                                           "EXPRESSION_TYPE",   "FRAMEWORK", "PURPOSE",   "MATH"};
+  const std::set<std::string> unnoticed = {
+      "DOCUMENT_REVISION", "ID",        "ITEMCOUNT", "GROUPS", "LEVELS",
+      "EXPRESSION_TYPE",   "FRAMEWORK", "PURPOSE",   "MATH",   "BUILD_SPATIAL_TREE"};
   Filled filled(5, 1);
   const std::string content = TemplateContent(filled.Core());
   std::string text = ReadFile(filled.Path());

@@ -337,6 +337,32 @@ std::string TemplateScript::Items(const Words& words) {
   return text;
 }
 
+/// The properties that may not be edited, of those that something locks.
+std::string TemplateScript::Locks(const std::string& name) {
+  std::string text;
+  const auto note = [&text](const char* label, const CEL_Property& property) {
+    if (!property.Editable()) text += std::string(text.empty() ? "" : ", ") + label;
+  };
+  CEL_Element& element = Element(name);
+  note("symbol", element.symbol);
+  note("type", element.unqType);
+  note("number", element.unqUnit);
+  if (const auto* input = dynamic_cast<CEL_Input*>(&element)) {
+    note("scope", input->scope);
+    note("variation", input->spatialVariation);
+    note("unit", input->unit);
+    note("default", input->defaultValue);
+    note("minimum", input->minValue);
+    note("maximum", input->maxValue);
+  }
+  if (const auto* variable = dynamic_cast<CEL_StateVariable*>(&element)) note("unit", variable->unit);
+  if (const auto* value = dynamic_cast<CEL_SpecieValue*>(&element)) note("unit", value->unit);
+  if (const auto* function = dynamic_cast<CEL_ExternalFunction*>(&element)) {
+    note("parameters", function->parameters);
+  }
+  return text.empty() ? "none" : text;
+}
+
 /// What a level includes, and what could be added to it.
 std::string TemplateScript::LevelItems(const Words& words) {
   const std::int32_t group = Number(words.at(0));
@@ -447,6 +473,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"look", [](S s, W w) { return s.Lookups(w.at(0)); }},
       {"groups", [](S s, W) { return s.Groups(); }},
       {"items", [](S s, W w) { return s.Items(w); }},
+      {"tree", [](S s, W) { return YesNo(s.core.GetMisc()->buildSpatialTree.BoolValue()); }},
+      {"locks", [](S s, W w) { return s.Locks(w.at(0)); }},
       {"level-items", [](S s, W w) { return s.LevelItems(w); }},
       {"modified", [](S s, W) { return YesNo(s.core.Modified()); }},
       {"mark", [](S s, W) { return s.core.SetModified(true), ""; }},
@@ -490,6 +518,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"offer", [](S s, W w) { return s.Offer(w); }},
       {"rename", [](S s, W w) { return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3)); }},
       {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
+      {"reset", [](S s, W w) { return s.Element(w.at(0)).Reset(), ""; }},
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},
       {"add-group", [](S s, W) { return std::to_string(s.core.AddVisibilityGroup()); }},
       {"remove-group", [](S s, W w) { return s.core.RemoveVisibilityGroup(Number(w.at(0))), ""; }},

@@ -51,6 +51,7 @@ class TemplateScript final {
   std::string Offer(const Words& words);
   std::string Groups();
   std::string Items(const Words& words);
+  std::string Locks(const std::string& name);
   std::string LevelItems(const Words& words);
   std::string Lookups(const std::string& name);
   std::string Shortened(std::string text) const;
