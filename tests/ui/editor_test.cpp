@@ -11,6 +11,7 @@
 #include <QTimer>
 #include <filesystem>
 #include <map>
+#include <set>
 
 #include "support/case_file.h"
 #include "ui/auto_create_dialog.h"
@@ -110,6 +111,32 @@ TEST(Forms, ShareTheirHeightBetweenExpressionsAndBoxTheirCounts) {
   EXPECT_EQ(editor.Core().GetConstant(0).description.Text(), "k");
   EXPECT_EQ(editor.Core().GetConstant(0).onlineHelp.Text(), "k+k");
   EXPECT_EQ(count->text(), "1");
+}
+
+TEST(Forms, LetTabReachTheMessagesThroughFieldsThatAreSeen) {
+  Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/fish_larvae.tessal"));
+  editor.User().answers = {Answer::NoToAll};
+  std::set<ElementKind> kinds;
+  for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
+    if (!kinds.insert(CElementTree::DataOf(**item).kind).second) continue;
+    editor.Tree().setCurrentItem(*item);
+    QCoreApplication::processEvents();
+    editor.Tree().setFocus();
+    QStringList stops;
+    constexpr int kMostStops = 40;
+    while (stops.size() < kMostStops && !editor.View().ErrorList().hasFocus()) {
+      QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+      const QWidget* stop = QApplication::focusWidget();
+      EXPECT_FALSE(stop->accessibleName().isEmpty()) << stop->metaObject()->className();
+      stops.append(stop->accessibleName());
+    }
+    EXPECT_LT(stops.size(), kMostStops)
+        << (*item)->text(0).toStdString() << ": " << stops.join(u'|').toStdString();
+    EXPECT_EQ(stops.removeDuplicates(), 0) << (*item)->text(0).toStdString();
+    for (qsizetype left = stops.size(); left > 0; --left)
+      QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backtab, Qt::ShiftModifier);
+    EXPECT_TRUE(editor.Tree().hasFocus()) << (*item)->text(0).toStdString();
+  }
 }
 
 TEST(Colours, StayReadableOnADarkGround) {
