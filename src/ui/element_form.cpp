@@ -3,21 +3,18 @@
 #include <QComboBox>
 #include <QFileInfo>
 #include <QGridLayout>
-#include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QSplitter>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <limits>
-#include <memory>
-#include <utility>
 
 #include "core/document.h"
 #include "core/rename.h"
 #include "elements/property_io.h"
+#include "ui/alt_keys.h"
 #include "ui/child.h"
 #include "ui/dialogs.h"
 #include "ui/documentation_link.h"
@@ -31,9 +28,6 @@
 namespace tessal {
 
 namespace {
-
-constexpr int kFewestLines = 2;
-constexpr int kMostLines = 4;
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
@@ -51,21 +45,6 @@ QString TextIn(const QWidget& editor) {
   return {};
 }
 
-bool IsShort(FieldEditor editor) {
-  switch (editor) {
-    case FieldEditor::ShortLine:
-    case FieldEditor::Number:
-    case FieldEditor::Integer:
-    case FieldEditor::Shown:
-    case FieldEditor::Count:
-    case FieldEditor::SortedChoice:
-    case FieldEditor::OrderedChoice:
-      return true;
-    default:
-      return false;
-  }
-}
-
 /// Whether a commit writes the field. A symbol is renamed in a way of its own.
 bool IsStored(FieldEditor editor) {
   switch (editor) {
@@ -79,30 +58,13 @@ bool IsStored(FieldEditor editor) {
   }
 }
 
-bool IsOneLine(FieldEditor editor) {
-  return IsShort(editor) || editor == FieldEditor::Symbol || editor == FieldEditor::Line ||
-         editor == FieldEditor::Documentation;
-}
-
-int HeightOf(const QWidget& editor, int lines) {
-  return editor.fontMetrics().lineSpacing() * lines + editor.fontMetrics().height() / 2;
-}
-
-void LimitHeight(QWidget& editor) {
-  editor.setMinimumHeight(HeightOf(editor, kFewestLines));
-  editor.setMaximumHeight(HeightOf(editor, kMostLines));
-}
-
 }  // namespace
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
   for (const FormField& field : fields) AddField(field);
-  SplitExpressions();
-  BoxCounts();
-  Arrange(1);
-  narrowWidth = layout->minimumSize().width();
-  Arrange(2);
+  LabelFields();
+  LayOut();
 }
 
 void CElementForm::AddField(const FormField& field) {
@@ -111,105 +73,17 @@ void CElementForm::AddField(const FormField& field) {
   control.cell = MakeEditor(field, control);
   control.editor->setObjectName(QString::number(field.control));
   control.editor->setAccessibleName(QString::fromLatin1(field.label));
-  control.label = MakeChild<QLabel>(QString::fromLatin1(field.label), this);
-  control.label->setBuddy(control.editor);
   controls.push_back(control);
 }
 
-void CElementForm::SplitExpressions() {
-  constexpr int kSameShare = 1000;
-  const auto isExpression = [](const Control& control) {
-    return control.field->editor == FieldEditor::Expression;
-  };
-  const auto expressionCount = std::count_if(controls.begin(), controls.end(), isExpression);
-  if (expressionCount < 2) return;
-  split = MakeChild<QSplitter>(Qt::Vertical, this);
-  split->setObjectName(QStringLiteral("Split"));
-  split->setChildrenCollapsible(false);
+void CElementForm::LabelFields() {
+  QStringList labels;
+  for (const Control& control : controls) labels.append(QString::fromLatin1(control.field->label));
+  labels = WithAltKeys(labels);
   for (Control& control : controls) {
-    if (!isExpression(control)) continue;
-    // A splitter takes a child in as soon as it has it as its parent.
-    const bool isFirst = split->count() == 0;
-    auto* panel = MakeChild<QWidget>(split);
-    panel->setObjectName(isFirst ? QStringLiteral("Top") : QStringLiteral("Bottom"));
-    auto* parts = MakeChild<QHBoxLayout>(panel);
-    parts->setContentsMargins(0, 0, 0, 0);
-    parts->addWidget(control.label, 0, Qt::AlignTop);
-    parts->addWidget(control.cell, 1);
-    split->addWidget(panel);
-    control.isInBlock = true;
+    control.label = MakeChild<QLabel>(labels.takeFirst(), this);
+    control.label->setBuddy(control.editor);
   }
-  split->setSizes(QList<int>(split->count(), kSameShare));
-}
-
-void CElementForm::BoxCounts() {
-  constexpr int kCountsPerRow = 2;
-  QGridLayout* cells = nullptr;
-  int place = 0;
-  for (Control& control : controls) {
-    if (control.field->editor != FieldEditor::Count) continue;
-    if (cells == nullptr) {
-      overview = MakeChild<QGroupBox>(strings::kGeneralOverview, this);
-      overview->setObjectName(QString::number(control_id::kOverviewBox));
-      cells = MakeChild<QGridLayout>(overview);
-    }
-    const int column = 2 * (place % kCountsPerRow);
-    cells->addWidget(control.label, place / kCountsPerRow, column);
-    cells->addWidget(control.cell, place / kCountsPerRow, column + 1);
-    control.isInBlock = true;
-    ++place;
-  }
-}
-
-void CElementForm::AddUnder(QWidget* widget) {
-  under.push_back(widget);
-  const int present = std::exchange(columns, 0);
-  Arrange(present);
-}
-
-void CElementForm::Arrange(int columnCount) {
-  if (columnCount == columns) return;
-  columns = columnCount;
-  while (const std::unique_ptr<QLayoutItem> gone{layout->takeAt(0)}) continue;
-  for (int row = 0; row < layout->rowCount(); ++row) layout->setRowStretch(row, 0);
-  constexpr int kGridColumns = 4;
-  int row = -1;
-  int column = kGridColumns;
-  bool grows = split != nullptr;
-  for (const Control& control : controls) {
-    if (control.isInBlock) continue;
-    const bool isShort = columns > 1 && IsShort(control.field->editor);
-    if (!isShort || column >= kGridColumns) {
-      ++row;
-      column = 0;
-    }
-    layout->addWidget(control.label, row, column,
-                      IsOneLine(control.field->editor) ? Qt::AlignVCenter : Qt::AlignTop);
-    layout->addWidget(control.cell, row, column + 1, 1, isShort ? 1 : kGridColumns - 1);
-    column = isShort ? column + 2 : kGridColumns;
-    if (control.field->editor != FieldEditor::Expression) continue;
-    layout->setRowStretch(row, 1);
-    grows = true;
-  }
-  if (overview != nullptr) layout->addWidget(overview, ++row, 0, 1, kGridColumns);
-  if (split != nullptr) {
-    layout->addWidget(split, ++row, 0, 1, kGridColumns);
-    layout->setRowStretch(row, 1);
-  }
-  for (QWidget* widget : under) layout->addWidget(widget, ++row, 0, 1, kGridColumns);
-  layout->setColumnStretch(1, 1);
-  layout->setColumnStretch(3, columns > 1 ? 1 : 0);
-  if (!grows) layout->setRowStretch(row + 1, 1);
-  updateGeometry();
-}
-
-QSize CElementForm::minimumSizeHint() const {
-  return {narrowWidth, layout->minimumSize().height()};
-}
-
-void CElementForm::resizeEvent(QResizeEvent* resize) {
-  CRightPaneBase::resizeEvent(resize);
-  Arrange(width() >= 2 * narrowWidth ? 2 : 1);
 }
 
 QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
@@ -240,7 +114,6 @@ QLineEdit* CElementForm::MakeLine(const FormField& field, QWidget* parent) {
 
 QWidget* CElementForm::MakeLines() {
   auto* lines = MakeChild<CPlainTextField>(this);
-  LimitHeight(*lines);
   connect(lines, &QTextEdit::textChanged, this, [this] { NoteEdited(); });
   WatchFocusLoss(*lines, [this] { NoteFocusLost(); });
   return lines;
@@ -259,7 +132,6 @@ QWidget* CElementForm::MakeCombo() {
 QWidget* CElementForm::MakeReferences() {
   auto* names = MakeChild<CAutoRichEditCtrl>(Document(), this);
   names->setReadOnly(true);
-  LimitHeight(*names);
   connect(names, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
   return names;
 }
@@ -290,7 +162,6 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   auto* rows = MakeChild<QVBoxLayout>(cell);
   rows->setContentsMargins(0, 0, 0, 0);
   auto* edit = MakeChild<CAutoRichEditCtrl>(Document(), cell);
-  edit->setMinimumHeight(HeightOf(*edit, kMostLines));
   auto* note = MakeChild<CLabel>(cell);
   note->setWordWrap(true);
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
@@ -302,8 +173,8 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   foot->addWidget(keypad, 0, Qt::AlignTop);
   rows->addWidget(edit, 1);
   rows->addLayout(foot);
-  connect(edit, &QTextEdit::textChanged, note, [edit, note] { note->setText(edit->ParserMessage()); });
-  connect(edit, &QTextEdit::textChanged, this, [this, edit] {
+  connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit, note] {
+    note->setText(edit->ParserMessage());
     if (edit->IsEdited()) NoteTyped();
   });
   connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
@@ -352,7 +223,6 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
     // What was typed and is not written yet stays.
     if (expression->IsEdited()) return;
     expression->SetColouredText(property.TextOf());
-    control.note->setText(expression->ParserMessage());
   } else if (auto* lines = qobject_cast<CPlainTextField*>(control.editor)) {
     lines->ShowText(text);
   }

@@ -76,6 +76,7 @@ class CElementForm : public CRightPaneBase {
 
  protected:
   void resizeEvent(QResizeEvent* resize) override;
+  void changeEvent(QEvent* change) override;
   void ItemToForm() override;
   void FormToItem() override;
   /// Writes the fields after the symbol, in the table's order; true when any has changed. A form whose fields
@@ -105,12 +106,21 @@ class CElementForm : public CRightPaneBase {
   void RenameInTyped(const std::string& former, const std::string& present);
   bool Store(const Control& control, CEL_Element& element);
   void AddField(const FormField& field);
+  /// Labels the fields, each with an Alt key of its own.
+  void LabelFields();
+  void LayOut();
   /// Puts several expressions into a splitter, each with the same share of the height.
   void SplitExpressions();
   /// Puts the counts into a box of their own.
   void BoxCounts();
+  /// What cannot be changed has the ground of the window.
+  void FlattenReadOnlyFields();
   /// Lays the fields out; short ones share a row when there are two columns.
   void Arrange(int columnCount);
+  /// Both return the last row in use.
+  int ArrangeRows();
+  int ArrangeBlocks(int row);
+  void ArrangeNumbers(std::span<const Control> numbers, int row);
   /// Makes the editor of a field. The cell that it lies in may hold more beside it.
   QWidget* MakeEditor(const FormField& field, Control& control);
   QLineEdit* MakeLine(const FormField& field, QWidget* parent);
@@ -138,6 +148,7 @@ class CElementForm : public CRightPaneBase {
   QGroupBox* overview = nullptr;  ///< of a form with counts
   int columns = 0;
   int narrowWidth = 0;  ///< what one column needs
+  int wideWidth = 0;    ///< what two columns need
 };
 
 }  // namespace tessal

@@ -6,6 +6,7 @@
 #include <QMouseEvent>
 #include <QScrollBar>
 #include <QToolTip>
+#include <utility>
 
 #include "core/document.h"
 #include "expr/parser.h"
@@ -19,9 +20,12 @@ namespace tessal {
 CAutoRichEditCtrl::CAutoRichEditCtrl(const CTessalDoc& shownDocument, QWidget* parent)
     : CPlainTextField(parent),
       source(shownDocument),
-      highlighter(MakeChild<CExpressionHighlighter>(document(), shownDocument.Core())) {
+      highlighter(MakeChild<CExpressionHighlighter>(shownDocument.Core(), this)) {
   viewport()->setMouseTracking(true);
-  connect(this, &QTextEdit::textChanged, this, &CAutoRichEditCtrl::FollowText);
+  // The scan comes before the formatting of what has changed.
+  connect(document(), &QTextDocument::contentsChange, this, &CAutoRichEditCtrl::FollowText);
+  highlighter->setDocument(document());
+  connect(this, &QTextEdit::textChanged, this, &CAutoRichEditCtrl::ReportText);
 }
 
 void CAutoRichEditCtrl::SetColouredText(const std::string& text) {
@@ -38,7 +42,13 @@ void CAutoRichEditCtrl::FollowText() {
   if (!isStale && text == coloured) return;
   isStale = false;
   coloured = text;
-  highlighter->Colour(text, palette().color(QPalette::Base));
+  isUnreported = true;
+  looksChangedBefore |= highlighter->Scan(text, palette().color(QPalette::Base));
+}
+
+void CAutoRichEditCtrl::ReportText() {
+  if (std::exchange(looksChangedBefore, false)) highlighter->rehighlight();
+  if (std::exchange(isUnreported, false)) emit ContentChanged();
 }
 
 QString CAutoRichEditCtrl::ParserMessage() const {
@@ -106,7 +116,9 @@ void CAutoRichEditCtrl::changeEvent(QEvent* change) {
   if (change->type() != QEvent::PaletteChange) return;
   // Another palette wants other colours.
   isStale = true;
+  looksChangedBefore = true;
   FollowText();
+  ReportText();
 }
 
 }  // namespace tessal

@@ -31,6 +31,8 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   QString TipOf(Uid uid) const;
 
  signals:
+  /// The text has become another, or its colours are looked up again. What Qt reports counts colours too.
+  void ContentChanged();
   /// A link was clicked with the right button, or the menu was asked for while the caret was on it.
   void LinkActivated(Uid uid);
 
@@ -41,17 +43,20 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   void changeEvent(QEvent* change) override;
 
  private:
-  /// Colours the text again when it has changed.
+  /// Looks the colours up when the text has changed.
   void FollowText();
+  void ReportText();
   Uid LinkAtCaret() const;
   /// The identity of the element with a symbol, 0 for none.
   Uid ElementNamed(const std::string& name) const;
 
   const CTessalDoc& source;
   CExpressionHighlighter* highlighter;
-  std::string content;   ///< the bytes that were shown last
-  QString coloured;      ///< the text that the colours belong to
-  bool isStale = false;  ///< the colours may be others though the text is the same
+  std::string content;              ///< the bytes that were shown last
+  QString coloured;                 ///< the text that the colours belong to
+  bool isStale = false;             ///< the colours may be others though the text is the same
+  bool looksChangedBefore = false;  ///< before the part of the text that has changed
+  bool isUnreported = false;
 };
 
 }  // namespace tessal

@@ -1,6 +1,7 @@
 #include "ui/expression_highlighter.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "expr/scanner.h"
 #include "ui/expression_colours.h"
@@ -44,14 +45,16 @@ QTextCharFormat LooksOf(const TokenStyle& style, const QColor& ground) {
 
 }  // namespace
 
-CExpressionHighlighter::CExpressionHighlighter(QTextDocument* document, const TemplateCore& templateCore)
-    : QSyntaxHighlighter(document), core(templateCore) {}
+CExpressionHighlighter::CExpressionHighlighter(const TemplateCore& templateCore, QObject* owner)
+    : QSyntaxHighlighter(owner), core(templateCore) {}
 
-void CExpressionHighlighter::Colour(const QString& text, const QColor& ground) {
+bool CExpressionHighlighter::Scan(const QString& text, const QColor& ground) {
   const std::string bytes = text.toStdString();
   std::vector<ExpressionToken> tokens;
   const ScannerRest rest;
-  if (!ScanExpressionTokens(bytes, tokens)) tokens.clear();
+  const bool wasClean = std::exchange(isClean, ScanExpressionTokens(bytes, tokens));
+  if (!isClean) tokens.clear();
+  ++revision;
   parts.clear();
   parts.reserve(tokens.size());
   ScreenPositions positions(bytes, text);
@@ -64,7 +67,7 @@ void CExpressionHighlighter::Colour(const QString& text, const QColor& ground) {
     if (style.link) part.link = expressionToken.text;
     parts.push_back(std::move(part));
   }
-  rehighlight();
+  return isClean != wasClean;
 }
 
 CExpressionHighlighter::Parts::const_iterator CExpressionHighlighter::FirstAfter(int position) const {
@@ -78,6 +81,8 @@ std::string CExpressionHighlighter::LinkAt(int position) const {
 }
 
 void CExpressionHighlighter::highlightBlock(const QString& text) {
+  // A comment may begin or end with any edit: the lines after a changed one are looked at too.
+  setCurrentBlockState(revision);
   const int start = currentBlock().position();
   const int end = start + static_cast<int>(text.size());
   for (auto part = FirstAfter(start); part != parts.end() && part->begin < end; ++part) {

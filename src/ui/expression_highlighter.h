@@ -1,5 +1,6 @@
 // The colours of an expression while it is edited: looks that lie over the text and are no part of it, so
-// that neither what is typed nor what is taken back carries them along.
+// that neither what is typed nor what is taken back carries them along. The owner has each new text scanned
+// before the toolkit formats the lines that have changed.
 #pragma once
 
 #include <QSyntaxHighlighter>
@@ -14,10 +15,11 @@ class CExpressionHighlighter final : public QSyntaxHighlighter {
   Q_OBJECT
 
  public:
-  CExpressionHighlighter(QTextDocument* document, const TemplateCore& templateCore);
+  CExpressionHighlighter(const TemplateCore& templateCore, QObject* owner);
 
-  /// Scans the document's text, and colours it for a ground when it scans cleanly; else it has no colours.
-  void Colour(const QString& text, const QColor& ground);
+  /// Scans the document's text for its colours on a ground; a text that does not scan cleanly has none. True
+  /// when lines before the change look different too.
+  bool Scan(const QString& text, const QColor& ground);
 
   /// The name of the element whose link covers the character at a position; empty without one.
   std::string LinkAt(int position) const;
@@ -40,6 +42,8 @@ class CExpressionHighlighter final : public QSyntaxHighlighter {
 
   const TemplateCore& core;
   Parts parts;
+  bool isClean = true;
+  int revision = 0;  ///< of the parts
 };
 
 }  // namespace tessal

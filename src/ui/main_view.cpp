@@ -145,6 +145,8 @@ QWidget* CMainView::MakeTitleDetail() {
   auto* area = MakeChild<QScrollArea>(this);
   area->setWidgetResizable(true);
   area->setFrameShape(QFrame::NoFrame);
+  // Nobody would see that it has the focus.
+  area->setFocusPolicy(Qt::NoFocus);
   holder = MakeChild<QWidget>(area);
   holder->setObjectName(QString::number(control_id::kRightPane));
   holderLayout = MakeChild<QVBoxLayout>(holder);
@@ -249,7 +251,9 @@ void CMainView::ReplaceForm(QTreeWidgetItem* item) {
   form = MakeForm({document, dialogs, CElementTree::DataOf(*item)}, holder);
   holderLayout->addWidget(form.get());
   form->Load();
-  QWidget::setTabOrder(tree, form.get());
+  // From the last field on to the messages.
+  const QList<QWidget*> stops = StopsOfForm();
+  if (!stops.isEmpty()) QWidget::setTabOrder(stops.last(), errorList);
 }
 
 void CMainView::Commit() {
@@ -448,12 +452,19 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
   return QWidget::eventFilter(watched, happened);
 }
 
+QList<QWidget*> CMainView::StopsOfForm() const {
+  QList<QWidget*> stops;
+  for (QWidget* next = tree->nextInFocusChain(); next != tree; next = next->nextInFocusChain()) {
+    if (form->isAncestorOf(next) && (next->focusPolicy() & Qt::TabFocus) != 0) stops.append(next);
+  }
+  return stops;
+}
+
 void CMainView::FocusForm() {
-  const auto fields = form->findChildren<QWidget*>();
-  const auto first = std::find_if(fields.begin(), fields.end(), [](const QWidget* field) {
-    return field->isEnabled() && field->isVisible() && (field->focusPolicy() & Qt::TabFocus) != 0;
-  });
-  QWidget* target = first == fields.end() ? static_cast<QWidget*>(errorList) : *first;
+  const QList<QWidget*> stops = StopsOfForm();
+  const auto first = std::find_if(stops.begin(), stops.end(),
+                                  [](const QWidget* stop) { return stop->isEnabled() && stop->isVisible(); });
+  QWidget* target = first == stops.end() ? static_cast<QWidget*>(errorList) : *first;
   target->setFocus(Qt::TabFocusReason);
 }
 

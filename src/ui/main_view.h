@@ -2,6 +2,7 @@
 // wrong. It is the hub of the editor: forms and dialogs speak to it through the document's hints.
 #pragma once
 
+#include <QList>
 #include <QWidget>
 #include <memory>
 
@@ -73,6 +74,8 @@ class CMainView final : public QWidget, public CView {
   void CommitAll();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
+  /// What Tab may reach in the form, in its order.
+  QList<QWidget*> StopsOfForm() const;
   void ShowHelp();
   void UpdateNavigation();
   void FillHistoryMenu();

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QClipboard>
+#include <QLabel>
 #include <QMimeData>
 #include <QPushButton>
 #include <QRadioButton>
@@ -11,6 +12,7 @@
 #include <QTimer>
 #include <filesystem>
 #include <map>
+#include <set>
 
 #include "support/case_file.h"
 #include "ui/auto_create_dialog.h"
@@ -110,6 +112,46 @@ TEST(Forms, ShareTheirHeightBetweenExpressionsAndBoxTheirCounts) {
   EXPECT_EQ(editor.Core().GetConstant(0).description.Text(), "k");
   EXPECT_EQ(editor.Core().GetConstant(0).onlineHelp.Text(), "k+k");
   EXPECT_EQ(count->text(), "1");
+}
+
+TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
+  Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/fish_larvae.tessal"));
+  editor.User().answers = {Answer::NoToAll};
+  // What a window of 800 by 600 leaves under its menus.
+  constexpr QSize kSmallScreen(800, 525);
+  editor.View().resize(kSmallScreen);
+  std::set<ElementKind> kinds;
+  for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
+    if (!kinds.insert(CElementTree::DataOf(**item).kind).second) continue;
+    editor.Tree().setCurrentItem(*item);
+    QCoreApplication::processEvents();
+    editor.Tree().setFocus();
+    for (const auto* field : editor.View().Form()->findChildren<CAutoRichEditCtrl*>()) {
+      if (field->isReadOnly()) continue;
+      EXPECT_EQ(field->visibleRegion().boundingRect(), field->rect())
+          << (*item)->text(0).toStdString() << " is seen only after scrolling";
+    }
+    QStringList stops;
+    constexpr int kMostStops = 40;
+    while (stops.size() < kMostStops && !editor.View().ErrorList().hasFocus()) {
+      QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+      const QWidget* stop = QApplication::focusWidget();
+      EXPECT_FALSE(stop->accessibleName().isEmpty()) << stop->metaObject()->className();
+      stops.append(stop->accessibleName());
+    }
+    EXPECT_LT(stops.size(), kMostStops)
+        << (*item)->text(0).toStdString() << ": " << stops.join(u'|').toStdString();
+    EXPECT_EQ(stops.removeDuplicates(), 0) << (*item)->text(0).toStdString();
+    std::set<QKeySequence> keys = {QKeySequence("Alt+F"), QKeySequence("Alt+H"), QKeySequence("Alt+V")};
+    for (const QLabel* label : editor.View().Form()->findChildren<QLabel*>()) {
+      if (label->buddy() == nullptr) continue;
+      EXPECT_TRUE(keys.insert(QKeySequence::mnemonic(label->text())).second) << label->text().toStdString();
+      EXPECT_EQ(QString(label->text()).remove(u'&'), label->buddy()->accessibleName());
+    }
+    for (qsizetype left = stops.size(); left > 0; --left)
+      QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backtab, Qt::ShiftModifier);
+    EXPECT_TRUE(editor.Tree().hasFocus()) << (*item)->text(0).toStdString();
+  }
 }
 
 TEST(Colours, StayReadableOnADarkGround) {
