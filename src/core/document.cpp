@@ -14,6 +14,12 @@ std::string FailureText(std::string_view what, const std::string& path) {
 
 }  // namespace
 
+bool CTessalDoc::OnNewDocument() {
+  core.SetModified(false);
+  SetNotifyChanges(true);
+  return true;
+}
+
 bool CTessalDoc::OnOpenDocument(const std::string& path) {
   if (!CDocument::OnOpenDocument(path)) return false;
   const bool loaded = core.LoadWrapper(path);
