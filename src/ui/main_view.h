@@ -4,6 +4,8 @@
 
 #include <QWidget>
 #include <memory>
+#include <string>
+#include <vector>
 
 #include "core/creation.h"
 #include "platform/docview.h"
@@ -38,6 +40,7 @@ class CMainView final : public QWidget, public CView {
   void OnCommit() override { Commit(); }
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
+  std::vector<ViewCommand> Commands() override;
   QWidget* Widget() override { return this; }
 
   CTessalDoc& Document() const { return document; }
@@ -60,6 +63,8 @@ class CMainView final : public QWidget, public CView {
  private:
   void BuildToolBar();
   void BuildLayout();
+  /// Offers to create an undefined symbol that the user may have refused before.
+  void CreateSymbol(const std::string& symbol);
   /// The title with the holder of the forms under it.
   QWidget* MakeTitleDetail();
   TemplateCore& Core() const;

@@ -4,8 +4,8 @@
 
 #include "core/document.h"
 #include "core/rename.h"
-#include "ui/create_hint.h"
 #include "ui/dialogs.h"
+#include "ui/offered_creation.h"
 #include "ui/text_bytes.h"
 
 namespace tessal {
@@ -51,12 +51,7 @@ bool CRightPaneBase::OfferUndefinedSymbols() {
   bool created = false;
   while (const std::optional<CreationOffer> offer = Core().NextOffer()) {
     if (!Dialogs().Ask(this, ToScreen(offer->question))) continue;
-    const int choice = Dialogs().ChooseKind(this, ToScreen(offer->symbol), offer->mask);
-    const CreateRequest* request = offer->RequestOf(choice);
-    if (request == nullptr) continue;
-    const CreateHint argument(*request);
-    Document().UpdateAllViews(nullptr, hint::kCreateElement, &argument);
-    created = true;
+    if (CreateOfferedKind(*offer, Document(), Dialogs(), this)) created = true;
   }
   return created;
 }
