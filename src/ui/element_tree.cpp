@@ -90,6 +90,15 @@ class NodeDelegate final : public QStyledItemDelegate {
     painter.restore();
   }
 
+  /// Between the text and its ground, and nearer to the text.
+  static QColor Greyed(const QPalette& palette) {
+    const QColor text = palette.color(QPalette::Text);
+    const QColor ground = palette.color(QPalette::Base);
+    const auto mixed = [](int near, int far) { return (3 * near + 2 * far) / 5; };
+    return {mixed(text.red(), ground.red()), mixed(text.green(), ground.green()),
+            mixed(text.blue(), ground.blue())};
+  }
+
   static void DrawCount(QPainter& painter, const QStyleOptionViewItem& shown, const QRect& caption,
                         int count) {
     constexpr int kGap = 10;
@@ -97,8 +106,7 @@ class NodeDelegate final : public QStyledItemDelegate {
     const QRect rest = caption.adjusted(shown.fontMetrics.horizontalAdvance(shown.text) + kGap, 0, 0, 0);
     painter.save();
     painter.setFont(shown.font);
-    painter.setPen(isSelected ? shown.palette.color(QPalette::HighlightedText)
-                              : shown.palette.color(QPalette::Disabled, QPalette::Text));
+    painter.setPen(isSelected ? shown.palette.color(QPalette::HighlightedText) : Greyed(shown.palette));
     painter.drawText(rest, Qt::AlignVCenter, QString::number(count));
     painter.restore();
   }

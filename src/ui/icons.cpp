@@ -35,6 +35,7 @@ constexpr QRgb kOrange = qRgb(200, 100, 0);
 constexpr QRgb kGreen = qRgb(46, 139, 60);
 constexpr QRgb kBlue = qRgb(40, 110, 200);
 constexpr QRgb kViolet = qRgb(120, 90, 200);
+constexpr QRgb kBrown = qRgb(150, 95, 50);
 constexpr QRgb kGrey = qRgb(120, 125, 130);
 constexpr QRgb kRed = qRgb(205, 40, 40);
 
@@ -58,10 +59,10 @@ constexpr KindIcon kKindIcons[] = {
     {Kind::SpecieStateVariable, "round-s", kTeal},
     {Kind::SpecieConstant, "round-c", kMagenta},
     {Kind::SpecieForcing, "round-f", kOrange},
-    {Kind::SpatialFunction, "search", kOrange},
+    {Kind::SpatialFunction, "search", kBrown},
     {Kind::ArithmeticExpression, "round-a", kGreen},
     {Kind::HorizontalVector, "horizontal", kBlue},
-    {Kind::VerticalEquation, "vertical", kBlue},
+    {Kind::VerticalEquation, "vertical", kViolet},
     {Kind::Miscellaneous, "settings", kGrey},
     {Kind::ExternalFunction, "function", kViolet},
     {Kind::VisibilityGroup, "visibility", kGrey},
@@ -76,10 +77,10 @@ constexpr KindIcon kKindIcons[] = {
     {Kind::SpecieStateVariableList, "folder", kTeal},
     {Kind::SpecieConstantList, "folder", kMagenta},
     {Kind::SpecieForcingList, "folder", kOrange},
-    {Kind::SpatialFunctionList, "folder", kOrange},
+    {Kind::SpatialFunctionList, "folder", kBrown},
     {Kind::ArithmeticExpressionList, "folder", kGreen},
     {Kind::HorizontalVectorList, "folder", kBlue},
-    {Kind::VerticalEquationList, "folder", kBlue},
+    {Kind::VerticalEquationList, "folder", kViolet},
 };
 
 /// In the order of `IconCommand`; they have the colour of texts.
