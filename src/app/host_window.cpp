@@ -125,8 +125,7 @@ void HostWindow::FillRecentMenu() {
   recentMenu->clear();
   const QStringList files = RecentFiles();
   for (const QString& path : files) {
-    recentMenu->addAction(QFileInfo(path).fileName() + QStringLiteral("  \u2013  ") + QFileInfo(path).path(),
-                          this, [this, path] { OpenFile(path); });
+    recentMenu->addAction(RecentFileCaption(path), this, [this, path] { OpenFile(path); });
   }
   if (files.isEmpty()) {
     recentMenu->addAction(tr("No files yet"))->setEnabled(false);

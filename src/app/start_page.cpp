@@ -6,6 +6,7 @@
 #include <QFileInfo>
 #include <QLabel>
 #include <QScrollArea>
+#include <QToolButton>
 #include <QVBoxLayout>
 #include <array>
 #include <memory>
@@ -20,6 +21,7 @@ namespace {
 /// them.
 constexpr std::array<const char*, 2> kExampleFolders = {"../share/tessal/examples", "../../../examples"};
 constexpr int kWidth = 520;
+constexpr int kGap = 12;
 
 template <class Object, class... Arguments>
 Object* Make(Arguments&&... arguments) {
@@ -39,7 +41,7 @@ QStringList Examples() {
 
 void Empty(QLayout& layout) {
   while (const std::unique_ptr<QLayoutItem> item{layout.takeAt(0)}) {
-    if (item->widget() == nullptr) continue;
+    if (item->widget() == nullptr) continue;  // a space
     // It may be the button that was pressed just now.
     item->widget()->hide();
     item->widget()->deleteLater();
@@ -54,6 +56,7 @@ StartPage::StartPage(QWidget* parent) : QWidget(parent) {
   auto* rows = Make<QVBoxLayout>(column);
   auto* create = Make<QCommandLinkButton>(tr("&New template"), tr("Begin with an empty template."), column);
   auto* open = Make<QCommandLinkButton>(tr("&Open..."), tr("Open a template from a file."), column);
+  for (auto* button : {create, open}) button->setAccessibleName(button->text().remove(u'&'));
   rows->addWidget(create);
   rows->addWidget(open);
   lists = Make<QVBoxLayout>();
@@ -78,25 +81,27 @@ StartPage::StartPage(QWidget* parent) : QWidget(parent) {
 
 void StartPage::Fill() {
   Empty(*lists);
-  AddFiles(tr("Recent files"), RecentFiles());
-  AddFiles(tr("Examples"), Examples());
+  AddFiles(tr("Recent files"), RecentFiles(), RecentFileCaption);
+  AddFiles(tr("Examples"), Examples(), [](const QString& path) { return QFileInfo(path).fileName(); });
 }
 
-void StartPage::AddFiles(const QString& heading, const QStringList& paths) {
+void StartPage::AddFiles(const QString& heading, const QStringList& paths,
+                         QString (*captionOf)(const QString& path)) {
   if (paths.isEmpty()) return;
   auto* title = Make<QLabel>(heading);
   QFont bold = title->font();
   bold.setBold(true);
   title->setFont(bold);
+  lists->addSpacing(kGap);
   lists->addWidget(title);
   for (const QString& path : paths) {
-    const QString name = QFileInfo(path).fileName();
-    auto* link = Make<QCommandLinkButton>(QString(name).replace(u'&', QStringLiteral("&&")));
-    link->setAccessibleName(name);
+    auto* link = Make<QToolButton>();
+    link->setText(fontMetrics().elidedText(captionOf(path), Qt::ElideMiddle, kWidth - kGap));
+    link->setAutoRaise(true);
+    link->setAccessibleName(QFileInfo(path).fileName());
     link->setAccessibleDescription(path);
     link->setToolTip(path);
-    // Without a description a link needs no more than its line.
-    link->setIconSize(QSize(12, 12));
+    link->setCursor(Qt::PointingHandCursor);
     connect(link, &QAbstractButton::clicked, this, [this, path] { emit FileChosen(path); });
     lists->addWidget(link);
   }

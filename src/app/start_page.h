@@ -22,7 +22,7 @@ class StartPage final : public QWidget {
   void FileChosen(const QString& path);
 
  private:
-  void AddFiles(const QString& heading, const QStringList& paths);
+  void AddFiles(const QString& heading, const QStringList& paths, QString (*captionOf)(const QString& path));
 
   QVBoxLayout* lists;
 };

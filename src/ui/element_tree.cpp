@@ -80,7 +80,7 @@ class NodeDelegate final : public QStyledItemDelegate {
 
  private:
   static void DrawDot(QPainter& painter, const QRect& icon, std::uint32_t level) {
-    const int size = icon.height() * 2 / 5;
+    const int size = icon.height() / 2;
     const QRect dot(icon.right() - size + 2, icon.bottom() - size + 2, size, size);
     painter.save();
     painter.setRenderHint(QPainter::Antialiasing);

@@ -4,7 +4,6 @@
 
 #include <QAbstractButton>
 #include <QApplication>
-#include <QCommandLinkButton>
 #include <QDir>
 #include <QDropEvent>
 #include <QFileDialog>
@@ -192,9 +191,9 @@ class HostScript final {
   /// What the page without a document offers; one of it is pressed, if it is named.
   bool UseStartPage(const QString& name) {
     QCoreApplication::processEvents();
-    for (auto* link : window.findChildren<QCommandLinkButton*>()) {
-      if (!link->isVisible()) continue;
-      const QString text = link->text().remove(u'&');
+    for (auto* link : window.centralWidget()->findChildren<QAbstractButton*>()) {
+      const QString text = link->accessibleName();
+      if (!link->isVisible() || text.isEmpty()) continue;
       if (name.isEmpty()) boxes.texts.append(text);
       if (text == name) return link->click(), true;
     }
