@@ -83,7 +83,7 @@ TEST(Colours, StayReadableOnADarkGround) {
 
 TEST(Colours, AreStrongOnAnyGroundOnRequest) {
   EXPECT_DOUBLE_EQ(ContrastRatio(Qt::black, Qt::white), 21.0);
-  EXPECT_NEAR(ContrastRatio(QColor(255, 0, 0), Qt::white), 3.998, 0.001);
+  EXPECT_NEAR(ContrastRatio(QColor(119, 119, 119), Qt::white), 4.478, 0.001);
   constexpr int kStep = 51;
   for (const QRgb ground : {qRgb(255, 255, 255), qRgb(239, 239, 239), qRgb(0, 0, 0), qRgb(35, 38, 41),
                             qRgb(118, 118, 118), qRgb(128, 90, 150)}) {
