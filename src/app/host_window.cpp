@@ -7,16 +7,23 @@
 #include <QDropEvent>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QFontMetrics>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
+#include <QScreen>
 #include <QSettings>
+#include <QStackedWidget>
+#include <QStatusBar>
 #include <QTabWidget>
 #include <algorithm>
 
 #include "app/open_document.h"
 #include "app/recent_files.h"
+#include "app/start_page.h"
+#include "app/view_commands.h"
+#include "platform/busy_notice.h"
 #include "platform/docview.h"
 
 namespace tessal {
@@ -25,6 +32,8 @@ namespace {
 
 const QString kGeometryKey = QStringLiteral("geometry");
 constexpr QSize kUsualSize(1100, 760);
+constexpr int kMostTitleCharacters = 100;
+constexpr int kMostTabCharacters = 40;
 
 QStringList LocalFiles(const QMimeData& mime) {
   QStringList files;
@@ -41,32 +50,54 @@ QString FullPath(const QString& path) {
   return canonical.isEmpty() ? file.absoluteFilePath() : canonical;
 }
 
+QString Shortened(const QString& text, int mostCharacters) {
+  return text.size() <= mostCharacters ? text : text.left(mostCharacters - 3) + QStringLiteral("...");
+}
+
 }  // namespace
 
 HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, const QString& editorName)
     : docTemplate(std::move(documentTemplate)),
       name(editorName),
-      tabs(std::make_unique<QTabWidget>(this).release()) {
+      pages(std::make_unique<QStackedWidget>(this).release()),
+      tabs(std::make_unique<QTabWidget>(this).release()),
+      startPage(std::make_unique<StartPage>(this).release()) {
   tabs->setDocumentMode(true);
   tabs->setTabsClosable(true);
   tabs->setMovable(true);
   tabs->setAccessibleName(tr("Open documents"));
-  setCentralWidget(tabs);
+  pages->addWidget(startPage);
+  pages->addWidget(tabs);
+  setCentralWidget(pages);
   setAcceptDrops(true);
-  resize(kUsualSize);
-  restoreGeometry(QSettings().value(kGeometryKey).toByteArray());
+  // Made now, it shows what the widgets of the window have to say.
+  statusBar();
+  FitToScreen();
   MakeMenus();
+  connect(startPage, &StartPage::NewRequested, this, &HostWindow::NewDocument);
+  connect(startPage, &StartPage::OpenRequested, this, &HostWindow::ChooseFiles);
+  connect(startPage, &StartPage::FileChosen, this, &HostWindow::OpenFile);
   connect(tabs, &QTabWidget::currentChanged, this, &HostWindow::Activate);
   connect(tabs, &QTabWidget::tabCloseRequested, this, [this](int index) {
     tabs->setCurrentIndex(index);
     CloseCurrent();
   });
-  UpdateTitles();
+  ShowFront();
+}
+
+void HostWindow::FitToScreen() {
+  resize(kUsualSize);
+  restoreGeometry(QSettings().value(kGeometryKey).toByteArray());
+  // The frame takes its part of the screen too; its size is known only when the window has been shown.
+  constexpr int kFrame = 40;
+  const QSize available = screen()->availableGeometry().size();
+  resize(size().boundedTo(available - QSize(kFrame, kFrame)));
 }
 
 HostWindow::~HostWindow() {
   // The views are widgets of the tabs, and owned here: they leave the tabs before those go.
   const QSignalBlocker quiet(tabs);
+  viewCommands->Show(nullptr);
   tabs->clear();
   documents.clear();
 }
@@ -82,18 +113,19 @@ void HostWindow::MakeMenus() {
   documentActions.append(
       file->addAction(tr("Save &As..."), QKeySequence(tr("Ctrl+Shift+S")), this, &HostWindow::SaveCurrentAs));
   file->addSeparator();
-  documentActions.append(file->addAction(tr("&Close"), QKeySequence::Close, this, &HostWindow::CloseCurrent));
+  QAction* close = file->addAction(tr("&Close"), QKeySequence::Close, this, &HostWindow::CloseCurrent);
+  documentActions.append(close);
   file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
   QMenu* help = menuBar()->addMenu(tr("&Help"));
   help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
+  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), *close).release();
 }
 
 void HostWindow::FillRecentMenu() {
   recentMenu->clear();
   const QStringList files = RecentFiles();
   for (const QString& path : files) {
-    recentMenu->addAction(QFileInfo(path).fileName() + QStringLiteral("  \u2013  ") + QFileInfo(path).path(),
-                          this, [this, path] { OpenFile(path); });
+    recentMenu->addAction(RecentFileCaption(path), this, [this, path] { OpenFile(path); });
   }
   if (files.isEmpty()) {
     recentMenu->addAction(tr("No files yet"))->setEnabled(false);
@@ -124,7 +156,8 @@ void HostWindow::NewDocument() {
 
 void HostWindow::ChooseFiles() {
   const QString folder = Current() == nullptr ? QString() : QFileInfo(Current()->Path()).path();
-  OpenFiles(QFileDialog::getOpenFileNames(this, tr("Open"), folder, FileFilter()));
+  const QStringList chosen = QFileDialog::getOpenFileNames(this, tr("Open"), folder, FileFilter());
+  OpenFiles(chosen);
 }
 
 void HostWindow::OpenFiles(const QStringList& paths) {
@@ -137,6 +170,8 @@ bool HostWindow::OpenFile(const QString& path) {
     tabs->setCurrentWidget(open->Widget());
     return true;
   }
+  const BusyNotice busy(*this, tr("Opening %1...").arg(full));
+  OpenDocument* untouched = FindUntouched();
   auto opened = std::make_unique<OpenDocument>(docTemplate->CreateNewDocument());
   if (!opened->Open(full)) {
     // The messages of the file that failed give way to those of the document in front.
@@ -146,7 +181,15 @@ bool HostWindow::OpenFile(const QString& path) {
   }
   AddRecentFile(full);
   AddTab(std::move(opened));
+  if (untouched != nullptr) Drop(*untouched);
   return true;
+}
+
+OpenDocument* HostWindow::FindUntouched() const {
+  if (documents.size() != 1 || !documents.front()->Path().isEmpty()) return nullptr;
+  // What is being entered is work too.
+  documents.front()->View().OnCommit();
+  return documents.front()->Document().IsModified() ? nullptr : documents.front().get();
 }
 
 void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
@@ -159,8 +202,9 @@ void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
     const QSignalBlocker quiet(tabs);
     tabs->setCurrentIndex(tabs->addTab(shown.Widget(), shown.Title()));
   }
+  pages->setCurrentWidget(tabs);
   shown.View().OnInitialUpdate();
-  UpdateTitles();
+  ShowFront();
   shown.Widget()->setFocus();
 }
 
@@ -212,6 +256,7 @@ bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
   dialog.setDefaultSuffix(extension.mid(1));
   if (dialog.exec() != QDialog::Accepted) return false;
   const QString path = dialog.selectedFiles().value(0);
+  dialog.hide();
   const OpenDocument* other = FindByPath(FullPath(path));
   if (other != nullptr && other != &saved) {
     QMessageBox::warning(this, name, tr("The file '%1' is open in another tab.").arg(path));
@@ -225,6 +270,7 @@ bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
 bool HostWindow::Save(OpenDocument& saved, const QString& path) {
   // What is being entered belongs in the file, and its messages to the question before it is written.
   saved.View().OnCommit();
+  const BusyNotice busy(*this, tr("Saving %1...").arg(path));
   const bool done = saved.Save(path);
   UpdateTitles();
   return done;
@@ -256,24 +302,40 @@ void HostWindow::Drop(OpenDocument& closed) {
   documents.erase(hit);
   tabs->removeTab(tabs->indexOf(gone->Widget()));
   gone->Widget()->setParent(nullptr);
-  UpdateTitles();
+  ShowFront();
 }
 
 void HostWindow::Activate() {
   if (OpenDocument* front = Current()) front->View().OnActivate();
+  ShowFront();
+}
+
+void HostWindow::ShowFront() {
+  OpenDocument* front = Current();
+  if (front == nullptr) startPage->Fill();
+  pages->setCurrentWidget(front == nullptr ? static_cast<QWidget*>(startPage) : tabs);
+  viewCommands->Show(front == nullptr ? nullptr : &front->View());
   UpdateTitles();
+}
+
+QString HostWindow::TabText(const QString& title) const {
+  const QFontMetrics metrics = tabs->fontMetrics();
+  QString text = metrics.elidedText(title, Qt::ElideMiddle, kMostTabCharacters * metrics.averageCharWidth());
+  // An ampersand in a file's name marks no shortcut key.
+  return text.replace(u'&', QStringLiteral("&&"));
 }
 
 void HostWindow::UpdateTitles() {
   for (const auto& open : documents) {
     const int tab = tabs->indexOf(open->Widget());
     if (tab < 0) continue;
-    // An ampersand in a file's name marks no shortcut key.
-    tabs->setTabText(tab, open->Title().replace(u'&', QStringLiteral("&&")));
+    tabs->setTabText(tab, TabText(open->Title()));
     tabs->setTabToolTip(tab, open->Path());
   }
   const OpenDocument* front = Current();
-  setWindowTitle(front == nullptr ? name : front->Title() + QStringLiteral(" \u2013 ") + name);
+  setWindowTitle(front == nullptr
+                     ? name
+                     : Shortened(front->Title(), kMostTitleCharacters) + QStringLiteral(" \u2013 ") + name);
   for (QAction* action : documentActions) action->setEnabled(front != nullptr);
 }
 

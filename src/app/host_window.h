@@ -8,12 +8,15 @@
 #include <vector>
 
 class QMenu;
+class QStackedWidget;
 class QTabWidget;
 
 namespace tessal {
 
 class CMultiDocTemplate;
 class OpenDocument;
+class StartPage;
+class ViewCommands;
 
 class HostWindow final : public QMainWindow {
   Q_OBJECT
@@ -43,12 +46,15 @@ class HostWindow final : public QMainWindow {
 
  private:
   void MakeMenus();
+  void FitToScreen();
   void FillRecentMenu();
   void ChooseFiles();
   void ShowAbout();
   QString FileFilter() const;
 
   void AddTab(std::unique_ptr<OpenDocument> opened);
+  /// The document that gives way to the first file: new, alone, and nobody has touched it.
+  OpenDocument* FindUntouched() const;
   OpenDocument* FindByWidget(const QWidget* widget) const;
   OpenDocument* FindByPath(const QString& path) const;
   bool Save(OpenDocument& saved, const QString& path);
@@ -57,11 +63,18 @@ class HostWindow final : public QMainWindow {
   bool MayClose(OpenDocument& closing);
   void Drop(OpenDocument& closed);
   void UpdateTitles();
+  QString TabText(const QString& title) const;
+  /// The view of the document in front takes over the messages and the menus; without one, the start page is
+  /// shown.
   void Activate();
+  void ShowFront();
 
   std::unique_ptr<CMultiDocTemplate> docTemplate;
   QString name;
+  QStackedWidget* pages;
   QTabWidget* tabs;
+  StartPage* startPage;
+  ViewCommands* viewCommands = nullptr;
   QMenu* recentMenu = nullptr;
   QList<QAction*> documentActions;  ///< those that need a document in front
   std::vector<std::unique_ptr<OpenDocument>> documents;

@@ -28,6 +28,12 @@ void AddRecentFile(const QString& path) {
   QSettings().setValue(kKey, files.mid(0, kMostRecentFiles));
 }
 
+QString RecentFileCaption(const QString& path) {
+  const QFileInfo file(path);
+  QString caption = file.fileName() + QStringLiteral("  \u2013  ") + file.path();
+  return caption.replace(u'&', QStringLiteral("&&"));
+}
+
 void ClearRecentFiles() {
   QSettings().remove(kKey);
 }

@@ -114,6 +114,15 @@ CreationOffer TemplateCore::OfferFor(const UndefinedSymbol& undefined) const {
   return offer;
 }
 
+std::optional<CreationOffer> TemplateCore::OfferOf(std::string_view symbol) {
+  const auto& names = UndefinedSymbols();
+  const auto hit =
+      std::find_if(names.begin(), names.end(), [symbol](const auto& name) { return name->symbol == symbol; });
+  if (hit == names.end()) return std::nullopt;
+  (*hit)->asked = true;
+  return OfferFor(**hit);
+}
+
 std::optional<CreationOffer> TemplateCore::NextOffer() {
   for (const auto& undefined : UndefinedSymbols()) {
     if (undefined->asked) continue;

@@ -21,6 +21,12 @@ TextEncoding EncodingOfFile(const std::string& path) {
 
 }  // namespace
 
+bool CTessalDoc::OnNewDocument() {
+  core.SetModified(false);
+  SetNotifyChanges(true);
+  return true;
+}
+
 bool CTessalDoc::OnOpenDocument(const std::string& path) {
   if (!CDocument::OnOpenDocument(path)) return false;
   encoding = EncodingOfFile(path);

@@ -51,6 +51,8 @@ class CTessalDoc final : public CDocument {
  public:
   explicit CTessalDoc(DocumentDialogs& userDialogs) : dialogs(userDialogs) {}
 
+  /// A new document holds nothing that a save would miss.
+  bool OnNewDocument() override;
   bool OnOpenDocument(const std::string& path) override;
   /// Asks first when the registry holds anything; false, with nothing written, on No.
   bool OnSaveDocument(const std::string& path) override;

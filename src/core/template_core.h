@@ -147,6 +147,8 @@ class TemplateCore final : public ElementOwner {
   /// The question about the first undefined symbol that was not asked about yet, which counts as asked from
   /// now on; none when nothing is left to ask. An answer may change the list: each call looks at it afresh.
   std::optional<CreationOffer> NextOffer();
+  /// The same question about one symbol, whether it was asked about or not; none when it is not undefined.
+  std::optional<CreationOffer> OfferOf(std::string_view symbol);
   /// Gives an element a new symbol and, if asked to, rewrites every expression that uses it. False, with
   /// nothing changed, when the new symbol exists, or the old one does not or is not editable: derived outputs
   /// and movements have captions, no symbols that a file holds.

@@ -343,12 +343,16 @@ std::string HtmlDocumentation(const TemplateCore& core, bool embedMathJax, const
   return PageWriter(core, embedMathJax).Write(created);
 }
 
-std::string PrepareUsualPagePath(const std::string& templateFile) {
+std::string UsualPagePath(const std::string& templateFile) {
   const std::filesystem::path file(templateFile);
-  const std::filesystem::path folder = file.parent_path() / "HTML_doc";
+  return (file.parent_path() / "HTML_doc" / file.filename().replace_extension(".html")).string();
+}
+
+std::string PrepareUsualPagePath(const std::string& templateFile) {
+  std::string page = UsualPagePath(templateFile);
   std::error_code shownByTheWrite;
-  std::filesystem::create_directory(folder, shownByTheWrite);
-  return (folder / file.filename().replace_extension(".html")).string();
+  std::filesystem::create_directory(std::filesystem::path(page).parent_path(), shownByTheWrite);
+  return page;
 }
 
 bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, bool embedMathJax,

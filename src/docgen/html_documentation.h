@@ -9,7 +9,10 @@ namespace tessal {
 class TemplateCore;
 
 /// Where the page of a template file goes when nobody names a place: the folder `HTML_doc` beside the file,
-/// and in it the file's plain name. Makes the folder; one that cannot be made shows when the page is written.
+/// and in it the file's plain name.
+std::string UsualPagePath(const std::string& templateFile);
+
+/// The same, with the folder made; one that cannot be made shows when the page is written.
 std::string PrepareUsualPagePath(const std::string& templateFile);
 
 /// Writes the page. False, with the reason in words, when not every byte reached the file, or when the path

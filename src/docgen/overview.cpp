@@ -1,10 +1,13 @@
 #include "docgen/overview.h"
 
 #include <algorithm>
+#include <filesystem>
+#include <system_error>
 #include <utility>
 
 #include "core/template_core.h"
 #include "elements/property_io.h"
+#include "platform/file_replacement.h"
 
 namespace tessal {
 
@@ -160,6 +163,16 @@ std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow
   AppendRow(TextTitles(), longest, text);
   for (const Cells& cells : table) AppendRow(cells, longest, text);
   return text;
+}
+
+bool ExportOverview(const TemplateCore& core, const std::string& path, std::string& failure) {
+  std::error_code notThere;
+  if (std::filesystem::equivalent(path, core.TemplateFileName(), notThere)) {
+    failure = "can not write the overview over its template '" + path + "'";
+    return false;
+  }
+  failure = WriteWholeFile(path, OverviewText(core, BuildOverview(core)));
+  return failure.empty();
 }
 
 }  // namespace tessal

@@ -45,4 +45,8 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core);
 /// return and line feed. Widths go by the rows alone: a longer title pushes its own row out of line.
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows);
 
+/// Writes that text. False, with the reason in words, when not every byte reached the file, or when the path
+/// is that of the template itself, which is then left alone.
+bool ExportOverview(const TemplateCore& core, const std::string& path, std::string& failure);
+
 }  // namespace tessal

@@ -62,6 +62,16 @@ class CDocument {
   std::vector<CView*> views;
 };
 
+/// A command of a view that a host shows in its menus and runs for the document in front. Texts are UTF-8; in
+/// menu and text an ampersand marks the shortcut key.
+struct ViewCommand {
+  std::string menu;
+  std::string text;
+  std::function<void()> run;
+  bool checkable = false;
+  bool checked = false;
+};
+
 class CView {
  public:
   CView() = default;
@@ -76,6 +86,8 @@ class CView {
   virtual void OnCommit() {}
   /// The view comes to the front among the views of other documents.
   virtual void OnActivate() {}
+  /// What the view offers for the menus of a host, in order. Asked for again after a command has run.
+  virtual std::vector<ViewCommand> Commands() { return {}; }
   /// The widget that a host puts into its frame; none for a view without a screen.
   virtual QWidget* Widget() { return nullptr; }
 

@@ -3,12 +3,14 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDesktopServices>
+#include <QDir>
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QKeyEvent>
 #include <QMessageBox>
 #include <QUrl>
 
+#include "platform/busy_notice.h"
 #include "ui/auto_create_dialog.h"
 #include "ui/help_window.h"
 #include "ui/strings.h"
@@ -19,6 +21,7 @@ namespace tessal {
 namespace {
 
 void ShowBox(QWidget* parent, const QString& title, const QString& text) {
+  const QuestionPointer pointer;
   QMessageBox box(QMessageBox::Warning, title, text, QMessageBox::Ok, parent);
   box.setTextFormat(Qt::PlainText);
   box.exec();
@@ -33,6 +36,7 @@ class QuestionBox final : public QMessageBox {
   }
 
   Answer Run() {
+    const QuestionPointer pointer;
     switch (exec()) {
       case Yes:
         return Answer::Yes;
@@ -89,6 +93,24 @@ class BoxDialogs final : public UserDialogs {
   QString ChooseDocumentationFile(QWidget* parent, const QString& start) override {
     return QFileDialog::getOpenFileName(parent, strings::kSelectDocumentation, start,
                                         strings::kDocumentationFilter);
+  }
+
+  QString ChooseExportFile(QWidget* parent, const QString& title, const QString& proposal,
+                           const QString& filter) override {
+    QFileDialog dialog(parent, title, QFileInfo(proposal).path(), filter);
+    dialog.setAcceptMode(QFileDialog::AcceptSave);
+    dialog.setDefaultSuffix(QFileInfo(proposal).suffix());
+    const QFileInfo folder(QFileInfo(proposal).path());
+    if (folder.isDir()) {
+      dialog.selectFile(proposal);
+    } else {
+      // The folder is made when the user agrees: until then it is a part of the name. Not every dialog of a
+      // desktop takes such a name.
+      dialog.setOption(QFileDialog::DontUseNativeDialog);
+      dialog.setDirectory(folder.path());
+      dialog.selectFile(folder.fileName() + u'/' + QFileInfo(proposal).fileName());
+    }
+    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
   }
 
   bool OpenWithSystem(const QString& target) override {

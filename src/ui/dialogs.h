@@ -27,6 +27,10 @@ class UserDialogs : public DocumentDialogs {
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
   /// Lets the user choose a documentation file; empty when declined.
   virtual QString ChooseDocumentationFile(QWidget* parent, const QString& start) = 0;
+  /// Lets the user choose where a file is written, from a proposal whose folder need not be there yet; empty
+  /// when declined.
+  virtual QString ChooseExportFile(QWidget* parent, const QString& title, const QString& proposal,
+                                   const QString& filter) = 0;
   /// Asks the system to open a file or an address; false when it cannot.
   virtual bool OpenWithSystem(const QString& target) = 0;
   /// Opens the help at the topic with this number.

@@ -1,12 +1,19 @@
 #include "ui/element_tree.h"
 
+#include <QApplication>
+#include <QPainter>
+#include <QStyledItemDelegate>
 #include <algorithm>
 #include <memory>
+#include <utility>
 
 #include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
+#include "ui/error_list.h"
+#include "ui/icons.h"
 #include "ui/node_kinds.h"
+#include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -16,10 +23,93 @@ namespace {
 
 constexpr int kIndent = 14;
 
-/// A node with its data.
+constexpr int kCountRole = Qt::UserRole;
+constexpr int kLevelRole = Qt::UserRole + 1;
+
+/// A node with its data. What is drawn beside the caption is computed when it is asked for.
 class ElementItem final : public QTreeWidgetItem {
  public:
-  CItemData data;
+  QVariant data(int column, int role) const override {
+    switch (role) {
+      case Qt::DecorationRole:
+        return IconOfKind(node.kind);
+      case Qt::ToolTipRole:
+        return messages.count == 0 ? QVariant() : PlainTip(MessageText());
+      case Qt::AccessibleDescriptionRole:
+        return messages.count == 0 ? QVariant() : MessageText();
+      case kCountRole:
+        return IsFolder() ? QVariant(childCount()) : QVariant();
+      case kLevelRole:
+        return messages.level;
+      default:
+        return QTreeWidgetItem::data(column, role);
+    }
+  }
+
+  CItemData node;
+  ElementMessages messages;
+
+ private:
+  /// A collection. The folder of the particle classes has the kind of its elements.
+  bool IsFolder() const {
+    const bool isList =
+        node.kind >= ElementKind::StateVariableList && node.kind <= ElementKind::VerticalEquationList;
+    return isList || node.id == folder_id::kParticleClasses || node.id == folder_id::kPluginFunctions ||
+           node.id == folder_id::kVisibilityGroups;
+  }
+
+  QString MessageText() const { return strings::kHasMessages.arg(text(0)).arg(messages.count); }
+};
+
+/// Draws the number of its elements after the caption of a folder, and a dot at an element with messages.
+class NodeDelegate final : public QStyledItemDelegate {
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+
+  void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override {
+    QStyledItemDelegate::paint(painter, option, index);
+    QStyleOptionViewItem shown = option;
+    initStyleOption(&shown, index);
+    const QStyle& style = shown.widget == nullptr ? *QApplication::style() : *shown.widget->style();
+    if (const std::uint32_t level = index.data(kLevelRole).toUInt(); level != 0)
+      DrawDot(*painter, style.subElementRect(QStyle::SE_ItemViewItemDecoration, &shown, shown.widget), level);
+    if (const QVariant count = index.data(kCountRole); count.isValid())
+      DrawCount(*painter, shown, style.subElementRect(QStyle::SE_ItemViewItemText, &shown, shown.widget),
+                count.toInt());
+  }
+
+ private:
+  static void DrawDot(QPainter& painter, const QRect& icon, std::uint32_t level) {
+    const int size = icon.height() / 2;
+    const QRect dot(icon.right() - size + 2, icon.bottom() - size + 2, size, size);
+    painter.save();
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.setPen(QPen(Qt::white, 1));
+    painter.setBrush(ColourOfLevel(level));
+    painter.drawEllipse(dot);
+    painter.restore();
+  }
+
+  /// Between the text and its ground, and nearer to the text.
+  static QColor Greyed(const QPalette& palette) {
+    const QColor text = palette.color(QPalette::Text);
+    const QColor ground = palette.color(QPalette::Base);
+    const auto mixed = [](int near, int far) { return (3 * near + 2 * far) / 5; };
+    return {mixed(text.red(), ground.red()), mixed(text.green(), ground.green()),
+            mixed(text.blue(), ground.blue())};
+  }
+
+  static void DrawCount(QPainter& painter, const QStyleOptionViewItem& shown, const QRect& caption,
+                        int count) {
+    constexpr int kGap = 10;
+    const bool isSelected = shown.state.testFlag(QStyle::State_Selected);
+    const QRect rest = caption.adjusted(shown.fontMetrics.horizontalAdvance(shown.text) + kGap, 0, 0, 0);
+    painter.save();
+    painter.setFont(shown.font);
+    painter.setPen(isSelected ? shown.palette.color(QPalette::HighlightedText) : Greyed(shown.palette));
+    painter.drawText(rest, Qt::AlignVCenter, QString::number(count));
+    painter.restore();
+  }
 };
 
 }  // namespace
@@ -29,20 +119,27 @@ CElementTree::CElementTree(QWidget* parent) : QTreeWidget(parent) {
   setHeaderHidden(true);
   setIndentation(kIndent);
   setUniformRowHeights(true);
+  setItemDelegate(MakeChild<NodeDelegate>(this));
   setContextMenuPolicy(Qt::CustomContextMenu);
   setAccessibleName(strings::kElements);
 }
 
 CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
-  return static_cast<ElementItem&>(item).data;
+  return static_cast<ElementItem&>(item).node;
+}
+
+QTreeWidgetItem* CElementTree::Make(ElementKind kind, Uid id, const std::string& caption) {
+  auto* item = MakeChild<ElementItem>();
+  item->node.kind = kind;
+  item->node.id = id;
+  item->setText(0, ToScreen(caption));
+  if (id != folder_id::kVisibilityGroup) nodes.emplace(id, item);
+  return item;
 }
 
 QTreeWidgetItem* CElementTree::Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                                       const std::string& caption) {
-  auto* item = MakeChild<ElementItem>();
-  item->data.kind = kind;
-  item->data.id = id;
-  item->setText(0, ToScreen(caption));
+  QTreeWidgetItem* item = Make(kind, id, caption);
   parent.insertChild(std::min(place, parent.childCount()), item);
   return item;
 }
@@ -54,28 +151,37 @@ QTreeWidgetItem* CElementTree::InsertFixed(QTreeWidgetItem& parent, int place, U
 
 template <class Elements>
 void CElementTree::InsertAll(QTreeWidgetItem& folder, const Elements& elements) {
-  for (const auto& element : elements) InsertElement(folder, *element, folder.childCount());
+  // All at once: a tree that is shown does some work for each insertion.
+  QList<QTreeWidgetItem*> made;
+  made.reserve(static_cast<qsizetype>(elements.size()));
+  for (const auto& element : elements)
+    made.append(Make(element->Kind(), element->GetUid(), ElementCaption(*element)));
+  folder.addChildren(made);
 }
 
 void CElementTree::Build(TemplateCore& core) {
   clear();
+  nodes.clear();
   groupItems.clear();
-  QTreeWidgetItem* root = InsertFixed(*invisibleRootItem(), 0, folder_id::kRoot);
-  ForEachHeadedCollection([this, root, &core](const auto& collection) {
+  marked.clear();
+  const NodeRow& row = NodeRowWithId(folder_id::kRoot);
+  root = Make(row.kind, row.id, CaptionOfFixedNode(row));
+  ForEachHeadedCollection([this, &core](const auto& collection) {
     const Uid id = NodeRowOfElements(collection.kind).folder;
     InsertAll(*InsertFixed(*root, root->childCount(), id), core.Elements().*collection.elements);
   });
   if (core.GetMisc() != nullptr) ShowMisc(core);
   if (core.GetSpecieCount() > 0) ShowParticles(core);
+  // The whole tree comes into the view in one step; only then can its nodes be opened.
+  addTopLevelItem(root);
   root->setExpanded(true);
+  if (QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses)) particles->setExpanded(true);
 }
 
 QTreeWidgetItem* CElementTree::FindById(Uid id) const {
-  if (RootItem() == nullptr) return nullptr;
-  for (QTreeWidgetItemIterator item(RootItem()); *item != nullptr; ++item) {
-    if (DataOf(**item).id == id) return *item;
-  }
-  return nullptr;
+  if (id == folder_id::kVisibilityGroup) return groupItems.empty() ? nullptr : groupItems.front();
+  const auto node = nodes.find(id);
+  return node == nodes.end() ? nullptr : node->second;
 }
 
 QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_Element& element, int place) {
@@ -83,7 +189,13 @@ QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_
 }
 
 QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie) {
-  QTreeWidgetItem* branch = InsertElement(folder, specie, folder.childCount());
+  QTreeWidgetItem* branch = MakeSpecie(specie);
+  folder.addChild(branch);
+  return branch;
+}
+
+QTreeWidgetItem* CElementTree::MakeSpecie(const CEL_Lagrange_Specie& specie) {
+  QTreeWidgetItem* branch = Make(specie.Kind(), specie.GetUid(), ElementCaption(specie));
   const auto addList = [this, branch, &specie](ElementKind listKind) {
     return InsertElement(*branch, specie.Head(listKind), branch->childCount());
   };
@@ -100,8 +212,8 @@ void CElementTree::ShowMisc(TemplateCore& core) {
   if (FindById(folder_id::kMiscellaneous) != nullptr || core.GetMisc() == nullptr) return;
   // After the collections and before the particle classes.
   QTreeWidgetItem* particles = FindById(folder_id::kParticleClasses);
-  const int place = particles == nullptr ? RootItem()->childCount() : RootItem()->indexOfChild(particles);
-  QTreeWidgetItem* settings = InsertFixed(*RootItem(), place, folder_id::kMiscellaneous);
+  const int place = particles == nullptr ? root->childCount() : root->indexOfChild(particles);
+  QTreeWidgetItem* settings = InsertFixed(*root, place, folder_id::kMiscellaneous);
   const auto& functions = core.GetMisc()->ExternalFunctions();
   if (!functions.empty()) InsertAll(*InsertFixed(*settings, 0, folder_id::kPluginFunctions), functions);
   InsertFixed(*settings, settings->childCount(), folder_id::kVisibilityGroups);
@@ -110,8 +222,10 @@ void CElementTree::ShowMisc(TemplateCore& core) {
 
 void CElementTree::ShowParticles(TemplateCore& core) {
   if (FindById(folder_id::kParticleClasses) != nullptr) return;
-  QTreeWidgetItem* folder = InsertFixed(*RootItem(), RootItem()->childCount(), folder_id::kParticleClasses);
-  for (const auto& specie : core.Species()) InsertSpecie(*folder, *specie);
+  QTreeWidgetItem* folder = InsertFixed(*root, root->childCount(), folder_id::kParticleClasses);
+  QList<QTreeWidgetItem*> branches;
+  for (const auto& specie : core.Species()) branches.append(MakeSpecie(*specie));
+  folder->addChildren(branches);
   folder->setExpanded(true);
 }
 
@@ -125,8 +239,16 @@ void CElementTree::RemoveBranch(Uid folderId) {
   RemoveNode(*branch);
 }
 
+void CElementTree::ForgetBranch(QTreeWidgetItem& item) {
+  // A visibility group has no entry of its own.
+  if (const auto node = nodes.find(DataOf(item).id); node != nodes.end() && node->second == &item)
+    nodes.erase(node);
+  for (int place = 0; place < item.childCount(); ++place) ForgetBranch(*item.child(place));
+}
+
 void CElementTree::RemoveNode(QTreeWidgetItem& item) {
   if (item.parent() == nullptr) return;
+  ForgetBranch(item);
   const std::unique_ptr<QTreeWidgetItem> gone(item.parent()->takeChild(item.parent()->indexOfChild(&item)));
 }
 
@@ -163,6 +285,19 @@ void CElementTree::MoveNode(QTreeWidgetItem& item, int step) {
   item.setExpanded(wasExpanded);
   if (wasCurrent) setCurrentItem(&item);
   setUpdatesEnabled(true);
+}
+
+void CElementTree::ShowMessages(const std::unordered_map<Uid, ElementMessages>& messages) {
+  const auto mark = [this](Uid id, const ElementMessages& shown) {
+    auto* item = static_cast<ElementItem*>(FindById(id));
+    if (item != nullptr) item->messages = shown;
+    return item != nullptr;
+  };
+  for (const Uid id : std::exchange(marked, {})) mark(id, {});
+  for (const auto& [id, shown] : messages) {
+    if (mark(id, shown)) marked.push_back(id);
+  }
+  viewport()->update();
 }
 
 }  // namespace tessal

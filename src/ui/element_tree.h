@@ -4,6 +4,7 @@
 #include <QTreeWidget>
 #include <cstddef>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include "ui/item_data.h"
@@ -13,6 +14,7 @@ namespace tessal {
 class CEL_Element;
 class CEL_Lagrange_Specie;
 class TemplateCore;
+struct ElementMessages;
 
 class CElementTree final : public QTreeWidget {
   Q_OBJECT
@@ -25,9 +27,9 @@ class CElementTree final : public QTreeWidget {
 
   static CItemData& DataOf(QTreeWidgetItem& item);
 
-  /// The first node with this id, depth first; none when there is none.
+  /// The first node with this id in the order of the tree; none when there is none. Needs no walk.
   QTreeWidgetItem* FindById(Uid id) const;
-  QTreeWidgetItem* RootItem() const { return topLevelItem(0); }
+  QTreeWidgetItem* RootItem() const { return root; }
   /// The nodes of the visibility groups, in group order.
   const std::vector<QTreeWidgetItem*>& GroupItems() const { return groupItems; }
 
@@ -39,14 +41,20 @@ class CElementTree final : public QTreeWidget {
   void ShowParticles(TemplateCore& core);
   void RemoveBranch(Uid folderId);
   /// Removes a node with its branch; the root stays.
-  static void RemoveNode(QTreeWidgetItem& item);
+  void RemoveNode(QTreeWidgetItem& item);
   void AddGroup(const std::string& name);
   /// Removes the node of the group at a position from 0; the groups after it move up by one number.
   void RemoveGroup(std::size_t position);
   /// Exchanges a node with a neighbour; nothing happens without one.
   void MoveNode(QTreeWidgetItem& item, int step);
 
+  /// Marks the nodes of the elements that have messages, and no others.
+  void ShowMessages(const std::unordered_map<Uid, ElementMessages>& messages);
+
  private:
+  /// A node that is in no tree yet, to be found by its id from now on.
+  QTreeWidgetItem* Make(ElementKind kind, Uid id, const std::string& caption);
+  void ForgetBranch(QTreeWidgetItem& item);
   QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                           const std::string& caption);
   /// Inserts the node that is no element and has this id.
@@ -54,7 +62,14 @@ class CElementTree final : public QTreeWidget {
   template <class Elements>
   void InsertAll(QTreeWidgetItem& folder, const Elements& elements);
 
+  /// Makes the branch of a particle class, outside of the tree.
+  QTreeWidgetItem* MakeSpecie(const CEL_Lagrange_Specie& specie);
+
   std::vector<QTreeWidgetItem*> groupItems;
+  /// The nodes by their ids. The visibility groups, which share one, are in the list above.
+  std::unordered_map<Uid, QTreeWidgetItem*> nodes;
+  std::vector<Uid> marked;  ///< the elements whose nodes are marked
+  QTreeWidgetItem* root = nullptr;
 };
 
 }  // namespace tessal

@@ -1,13 +1,19 @@
 #include "ui/error_list.h"
 
+#include <QContextMenuEvent>
+#include <QHeaderView>
+#include <QMenu>
 #include <QSignalBlocker>
+#include <QStyledItemDelegate>
 #include <algorithm>
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
+#include "ui/icons.h"
 #include "ui/node_kinds.h"
+#include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -16,6 +22,24 @@ namespace tessal {
 namespace {
 
 constexpr int kUidRole = Qt::UserRole;
+constexpr int kItemColumn = 0;
+constexpr int kMessageColumn = 1;
+/// The column "Item" takes at most this part of the list.
+constexpr int kItemShare = 3;
+/// An undefined symbol keeps a template from being used.
+constexpr auto kUndefinedLevel = static_cast<std::uint32_t>(ErrorLevel::Critical);
+
+/// Each row is a link to its element, and looks like one under the pointer.
+class LinkRows final : public QStyledItemDelegate {
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+
+ protected:
+  void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override {
+    QStyledItemDelegate::initStyleOption(option, index);
+    if (option->state.testFlag(QStyle::State_MouseOver)) option->font.setUnderline(true);
+  }
+};
 
 }  // namespace
 
@@ -27,6 +51,10 @@ CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
   setUniformRowHeights(true);
   setAllColumnsShowFocus(true);
   setAccessibleName(strings::kMessages);
+  setItemDelegate(MakeChild<LinkRows>(this));
+  // The hand over a row, and the line under it, follow the pointer.
+  viewport()->setAttribute(Qt::WA_Hover);
+  viewport()->setMouseTracking(true);
   // A choice fills the list again: where a click also activates, the second signal finds its row gone.
   const auto choose = [this](const QTreeWidgetItem* row) {
     if (row != nullptr) emit ElementChosen(Uid{row->data(0, kUidRole).toInt()});
@@ -36,7 +64,7 @@ CErrorList::CErrorList(QWidget* parent) : QTreeWidget(parent) {
 }
 
 std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
-  std::vector<Row> rows;
+  std::vector<Row> collected;
   // The users of the undefined symbols lie on top, the last ones first: each is put at the place of its
   // symbol, before what lies there.
   std::size_t place = 0;
@@ -45,8 +73,8 @@ std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
     for (const Uid user : undefined->usedBy) {
       const CEL_Element* element = core.GetElement(user);
       const QString caption = element == nullptr ? QString() : ToScreen(ElementCaption(*element));
-      rows.insert(rows.begin() + static_cast<std::ptrdiff_t>(std::min(place, rows.size())),
-                  {caption, message, user});
+      collected.insert(collected.begin() + static_cast<std::ptrdiff_t>(std::min(place, collected.size())),
+                       {caption, message, user, kUndefinedLevel, undefined->symbol});
     }
     ++place;
   }
@@ -55,35 +83,87 @@ std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
   Uid uid = Uid::None;
   for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
     Errors().GetErrorForList(index, symbol, uid, text);
-    rows.push_back({symbol.empty() ? strings::kGeneric : ToScreen(symbol), ToScreen(text).trimmed(), uid});
+    collected.push_back({symbol.empty() ? strings::kGeneric : ToScreen(symbol), ToScreen(text).trimmed(), uid,
+                         Errors().Records()[index].level, std::string()});
   }
-  return rows;
+  return collected;
+}
+
+QTreeWidgetItem* CErrorList::MakeItem(const Row& row) {
+  auto* item = MakeChild<QTreeWidgetItem>(QStringList{row.item, row.message});
+  item->setData(kItemColumn, kUidRole, NumberOf(row.uid));
+  item->setIcon(kItemColumn, IconOfLevel(row.level));
+  item->setData(kItemColumn, Qt::AccessibleTextRole, WordOfLevel(row.level) + u' ' + row.item);
+  item->setToolTip(kItemColumn, PlainTip(row.item));
+  item->setToolTip(kMessageColumn, PlainTip(row.message));
+  return item;
+}
+
+std::unordered_map<Uid, ElementMessages> CErrorList::MessagesOfElements() const {
+  std::unordered_map<Uid, ElementMessages> messages;
+  for (const Row& row : rows) {
+    if (!IsElement(row.uid)) continue;
+    ElementMessages& entry = messages[row.uid];
+    ++entry.count;
+    entry.level = std::max(entry.level, row.level);
+  }
+  return messages;
 }
 
 void CErrorList::RefreshErrorList(TemplateCore& core) {
   Errors().ClearErrors();
   core.ValidateTemplate();
-  const std::vector<Row> rows = CollectRows(core);
+  rows = CollectRows(core);
 
   const QTreeWidgetItem* selected = currentItem();
   const QString selectedItem = selected == nullptr ? QString() : selected->text(0);
   const QString selectedMessage = selected == nullptr ? QString() : selected->text(1);
-  const QSignalBlocker quiet(this);
+  QSignalBlocker quiet(this);
   clear();
   QList<QTreeWidgetItem*> items;
   items.reserve(static_cast<qsizetype>(rows.size()));
   QTreeWidgetItem* reselected = nullptr;
   for (const Row& row : rows) {
-    auto* item = MakeChild<QTreeWidgetItem>(QStringList{row.item, row.message});
-    item->setData(0, kUidRole, NumberOf(row.uid));
-    item->setToolTip(1, row.message.toHtmlEscaped());
+    QTreeWidgetItem* item = MakeItem(row);
     items.append(item);
     const bool isSelected = selected != nullptr && row.item == selectedItem && row.message == selectedMessage;
     if (isSelected && reselected == nullptr) reselected = item;
   }
   addTopLevelItems(items);
   if (reselected != nullptr) setCurrentItem(reselected);
-  for (int column = 0; column < columnCount(); ++column) resizeColumnToContents(column);
+  FitColumns();
+  quiet.unblock();
+  emit Refreshed();
+}
+
+void CErrorList::FitColumns() {
+  resizeColumnToContents(kItemColumn);
+  setColumnWidth(kItemColumn, std::min(columnWidth(kItemColumn), viewport()->width() / kItemShare));
+}
+
+void CErrorList::resizeEvent(QResizeEvent* resize) {
+  QTreeWidget::resizeEvent(resize);
+  FitColumns();
+}
+
+void CErrorList::mouseMoveEvent(QMouseEvent* move) {
+  QTreeWidget::mouseMoveEvent(move);
+  viewport()->setCursor(itemAt(move->pos()) == nullptr ? Qt::ArrowCursor : Qt::PointingHandCursor);
+}
+
+void CErrorList::contextMenuEvent(QContextMenuEvent* request) {
+  const bool byKey = request->reason() == QContextMenuEvent::Keyboard;
+  QTreeWidgetItem* item = byKey ? currentItem() : itemAt(viewport()->mapFromGlobal(request->globalPos()));
+  const auto place = static_cast<std::size_t>(indexOfTopLevelItem(item));
+  if (item == nullptr || rows[place].undefinedSymbol.empty()) return;
+  const std::string symbol = rows[place].undefinedSymbol;
+  QMenu menu(this);
+  QString name = ToScreen(symbol);
+  const QAction* create =
+      menu.addAction(strings::kCreateSymbol.arg(name.replace(u'&', QStringLiteral("&&"))));
+  const QPoint point = byKey ? viewport()->mapToGlobal(visualItemRect(item).center()) : request->globalPos();
+  // Creating fills the list again, and with it goes the row: the menu is closed by then.
+  if (menu.exec(point) == create) emit CreateSymbolRequested(symbol);
 }
 
 }  // namespace tessal

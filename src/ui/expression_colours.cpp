@@ -1,8 +1,13 @@
 #include "ui/expression_colours.h"
 
+#include <QApplication>
+#include <QSettings>
+#include <QTextEdit>
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <string>
+#include <utility>
 
 #include "core/template_core.h"
 #include "expr/function_catalogue.h"
@@ -61,6 +66,22 @@ TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
   return Style(kUnknownName, true, false, false);
 }
 
+const QString kStrongKey = QStringLiteral("strongColours");
+
+/// The choice, read from the settings once: each coloured word asks for it.
+bool& StrongChoice() {
+  static bool strong = QSettings().value(kStrongKey, false).toBool();
+  return strong;
+}
+
+/// W3C, Web Content Accessibility Guidelines 2.1, "relative luminance", for sRGB.
+double RelativeLuminance(const QColor& colour) {
+  const auto linear = [](double channel) {
+    return channel <= 0.03928 ? channel / 12.92 : std::pow((channel + 0.055) / 1.055, 2.4);
+  };
+  return 0.2126 * linear(colour.redF()) + 0.7152 * linear(colour.greenF()) + 0.0722 * linear(colour.blueF());
+}
+
 }  // namespace
 
 TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
@@ -77,9 +98,48 @@ TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCo
 QColor ReadableColour(const QColor& colour, const QColor& ground) {
   constexpr int kDarkGround = 128;
   constexpr int kLightEnough = 170;
+  if (UsesStrongColours()) return StrongColour(colour, ground);
   if (ground.lightness() >= kDarkGround) return colour;
   return QColor::fromHsl(std::max(colour.hslHue(), 0), colour.hslSaturation(),
                          std::max(255 - colour.lightness(), kLightEnough));
+}
+
+double ContrastRatio(const QColor& first, const QColor& second) {
+  constexpr double kFlare = 0.05;
+  const auto [darker, lighter] = std::minmax({RelativeLuminance(first), RelativeLuminance(second)});
+  return (lighter + kFlare) / (darker + kFlare);
+}
+
+QColor StrongColour(const QColor& colour, const QColor& ground) {
+  // On any ground one of black and white has a contrast of 4.58 or more: the search ends.
+  const bool darken = ContrastRatio(Qt::black, ground) > ContrastRatio(Qt::white, ground);
+  const int end = darken ? 0 : 255;
+  QColor strong = colour;
+  for (int lightness = colour.lightness();
+       ContrastRatio(strong, ground) < kStrongContrast && lightness != end;) {
+    lightness += darken ? -1 : 1;
+    strong = QColor::fromHsl(std::max(colour.hslHue(), 0), colour.hslSaturation(), lightness);
+  }
+  return strong;
+}
+
+ViewCommand StrongColoursCommand() {
+  const bool strong = UsesStrongColours();
+  return {"&View", "&Strong Colours", [strong] { UseStrongColours(!strong); }, true, strong};
+}
+
+bool UsesStrongColours() {
+  return StrongChoice();
+}
+
+void UseStrongColours(bool strong) {
+  if (std::exchange(StrongChoice(), strong) == strong) return;
+  QSettings().setValue(kStrongKey, strong);
+  // To a field it is as if the palette had changed.
+  for (QWidget* widget : QApplication::allWidgets()) {
+    QEvent change(QEvent::PaletteChange);
+    if (qobject_cast<QTextEdit*>(widget) != nullptr) QApplication::sendEvent(widget, &change);
+  }
 }
 
 }  // namespace tessal

@@ -3,6 +3,8 @@
 
 #include <QColor>
 
+#include "platform/docview.h"
+
 namespace tessal {
 
 struct ExpressionToken;
@@ -19,7 +21,25 @@ struct TokenStyle {
 TokenStyle StyleOfToken(const ExpressionToken& token, const TemplateCore& core);
 
 /// A colour that is made for a light ground, as it is shown on a given one: unchanged on a light one,
-/// lightened on a dark one.
+/// lightened on a dark one; with strong colours, as `StrongColour` gives it.
 QColor ReadableColour(const QColor& colour, const QColor& ground);
+
+/// The contrast of two colours, from 1 to 21 (W3C, Web Content Accessibility Guidelines 2.1, "contrast
+/// ratio").
+double ContrastRatio(const QColor& first, const QColor& second);
+
+/// The contrast that strong colours have at least (the same guidelines, level AA).
+inline constexpr double kStrongContrast = 4.5;
+
+/// The colour itself where it has that contrast with the ground; otherwise darkened or lightened, with its
+/// hue kept, until it has.
+QColor StrongColour(const QColor& colour, const QColor& ground);
+
+/// Whether expressions are shown in strong colours: the user's choice, kept in the settings. A change reaches
+/// all fields at once.
+bool UsesStrongColours();
+void UseStrongColours(bool strong);
+/// The switch in the menu of views.
+ViewCommand StrongColoursCommand();
 
 }  // namespace tessal

@@ -17,9 +17,15 @@ std::vector<const CEL_Element*> PointersTo(const Elements& elements) {
 
 }  // namespace
 
+ElementKind KindInFolder(const CItemData& folder) {
+  // The one downward movement of a class is never made.
+  const bool isDownward = folder.kind == ElementKind::VerticalEquationList;
+  return isDownward ? ElementKind::VerticalEquation : NodeRowOf(folder).creates;
+}
+
 std::vector<const CEL_Element*> ElementsOfFolder(const TemplateCore& core, const CItemData& folder) {
   std::vector<const CEL_Element*> elements;
-  const ElementKind kind = NodeRowOf(folder).creates;
+  const ElementKind kind = KindInFolder(folder);
   const bool isOfTemplate = WithCollection(
       kind, [&elements, &core](const auto& row) { elements = PointersTo(core.Elements().*row.elements); });
   if (isOfTemplate) return elements;

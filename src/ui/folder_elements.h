@@ -10,6 +10,9 @@ namespace tessal {
 class CEL_Element;
 class TemplateCore;
 
+/// The kind of the elements that a folder holds; None for a node that is no folder.
+ElementKind KindInFolder(const CItemData& folder);
+
 /// In the order of the template; none for a node that is no folder.
 std::vector<const CEL_Element*> ElementsOfFolder(const TemplateCore& core, const CItemData& folder);
 

@@ -12,6 +12,7 @@
 #include "ui/child.h"
 #include "ui/create_hint.h"
 #include "ui/folder_elements.h"
+#include "ui/icons.h"
 #include "ui/node_kinds.h"
 #include "ui/property_of.h"
 #include "ui/row_table.h"
@@ -90,6 +91,9 @@ std::ptrdiff_t DistanceInFolder(const std::vector<const CEL_Element*>& elements,
 CGenericListView::CGenericListView(const FormContext& context, QWidget* parent)
     : CListPage(context, ToScreen(CaptionOfFixedNode(NodeRowOf(context.item))), parent) {
   BuildFilter();
+  constexpr int kNameColumn = 1;
+  const ElementKind kind = KindInFolder(context.item);
+  Table().Model().ShowIcons(kNameColumn, [kind](const CRowModel::Row&) { return IconOfKind(kind); });
 }
 
 void CGenericListView::BuildFilter() {

@@ -6,6 +6,7 @@
 
 #include "ui/child.h"
 #include "ui/control_ids.h"
+#include "ui/icons.h"
 #include "ui/row_table.h"
 #include "ui/strings.h"
 
@@ -17,16 +18,17 @@ struct CommandRow {
   int control;
   const QString& text;
   QKeySequence key;
+  IconCommand icon;
 };
 
 // In the order of the tool bar.
 const std::array<CommandRow, 5>& CommandRows() {
   static const std::array<CommandRow, 5> kRows = {{
-      {32796, strings::kNew, QKeySequence(Qt::Key_Insert)},
-      {32790, strings::kEditRow, QKeySequence()},
-      {32789, strings::kDelete, QKeySequence(Qt::Key_Delete)},
-      {32791, strings::kMoveDown, QKeySequence(Qt::ALT | Qt::Key_Down)},
-      {32792, strings::kMoveUp, QKeySequence(Qt::ALT | Qt::Key_Up)},
+      {32796, strings::kNew, QKeySequence(Qt::Key_Insert), IconCommand::New},
+      {32790, strings::kEditRow, QKeySequence(), IconCommand::Edit},
+      {32789, strings::kDelete, QKeySequence(Qt::Key_Delete), IconCommand::Delete},
+      {32791, strings::kMoveDown, QKeySequence(Qt::ALT | Qt::Key_Down), IconCommand::MoveDown},
+      {32792, strings::kMoveUp, QKeySequence(Qt::ALT | Qt::Key_Up), IconCommand::MoveUp},
   }};
   return kRows;
 }
@@ -50,7 +52,7 @@ void CListPage::BuildToolBar() {
   bar->setToolButtonStyle(Qt::ToolButtonTextBesideIcon);
   for (std::size_t place = 0; place < kCommandCount; ++place) {
     const CommandRow& row = CommandRows()[place];
-    QAction* action = bar->addAction(row.text);
+    QAction* action = bar->addAction(IconOfCommand(row.icon), row.text);
     actions[place] = action;
     action->setObjectName(QString::number(row.control));
     action->setShortcut(row.key);

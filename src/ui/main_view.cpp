@@ -4,9 +4,9 @@
 #include <QFontInfo>
 #include <QKeyEvent>
 #include <QMenu>
+#include <QScreen>
 #include <QScrollArea>
 #include <QSplitter>
-#include <QStyle>
 #include <QToolBar>
 #include <QToolButton>
 #include <QVBoxLayout>
@@ -19,10 +19,15 @@
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
+#include "ui/export_commands.h"
+#include "ui/expression_colours.h"
 #include "ui/folder_elements.h"
 #include "ui/help_window.h"
+#include "ui/icons.h"
+#include "ui/kept_splitter.h"
 #include "ui/label.h"
 #include "ui/node_kinds.h"
+#include "ui/offered_creation.h"
 #include "ui/right_pane.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
@@ -52,7 +57,9 @@ std::int32_t NumberOf(const UpdateHint* argument) {
 
 CMainView::CMainView(CTessalDoc& shownDocument, UserDialogs& userDialogs)
     : document(shownDocument), dialogs(userDialogs) {
-  setMinimumSize(kSmallestView);
+  // On a small screen, or a large scale, no more than the window around it can have.
+  constexpr double kPartOfScreen = 0.75;
+  setMinimumSize(kSmallestView.boundedTo(screen()->availableGeometry().size() * kPartOfScreen));
 }
 
 CMainView::~CMainView() {
@@ -68,6 +75,9 @@ TemplateCore& CMainView::Core() const {
 void CMainView::OnInitialUpdate() {
   BuildToolBar();
   BuildLayout();
+  connect(errorList, &CErrorList::Refreshed, this,
+          [this] { tree->ShowMessages(errorList->MessagesOfElements()); });
+  connect(errorList, &CErrorList::CreateSymbolRequested, this, &CMainView::CreateSymbol);
   tree->Build(Core());
   errorList->RefreshErrorList(Core());
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
@@ -88,16 +98,17 @@ void CMainView::BuildToolBar() {
   toolBar = MakeChild<QToolBar>(this);
   toolBar->setObjectName(QString::number(control_id::kNavigation));
   toolBar->setIconSize(kIcons);
-  back = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowBack), strings::kNavigateBack, this,
+  back = toolBar->addAction(IconOfCommand(IconCommand::Back), strings::kNavigateBack, this,
                             [this] { SelectById(history.Back()); });
-  forward = toolBar->addAction(style()->standardIcon(QStyle::SP_ArrowForward), strings::kNavigateForward,
-                               this, [this] { SelectById(history.Forward()); });
+  forward = toolBar->addAction(IconOfCommand(IconCommand::Forward), strings::kNavigateForward, this,
+                               [this] { SelectById(history.Forward()); });
   back->setShortcut(QKeySequence::Back);
   forward->setShortcut(QKeySequence::Forward);
   historyMenu = MakeChild<QMenu>(this);
   connect(historyMenu, &QMenu::aboutToShow, this, &CMainView::FillHistoryMenu);
   auto* button = MakeChild<QToolButton>(toolBar);
   button->setText(strings::kNavigationHistory);
+  button->setIcon(IconOfCommand(IconCommand::History));
   button->setToolTip(strings::kNavigationHistory);
   button->setMenu(historyMenu);
   button->setPopupMode(QToolButton::InstantPopup);
@@ -119,6 +130,7 @@ void CMainView::BuildLayout() {
   treeDetail->setMinimumHeight(kSmallestUpper);
   treeDetail->setChildrenCollapsible(false);
   treeDetail->setSizes({kUsualTree, 3 * kUsualTree});
+  KeepSplitter(*treeDetail);
 
   auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
   topBottom->setObjectName(QStringLiteral("TopBottom"));
@@ -127,6 +139,7 @@ void CMainView::BuildLayout() {
   topBottom->setStretchFactor(0, 1);
   topBottom->setChildrenCollapsible(false);
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
+  KeepSplitter(*topBottom);
 
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
@@ -139,6 +152,8 @@ QWidget* CMainView::MakeTitleDetail() {
   title = MakeChild<CLabel>(this);
   title->setObjectName(QString::number(control_id::kTitle));
   title->SetFontWeight(kTitleWeight);
+  // As wide as the form under it, however long the name.
+  title->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Fixed);
   // Where the user's font is larger than usual, the title is no smaller than the text under it.
   title->SetFontHeight(std::max(kTitleHeight, QFontInfo(font()).pixelSize() + 2));
 
@@ -409,7 +424,7 @@ void CMainView::DeleteNode(QTreeWidgetItem& item) {
     if (next == nullptr) next = parent;
     if (next != nullptr) tree->setCurrentItem(next);
   }
-  CElementTree::RemoveNode(item);
+  tree->RemoveNode(item);
 }
 
 void CMainView::DeleteFromMenu(Uid id, std::int32_t groupIndex) {
@@ -458,6 +473,22 @@ QList<QWidget*> CMainView::StopsOfForm() const {
     if (form->isAncestorOf(next) && (next->focusPolicy() & Qt::TabFocus) != 0) stops.append(next);
   }
   return stops;
+}
+
+std::vector<ViewCommand> CMainView::Commands() {
+  std::vector<ViewCommand> commands = ExportCommands(document, dialogs, *this);
+  commands.push_back(StrongColoursCommand());
+  return commands;
+}
+
+void CMainView::CreateSymbol(const std::string& symbol) {
+  // What is being entered may define the symbol, or use it no more.
+  Commit();
+  const auto offer = Core().OfferOf(symbol);
+  if (!offer || !CreateOfferedKind(*offer, document, dialogs, this)) return;
+  if (form) form->Load();
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
 }
 
 void CMainView::FocusForm() {

@@ -5,6 +5,8 @@
 #include <QList>
 #include <QWidget>
 #include <memory>
+#include <string>
+#include <vector>
 
 #include "core/creation.h"
 #include "platform/docview.h"
@@ -40,6 +42,7 @@ class CMainView final : public QWidget, public CView {
   void OnCommit() override { CommitAll(); }
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
+  std::vector<ViewCommand> Commands() override;
   QWidget* Widget() override { return this; }
 
   CTessalDoc& Document() const { return document; }
@@ -62,6 +65,8 @@ class CMainView final : public QWidget, public CView {
  private:
   void BuildToolBar();
   void BuildLayout();
+  /// Offers to create an undefined symbol that the user may have refused before.
+  void CreateSymbol(const std::string& symbol);
   /// The title with the holder of the forms under it.
   QWidget* MakeTitleDetail();
   TemplateCore& Core() const;

@@ -5,8 +5,8 @@
 
 #include "core/document.h"
 #include "core/rename.h"
-#include "ui/create_hint.h"
 #include "ui/dialogs.h"
+#include "ui/offered_creation.h"
 #include "ui/text_bytes.h"
 
 namespace tessal {
@@ -70,13 +70,7 @@ bool CRightPaneBase::OfferUndefinedSymbols() {
   while (const std::optional<CreationOffer> offer = Core().NextOffer()) {
     const Answer answer = AskAbout(*offer);
     if (answer == Answer::NoToAll) DeclineOffers(Core());
-    if (answer != Answer::Yes) continue;
-    const int choice = Dialogs().ChooseKind(this, ToScreen(offer->symbol), offer->mask);
-    const CreateRequest* request = offer->RequestOf(choice);
-    if (request == nullptr) continue;
-    const CreateHint argument(*request);
-    Document().UpdateAllViews(nullptr, hint::kCreateElement, &argument);
-    created = true;
+    if (answer == Answer::Yes && CreateOfferedKind(*offer, Document(), Dialogs(), this)) created = true;
   }
   return created;
 }

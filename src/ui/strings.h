@@ -79,4 +79,14 @@ inline const QString kDocumentationFilter =
 // The creation dialog.
 inline const QString kSkip = QStringLiteral("Skip");
 
+// Exports.
+inline const QString kExporting = QStringLiteral("Exporting to %1...");
+inline const QString kNotExported = QStringLiteral("Failed to export to\n%1\n\n%2");
+inline const QString kExported = QStringLiteral("Exported to\n%1\n\nOpen it?");
+inline const QString kNotOpened = QStringLiteral("No program on this system opens\n%1");
+
+// The list of messages and the marks in the tree.
+inline const QString kCreateSymbol = QStringLiteral("&Create symbol '%1'...");
+inline const QString kHasMessages = QStringLiteral("%1 in the list of messages: %2");
+
 }  // namespace tessal::strings

@@ -8,6 +8,8 @@
 #include <QDropEvent>
 #include <QFileDialog>
 #include <QLineEdit>
+#include <QMenu>
+#include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
 #include <QRegularExpression>
@@ -146,6 +148,18 @@ class HostScript final {
     return true;
   }
 
+  /// Makes a constant by the menu of their folder.
+  bool Touch() {
+    auto* tree = window.Current()->Widget()->findChild<QTreeWidget*>("1127");
+    QTimer::singleShot(0, tree, [] {
+      auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+      menu->actions().at(0)->trigger();
+      menu->close();
+    });
+    emit tree->customContextMenuRequested(tree->visualItemRect(tree->topLevelItem(0)->child(1)).center());
+    return true;
+  }
+
   bool Drop(const QStringList& names) {
     QMimeData dropped;
     QList<QUrl> urls;
@@ -156,6 +170,34 @@ class HostScript final {
     QDropEvent drop(QPointF(1, 1), Qt::CopyAction, &dropped, Qt::LeftButton, {});
     QApplication::sendEvent(&window, &drop);
     return enter.isAccepted();
+  }
+
+  /// The entries of a menu; one of them is chosen, if it is named.
+  bool UseMenu(const QString& title, const QString& entry) {
+    for (const QAction* menu : window.menuBar()->actions()) {
+      if (menu->text().remove(u'&') != title || !menu->isVisible()) continue;
+      for (QAction* action : menu->menu()->actions()) {
+        const QString text = action->text().remove(u'&');
+        if (entry.isEmpty() && !text.isEmpty())
+          boxes.texts.append((action->isChecked() ? "x " : "  ") + text +
+                             (action->isEnabled() ? "" : " (grey)"));
+        if (!entry.isEmpty() && text == entry) return action->trigger(), true;
+      }
+      return entry.isEmpty();
+    }
+    return false;
+  }
+
+  /// What the page without a document offers; one of it is pressed, if it is named.
+  bool UseStartPage(const QString& name) {
+    QCoreApplication::processEvents();
+    for (auto* link : window.centralWidget()->findChildren<QAbstractButton*>()) {
+      const QString text = link->accessibleName();
+      if (!link->isVisible() || text.isEmpty()) continue;
+      if (name.isEmpty()) boxes.texts.append(text);
+      if (text == name) return link->click(), true;
+    }
+    return name.isEmpty();
   }
 
   /// Somebody else writes a file.
@@ -181,6 +223,11 @@ const std::map<QString, HostScript::Call> HostScript::kCalls = {
     {"new", [](auto& host, auto& /*words*/) { return host.window.NewDocument(), true; }},
     {"edit", [](auto& host, auto& words) { return host.Edit(words.join(u' ')); }},
     {"commit", [](auto& host, auto& /*words*/) { return host.window.Current()->View().OnCommit(), true; }},
+    // A folder's menu makes an element.
+    {"touch", [](auto& host, auto& /*words*/) { return host.Touch(); }},
+    {"menu",
+     [](auto& host, auto& words) { return host.UseMenu(words[0], QStringList(words.mid(1)).join(u' ')); }},
+    {"start", [](auto& host, auto& words) { return host.UseStartPage(words.join(u' ')); }},
     {"name", [](auto& host, auto& words) { return host.boxes.saveAs = host.Path(words[0]), true; }},
     {"save", [](auto& host, auto& /*words*/) { return host.window.SaveCurrent(); }},
     {"save-as", [](auto& host, auto& /*words*/) { return host.window.SaveCurrentAs(); }},

@@ -42,6 +42,12 @@ int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::ui
   return TakeFirst(choices, -1);
 }
 
+QString ScriptedUser::ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
+                                       const QString& filter) {
+  log.append(title + QStringLiteral(" to ") + proposal + QStringLiteral(" of ") + filter);
+  return exportFile.isNull() ? proposal : exportFile;
+}
+
 bool ScriptedUser::OpenWithSystem(const QString& target) {
   log.append(QStringLiteral("open ") + target);
   return openable.contains(target);

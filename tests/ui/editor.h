@@ -42,6 +42,8 @@ class ScriptedUser final : public UserDialogs {
   QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
     return documentationFile;
   }
+  QString ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
+                           const QString& filter) override;
   bool OpenWithSystem(const QString& target) override;
   void ShowHelp(QWidget* /*parent*/, int topic) override { log.append("help " + QString::number(topic)); }
 
@@ -51,6 +53,7 @@ class ScriptedUser final : public UserDialogs {
   QList<tessal::Answer> answers;  ///< to questions; Yes when used up
   QList<int> choices;             ///< of kinds; skips when used up
   QString documentationFile;
+  QString exportFile;    ///< where exports go; to the proposal when it is null
   QStringList openable;  ///< what the system can open
 
  private:

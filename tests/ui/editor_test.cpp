@@ -9,6 +9,7 @@
 #include <QRadioButton>
 #include <QSplitter>
 #include <QTest>
+#include <QTextBlock>
 #include <QTimer>
 #include <filesystem>
 #include <map>
@@ -20,6 +21,8 @@
 #include "ui/editor.h"
 #include "ui/element_form.h"
 #include "ui/expression_colours.h"
+#include "ui/icons.h"
+#include "ui/node_kinds.h"
 
 namespace tessal {
 namespace {
@@ -161,6 +164,103 @@ TEST(Colours, StayReadableOnADarkGround) {
     EXPECT_EQ(ReadableColour(QColor(given), Qt::white), QColor(given)) << "unchanged on a light ground";
     EXPECT_GE(ReadableColour(QColor(given), dark).lightness(), 150);
   }
+}
+
+TEST(Colours, AreStrongOnAnyGroundOnRequest) {
+  EXPECT_DOUBLE_EQ(ContrastRatio(Qt::black, Qt::white), 21.0);
+  EXPECT_NEAR(ContrastRatio(QColor(119, 119, 119), Qt::white), 4.478, 0.001);
+  constexpr int kStep = 51;
+  for (const QRgb ground : {qRgb(255, 255, 255), qRgb(239, 239, 239), qRgb(0, 0, 0), qRgb(35, 38, 41),
+                            qRgb(118, 118, 118), qRgb(128, 90, 150)}) {
+    for (int rgb = 0; rgb < 216; ++rgb) {
+      const QColor given(rgb / 36 * kStep, rgb / 6 % 6 * kStep, rgb % 6 * kStep);
+      const QColor strong = StrongColour(given, ground);
+      EXPECT_GE(ContrastRatio(strong, ground), kStrongContrast)
+          << given.name().toStdString() << " on " << QColor(ground).name().toStdString();
+      if (ContrastRatio(given, ground) >= kStrongContrast) {
+        EXPECT_EQ(strong, given) << "left as it is";
+      }
+    }
+  }
+}
+
+/// The colours of all words that a field shows.
+std::set<QRgb> ColoursOf(const QTextEdit& field) {
+  std::set<QRgb> colours;
+  for (auto part = field.document()->begin().begin(); !part.atEnd(); ++part)
+    colours.insert(part.fragment().charFormat().foreground().color().rgb());
+  return colours;
+}
+
+TEST(Colours, ChangeInAllFieldsAtOnce) {
+  Editor editor(ModelText("small"));
+  editor.Select("a");
+  auto& field = editor.Field<CAutoRichEditCtrl>("Expression");
+  const std::set<QRgb> usual = ColoursOf(field);
+  UseStrongColours(true);
+  for (const QRgb colour : ColoursOf(field))
+    EXPECT_GE(ContrastRatio(QColor(colour), Qt::white), kStrongContrast);
+  EXPECT_NE(ColoursOf(field), usual);
+  UseStrongColours(false);
+  EXPECT_EQ(ColoursOf(field), usual);
+}
+
+TEST(Icons, AreAllDrawnAndAllDifferent) {
+  std::vector<std::pair<QIcon, std::string>> icons;
+  for (ElementKind kind = ElementKind::None; kind <= node_kind::kPluginFunctions; kind = KindAfter(kind, 1)) {
+    if (kind != ElementKind::Unknown && NodeRowOfElements(kind).kind == kind)
+      icons.emplace_back(IconOfKind(kind), "kind " + std::to_string(NumberOf(kind)));
+  }
+  for (int command = 0; command <= static_cast<int>(IconCommand::History); ++command)
+    icons.emplace_back(IconOfCommand(IconCommand{command}), "command " + std::to_string(command));
+  for (std::uint32_t level = 1; level <= 4; ++level)
+    icons.emplace_back(IconOfLevel(level), "level " + std::to_string(level));
+  std::map<QByteArray, std::string> seen;
+  for (const auto& [icon, name] : icons) {
+    const QImage drawn = icon.pixmap(QSize(16, 16), 1.0).toImage();
+    const QByteArray pixels(reinterpret_cast<const char*>(drawn.constBits()), drawn.sizeInBytes());
+    EXPECT_GT(std::set<char>(pixels.begin(), pixels.end()).size(), 2U) << name << " is empty";
+    EXPECT_TRUE(seen.emplace(pixels, name).second) << name << " looks like " << seen[pixels];
+  }
+  EXPECT_TRUE(IconOfLevel(0).isNull() && IconOfLevel(5).isNull());
+}
+
+TEST(Icons, OfCommandsFollowThePalette) {
+  const QIcon icon = IconOfCommand(IconCommand::New);
+  const auto middle = [&icon] { return icon.pixmap(QSize(16, 16), 1.0).toImage().pixelColor(8, 8); };
+  const QPalette former = QApplication::palette();
+  QApplication::setPalette(QPalette(QColor(40, 40, 40)));
+  EXPECT_GT(middle().lightness(), 200);
+  QApplication::setPalette(QPalette(QColor(240, 240, 240)));
+  EXPECT_LT(middle().lightness(), 50);
+  QApplication::setPalette(former);
+}
+
+TEST(Messages, LeaveTheirTextTwoThirdsOfTheList) {
+  const std::string longName(300, 'x');
+  Editor editor(ModelText("constant " + longName + " -1"));
+  const CErrorList& list = editor.View().ErrorList();
+  EXPECT_LE(list.columnWidth(0), list.viewport()->width() / 3);
+  EXPECT_EQ(list.columnWidth(0) + list.columnWidth(1), list.viewport()->width())
+      << "no scrolling to the side";
+  EXPECT_TRUE(list.topLevelItem(0)->toolTip(0).contains(QString::fromStdString(longName)));
+}
+
+TEST(Tree, FindsNodesThatComeAndGo) {
+  Editor editor(ModelText("small\nsettings"));
+  const Uid gone = editor.IdOf("k");
+  editor.Select("f");
+  const NumberHint hideMisc(0);
+  const NumberHint showMisc(1);
+  editor.Document().UpdateAllViews(nullptr, hint::kShowMisc, &hideMisc);
+  EXPECT_EQ(editor.Tree().FindById(folder_id::kVisibilityGroups), nullptr) << "went with its branch";
+  editor.Document().UpdateAllViews(nullptr, hint::kShowMisc, &showMisc);
+  EXPECT_EQ(editor.Tree().FindById(folder_id::kMiscellaneous), editor.Node("Miscellaneous"));
+  const NumberHint removed(NumberOf(gone));
+  editor.Document().UpdateAllViews(nullptr, hint::kDeleteItem, &removed);
+  EXPECT_EQ(editor.Tree().FindById(gone), nullptr);
+  for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item)
+    EXPECT_EQ(editor.Tree().FindById(CElementTree::DataOf(**item).id), *item);
 }
 
 TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {

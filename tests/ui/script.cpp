@@ -6,6 +6,8 @@
 #include <QApplication>
 #include <QClipboard>
 #include <QContextMenuEvent>
+#include <QDirIterator>
+#include <QFileInfo>
 #include <QMenu>
 #include <QPushButton>
 #include <QTest>
@@ -170,6 +172,46 @@ void ClickError(Editor& editor, const Words& words) {
   QTest::mouseClick(list.viewport(), Qt::LeftButton, {}, row.center());
 }
 
+/// "0: Create" uses the menu of a row of the list, by the menu key.
+std::string RowMenu(Editor& editor, const Words& words) {
+  CErrorList& list = editor.View().ErrorList();
+  list.setCurrentItem(list.topLevelItem(words.Number()));
+  QString entries;
+  QTimer::singleShot(0, &list, [&entries, &words] {
+    auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    if (menu == nullptr) return;
+    for (QAction* action : menu->actions()) entries += action->text() + u'\n';
+    menu->setActiveAction(words.second.isEmpty() ? nullptr : menu->actions().at(0));
+    QTest::keyClick(menu, words.second.isEmpty() ? Qt::Key_Escape : Qt::Key_Return);
+  });
+  QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
+  QApplication::sendEvent(list.viewport(), &byKey);
+  QCoreApplication::processEvents();
+  return entries.isEmpty() ? "none\n" : entries.toStdString();
+}
+
+/// The nodes that carry a mark, with what its tip says.
+std::string Marks(Editor& editor, const Words& /*words*/) {
+  std::string text;
+  for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
+    const QString mark = (*item)->data(0, Qt::AccessibleDescriptionRole).toString();
+    if (!mark.isEmpty()) text += mark.toStdString() + "\n";
+  }
+  return text.empty() ? "none\n" : text;
+}
+
+/// "Export Overview" runs the command of the view whose text has this in it, and lists the files then there.
+std::string RunCommand(Editor& editor, const Words& words) {
+  for (const ViewCommand& command : editor.View().Commands()) {
+    if (ToScreen(command.text).remove(u'&').contains(words.first)) command.run();
+  }
+  QDirIterator file(QFileInfo(ToScreen(editor.Path())).path(), QDir::Files, QDirIterator::Subdirectories);
+  QStringList found;
+  while (file.hasNext()) found.append(file.next());
+  found.sort();
+  return Lines(found);
+}
+
 void EnterError(Editor& editor, const Words& words) {
   CErrorList& list = editor.View().ErrorList();
   list.setFocus();
@@ -229,6 +271,11 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        for (const char letter : words.all) editor.User().answers.push_back(letters.at(letter));
      }},
     {"pick", [](Editor& editor, auto& words) { editor.User().choices.push_back(words.Number()); }},
+    {"export-to",
+     [](Editor& editor, auto& words) {
+       editor.User().exportFile =
+           ToScreen(words.all).replace("FOLDER", QFileInfo(ToScreen(editor.Path())).path());
+     }},
     {"browse", [](Editor& editor, auto& words) { editor.User().documentationFile = words.first; }},
     {"hint", SendHint},
     {"create", Create},
@@ -263,6 +310,9 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
      }},
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
+    {"row-menu", RowMenu},
+    {"marks", Marks},
+    {"command", RunCommand},
     {"tabs", PressTab},
     {"save", Save},
     {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},
@@ -317,6 +367,7 @@ std::string Script::Answer(const CaseCall& call) {
   }
   QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
   for (const QString& line : editor->User().TakeLog()) answer += line.toStdString() + "\n";
+  answer = ToScreen(answer).replace(QFileInfo(ToScreen(editor->Path())).path(), "FOLDER").toStdString();
   const State present = Look();
   answer += Changes(former.lines, present.lines);
   // Another node's form is another form.
