@@ -23,7 +23,6 @@ namespace {
 
 constexpr int kUidRole = Qt::UserRole;
 constexpr int kItemColumn = 0;
-constexpr int kMessageColumn = 1;
 /// The column "Item" takes at most this part of the list.
 constexpr int kItemShare = 3;
 /// An undefined symbol keeps a template from being used.
