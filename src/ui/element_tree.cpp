@@ -71,11 +71,12 @@ class NodeDelegate final : public QStyledItemDelegate {
     QStyleOptionViewItem shown = option;
     initStyleOption(&shown, index);
     const QStyle& style = shown.widget == nullptr ? *QApplication::style() : *shown.widget->style();
-    if (const std::uint32_t level = index.data(kLevelRole).toUInt(); level != 0)
-      DrawDot(*painter, style.subElementRect(QStyle::SE_ItemViewItemDecoration, &shown, shown.widget), level);
-    if (const QVariant count = index.data(kCountRole); count.isValid())
-      DrawCount(*painter, shown, style.subElementRect(QStyle::SE_ItemViewItemText, &shown, shown.widget),
-                count.toInt());
+    const QRect icon = style.subElementRect(QStyle::SE_ItemViewItemDecoration, &shown, shown.widget);
+    const QRect caption = style.subElementRect(QStyle::SE_ItemViewItemText, &shown, shown.widget);
+    const std::uint32_t level = index.data(kLevelRole).toUInt();
+    const QVariant count = index.data(kCountRole);
+    if (level != 0) DrawDot(*painter, icon, level);
+    if (count.isValid()) DrawCount(*painter, shown, caption, count.toInt());
   }
 
  private:

@@ -23,11 +23,30 @@ namespace {
 
 constexpr int kUidRole = Qt::UserRole;
 constexpr int kItemColumn = 0;
-constexpr int kMessageColumn = 1;
 /// The column "Item" takes at most this part of the list.
 constexpr int kItemShare = 3;
 /// An undefined symbol keeps a template from being used.
 constexpr auto kUndefinedLevel = static_cast<std::uint32_t>(ErrorLevel::Critical);
+
+/// A row of the list. Its icon and its tips are made when they are asked for: the list is filled often.
+class RowItem final : public QTreeWidgetItem {
+ public:
+  RowItem(const QString& item, const QString& message, Uid uid, std::uint32_t messageLevel)
+      : QTreeWidgetItem(QStringList{item, message}), level(messageLevel) {
+    setData(kItemColumn, kUidRole, NumberOf(uid));
+  }
+
+  QVariant data(int column, int role) const override {
+    if (role == Qt::ToolTipRole) return PlainTip(text(column));
+    if (role == Qt::DecorationRole && column == kItemColumn) return IconOfLevel(level);
+    if (role == Qt::AccessibleTextRole && column == kItemColumn)
+      return QString(WordOfLevel(level) + u' ' + text(column));
+    return QTreeWidgetItem::data(column, role);
+  }
+
+ private:
+  std::uint32_t level;
+};
 
 /// Each row is a link to its element, and looks like one under the pointer.
 class LinkRows final : public QStyledItemDelegate {
@@ -89,16 +108,6 @@ std::vector<CErrorList::Row> CErrorList::CollectRows(const TemplateCore& core) {
   return collected;
 }
 
-QTreeWidgetItem* CErrorList::MakeItem(const Row& row) {
-  auto* item = MakeChild<QTreeWidgetItem>(QStringList{row.item, row.message});
-  item->setData(kItemColumn, kUidRole, NumberOf(row.uid));
-  item->setIcon(kItemColumn, IconOfLevel(row.level));
-  item->setData(kItemColumn, Qt::AccessibleTextRole, WordOfLevel(row.level) + u' ' + row.item);
-  item->setToolTip(kItemColumn, PlainTip(row.item));
-  item->setToolTip(kMessageColumn, PlainTip(row.message));
-  return item;
-}
-
 std::unordered_map<Uid, ElementMessages> CErrorList::MessagesOfElements() const {
   std::unordered_map<Uid, ElementMessages> messages;
   for (const Row& row : rows) {
@@ -124,7 +133,7 @@ void CErrorList::RefreshErrorList(TemplateCore& core) {
   items.reserve(static_cast<qsizetype>(rows.size()));
   QTreeWidgetItem* reselected = nullptr;
   for (const Row& row : rows) {
-    QTreeWidgetItem* item = MakeItem(row);
+    auto* item = MakeChild<RowItem>(row.item, row.message, row.uid, row.level);
     items.append(item);
     const bool isSelected = selected != nullptr && row.item == selectedItem && row.message == selectedMessage;
     if (isSelected && reselected == nullptr) reselected = item;

@@ -55,7 +55,6 @@ class CErrorList final : public QTreeWidget {
   };
 
   static std::vector<Row> CollectRows(const TemplateCore& core);
-  static QTreeWidgetItem* MakeItem(const Row& row);
   void FitColumns();
 
   std::vector<Row> rows;
