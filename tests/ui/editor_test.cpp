@@ -124,6 +124,11 @@ TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
   for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
     if (!kinds.insert(CElementTree::DataOf(**item).kind).second) continue;
     editor.Tree().setCurrentItem(*item);
+    // One column, and two again.
+    for (const QSize size : {QSize(500, 400), kSmallScreen}) {
+      editor.View().resize(size);
+      QCoreApplication::processEvents();
+    }
     QCoreApplication::processEvents();
     editor.Tree().setFocus();
     for (const auto* field : editor.View().Form()->findChildren<CAutoRichEditCtrl*>()) {
