@@ -24,7 +24,7 @@ constexpr int kGridColumns = 4;
 constexpr int kRowSpacing = 4;
 /// Default, minimum and maximum.
 constexpr std::ptrdiff_t kNumbersInRow = 3;
-constexpr int kDigitsSeen = 8;
+constexpr int kDigitsSeen = 6;
 
 bool IsShort(FieldEditor editor) {
   switch (editor) {

@@ -20,7 +20,7 @@ namespace tessal {
 CAutoRichEditCtrl::CAutoRichEditCtrl(const CTessalDoc& shownDocument, QWidget* parent)
     : CPlainTextField(parent),
       source(shownDocument),
-      highlighter(MakeChild<CExpressionHighlighter>(shownDocument.Core(), this)) {
+      highlighter(MakeChild<CExpressionHighlighter>(shownDocument.Core(), document())) {
   viewport()->setMouseTracking(true);
   // The scan comes before the formatting of what has changed.
   connect(document(), &QTextDocument::contentsChange, this, &CAutoRichEditCtrl::FollowText);

@@ -127,6 +127,11 @@ TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
   for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
     if (!kinds.insert(CElementTree::DataOf(**item).kind).second) continue;
     editor.Tree().setCurrentItem(*item);
+    // One column, and two again.
+    for (const QSize size : {QSize(500, 400), kSmallScreen}) {
+      editor.View().resize(size);
+      QCoreApplication::processEvents();
+    }
     QCoreApplication::processEvents();
     editor.Tree().setFocus();
     for (const auto* field : editor.View().Form()->findChildren<CAutoRichEditCtrl*>()) {
@@ -276,21 +281,28 @@ TEST(AutoCreate, GivesTheTickedKindOnOkOnly) {
 }
 
 TEST(Questions, AreNotAnsweredByEscapeOrTheCloseButton) {
-  const std::map<QString, Answer> answers = {{"&Yes", Answer::Yes},
-                                             {"&No", Answer::No},
-                                             {"N&o to All", Answer::NoToAll},
-                                             {"Escape", Answer::Cancelled},
-                                             {"close", Answer::Cancelled}};
-  for (const auto& [action, answer] : answers) {
-    QTimer::singleShot(0, qApp, [&action] {
+  struct Row {
+    Answer (UserDialogs::*ask)(QWidget* parent, const QString& question);
+    QString action;
+    Answer answer;
+  };
+  const Row rows[] = {{&UserDialogs::Ask, "&Yes", Answer::Yes},
+                      {&UserDialogs::Ask, "&No", Answer::No},
+                      {&UserDialogs::Ask, "Escape", Answer::Cancelled},
+                      {&UserDialogs::Ask, "close", Answer::Cancelled},
+                      {&UserDialogs::AskOneOfMany, "N&o to All", Answer::NoToAll},
+                      {&UserDialogs::AskOneOfMany, "close", Answer::Cancelled}};
+  for (const Row& row : rows) {
+    QTimer::singleShot(0, qApp, [&row] {
       QWidget* box = QApplication::activeModalWidget();
-      for (QPushButton* button : box->findChildren<QPushButton*>()) {
-        if (button->text() == action) return button->click();
+      const auto buttons = box->findChildren<QPushButton*>();
+      for (QPushButton* button : buttons) {
+        if (button->text() == row.action) return button->click();
       }
-      if (action == "close") return static_cast<void>(box->close());
-      QTest::keyClick(box->findChild<QPushButton*>(), Qt::Key_Escape);
+      if (row.action == "close") return static_cast<void>(box->close());
+      QTest::keyClick(buttons.first(), Qt::Key_Escape);
     });
-    EXPECT_EQ(ScreenDialogs().AskOneOfMany(nullptr, "Really?"), answer) << action.toStdString();
+    EXPECT_EQ((ScreenDialogs().*row.ask)(nullptr, "Really?"), row.answer) << row.action.toStdString();
   }
 }
 
