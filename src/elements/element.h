@@ -223,6 +223,9 @@ class CEL_Element : public PropertyListener {
 class TableListener final : public PropertyListener {
  public:
   explicit TableListener(CEL_Element& listening) : element(listening) {}
+  TableListener(const TableListener&) = delete;
+  TableListener& operator=(const TableListener&) = delete;
+  virtual ~TableListener() = default;
   void OnPropertyChanged(CEL_Property& /*changed*/) override { element.RebuildOwner(); }
 
  private:
