@@ -167,7 +167,10 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
   keypad->setObjectName(QString::number(field.keypad));
-  keypad->setAccessibleName(strings::kExpressionEditor);
+  // In a form with several expressions each button has a name of its own.
+  const bool isOnly = field.keypad == control_id::kKeypad;
+  keypad->setAccessibleName(isOnly ? strings::kExpressionEditor
+                                   : strings::kExpressionEditor + u' ' + QString::fromLatin1(field.label));
   auto* foot = MakeChild<QHBoxLayout>();
   foot->addWidget(note, 1);
   foot->addWidget(keypad, 0, Qt::AlignTop);
