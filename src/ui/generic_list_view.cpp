@@ -9,6 +9,7 @@
 #include <cstdlib>
 
 #include "core/document.h"
+#include "ui/alt_keys.h"
 #include "ui/child.h"
 #include "ui/create_hint.h"
 #include "ui/folder_elements.h"
@@ -98,20 +99,21 @@ CGenericListView::CGenericListView(const FormContext& context, QWidget* parent)
 
 void CGenericListView::BuildFilter() {
   auto* row = MakeChild<QHBoxLayout>();
-  const auto addCombo = [this, row](int control, const QString& caption) {
+  const QStringList labels = WithAltKeys({strings::kVisibilityGroup, strings::kLevel, strings::kExpand});
+  const auto addCombo = [this, row](int control, const QString& caption, const QString& keyedCaption) {
     auto* combo = MakeChild<QComboBox>(this);
     combo->setObjectName(QString::number(control));
     combo->setAccessibleName(caption);
     combo->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
-    auto* label = MakeChild<QLabel>(caption, this);
+    auto* label = MakeChild<QLabel>(keyedCaption, this);
     label->setBuddy(combo);
     row->addWidget(label);
     row->addWidget(combo, 1);
     return combo;
   };
-  groups = addCombo(kGroupControl, strings::kVisibilityGroup);
-  levels = addCombo(kLevelControl, strings::kLevel);
-  expand = MakeChild<QCheckBox>(strings::kExpand, this);
+  groups = addCombo(kGroupControl, strings::kVisibilityGroup, labels[0]);
+  levels = addCombo(kLevelControl, strings::kLevel, labels[1]);
+  expand = MakeChild<QCheckBox>(labels[2], this);
   expand->setObjectName(QString::number(kExpandControl));
   expand->setAccessibleName(strings::kExpand);
   row->addWidget(expand);

@@ -58,7 +58,9 @@ void CListPage::BuildToolBar() {
     action->setShortcut(row.key);
     action->setShortcutContext(Qt::WidgetWithChildrenShortcut);
     addAction(action);
-    bar->widgetForAction(action)->setFocusPolicy(Qt::TabFocus);
+    QWidget* button = bar->widgetForAction(action);
+    button->setFocusPolicy(Qt::TabFocus);
+    button->setAccessibleName(row.text);
     connect(action, &QAction::triggered, this,
             [this, place] { Run(static_cast<Command>(place), table->CurrentRow()); });
   }

@@ -27,6 +27,7 @@ inline const QString kLevel = QStringLiteral("Level");
 inline const QString kExpand = QStringLiteral("expand");
 
 // The pages of the root.
+inline const QString kPages = QStringLiteral("Pages");
 inline const QString kGeneralPage = QStringLiteral("General");
 inline const QString kOverviewPage = QStringLiteral("Overview");
 inline const QString kEnableMisc = QStringLiteral("Enable miscellaneous features");
@@ -45,6 +46,7 @@ inline const QString kGroupName = QStringLiteral("Group Name:");
 inline const QString kGroupDescription = QStringLiteral("Description:");
 inline const QString kLevelName = QStringLiteral("Level name");
 inline const QString kAvailableItems = QStringLiteral("Available items");
+inline const QString kLevelDescription = QStringLiteral("Description of the level");
 inline const QString kIncludedItems = QStringLiteral("Include items");
 inline const QString kInclude = QStringLiteral("-->");
 inline const QString kExclude = QStringLiteral("<--");

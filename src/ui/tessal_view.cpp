@@ -1,5 +1,6 @@
 #include "ui/tessal_view.h"
 
+#include <QTabBar>
 #include <QTabWidget>
 #include <QVBoxLayout>
 
@@ -21,6 +22,8 @@ CTessalView::CTessalView(const FormContext& context, QWidget* parent)
   pages->setObjectName(QStringLiteral("1001"));
   general = MakeChild<CGeneralPpg>(context, pages);
   overview = MakeChild<COverviewPpg>(context, pages);
+  pages->setAccessibleName(strings::kPages);
+  pages->tabBar()->setAccessibleName(strings::kPages);
   pages->addTab(general, strings::kGeneralPage);
   pages->addTab(overview, strings::kOverviewPage);
   auto* layout = MakeChild<QVBoxLayout>(this);

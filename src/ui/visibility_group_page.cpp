@@ -10,6 +10,7 @@
 
 #include "core/document.h"
 #include "elements/property_io.h"
+#include "ui/alt_keys.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
 #include "ui/create_hint.h"
@@ -59,6 +60,17 @@ CVisibilityGroupDlg::CVisibilityGroupDlg(const FormContext& context, QWidget* pa
   BuildGroupFields();
   BuildLevels();
   BuildItems();
+  QStringList texts;
+  for (const QLabel* label : labels) texts.append(label->text());
+  texts = WithAltKeys(texts);
+  for (QLabel* label : labels) label->setText(texts.takeFirst());
+}
+
+QLabel* CVisibilityGroupDlg::AddLabel(const QString& text, QWidget* labelled) {
+  auto* label = MakeChild<QLabel>(text, this);
+  label->setBuddy(labelled);
+  labels.append(label);
+  return label;
 }
 
 QLineEdit* CVisibilityGroupDlg::AddLine(int control, const QString& label,
@@ -87,10 +99,8 @@ QPushButton* CVisibilityGroupDlg::AddButton(int control, const QString& text, co
 void CVisibilityGroupDlg::BuildGroupFields() {
   auto* grid = MakeChild<QGridLayout>();
   const auto addRow = [this, grid](const QString& label, QLineEdit* line) {
-    auto* caption = MakeChild<QLabel>(label, this);
-    caption->setBuddy(line);
     const int row = grid->rowCount();
-    grid->addWidget(caption, row, 0);
+    grid->addWidget(AddLabel(label, line), row, 0);
     grid->addWidget(line, row, 1);
   };
   name = AddLine(1133, strings::kGroupName, &CVisibilityGroupDlg::StoreGroup);
@@ -101,32 +111,28 @@ void CVisibilityGroupDlg::BuildGroupFields() {
 }
 
 void CVisibilityGroupDlg::BuildLevels() {
-  auto* caption = MakeChild<QLabel>(strings::kDefinedLevels, this);
   levels = MakeChild<CRowTable>(control_id::kList, strings::kDefinedLevels, this);
   levels->Model().AllowEditing(
       {kNameColumn, kDescriptionColumn},
       [this](int row, int column, const QString& text) { StoreLevelCell(row, column, text); });
-  caption->setBuddy(levels);
   levels->setItemDelegate(MakeChild<CellDelegate>(levels));
   connect(levels, &CRowTable::RowSelected, this, &CVisibilityGroupDlg::SelectLevel);
   deleteLevel =
       AddButton(1135, QStringLiteral("-"), strings::kDeleteLevel, &CVisibilityGroupDlg::DeleteLevel);
   QPushButton* add = AddButton(1136, QStringLiteral("+"), strings::kAddLevel, &CVisibilityGroupDlg::AddLevel);
   levelName = AddLine(1150, strings::kLevelName, &CVisibilityGroupDlg::StoreLevel);
-  levelDescription = AddLine(1151, strings::kDescriptionColumn, &CVisibilityGroupDlg::StoreLevel);
+  levelDescription = AddLine(1151, strings::kLevelDescription, &CVisibilityGroupDlg::StoreLevel);
 
   auto* grid = MakeChild<QGridLayout>();
   constexpr int kRowsOfLevels = 3;
-  grid->addWidget(caption, 0, 0);
+  grid->addWidget(AddLabel(strings::kDefinedLevels, levels), 0, 0);
   grid->addWidget(levels, 1, 0, kRowsOfLevels, 1);
   grid->addWidget(deleteLevel, 1, 1);
   grid->addWidget(add, 2, 1);
   grid->setRowStretch(kRowsOfLevels, 1);
   auto* fields = MakeChild<QHBoxLayout>();
   for (QLineEdit* line : {levelName, levelDescription}) {
-    auto* label = MakeChild<QLabel>(line->accessibleName(), this);
-    label->setBuddy(line);
-    fields->addWidget(label);
+    fields->addWidget(AddLabel(line == levelName ? strings::kLevelName : strings::kDescriptionColumn, line));
     fields->addWidget(line, 1);
   }
   layout->addLayout(grid, 1);
@@ -146,9 +152,8 @@ void CVisibilityGroupDlg::BuildItems() {
 
   auto* grid = MakeChild<QGridLayout>();
   const auto addTable = [this, grid](int column, int labelControl, CRowTable* table) {
-    auto* label = MakeChild<QLabel>(table->accessibleName(), this);
+    QLabel* label = AddLabel(table->accessibleName(), table);
     label->setObjectName(QString::number(labelControl));
-    label->setBuddy(table);
     grid->addWidget(label, 0, column);
     grid->addWidget(table, 1, column);
     grid->setColumnStretch(column, 1);

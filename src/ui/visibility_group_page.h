@@ -3,6 +3,7 @@
 
 #include "ui/right_pane.h"
 
+class QLabel;
 class QLineEdit;
 class QPushButton;
 class QVBoxLayout;
@@ -28,6 +29,7 @@ class CVisibilityGroupDlg final : public CRightPaneBase {
   void BuildLevels();
   void BuildItems();
   QLineEdit* AddLine(int control, const QString& label, void (CVisibilityGroupDlg::*store)());
+  QLabel* AddLabel(const QString& text, QWidget* labelled);
   QPushButton* AddButton(int control, const QString& text, const QString& name,
                          void (CVisibilityGroupDlg::*run)());
 
@@ -53,6 +55,7 @@ class CVisibilityGroupDlg final : public CRightPaneBase {
   void ExcludePicked();
 
   QVBoxLayout* layout;
+  QList<QLabel*> labels;
   QLineEdit* name = nullptr;
   QLineEdit* description = nullptr;
   CRowTable* levels = nullptr;

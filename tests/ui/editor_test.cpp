@@ -10,6 +10,7 @@
 #include <QSplitter>
 #include <QTest>
 #include <QTextBlock>
+#include <QTextLayout>
 #include <QTimer>
 #include <filesystem>
 #include <map>
@@ -154,7 +155,7 @@ TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
     for (const QLabel* label : editor.View().Form()->findChildren<QLabel*>()) {
       if (label->buddy() == nullptr) continue;
       EXPECT_TRUE(keys.insert(QKeySequence::mnemonic(label->text())).second) << label->text().toStdString();
-      EXPECT_EQ(QString(label->text()).remove(u'&'), label->buddy()->accessibleName());
+      EXPECT_TRUE(label->buddy()->accessibleName().startsWith(QString(label->text()).remove(u'&')));
     }
     for (qsizetype left = stops.size(); left > 0; --left)
       QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backtab, Qt::ShiftModifier);
@@ -192,8 +193,8 @@ TEST(Colours, AreStrongOnAnyGroundOnRequest) {
 /// The colours of all words that a field shows.
 std::set<QRgb> ColoursOf(const QTextEdit& field) {
   std::set<QRgb> colours;
-  for (auto part = field.document()->begin().begin(); !part.atEnd(); ++part)
-    colours.insert(part.fragment().charFormat().foreground().color().rgb());
+  for (const auto& part : field.document()->firstBlock().layout()->formats())
+    colours.insert(part.format.foreground().color().rgb());
   return colours;
 }
 

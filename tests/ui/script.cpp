@@ -14,6 +14,7 @@
 #include <QTextBlock>
 #include <QTimer>
 #include <QToolBar>
+#include <QToolButton>
 #include <algorithm>
 #include <set>
 
@@ -385,7 +386,8 @@ Script::State Script::Look() {
   for (const QString& row : editor->Rows()) state.lines.push_back("error " + row.toStdString());
   AppendTemplate(state.lines);
   for (const QWidget* field : editor->View().Form()->findChildren<QWidget*>()) {
-    if (field->accessibleName().isEmpty() || qobject_cast<const QPushButton*>(field)) continue;
+    const bool isButton = qobject_cast<const QPushButton*>(field) || qobject_cast<const QToolButton*>(field);
+    if (field->accessibleName().isEmpty() || isButton) continue;
     state.form.push_back("[" + field->accessibleName().toStdString() + "] " +
                          Editor::TextOf(*field).toStdString() + (field->isEnabled() ? "" : " (locked)"));
   }

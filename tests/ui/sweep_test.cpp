@@ -1,0 +1,125 @@
+// Every field of every form can be edited, and what was edited is what the file brings back.
+#include <gtest/gtest.h>
+
+#include <QCheckBox>
+#include <QTabWidget>
+#include <QTest>
+
+#include "core/error_registry.h"
+#include "support/case_file.h"
+#include "support/template_content.h"
+#include "support/template_text.h"
+#include "ui/editor.h"
+#include "ui/node_kinds.h"
+
+namespace tessal {
+namespace {
+
+using test::Editor;
+
+/// A node by its path of places, since an edit may change its caption.
+using Path = std::vector<int>;
+
+std::vector<Path> AllNodes(const QTreeWidgetItem& item, const Path& path = {}) {
+  std::vector<Path> nodes = {path};
+  for (int place = 0; place < item.childCount(); ++place) {
+    Path below = path;
+    below.push_back(place);
+    const auto further = AllNodes(*item.child(place), below);
+    nodes.insert(nodes.end(), further.begin(), further.end());
+  }
+  return nodes;
+}
+
+QTreeWidgetItem& NodeAt(Editor& editor, const Path& path) {
+  QTreeWidgetItem* item = editor.Tree().RootItem();
+  for (const int place : path) item = item->child(place);
+  return *item;
+}
+
+QString EditOf(const QString& control, const QString& text) {
+  // A symbol stays a symbol, a number a number, and an expression an expression.
+  if (control == QStringLiteral("1097")) return text + QStringLiteral("_n");
+  bool isNumber = false;
+  const double number = text.toDouble(&isNumber);
+  return isNumber ? QString::number(number + 1) : text + QStringLiteral(" + 1");
+}
+
+/// Edits a field as its user does, and leaves it; whether it could be edited.
+bool Edit(Editor& editor, QWidget& field) {
+  if (!field.isEnabled() || field.property("readOnly").toBool() || !field.isVisible()) return false;
+  if (auto* combo = qobject_cast<QComboBox*>(&field)) {
+    if (combo->count() < 2) return false;
+    const int entry = (combo->currentIndex() + 1) % combo->count();
+    combo->setCurrentIndex(entry);
+    emit combo->activated(entry);
+    return true;
+  }
+  const QString control = field.objectName();
+  const QString typed = EditOf(control, Editor::TextOf(field));
+  const QString label = field.accessibleName();
+  editor.Type(label, typed);
+  editor.View().OnCommit();
+  QWidget* shown = editor.View().Form()->findChild<QWidget*>(control);
+  if (shown != nullptr) EXPECT_EQ(Editor::TextOf(*shown), typed) << label.toStdString();
+  editor.LeaveField();
+  return true;
+}
+
+/// Edits every field of the form that is open; how many there were.
+int EditForm(Editor& editor) {
+  int edited = 0;
+  QStringList controls;
+  for (const QWidget* field : editor.View().Form()->findChildren<QWidget*>()) {
+    const bool isField = qobject_cast<const QLineEdit*>(field) || qobject_cast<const QComboBox*>(field) ||
+                         qobject_cast<const CPlainTextField*>(field);
+    bool isNumbered = false;
+    field->objectName().toInt(&isNumbered);
+    // The filter of the lists edits nothing.
+    const bool isFilter = field->objectName() == QStringLiteral("1147") || field->objectName() == "1148";
+    if (isField && isNumbered && !isFilter) controls.append(field->objectName());
+  }
+  for (const QString& control : controls) {
+    auto* field = editor.View().Form()->findChild<QWidget*>(control);
+    if (field != nullptr && Edit(editor, *field)) ++edited;
+  }
+  return edited;
+}
+
+std::string ContentOf(const std::string& path) {
+  TemplateCore core;
+  EXPECT_TRUE(core.LoadWrapper(path)) << Errors().JoinErrors();
+  return test::TemplateContent(core);
+}
+
+void Sweep(const std::string& name, const std::string& text) {
+  SCOPED_TRACE(name);
+  Editor editor(text);
+  editor.User().answers = QList<Answer>(1000, Answer::NoToAll);
+  int edited = 0;
+  for (const Path& path : AllNodes(*editor.Tree().RootItem())) {
+    editor.User().answers.prepend(Answer::Yes);
+    editor.Tree().setCurrentItem(&NodeAt(editor, path));
+    edited += EditForm(editor);
+    ASSERT_FALSE(testing::Test::HasFailure()) << NodeAt(editor, path).text(0).toStdString();
+  }
+  EXPECT_GT(edited, 100);
+  editor.View().OnCommit();
+  editor.User().answers = {Answer::Yes};
+  const std::string saved = editor.Path() + ".saved";
+  ASSERT_TRUE(editor.Document().OnSaveDocument(saved));
+  const std::string content = test::TemplateContent(editor.Core());
+  EXPECT_EQ(ContentOf(saved), content);
+}
+
+TEST(Sweep, EveryFieldOfEveryFormIsStoredAndComesBackFromTheFile) {
+  for (const std::string example :
+       {"eutrophication", "fasham", "faults", "fish_larvae", "lake_management", "streeter_phelps"}) {
+    Sweep(example, test::ReadFile(TESSAL_SOURCE_DIR "/examples/" + example + ".tessal"));
+  }
+  constexpr unsigned kSeed = 11;
+  Sweep("random " + std::to_string(kSeed), test::RandomTemplate(kSeed, 60));
+}
+
+}  // namespace
+}  // namespace tessal
