@@ -45,7 +45,7 @@ void FirstPaint(benchmark::State& state) {
     benchmark::DoNotOptimize(editor.view->grab().width());
   }
 }
-BENCHMARK(FirstPaint)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+BENCHMARK(FirstPaint)->Arg(500)->Arg(5'000)->Arg(10'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
 /// Selects an element and commits a changed field of its form over and over.
 void CommitIn(benchmark::State& state, Uid (*uidOf)(TemplateCore& core)) {
@@ -74,6 +74,37 @@ BENCHMARK_CAPTURE(CommitIn, process, MiddleProcess)
     ->Arg(50'000)
     ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(CommitIn, constant, FirstConstant)->Arg(5'000)->Unit(benchmark::kMillisecond);
+
+/// Selects one process and another: the commit of the form that is left, and the form that is opened and
+/// painted.
+void Selection(benchmark::State& state) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  const TemplateCore& core = editor.view->Document().Core();
+  std::size_t turn = core.GetProcessCount() / 2;
+  for ([[maybe_unused]] auto iteration : state) {
+    editor.view->SelectById(core.GetProcess(turn ^= 1U).GetUid());
+    QCoreApplication::processEvents();
+    benchmark::DoNotOptimize(editor.view->Form()->grab().width());
+  }
+}
+BENCHMARK(Selection)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// Selects the folder of many constants, and the root again; the time of the folder alone counts.
+void FolderSelection(benchmark::State& state) {
+  const ScratchFolder folder;
+  const OpenEditor editor(bench::FileOfConstants(folder, static_cast<int>(state.range(0))));
+  for ([[maybe_unused]] auto iteration : state) {
+    editor.view->SelectById(folder_id::kConstants);
+    QCoreApplication::processEvents();
+    benchmark::DoNotOptimize(editor.view->Form()->grab().width());
+    state.PauseTiming();
+    editor.view->SelectById(folder_id::kForcings);
+    QCoreApplication::processEvents();
+    state.ResumeTiming();
+  }
+}
+BENCHMARK(FolderSelection)->Arg(1'000)->Arg(10'000)->Arg(100'000)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

@@ -19,6 +19,13 @@ class TemplateWriter final {
         auxiliaries(elements * 25 / 100),
         processes(elements * 25 / 100) {}
 
+  /// Nothing but constants.
+  static TemplateWriter OfConstants(int count) {
+    TemplateWriter writer(0);
+    writer.constants = count;
+    return writer;
+  }
+
   std::string Text() {
     text = "// Tessal template\r\n\r\n[TESSAL_SETUP]\r\n";
     Head("A generated template");
@@ -124,11 +131,23 @@ ScratchFolder::~ScratchFolder() {
   std::filesystem::remove_all(path, ignored);
 }
 
-std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements) {
+namespace {
+
+std::string FileOf(const ScratchFolder& folder, const std::string& text) {
   const std::string path = folder.File("model.tessal");
-  const std::string failure = WriteWholeFile(path, TemplateWriter(static_cast<int>(elements)).Text());
+  const std::string failure = WriteWholeFile(path, text);
   if (!failure.empty()) throw std::runtime_error(failure);
   return path;
+}
+
+}  // namespace
+
+std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements) {
+  return FileOf(folder, TemplateWriter(static_cast<int>(elements)).Text());
+}
+
+std::string FileOfConstants(const ScratchFolder& folder, int count) {
+  return FileOf(folder, TemplateWriter::OfConstants(count).Text());
 }
 
 }  // namespace tessal::bench

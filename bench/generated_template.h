@@ -26,4 +26,7 @@ class ScratchFolder final {
 /// each.
 std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements);
 
+/// The same of a template that has constants alone.
+std::string FileOfConstants(const ScratchFolder& folder, int count);
+
 }  // namespace tessal::bench

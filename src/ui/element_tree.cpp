@@ -26,6 +26,15 @@ constexpr int kIndent = 14;
 constexpr int kCountRole = Qt::UserRole;
 constexpr int kLevelRole = Qt::UserRole + 1;
 
+/// Between the text and its ground, and nearer to the text.
+QColor Greyed(const QPalette& palette) {
+  const QColor text = palette.color(QPalette::Text);
+  const QColor ground = palette.color(QPalette::Base);
+  const auto mixed = [](int near, int far) { return (3 * near + 2 * far) / 5; };
+  return {mixed(text.red(), ground.red()), mixed(text.green(), ground.green()),
+          mixed(text.blue(), ground.blue())};
+}
+
 /// A node with its data. What is drawn beside the caption is computed when it is asked for.
 class ElementItem final : public QTreeWidgetItem {
  public:
@@ -35,6 +44,8 @@ class ElementItem final : public QTreeWidgetItem {
         return IconOfKind(node.kind);
       case Qt::ToolTipRole:
         return messages.count == 0 ? QVariant() : PlainTip(MessageText());
+      case Qt::AccessibleTextRole:
+        return ShownText();
       case Qt::AccessibleDescriptionRole:
         return messages.count == 0 ? QVariant() : MessageText();
       case kCountRole:
@@ -46,8 +57,11 @@ class ElementItem final : public QTreeWidgetItem {
     }
   }
 
+  QString ShownText() const { return text(0).isEmpty() ? standIn : text(0); }
+
   CItemData node;
   ElementMessages messages;
+  QString standIn;  ///< shown greyed while the caption is empty
 
  private:
   /// A collection. The folder of the particle classes has the kind of its elements.
@@ -58,7 +72,7 @@ class ElementItem final : public QTreeWidgetItem {
            node.id == folder_id::kVisibilityGroups;
   }
 
-  QString MessageText() const { return strings::kHasMessages.arg(text(0)).arg(messages.count); }
+  QString MessageText() const { return strings::kHasMessages.arg(ShownText()).arg(messages.count); }
 };
 
 /// Draws the number of its elements after the caption of a folder, and a dot at an element with messages.
@@ -79,6 +93,14 @@ class NodeDelegate final : public QStyledItemDelegate {
     if (count.isValid()) DrawCount(*painter, shown, caption, count.toInt());
   }
 
+ protected:
+  void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override {
+    QStyledItemDelegate::initStyleOption(option, index);
+    if (!option->text.isEmpty()) return;
+    option->text = index.data(Qt::AccessibleTextRole).toString();
+    option->palette.setColor(QPalette::Text, Greyed(option->palette));
+  }
+
  private:
   static void DrawDot(QPainter& painter, const QRect& icon, std::uint32_t level) {
     const int size = icon.height() / 2;
@@ -89,15 +111,6 @@ class NodeDelegate final : public QStyledItemDelegate {
     painter.setBrush(ColourOfLevel(level));
     painter.drawEllipse(dot);
     painter.restore();
-  }
-
-  /// Between the text and its ground, and nearer to the text.
-  static QColor Greyed(const QPalette& palette) {
-    const QColor text = palette.color(QPalette::Text);
-    const QColor ground = palette.color(QPalette::Base);
-    const auto mixed = [](int near, int far) { return (3 * near + 2 * far) / 5; };
-    return {mixed(text.red(), ground.red()), mixed(text.green(), ground.green()),
-            mixed(text.blue(), ground.blue())};
   }
 
   static void DrawCount(QPainter& painter, const QStyleOptionViewItem& shown, const QRect& caption,
@@ -129,6 +142,16 @@ CItemData& CElementTree::DataOf(QTreeWidgetItem& item) {
   return static_cast<ElementItem&>(item).node;
 }
 
+QString CElementTree::ShownText(const QTreeWidgetItem& item) {
+  return static_cast<const ElementItem&>(item).ShownText();
+}
+
+QTreeWidgetItem* CElementTree::MakeElement(const CEL_Element& element) {
+  QTreeWidgetItem* item = Make(element.Kind(), element.GetUid(), ElementCaption(element));
+  static_cast<ElementItem*>(item)->standIn = ToScreen(element.symbol.Text());
+  return item;
+}
+
 QTreeWidgetItem* CElementTree::Make(ElementKind kind, Uid id, const std::string& caption) {
   auto* item = MakeChild<ElementItem>();
   item->node.kind = kind;
@@ -155,8 +178,7 @@ void CElementTree::InsertAll(QTreeWidgetItem& folder, const Elements& elements) 
   // All at once: a tree that is shown does some work for each insertion.
   QList<QTreeWidgetItem*> made;
   made.reserve(static_cast<qsizetype>(elements.size()));
-  for (const auto& element : elements)
-    made.append(Make(element->Kind(), element->GetUid(), ElementCaption(*element)));
+  for (const auto& element : elements) made.append(MakeElement(*element));
   folder.addChildren(made);
 }
 
@@ -186,7 +208,9 @@ QTreeWidgetItem* CElementTree::FindById(Uid id) const {
 }
 
 QTreeWidgetItem* CElementTree::InsertElement(QTreeWidgetItem& folder, const CEL_Element& element, int place) {
-  return Insert(folder, place, element.Kind(), element.GetUid(), ElementCaption(element));
+  QTreeWidgetItem* item = MakeElement(element);
+  folder.insertChild(std::min(place, folder.childCount()), item);
+  return item;
 }
 
 QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_Lagrange_Specie& specie) {
@@ -196,7 +220,7 @@ QTreeWidgetItem* CElementTree::InsertSpecie(QTreeWidgetItem& folder, const CEL_L
 }
 
 QTreeWidgetItem* CElementTree::MakeSpecie(const CEL_Lagrange_Specie& specie) {
-  QTreeWidgetItem* branch = Make(specie.Kind(), specie.GetUid(), ElementCaption(specie));
+  QTreeWidgetItem* branch = MakeElement(specie);
   const auto addList = [this, branch, &specie](ElementKind listKind) {
     return InsertElement(*branch, specie.Head(listKind), branch->childCount());
   };

@@ -26,6 +26,8 @@ class CElementTree final : public QTreeWidget {
   void Build(TemplateCore& core);
 
   static CItemData& DataOf(QTreeWidgetItem& item);
+  /// What a node shows: its caption, and an element without one its symbol.
+  static QString ShownText(const QTreeWidgetItem& item);
 
   /// The first node with this id in the order of the tree; none when there is none. Needs no walk.
   QTreeWidgetItem* FindById(Uid id) const;
@@ -54,6 +56,7 @@ class CElementTree final : public QTreeWidget {
  private:
   /// A node that is in no tree yet, to be found by its id from now on.
   QTreeWidgetItem* Make(ElementKind kind, Uid id, const std::string& caption);
+  QTreeWidgetItem* MakeElement(const CEL_Element& element);
   void ForgetBranch(QTreeWidgetItem& item);
   QTreeWidgetItem* Insert(QTreeWidgetItem& parent, int place, ElementKind kind, Uid id,
                           const std::string& caption);

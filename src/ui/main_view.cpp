@@ -243,7 +243,7 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
   ReplaceForm(current);
   if (current != nullptr) {
     const CItemData& node = CElementTree::DataOf(*current);
-    history.Add(node.id, current->text(0).toStdString());
+    history.Add(node.id, CElementTree::ShownText(*current).toStdString());
     helpNumber = NodeRowOf(node).help;
   }
   UpdateNavigation();
@@ -292,9 +292,9 @@ void CMainView::RefreshCaption(QTreeWidgetItem* item) {
   const bool isFolder = node.kind >= ElementKind::Root;
   if (element != nullptr && !isFolder) {
     const QString caption = ToScreen(MarkedCaption(*element));
-    if (!caption.isEmpty()) item->setText(0, caption);
+    item->setText(0, caption);
   }
-  title->setText(item->text(0));
+  title->setText(CElementTree::ShownText(*item));
 }
 
 void CMainView::ShowHelp() {

@@ -8,6 +8,7 @@
 #include <QContextMenuEvent>
 #include <QDirIterator>
 #include <QFileInfo>
+#include <QLabel>
 #include <QMenu>
 #include <QPushButton>
 #include <QTest>
@@ -318,6 +319,11 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"save", Save},
     {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},
     {"clipboard", Clipboard},
+    {"title",
+     [](Editor& editor, auto& /*words*/) {
+       return editor.View().findChild<QLabel*>(QStringLiteral("1125"))->text().toStdString() + "; " +
+              CElementTree::ShownText(*editor.Tree().currentItem()).toStdString() + "\n";
+     }},
 };
 
 /// The lines that went, then those that came.
