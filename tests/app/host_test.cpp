@@ -142,6 +142,8 @@ class HostScript final {
     QWidget* shown = window.Current()->Widget();
     auto* tree = shown->findChild<QTreeWidget*>("1127");
     tree->setCurrentItem(tree->findItems("k", Qt::MatchExactly | Qt::MatchRecursive).at(0));
+    // The form that was left waits for the event loop to delete it.
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     auto* field = shown->findChild<QWidget*>("1083");
     field->setFocus();
     QTest::keyClicks(field, text);
