@@ -49,7 +49,7 @@ QString CGeneralPpg::DocumentationFolder() const {
 }
 
 void CGeneralPpg::ShowBranch(const char* state, int hintNumber, bool on) {
-  Item().viewState[state] = on ? "1" : "0";
+  Item().viewState[state] = std::string(1, on ? '1' : '0');
   const NumberHint argument(on ? 1 : 0);
   Document().UpdateAllViews(nullptr, hintNumber, &argument);
 }

@@ -28,6 +28,7 @@
 #include "app/editor_module.h"
 #include "app/host_window.h"
 #include "app/open_document.h"
+#include "app/start_page.h"
 #include "app/recent_files.h"
 #include "platform/docview.h"
 #include "support/case_file.h"
@@ -193,7 +194,7 @@ class HostScript final {
   /// What the page without a document offers; one of it is pressed, if it is named.
   bool UseStartPage(const QString& name) {
     QCoreApplication::processEvents();
-    for (auto* link : window.centralWidget()->findChildren<QAbstractButton*>()) {
+    for (auto* link : window.findChild<StartPage*>()->findChildren<QAbstractButton*>()) {
       const QString text = link->accessibleName();
       if (!link->isVisible() || text.isEmpty()) continue;
       if (name.isEmpty()) boxes.texts.append(text);
