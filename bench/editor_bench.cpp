@@ -47,6 +47,22 @@ void FirstPaint(benchmark::State& state) {
 }
 BENCHMARK(FirstPaint)->Arg(500)->Arg(5'000)->Arg(10'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
+/// The same of a template that is loaded already: the view is made, filled and painted.
+void PaintLoaded(benchmark::State& state) {
+  const ScratchFolder folder;
+  CTessalDoc document(ScreenDialogs());
+  if (!document.OnOpenDocument(FileOfSize(folder, state.range(0)))) throw std::runtime_error("no template");
+  for ([[maybe_unused]] auto iteration : state) {
+    CMainView view(document, ScreenDialogs());
+    document.AddView(view);
+    view.OnInitialUpdate();
+    view.resize(kScreen);
+    view.show();
+    benchmark::DoNotOptimize(view.grab().width());
+  }
+}
+BENCHMARK(PaintLoaded)->Arg(1'000)->Arg(10'000)->Arg(100'000)->Unit(benchmark::kMillisecond);
+
 /// Selects an element and commits a changed field of its form over and over.
 void CommitIn(benchmark::State& state, Uid (*uidOf)(TemplateCore& core)) {
   const ScratchFolder folder;

@@ -79,7 +79,6 @@ void CMainView::OnInitialUpdate() {
           [this] { tree->ShowMessages(errorList->MessagesOfElements()); });
   connect(errorList, &CErrorList::CreateSymbolRequested, this, &CMainView::CreateSymbol);
   tree->Build(Core());
-  errorList->RefreshErrorList(Core());
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
   connect(tree, &QTreeWidget::customContextMenuRequested, this, &CMainView::OpenContextMenu);
   connect(errorList, &CErrorList::ElementChosen, this, &CMainView::SelectById);
@@ -88,6 +87,7 @@ void CMainView::OnInitialUpdate() {
   help->setShortcutContext(Qt::WidgetWithChildrenShortcut);
   connect(help, &QAction::triggered, this, &CMainView::ShowHelp);
   addAction(help);
+  // The first selection fills the list of messages too.
   tree->setCurrentItem(tree->RootItem());
   // A host that gives the view the focus gives it to the tree.
   setFocusProxy(tree);
