@@ -99,8 +99,12 @@ void CElementForm::SplitExpressions() {
   split = MakeChild<QSplitter>(Qt::Vertical, this);
   split->setObjectName(QStringLiteral("Split"));
   split->setChildrenCollapsible(false);
+  int widest = 0;
+  for (const Control& control : controls) widest = std::max(widest, control.label->sizeHint().width());
   for (Control& control : controls) {
     if (!isExpression(control)) continue;
+    // The halves are laid out by themselves; their fields begin side by side.
+    control.label->setMinimumWidth(widest);
     // A splitter takes a child in as soon as it has it as its parent.
     const bool isFirst = split->count() == 0;
     auto* panel = MakeChild<QWidget>(split);

@@ -7,6 +7,7 @@
 #include <QScreen>
 #include <QScrollArea>
 #include <QSplitter>
+#include <QTimer>
 #include <QToolBar>
 #include <QToolButton>
 #include <QVBoxLayout>
@@ -247,6 +248,12 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
     helpNumber = NodeRowOf(node).help;
   }
   UpdateNavigation();
+  // A click selects the row under the pointer, where a node that the commit has made may lie by then.
+  QTimer::singleShot(0, this, [this] {
+    QTreeWidgetItem* item = tree->currentItem();
+    if (item != nullptr && !item->isSelected())
+      tree->setCurrentItem(item, 0, QItemSelectionModel::ClearAndSelect);
+  });
 }
 
 void CMainView::CloseForm() {

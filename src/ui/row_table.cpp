@@ -101,8 +101,9 @@ void CRowTable::SizeColumns() {
   const int limit = kWidestColumn * fontMetrics().averageCharWidth();
   for (int column = 0; column < rows->columnCount(); ++column) {
     int content = WidthOfLongest(column) + kCellMargin;
-    if (rows->index(0, column).data(Qt::DecorationRole).isValid())
-      content += iconSize().width() + kCellMargin / 2;
+    if (rows->index(0, column).data(Qt::DecorationRole).isValid()) {
+      content += style()->pixelMetric(QStyle::PM_SmallIconSize) + kCellMargin / 2;
+    }
     setColumnWidth(column, std::max(header()->sectionSizeHint(column), std::min(content, limit)));
   }
 }

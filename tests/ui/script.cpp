@@ -286,6 +286,12 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        Hint(editor, hint::kRenameGroup, RenameGroupHint(words.Number(), words.second.toStdString()));
      }},
     {"use-menu", [](Editor& editor, auto& words) { editor.UseMenu(words.first, words.second); }},
+    {"click-node",
+     [](Editor& editor, auto& words) {
+       const QPoint point = editor.Tree().visualItemRect(editor.Node(words.first)).center();
+       QTest::mouseClick(editor.Tree().viewport(), Qt::LeftButton, {}, point);
+       QCoreApplication::processEvents();
+     }},
     {"click-error", ClickError},
     {"enter-error", EnterError},
     {"follow-error",
@@ -319,6 +325,12 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"save", Save},
     {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},
     {"clipboard", Clipboard},
+    {"selection",
+     [](Editor& editor, auto& /*words*/) {
+       QStringList captions;
+       for (const QTreeWidgetItem* item : editor.Tree().selectedItems()) captions.append(item->text(0));
+       return Lines(captions);
+     }},
     {"title",
      [](Editor& editor, auto& /*words*/) {
        return editor.View().findChild<QLabel*>(QStringLiteral("1125"))->text().toStdString() + "; " +
