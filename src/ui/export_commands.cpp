@@ -79,6 +79,7 @@ void Run(const Export& what, CTessalDoc& document, UserDialogs& dialogs, QWidget
 
 std::vector<ViewCommand> ExportCommands(CTessalDoc& document, UserDialogs& dialogs, QWidget& view) {
   std::vector<ViewCommand> commands;
+  commands.reserve(kExports.size());
   for (const Export& what : kExports) {
     commands.push_back(
         {"&File", what.command, [&what, &document, &dialogs, &view] { Run(what, document, dialogs, view); }});

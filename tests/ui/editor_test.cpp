@@ -118,8 +118,9 @@ TEST(Forms, ShareTheirHeightBetweenExpressionsAndBoxTheirCounts) {
   EXPECT_EQ(count->text(), "1");
 }
 
-TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
-  Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/fish_larvae.tessal"));
+/// One form of each kind of node of an example.
+void WalkForms(const std::string& example) {
+  Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/" + example + ".tessal"));
   editor.User().answers = {Answer::NoToAll};
   // What a window of 800 by 600 leaves under its menus.
   constexpr QSize kSmallScreen(800, 525);
@@ -161,6 +162,11 @@ TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
       QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backtab, Qt::ShiftModifier);
     EXPECT_TRUE(editor.Tree().hasFocus()) << (*item)->text(0).toStdString();
   }
+}
+
+TEST(Forms, AreWalkedWithTabUpToTheMessagesAndHaveAKeyForEachField) {
+  WalkForms("fish_larvae");
+  WalkForms("lake_management");
 }
 
 TEST(Colours, StayReadableOnADarkGround) {
