@@ -54,6 +54,18 @@ COverviewPpg::COverviewPpg(const FormContext& context, QWidget* parent)
 }
 
 void COverviewPpg::ItemToForm() {
+  isFilled = false;
+  if (isVisible()) Fill();
+}
+
+void COverviewPpg::showEvent(QShowEvent* seen) {
+  CRightPaneBase::showEvent(seen);
+  // Most visits to the root look at its other page.
+  if (!isFilled) Fill();
+}
+
+void COverviewPpg::Fill() {
+  isFilled = true;
   shown = BuildOverview(Core());
   std::vector<CRowModel::Row> rows(shown.size());
   for (std::size_t place = 0; place < rows.size(); ++place) {

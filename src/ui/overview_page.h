@@ -1,4 +1,4 @@
-// The table of all elements of a template, as it was when the page was filled: a row leads to its element,
+// The table of all elements of a template, as it was when the page was first seen: a row leads to its element,
 // and the whole goes to the clipboard as text.
 #pragma once
 
@@ -19,8 +19,10 @@ class COverviewPpg final : public CRightPaneBase {
 
  protected:
   void ItemToForm() override;
+  void showEvent(QShowEvent* seen) override;
 
  private:
+  void Fill();
   void CopyToClipboard();
   /// Writes the documentation page beside the template, after a question. A failure is shown before the
   /// closing message, which reads the same whatever came of it.
@@ -28,6 +30,7 @@ class COverviewPpg final : public CRightPaneBase {
 
   CRowTable* table;
   std::vector<OverviewRow> shown;
+  bool isFilled = false;
 };
 
 }  // namespace tessal

@@ -4,6 +4,7 @@
 
 #include <QComboBox>
 #include <QPushButton>
+#include <QTabWidget>
 #include <iterator>
 #include <map>
 
@@ -91,6 +92,8 @@ TEST(Examples, ShowTheirNodesAndFormsAndAreNotChangedByALook) {
     forms += "== " + name + "\n";
     for (QTreeWidgetItemIterator item(&editor.Tree()); *item != nullptr; ++item) {
       editor.Tree().setCurrentItem(*item);
+      // The overview is filled when it is seen.
+      for (auto* pages : editor.View().Form()->findChildren<QTabWidget*>()) pages->setCurrentIndex(1);
       for (QWidget* field : editor.View().Form()->findChildren<QWidget*>()) field->setFocus();
       const CItemData& data = CElementTree::DataOf(**item);
       nodes += NodeText(editor, **item, data);
