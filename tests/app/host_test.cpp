@@ -181,9 +181,10 @@ class HostScript final {
       if (menu->text().remove(u'&') != title || !menu->isVisible()) continue;
       for (QAction* action : menu->menu()->actions()) {
         const QString text = action->text().remove(u'&');
-        if (entry.isEmpty() && !text.isEmpty())
+        if (entry.isEmpty() && !text.isEmpty()) {
           boxes.texts.append((action->isChecked() ? "x " : "  ") + text +
                              (action->isEnabled() ? "" : " (grey)"));
+        }
         if (!entry.isEmpty() && text == entry) return action->trigger(), true;
       }
       return entry.isEmpty();
