@@ -12,7 +12,8 @@ QStringList RecentFiles();
 /// Puts a file at the head of the list.
 void AddRecentFile(const QString& path);
 void ClearRecentFiles();
-/// How lists name one of the files: its plain name, and the folder that tells it from others of that name.
+/// How lists name one of the files: its plain name, and the folder, which sets it apart from others of that
+/// name.
 QString RecentFileCaption(const QString& path);
 
 }  // namespace tessal

@@ -1,4 +1,4 @@
-// Texts of a template as tips: plain, whatever stands in them, and wrapped at a width that can be read.
+// Texts of a template as tips: plain, whatever they hold, and wrapped at a width that can be read.
 #pragma once
 
 #include <QString>
