@@ -354,13 +354,13 @@ Uid CMainView::CreateElement(const CreateRequest& request) {
     document.UpdateAllViews(nullptr, hint::kSelectGroup, &last);
     return Uid::None;
   }
-  const CreatedElement created = Core().CreateElement(request);
-  if (created.uid != Uid::None) InsertCreated(request, created);
-  return created.uid;
+  const Uid created = Core().CreateElement(request).uid;
+  if (created != Uid::None) InsertCreated(request, created);
+  return created;
 }
 
-void CMainView::InsertCreated(const CreateRequest& request, const CreatedElement& created) {
-  const CEL_Element* element = Core().GetElement(created.uid);
+void CMainView::InsertCreated(const CreateRequest& request, Uid created) {
+  const CEL_Element* element = Core().GetElement(created);
   if (request.kind == ElementKind::Specie) tree->ShowParticles(Core());
   QTreeWidgetItem* folder = FolderFor(request);
   if (element == nullptr || folder == nullptr) return;

@@ -95,7 +95,7 @@ class CMainView final : public QWidget, public CView {
   void DeleteNode(QTreeWidgetItem& item);
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;
-  void InsertCreated(const CreateRequest& request, const CreatedElement& created);
+  void InsertCreated(const CreateRequest& request, Uid created);
   int PlaceOf(const CEL_Element& element, QTreeWidgetItem& folder) const;
 
   CTessalDoc& document;

@@ -49,7 +49,6 @@ class CRightPaneBase : public QWidget {
   virtual void ItemToForm() {}
   virtual void FormToItem() {}
 
-  const FormContext& Context() const { return where; }
   CTessalDoc& Document() const { return where.document; }
   TemplateCore& Core() const;
   UserDialogs& Dialogs() const { return where.dialogs; }
