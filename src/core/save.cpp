@@ -1,8 +1,8 @@
-// Saving a template: written through the key-file library into a temporary file beside the target, joined
-// with the top-level sections that only the kept tree knows, and put in the target's place in one step.
-#include <cstdio>
+// Saving a template: its text is written through the key-file library, joined with the top-level sections
+// that only the kept tree knows, and put in the target's place in one step.
 #include <exception>
 #include <locale>
+#include <optional>
 #include <sstream>
 
 #include "core/error_registry.h"
@@ -101,10 +101,13 @@ class Writing final {
   /// Under a new name: with fresh version stamps and a restarted revision.
   bool SaveAs(const std::string& path);
   bool SaveInPlace(const std::string& path);
+  /// Everything that goes into the file; nothing, with the reason, when the format cannot hold it. Raises
+  /// the revision.
+  std::optional<std::string> FileText(std::string& reason);
+  /// The same, with all but the record numbers left as it was.
+  std::optional<std::string> CopyText(std::string& reason);
 
  private:
-  /// Writes everything into the place of the file; the empty text, or the reason of a failure.
-  std::string WriteThrough(const std::string& path);
   bool WriteSections(KvfHandle file);
   std::string KeptSectionsText() const;
 
@@ -138,7 +141,8 @@ bool Writing::SaveInPlace(const std::string& path) {
   const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
   std::string reason;
   try {
-    reason = WriteThrough(path);
+    const std::optional<std::string> text = FileText(reason);
+    if (text) reason = ReplaceFile(path, *text);
   } catch (const std::exception& failure) {
     reason = failure.what();
   }
@@ -155,20 +159,27 @@ bool Writing::SaveInPlace(const std::string& path) {
   return true;
 }
 
-std::string Writing::WriteThrough(const std::string& path) {
-  const std::string temporary = path + "$";
-  std::string text;
-  {
-    const Image image;
-    if (!WriteSections(image.Handle())) return "the template holds what the file format can not";
-    if (kvfWrite(image.Handle(), temporary) != kKvfOk) return kvfGetWriteFailure();
-    // Not read back from the temporary file: another save of the same template may be writing it by now.
-    text = kvfGetText(image.Handle());
+std::optional<std::string> Writing::FileText(std::string& reason) {
+  const Image image;
+  if (!WriteSections(image.Handle())) {
+    reason = "the template holds what the file format can not";
+    return std::nullopt;
   }
-  std::string reason = ReplaceFile(path, WithTypeLine(text + KeptSectionsText()));
-  const std::string removal = RemoveFile(temporary);
-  if (!removal.empty()) std::fprintf(stderr, "could not delete temporary file %s\n", temporary.c_str());
-  return reason;
+  return WithTypeLine(kvfGetText(image.Handle()) + KeptSectionsText());
+}
+
+std::optional<std::string> Writing::CopyText(std::string& reason) {
+  const bool formerlyModified = state.flags.modified;
+  const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
+  std::optional<std::string> text;
+  try {
+    text = FileText(reason);
+  } catch (const std::exception& failure) {
+    reason = failure.what();
+  }
+  state.misc.documentRevision.SetInt(formerRevision);
+  state.flags.modified = formerlyModified;
+  return text;
 }
 
 std::string Writing::KeptSectionsText() const {
@@ -216,6 +227,10 @@ bool Writing::WriteSections(KvfHandle file) {
 bool TemplateCore::SaveWrapper(const std::string& path) {
   Writing writing(state);
   return path == state.saveFileName ? writing.SaveInPlace(path) : writing.SaveAs(path);
+}
+
+std::optional<std::string> TemplateCore::CopyText(std::string& reason) {
+  return Writing(state).CopyText(reason);
 }
 
 }  // namespace tessal

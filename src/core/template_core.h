@@ -210,6 +210,9 @@ class TemplateCore final : public ElementOwner {
   /// Saves: under its own name plainly, under another with fresh version stamps and a restarted revision.
   /// False when it failed; the registry then holds the reason, and the file on disk is as it was.
   bool SaveWrapper(const std::string& path);
+  /// The text that a plain save would write, but for the revision, which stays. Nothing, with the reason,
+  /// when the format cannot hold the template; the registry then names the elements.
+  std::optional<std::string> CopyText(std::string& reason);
 
  private:
   template <class Element>

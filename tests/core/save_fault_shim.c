@@ -32,12 +32,14 @@ int open(const char* path, int flags, ...) {
   va_start(arguments, flags);
   const mode_t mode = (flags & O_CREAT) != 0 ? va_arg(arguments, mode_t) : 0;
   va_end(arguments);
-  if ((flags & O_CREAT) != 0 && path[strlen(path) - 1] == '$') counting = 1;
   if (strikes()) return -1;
   return NEXT(open)(path, flags, mode);
 }
 
-int mkostemp(char* pattern, int flags) { return strikes() ? -1 : NEXT(mkostemp)(pattern, flags); }
+int mkostemp(char* pattern, int flags) {
+  counting = 1;
+  return strikes() ? -1 : NEXT(mkostemp)(pattern, flags);
+}
 
 ssize_t write(int descriptor, const void* bytes, size_t count) {
   if (descriptor > 2 && strikes()) {
