@@ -37,6 +37,7 @@ class TemplateScript final {
   CEL_Lagrange_Specie* ClassIn(const Words& words, std::size_t place);
 
   std::string Load(const std::string& path);
+  std::string Account() const;
   std::string Save(const std::string& name);
   std::string File(const std::string& name) const;
   std::string EditFile(const std::string& part, const std::string& by);
