@@ -365,7 +365,7 @@ bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, 
   const std::time_t now = std::time(nullptr);
   std::tm local = {};
   localtime_r(&now, &local);
-  failure = WriteWholeFile(path, HtmlDocumentation(core, embedMathJax, local));
+  failure = WriteOutputFile(path, HtmlDocumentation(core, embedMathJax, local));
   return failure.empty();
 }
 
