@@ -267,7 +267,7 @@ int RunTool(int count, char** arguments) {
   const ExitCode exitCode = line.run();
   // The option file and its log fail no command, but nobody should compute with other settings than those
   // meant.
-  if (!CarbonateProblem().empty()) Complain(CarbonateProblem());
+  if (!CarbonateProblem().empty()) Complain(OnOneLine(CarbonateProblem()));
   return FlushOutput() ? exitCode : kCallFault;
 }
 
