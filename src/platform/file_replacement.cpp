@@ -61,20 +61,18 @@ bool TakeOwner(int descriptor, const struct stat& old, const struct stat& fresh)
   return fchown(descriptor, kSameOwner, old.st_gid) == 0 || IsForOthersToDecide(errno);
 }
 
-/// Gives the new file the owner and the permissions of the one at the target. Where nothing or only a link is
-/// there, it gets the usual permissions.
+/// Gives the new file the owner and the permissions of the one at the target, or the usual permissions.
 bool TakeAttributes(int descriptor, const std::string& target) {
   constexpr mode_t kPermissionBits = 07777;
   struct stat old = {};
   struct stat fresh = {};
   if (fstat(descriptor, &fresh) != 0) return false;
   mode_t mode = 0;
-  const bool isThere = lstat(target.c_str(), &old) == 0;
-  if (!isThere && errno != ENOENT) return false;
-  if (isThere && !S_ISLNK(old.st_mode)) {
+  if (lstat(target.c_str(), &old) == 0) {
     if (!TakeOwner(descriptor, old, fresh)) return false;
     mode = old.st_mode & kPermissionBits;
   } else {
+    if (errno != ENOENT) return false;
     mode = UsualMode();
   }
   return mode == (fresh.st_mode & kPermissionBits) || fchmod(descriptor, mode) == 0 ||
@@ -128,13 +126,14 @@ std::string ProtectionOfAllNames(const std::string& target) {
   return Protection(target, old);
 }
 
-/// The same for what is only of the name: a link may be replaced, and keeps what it leads to.
+/// The same for a file that others may have put there: what it leads to, or shares, is not touched.
 std::string ProtectionOfName(const std::string& target) {
   struct stat old = {};
   if (lstat(target.c_str(), &old) != 0) {
     return errno == ENOENT ? std::string() : Reason("can not write file", target, errno);
   }
-  return S_ISLNK(old.st_mode) ? std::string() : Protection(target, old);
+  return S_ISLNK(old.st_mode) ? "can not replace '" + target + "': it is a symbolic link"
+                              : Protection(target, old);
 }
 
 /// Writes the content into the new file and lets it take the target's place. The empty text, or what failed.
@@ -154,6 +153,13 @@ std::string PutInPlace(const std::filesystem::path& target, const std::string& s
   if (!failed.empty()) return Reason(failed, shown, errno);
   return FlushFolder(target.parent_path()) ? std::string()
                                            : Reason("can not flush the folder of file", shown, errno);
+}
+
+std::string WriteStream(const std::string& path, std::string_view content) {
+  Descriptor stream(open(path.c_str(), O_WRONLY | O_NOCTTY | O_CLOEXEC));
+  if (!stream.IsOpen()) return Reason("can not write file", path, errno);
+  const std::string_view failed = WriteAndClose(stream, content);
+  return failed.empty() ? std::string() : Reason(failed, path, errno);
 }
 
 }  // namespace
@@ -206,7 +212,14 @@ std::string ReplaceFile(const std::string& target, std::string_view content) {
   return reason.empty() ? PutInPlace(*real, target, content) : reason;
 }
 
+bool IsStream(const std::string& path) {
+  struct stat status = {};
+  if (stat(path.c_str(), &status) != 0) return false;
+  return S_ISCHR(status.st_mode) || S_ISFIFO(status.st_mode) || S_ISSOCK(status.st_mode);
+}
+
 std::string WriteOutputFile(const std::string& path, std::string_view content) {
+  if (IsStream(path)) return WriteStream(path, content);
   std::string reason = ProtectionOfName(path);
   return reason.empty() ? PutInPlace(path, path, content) : reason;
 }

@@ -28,9 +28,13 @@ std::string WriteFreshFile(const std::string& path, std::string_view content);
 /// flushed, the new one is.
 std::string ReplaceFile(const std::string& target, std::string_view content);
 
-/// The same for what is made from a document: a symbolic link, or one of several names of a file, is itself
-/// replaced, so that what it leads to is never written.
+/// The same for what is made from a document. It is never written through a symbolic link, which is refused,
+/// nor into the other names of a file, which keep the old content. A pipe, a terminal or a device of that
+/// kind, by a link too, has no content that could be lost and is written as it is.
 std::string WriteOutputFile(const std::string& path, std::string_view content);
+
+/// Whether the path leads to a pipe, a terminal or a device of that kind.
+bool IsStream(const std::string& path);
 
 /// Removes a file. Returns the empty text, or the reason in words.
 std::string RemoveFile(const std::string& path);
