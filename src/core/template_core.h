@@ -207,6 +207,9 @@ class TemplateCore final : public ElementOwner {
   /// Loads a file in the place of the present template. False when it could not be read; the registry then
   /// holds the reason.
   bool LoadWrapper(const std::string& path);
+  /// Loads the content of one file as that of another, which a plain save then replaces; of none where `path`
+  /// is empty. Fails as a load does.
+  bool LoadCopy(const std::string& source, const std::string& path);
   /// Saves: under its own name plainly, under another with fresh version stamps and a restarted revision.
   /// False when it failed; the registry then holds the reason, and the file on disk is as it was.
   bool SaveWrapper(const std::string& path);
