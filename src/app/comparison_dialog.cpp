@@ -3,8 +3,10 @@
 #include <QDialogButtonBox>
 #include <QHeaderView>
 #include <QLabel>
+#include <QPlainTextEdit>
 #include <QTreeWidget>
 #include <QVBoxLayout>
+#include <algorithm>
 #include <memory>
 
 #include "platform/docview.h"
@@ -14,14 +16,16 @@ namespace tessal {
 namespace {
 
 constexpr QSize kUsualSize(900, 480);
-constexpr int kWidestColumn = 260;
+constexpr int kWidestColumn = 200;
 
 template <class Object, class... Arguments>
 Object* Make(Arguments&&... arguments) {
   return std::make_unique<Object>(std::forward<Arguments>(arguments)...).release();
 }
 
-/// Several lines lie in one row, with the whole in the tip.
+enum Column { kChange, kKind, kName, kField, kBefore, kAfter };
+
+/// Several lines lie in one row; the item keeps the whole.
 void AddRow(QTreeWidget& table, const DocumentDifference& difference) {
   const QStringList texts = {
       QString::fromStdString(difference.change), QString::fromStdString(difference.kind),
@@ -30,7 +34,7 @@ void AddRow(QTreeWidget& table, const DocumentDifference& difference) {
   auto* row = Make<QTreeWidgetItem>(&table);
   for (int column = 0; column < texts.size(); ++column) {
     row->setText(column, texts[column].simplified());
-    row->setToolTip(column, texts[column].toHtmlEscaped());
+    row->setData(column, Qt::UserRole, texts[column]);
   }
 }
 
@@ -40,12 +44,28 @@ QTreeWidget* MakeTable(const DocumentComparison& comparison, const QStringList& 
   table->setRootIsDecorated(false);
   table->setUniformRowHeights(true);
   table->setAlternatingRowColors(true);
+  table->setAllColumnsShowFocus(true);
   table->setHeaderLabels(heads);
   for (const DocumentDifference& difference : comparison.differences) AddRow(*table, difference);
-  table->header()->setMaximumSectionSize(kWidestColumn);
-  for (int column = 0; column < table->columnCount(); ++column) table->resizeColumnToContents(column);
-  table->header()->setMaximumSectionSize(-1);
+  for (int column = kChange; column < kBefore; ++column) {
+    table->resizeColumnToContents(column);
+    table->setColumnWidth(column, std::min(table->columnWidth(column), kWidestColumn));
+  }
+  for (const int column : {kBefore, kAfter})
+    table->header()->setSectionResizeMode(column, QHeaderView::Stretch);
   return table;
+}
+
+/// Shows one value of the row in front with all its lines.
+QPlainTextEdit* MakeValue(QTreeWidget& table, int column, QWidget* parent) {
+  auto* value = Make<QPlainTextEdit>(parent);
+  value->setReadOnly(true);
+  value->setTabChangesFocus(true);
+  value->setAccessibleName(table.headerItem()->text(column));
+  QObject::connect(&table, &QTreeWidget::currentItemChanged, value, [value, column](QTreeWidgetItem* row) {
+    value->setPlainText(row == nullptr ? QString() : row->data(column, Qt::UserRole).toString());
+  });
+  return value;
 }
 
 }  // namespace
@@ -69,7 +89,12 @@ ComparisonDialog::ComparisonDialog(const DocumentComparison& comparison, const Q
   auto* rows = Make<QVBoxLayout>(this);
   rows->addWidget(summary);
   const QStringList heads = {tr("Change"), tr("Kind"), tr("Name"), tr("Field"), before, after};
-  rows->addWidget(MakeTable(comparison, heads, this), 1);
+  QTreeWidget* table = MakeTable(comparison, heads, this);
+  auto* values = Make<QHBoxLayout>();
+  for (const int column : {kBefore, kAfter}) values->addWidget(MakeValue(*table, column, this));
+  rows->addWidget(table, 3);
+  rows->addLayout(values, 1);
+  table->setCurrentItem(table->topLevelItem(0));
   auto* buttons = Make<QDialogButtonBox>(QDialogButtonBox::Close, this);
   connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
   rows->addWidget(buttons);

@@ -117,8 +117,8 @@ DocumentOpening::WorkChoice DocumentOpening::AskAboutWork(const FoundWork& work)
                   Translated("The editor ended before the changes to %1 were saved.").arg(document),
                   QMessageBox::NoButton, &window);
   box.setTextFormat(Qt::PlainText);
-  QString times = Translated("The unsaved work is of %1.").arg(TimeOf(work.file));
-  if (hasFile) times += u' ' + Translated("The file is of %1.").arg(TimeOf(work.path));
+  QString times = Translated("The unsaved work was kept on %1.").arg(TimeOf(work.file));
+  if (hasFile) times += u' ' + Translated("The file was written on %1.").arg(TimeOf(work.path));
   box.setInformativeText(times);
   const QPushButton* recover = box.addButton(Translated("&Recover"), QMessageBox::AcceptRole);
   const QPushButton* compare =

@@ -325,7 +325,8 @@ bool HostWindow::Save(OpenDocument& saved, const QString& path) {
 bool HostWindow::MayClose(OpenDocument& closing) {
   tabs->setCurrentWidget(closing.Widget());
   closing.View().OnCommit();
-  if (!closing.Document().IsModified()) return true;
+  // Of a file that is gone, the document is all that is left.
+  if (!closing.Document().IsModified() && closing.File().State() != FileState::Gone) return true;
   const auto answer = QMessageBox::warning(
       this, name,
       tr("Save the changes to '%1'?").arg(closing.Path().isEmpty() ? closing.Title() : closing.Path()),

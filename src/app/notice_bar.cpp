@@ -33,9 +33,10 @@ NoticeBar::NoticeBar(QWidget* parent) : QFrame(parent) {
   text->setTextFormat(Qt::PlainText);
   text->setWordWrap(true);
   text->setForegroundRole(QPalette::ToolTipText);
-  reload = Make<QPushButton>(tr("&Reload"), this);
-  auto* keep = Make<QPushButton>(tr("&Keep Mine"), this);
-  compare = Make<QPushButton>(tr("&Compare..."), this);
+  // Without Alt keys, which the forms need.
+  reload = Make<QPushButton>(tr("Reload"), this);
+  auto* keep = Make<QPushButton>(tr("Keep Mine"), this);
+  compare = Make<QPushButton>(tr("Compare..."), this);
   auto* row = Make<QHBoxLayout>(this);
   row->addWidget(sign);
   row->addWidget(text, 1);
