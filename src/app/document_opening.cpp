@@ -111,11 +111,11 @@ DocumentOpening::WorkChoice DocumentOpening::DecideAboutWork(const FoundWork& wo
 
 DocumentOpening::WorkChoice DocumentOpening::AskAboutWork(const FoundWork& work) const {
   const bool hasFile = QFileInfo::exists(work.path);
-  const QString document = work.path.isEmpty() ? Translated("a document that was never saved")
-                                               : Translated("the file '%1'").arg(work.path);
-  QMessageBox box(QMessageBox::Question, name,
-                  Translated("The editor ended before the changes to %1 were saved.").arg(document),
-                  QMessageBox::NoButton, &window);
+  const QString what =
+      work.path.isEmpty()
+          ? Translated("The editor ended before a new document was saved.")
+          : Translated("The editor ended before the changes to the file '%1' were saved.").arg(work.path);
+  QMessageBox box(QMessageBox::Question, name, what, QMessageBox::NoButton, &window);
   box.setTextFormat(Qt::PlainText);
   QString times = Translated("The unsaved work was kept on %1.").arg(TimeOf(work.file));
   if (hasFile) times += u' ' + Translated("The file was written on %1.").arg(TimeOf(work.path));

@@ -1,5 +1,7 @@
 #include "app/host_window.h"
 
+#include <malloc.h>
+
 #include <QAction>
 #include <QApplication>
 #include <QCloseEvent>
@@ -346,10 +348,13 @@ void HostWindow::Drop(OpenDocument& closed) {
   closed.DropWork();
   const auto hit = std::find_if(documents.begin(), documents.end(),
                                 [&closed](const auto& open) { return open.get() == &closed; });
-  const std::unique_ptr<OpenDocument> gone = std::move(*hit);
+  std::unique_ptr<OpenDocument> gone = std::move(*hit);
   documents.erase(hit);
   tabs->removeTab(tabs->indexOf(gone->Widget()));
   gone->Widget()->setParent(nullptr);
+  gone.reset();
+  // The allocator would hold on to the memory of a large document.
+  malloc_trim(0);
   ShowFront();
 }
 
