@@ -222,4 +222,11 @@ bool TemplateCore::LoadWrapper(const std::string& path) {
   return Reading(*this, state).Load(std::string(path));
 }
 
+bool TemplateCore::LoadCopy(const std::string& source, const std::string& path) {
+  if (!LoadWrapper(source)) return false;
+  state.templateFileName = path;
+  state.saveFileName = path;
+  return true;
+}
+
 }  // namespace tessal

@@ -5,6 +5,7 @@
 #include <sstream>
 #include <stdexcept>
 
+#include "core/comparison.h"
 #include "core/error_registry.h"
 #include "core/loaded_template.h"
 #include "core/rename.h"
@@ -236,6 +237,20 @@ std::string TemplateScript::Undefined() const {
     text += "\n";
   }
   return text;
+}
+
+std::string TemplateScript::Compare() const {
+  const MessagesAside aside;
+  TemplateCore file;
+  file.LoadWrapper(folder.File(kModel));
+  std::string text;
+  for (const SymbolChange& change : CompareBySymbol(file, core)) {
+    text += "-+*"[static_cast<std::size_t>(change.change)];
+    text += " " + change.kind + " '" + change.symbol + "'\n";
+    for (const FieldChange& field : change.fields)
+      text += "    " + field.field + ": '" + field.before + "' -> '" + field.after + "'\n";
+  }
+  return text + (NotifyChanges() ? "" : "notifications stay off");
 }
 
 std::string TemplateScript::Fields(const std::string& name) {
@@ -482,6 +497,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"order", [](S s, W) { return s.Order(); }},
       {"undefined", [](S s, W) { return s.Undefined(); }},
       {"state", [](S s, W) { return s.State(); }},
+      {"compare", [](S s, W) { return s.Compare(); }},
       {"fields", [](S s, W w) { return s.Fields(w.at(0)); }},
       {"look", [](S s, W w) { return s.Lookups(w.at(0)); }},
       {"groups", [](S s, W) { return s.Groups(); }},

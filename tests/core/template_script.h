@@ -45,6 +45,8 @@ class TemplateScript final {
   std::string Table() const;
   std::string Order() const;
   std::string Undefined() const;
+  /// What has changed from the file to the template.
+  std::string Compare() const;
   std::string Fields(const std::string& name);
   std::string Set(const std::string& name, const std::string& field, const std::string& value);
   std::string MoveBeforeFirstUser(const std::string& name);
