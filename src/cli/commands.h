@@ -25,6 +25,8 @@ struct RenameCall {
   std::string oldSymbol;
   std::string newSymbol;
   bool onlySymbol = false;
+  bool wholeWords = false;
+  bool letterRule = false;
   std::string output;
 };
 ExitCode RunRename(const RenameCall& call);
