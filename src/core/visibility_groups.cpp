@@ -135,7 +135,9 @@ void VisibilityGroups::Leave(CEL_Element& element) {
     for (VisibilityLevel& level : group.levels) level.items.erase(element.GetUid());
   }
   const auto memberships = element.Visibility();
+  if (memberships.empty()) return;
   for (const auto& [group, level] : memberships) element.RemoveVisibility(group, level);
+  state.flags.modified = true;
 }
 
 std::int32_t VisibilityGroups::AddGroup() {

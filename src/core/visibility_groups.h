@@ -29,7 +29,7 @@ class VisibilityGroups final {
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
   void RemoveItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
-  /// Takes an element out of all groups.
+  /// Takes an element out of all groups; an edit when it was in one.
   void Leave(CEL_Element& element);
 
  private:

@@ -472,6 +472,12 @@ CEL_Lagrange_Specie* TemplateScript::ClassIn(const Words& words, std::size_t pla
   return place < words.size() ? &dynamic_cast<CEL_Lagrange_Specie&>(Element(words[place])) : nullptr;
 }
 
+std::string TemplateScript::Lost(const std::string& oldSymbol, const std::string& newSymbol) const {
+  std::string lines;
+  for (const LostName& lost : LostByRename(core, oldSymbol, newSymbol)) lines += LossText(core, lost) + "\n";
+  return lines;
+}
+
 std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
   Uid predecessor = UidOf(name);
   const bool moved = core.MoveBeforeFirstUser(UidOf(name), predecessor);
@@ -521,6 +527,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"can-move", [](S s, W w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
       {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},
       {"rename-failure", [](S, W w) { return RenameFailure(w.at(0)); }},
+      {"lost-by-rename", [](S s, W w) { return s.Lost(w.at(0), w.at(1)); }},
       {"replace", [](S, W w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
   };
   return kQuestions;
@@ -547,6 +554,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"create", [](S s, W w) { return s.Create(w); }},
       {"offer", [](S s, W w) { return s.Offer(w); }},
       {"rename", [](S s, W w) { return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3)); }},
+      {"rename-whole",
+       [](S s, W w) { return YesNo(s.core.Rename(w.at(0), w.at(1), Rewriting::WholeNames)); }},
       {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
       {"reset", [](S s, W w) { return s.Element(w.at(0)).Reset(), ""; }},
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},

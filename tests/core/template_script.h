@@ -51,6 +51,7 @@ class TemplateScript final {
   std::string Set(const std::string& name, const std::string& field, const std::string& value);
   std::string MoveBeforeFirstUser(const std::string& name);
   std::string Create(const Words& words);
+  std::string Lost(const std::string& oldSymbol, const std::string& newSymbol) const;
   std::string Offer(const Words& words);
   std::string Groups();
   std::string Items(const Words& words);
