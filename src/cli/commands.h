@@ -25,6 +25,8 @@ struct SaveCall {
   bool force = false;
 };
 ExitCode RunSave(const SaveCall& call);
+/// Takes over what the load passes over, prints its account, and saves.
+ExitCode RunRepair(const std::string& file, const std::string& output);
 ExitCode RunNew(const std::string& output, bool overwrite);
 struct RenameCall {
   std::string file;

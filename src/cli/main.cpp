@@ -137,6 +137,11 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddOutput(*save, line.save.output, "saves under this name, not in place");
   AddForce(*save, line.save.force);
 
+  CLI::App* repair = AddCommand(app, line, kTemplates, "repair", "takes over values that a load passes over",
+                                [&line] { return RunRepair(line.save.file, line.save.output); });
+  AddFile(*repair, line.save.file);
+  AddOutput(*repair, line.save.output, "saves under this name, not in place");
+
   CLI::App* create = AddCommand(app, line, kTemplates, "new", "saves an empty template",
                                 [&line] { return RunNew(line.file, line.force); });
   create->add_option("OUT", line.file, "the new file")->required();
