@@ -31,6 +31,8 @@ struct RenameCall {
   std::string oldSymbol;
   std::string newSymbol;
   bool onlySymbol = false;
+  bool wholeWords = false;
+  bool letterRule = false;
   std::string output;
   bool force = false;
 };

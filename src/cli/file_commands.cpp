@@ -29,12 +29,33 @@ ExitCode RunNew(const std::string& output, bool overwrite) {
   return SaveOrComplain(core, output) ? kFine : kCallFault;
 }
 
+namespace {
+
+Rewriting RewritingOf(const RenameCall& call) {
+  if (call.onlySymbol) return Rewriting::None;
+  return call.wholeWords ? Rewriting::WholeNames : Rewriting::ByLetters;
+}
+
+/// Lists what a rename by letters would lose, unless it loses nothing, or was asked for.
+bool ComplainOfLosses(const TemplateCore& core, const RenameCall& call, const std::string& newSymbol) {
+  if (RewritingOf(call) != Rewriting::ByLetters || call.letterRule) return false;
+  const std::vector<LostName> lost = LostByRename(core, call.oldSymbol, newSymbol);
+  if (lost.empty()) return false;
+  Complain("longer names would change too (" + std::to_string(lost.size()) + "):");
+  for (const LostName& name : lost) Complain(LossText(core, name));
+  Complain("--whole-words leaves them alone, --letter-rule changes them");
+  return true;
+}
+
+}  // namespace
+
 ExitCode RunRename(const RenameCall& call) {
   TemplateCore core;
   if (!MayWriteOutput(call) || !LoadToSave(core, call.file)) return kCallFault;
   const std::string newSymbol(CleanText(call.newSymbol));
   std::string refusal = RenameRefusal(core, newSymbol);
-  if (refusal.empty() && !core.RenameSymbol(call.oldSymbol, newSymbol, !call.onlySymbol)) {
+  if (refusal.empty() && ComplainOfLosses(core, call, newSymbol)) return kContentFault;
+  if (refusal.empty() && !core.Rename(call.oldSymbol, newSymbol, RewritingOf(call))) {
     refusal = RenameFailure(newSymbol);
   }
   if (!refusal.empty()) {

@@ -149,6 +149,10 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   rename->add_option("OLD", line.rename.oldSymbol, "the symbol to rename")->required();
   rename->add_option("NEW", line.rename.newSymbol, "its new name")->required();
   rename->add_flag("--only-symbol", line.rename.onlySymbol, "leaves the uses as they are");
+  CLI::Option* wholeWords =
+      rename->add_flag("--whole-words", line.rename.wholeWords, "leaves longer names alone");
+  rename->add_flag("--letter-rule", line.rename.letterRule, "changes longer names too, defined or not")
+      ->excludes(wholeWords);
   AddOutput(*rename, line.rename.output, "saves under this name, not in place");
   AddForce(*rename, line.rename.force);
 

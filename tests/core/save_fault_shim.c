@@ -1,5 +1,5 @@
-/* Preloaded into the save probe. Counts the calls by which a save reaches the disk, from the opening of its
-   temporary file on, and at the n-th (SAVE_FAULT_AT) ends the process (SAVE_FAULT_KIND=kill) or fails as a full disk does. */
+/* Preloaded into the probes. Counts the calls by which a save reaches the disk, from the opening of its
+   temporary file on or (SAVE_FAULT_FROM=start) from the first, and at the n-th (SAVE_FAULT_AT) ends the process (SAVE_FAULT_KIND=kill) or fails as a full disk does. */
 #define _GNU_SOURCE
 #include <dlfcn.h>
 #include <errno.h>
@@ -20,6 +20,7 @@ static int calls = 0;
 static int strikes(void) {
   const char* at = getenv("SAVE_FAULT_AT");
   const char* kind = getenv("SAVE_FAULT_KIND");
+  if (getenv("SAVE_FAULT_FROM") != NULL) counting = 1;
   if (!counting || at == NULL || ++calls != atoi(at)) return 0;
   if (kind != NULL && strcmp(kind, "kill") == 0) raise(SIGKILL);
   errno = ENOSPC;
@@ -84,5 +85,9 @@ int fchown(int descriptor, uid_t owner, gid_t group) {
 int fchmod(int descriptor, mode_t mode) { return strikes() ? -1 : NEXT(fchmod)(descriptor, mode); }
 
 int rename(const char* from, const char* to) { return strikes() ? -1 : NEXT(rename)(from, to); }
+
+int mkdir(const char* path, mode_t mode) { return strikes() ? -1 : NEXT(mkdir)(path, mode); }
+
+int lstat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(lstat)(path, status); }
 
 int unlink(const char* path) { return strikes() ? -1 : NEXT(unlink)(path); }
