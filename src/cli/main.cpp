@@ -5,6 +5,7 @@
 #include <exception>
 #include <functional>
 #include <memory>
+#include <new>
 #include <string>
 #include <system_error>
 #include <vector>
@@ -302,6 +303,9 @@ int main(int count, char** arguments) {
   std::signal(SIGPIPE, SIG_IGN);
   try {
     return tessal::cli::RunTool(count, arguments);
+  } catch (const std::bad_alloc&) {
+    tessal::cli::Complain("out of memory");
+    return tessal::cli::kCallFault;
   } catch (const std::exception& failure) {
     tessal::cli::Complain(failure.what());
     return tessal::cli::kCallFault;

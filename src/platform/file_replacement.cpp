@@ -4,10 +4,9 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <cerrno>
 #include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <system_error>
 
 #include "platform/descriptor.h"
@@ -165,6 +164,7 @@ std::string WriteStream(const std::string& path, std::string_view content) {
 }  // namespace
 
 std::optional<std::string> ReadWholeFile(const std::string& path, std::string& failure) {
+  constexpr std::size_t kPiece = 1U << 16U;
   std::error_code unknown;
   const auto type = std::filesystem::status(path, unknown).type();
   if (type == std::filesystem::file_type::character || type == std::filesystem::file_type::block) {
@@ -172,18 +172,23 @@ std::optional<std::string> ReadWholeFile(const std::string& path, std::string& f
     failure = "can not read file '" + path + "': it is a device";
     return std::nullopt;
   }
-  std::ifstream file(path, std::ios::binary);
-  std::ostringstream content;
-  if (!file) {
+  const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  if (!file.IsOpen()) {
     failure = Reason("can not read file", path, errno);
     return std::nullopt;
   }
-  if (file.peek() != std::ifstream::traits_type::eof()) content << file.rdbuf();
-  if (file.bad() || content.fail()) {
-    failure = Reason("can not read file", path, errno != 0 ? errno : EIO);
-    return std::nullopt;
+  std::string content;
+  std::array<char, kPiece> piece{};
+  ssize_t count = 0;
+  while ((count = read(file.Number(), piece.data(), piece.size())) != 0) {
+    if (count > 0) {
+      content.append(piece.data(), static_cast<std::size_t>(count));
+    } else if (errno != EINTR) {
+      failure = Reason("can not read file", path, errno);
+      return std::nullopt;
+    }
   }
-  return std::move(content).str();
+  return content;
 }
 
 std::uintmax_t FileSize(const std::string& path) {

@@ -1,5 +1,6 @@
 #include "platform/temporary_file.h"
 
+#include <dirent.h>
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/stat.h>
@@ -11,8 +12,8 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <memory>
 #include <string_view>
-#include <system_error>
 
 namespace tessal {
 
@@ -102,12 +103,12 @@ void RemoveTemporaryRests(const std::filesystem::path& target) {
   const std::filesystem::path folder = target.has_parent_path() ? target.parent_path() : ".";
   struct stat status = {};
   const uid_t owner = lstat(target.c_str(), &status) == 0 ? status.st_uid : geteuid();
-  std::error_code failure;
-  for (std::filesystem::directory_iterator entry(folder, failure), end; !failure && entry != end;
-       entry.increment(failure)) {
-    const std::string name = entry->path().filename().native();
+  // Not the library's iterator, whose constructor ends the process when there is no memory.
+  const std::unique_ptr<DIR, int (*)(DIR*)> listing(opendir(folder.c_str()), closedir);
+  while (const dirent* entry = listing ? readdir(listing.get()) : nullptr) {
+    const std::string_view name = entry->d_name;
     if (name.size() == start.size() + kPlaceholders.size() && name.starts_with(start)) {
-      RemoveRest(entry->path().native(), owner);
+      RemoveRest((folder / name).native(), owner);
     }
   }
 }

@@ -88,6 +88,4 @@ int rename(const char* from, const char* to) { return strikes() ? -1 : NEXT(rena
 
 int mkdir(const char* path, mode_t mode) { return strikes() ? -1 : NEXT(mkdir)(path, mode); }
 
-int lstat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(lstat)(path, status); }
-
 int unlink(const char* path) { return strikes() ? -1 : NEXT(unlink)(path); }
