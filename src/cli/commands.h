@@ -26,7 +26,7 @@ struct SaveCall {
 };
 ExitCode RunSave(const SaveCall& call);
 /// Takes over what the load passes over, prints its account, and saves.
-ExitCode RunRepair(const std::string& file, const std::string& output);
+ExitCode RunRepair(const SaveCall& call);
 ExitCode RunNew(const std::string& output, bool overwrite);
 struct RenameCall {
   std::string file;

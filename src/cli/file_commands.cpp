@@ -33,13 +33,12 @@ ExitCode RunSave(const SaveCall& call) {
   return SaveOrComplain(core, call.output.empty() ? call.file : call.output) ? kFine : kCallFault;
 }
 
-ExitCode RunRepair(const std::string& file, const std::string& output) {
+ExitCode RunRepair(const SaveCall& call) {
   TemplateCore core;
-  if (!output.empty() && !IsFreeOrComplain(output)) return kCallFault;
-  if (!LoadOrComplain(core, file)) return kCallFault;
-  for (const AccountEntry& entry : core.Account().Entries()) PrintLine(AccountLine(file, entry));
+  if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
+  for (const AccountEntry& entry : core.Account().Entries()) PrintLine(AccountLine(call.file, entry));
   const bool isWhole = core.TakeOverPassedOver();
-  if (!SaveOrComplain(core, output.empty() ? file : output)) return kCallFault;
+  if (!SaveOrComplain(core, call.output.empty() ? call.file : call.output)) return kCallFault;
   return isWhole ? kFine : kContentFault;
 }
 

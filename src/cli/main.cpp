@@ -139,9 +139,10 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddForce(*save, line.save.force);
 
   CLI::App* repair = AddCommand(app, line, kTemplates, "repair", "takes over values that a load passes over",
-                                [&line] { return RunRepair(line.save.file, line.save.output); });
+                                [&line] { return RunRepair(line.save); });
   AddFile(*repair, line.save.file);
   AddOutput(*repair, line.save.output, "saves under this name, not in place");
+  AddForce(*repair, line.save.force);
 
   CLI::App* create = AddCommand(app, line, kTemplates, "new", "saves an empty template",
                                 [&line] { return RunNew(line.file, line.force); });

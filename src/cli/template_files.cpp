@@ -40,7 +40,8 @@ std::string AccountLine(const std::string& file, const AccountEntry& entry) {
 bool MayReplaceOrComplain(const TemplateCore& core, const std::string& file) {
   if (!core.Account().Loses()) return true;
   ComplainOfLosses(core, file);
-  Complain("'" + file + "' holds what a save would lose; --force saves all the same, --output to another file");
+  Complain("'" + file +
+           "' holds what a save would lose; --force saves all the same, --output to another file");
   return false;
 }
 

@@ -6,7 +6,7 @@
 namespace tessal {
 class TemplateCore;
 struct AccountEntry;
-}
+}  // namespace tessal
 
 namespace tessal::cli {
 
