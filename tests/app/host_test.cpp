@@ -196,6 +196,7 @@ class HostScript final {
     if (!QTest::qWaitFor([bar] { return bar->isVisible(); }, patience)) return false;
     // A second look may find more.
     if (button.isEmpty()) QTest::qWait(patience / 8);
+    if (!bar->isVisible()) return false;
     for (auto* label : bar->findChildren<QLabel*>())
       if (button.isEmpty() && !label->text().isEmpty()) boxes.texts.append(label->text());
     for (auto* each : bar->findChildren<QAbstractButton*>()) {
