@@ -120,6 +120,7 @@ class HostScript final {
  public:
   explicit HostScript(const std::string& files) {
     QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
+    ClearRecentFiles();
     qputenv("XDG_STATE_HOME", QByteArray::fromStdString(state.Path().string()));
     std::istringstream input(files);
     for (std::string name, value; input >> name >> value;) Write(name, value);
