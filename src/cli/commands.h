@@ -17,19 +17,36 @@ ExitCode RunExplain(const std::string& code);
 ExitCode RunExplainAll();
 ExitCode RunExplainPage();
 ExitCode RunSymbols(const std::string& file, Format format);
-/// With an empty output a plain save in place, else a save under that name.
-ExitCode RunSave(const std::string& file, const std::string& output);
+/// With an empty output a plain save in place, else a save under that name, which is refused when a file has
+/// it, unless forced.
+struct SaveCall {
+  std::string file;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunSave(const SaveCall& call);
 ExitCode RunNew(const std::string& output, bool overwrite);
 struct RenameCall {
   std::string file;
   std::string oldSymbol;
   std::string newSymbol;
   bool onlySymbol = false;
+  bool wholeWords = false;
+  bool letterRule = false;
   std::string output;
+  bool force = false;
 };
 ExitCode RunRename(const RenameCall& call);
 ExitCode RunOverview(const std::string& file);
-ExitCode RunHtml(const std::string& file, bool withMathJax, const std::string& output);
+/// With an empty output the page goes to its usual place. What is no page is replaced only when forced, and
+/// never there.
+struct HtmlCall {
+  std::string file;
+  bool withMathJax = false;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunHtml(const HtmlCall& call);
 
 // Key files.
 ExitCode RunTree(const std::string& file);

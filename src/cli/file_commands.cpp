@@ -1,7 +1,4 @@
 // Commands that write a template: save, new and rename.
-#include <filesystem>
-#include <system_error>
-
 #include "cli/commands.h"
 #include "cli/template_files.h"
 #include "core/rename.h"
@@ -10,28 +7,55 @@
 
 namespace tessal::cli {
 
-ExitCode RunSave(const std::string& file, const std::string& output) {
+namespace {
+
+/// Whether the output of a call, if it names one, may be written.
+template <class Call>
+bool MayWriteOutput(const Call& call) {
+  return call.output.empty() || call.force || IsFreeOrComplain(call.output);
+}
+
+}  // namespace
+
+ExitCode RunSave(const SaveCall& call) {
   TemplateCore core;
-  if (!LoadToSave(core, file)) return kCallFault;
-  return SaveOrComplain(core, output.empty() ? file : output) ? kFine : kCallFault;
+  if (!MayWriteOutput(call) || !LoadToSave(core, call.file)) return kCallFault;
+  return SaveOrComplain(core, call.output.empty() ? call.file : call.output) ? kFine : kCallFault;
 }
 
 ExitCode RunNew(const std::string& output, bool overwrite) {
-  std::error_code error;
-  if (!overwrite && std::filesystem::exists(std::filesystem::symlink_status(output, error))) {
-    Complain("'" + output + "' exists already; --force replaces it");
-    return kCallFault;
-  }
+  if (!overwrite && !IsFreeOrComplain(output)) return kCallFault;
   TemplateCore core;
   return SaveOrComplain(core, output) ? kFine : kCallFault;
 }
 
+namespace {
+
+Rewriting RewritingOf(const RenameCall& call) {
+  if (call.onlySymbol) return Rewriting::None;
+  return call.wholeWords ? Rewriting::WholeNames : Rewriting::ByLetters;
+}
+
+/// Lists what a rename by letters would lose, unless it loses nothing, or was asked for.
+bool ComplainOfLosses(const TemplateCore& core, const RenameCall& call, const std::string& newSymbol) {
+  if (RewritingOf(call) != Rewriting::ByLetters || call.letterRule) return false;
+  const std::vector<LostName> lost = LostByRename(core, call.oldSymbol, newSymbol);
+  if (lost.empty()) return false;
+  Complain("longer names would change too (" + std::to_string(lost.size()) + "):");
+  for (const LostName& name : lost) Complain(LossText(core, name));
+  Complain("--whole-words leaves them alone, --letter-rule changes them");
+  return true;
+}
+
+}  // namespace
+
 ExitCode RunRename(const RenameCall& call) {
   TemplateCore core;
-  if (!LoadToSave(core, call.file)) return kCallFault;
+  if (!MayWriteOutput(call) || !LoadToSave(core, call.file)) return kCallFault;
   const std::string newSymbol(CleanText(call.newSymbol));
   std::string refusal = RenameRefusal(core, newSymbol);
-  if (refusal.empty() && !core.RenameSymbol(call.oldSymbol, newSymbol, !call.onlySymbol)) {
+  if (refusal.empty() && ComplainOfLosses(core, call, newSymbol)) return kContentFault;
+  if (refusal.empty() && !core.Rename(call.oldSymbol, newSymbol, RewritingOf(call))) {
     refusal = RenameFailure(newSymbol);
   }
   if (!refusal.empty()) {

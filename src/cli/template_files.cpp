@@ -1,5 +1,8 @@
 #include "cli/template_files.h"
 
+#include <filesystem>
+#include <system_error>
+
 #include "cli/output.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
@@ -35,6 +38,13 @@ bool LoadToSave(TemplateCore& core, const std::string& file) {
              std::string(WithoutLineFeed(record.text)));
   }
   return true;
+}
+
+bool IsFreeOrComplain(const std::string& output) {
+  std::error_code shownByTheSave;
+  if (!std::filesystem::exists(std::filesystem::symlink_status(output, shownByTheSave))) return true;
+  Complain("'" + output + "' exists already; --force replaces it");
+  return false;
 }
 
 bool SaveOrComplain(TemplateCore& core, const std::string& file) {

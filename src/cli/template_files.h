@@ -15,6 +15,9 @@ bool LoadOrComplain(TemplateCore& core, const std::string& file);
 /// The same for a file that will be saved again: warns when a save would leave its further sections out.
 bool LoadToSave(TemplateCore& core, const std::string& file);
 
+/// Whether a new file may have this name. False, with the reason on standard error, when something has it.
+bool IsFreeOrComplain(const std::string& output);
+
 /// Saves a template. False, with the reasons on standard error, when it could not be saved.
 bool SaveOrComplain(TemplateCore& core, const std::string& file);
 

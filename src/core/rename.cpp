@@ -1,5 +1,7 @@
 #include "core/rename.h"
 
+#include <cstddef>
+#include <unordered_set>
 #include <utility>
 
 #include "core/template_core.h"
@@ -9,7 +11,12 @@
 
 namespace tessal {
 
-std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord) {
+namespace {
+
+/// `ReplaceWord`, with the places of what it replaced in the text.
+std::string ReplaceWordAt(std::string_view text, std::string_view oldWord, std::string_view newWord,
+                          std::vector<std::size_t>& places) {
+  places.clear();
   if (oldWord.empty()) return std::string(text);
   std::string result;
   std::size_t copied = 0;
@@ -29,6 +36,7 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
       position = end;
       continue;
     }
+    places.push_back(hit);
     result += text.substr(copied, hit - copied);
     result += newWord;
     copied = position = end;
@@ -37,16 +45,137 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
   return result;
 }
 
+std::string Quoted(std::string_view expression) {
+  return '"' + std::string(expression) + '"';
+}
+
+/// Calls the visitor with the code and the lexeme, a view into the expression, of each of its tokens. Scans
+/// to come begin as if nobody had looked.
+template <class Visitor>
+void ForEachToken(std::string_view expression, Visitor visit) {
+  const std::string_view text = StripExpressionQuotes(expression);
+  const ScannerStart start = ExpressionScannerStart();
+  ResetExpressionScanner();
+  {
+    ExpressionScan scan(text);
+    for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {
+      const std::size_t length = scan.Lexeme().size();
+      visit(code, text.substr(scan.Consumed() - length, length));
+    }
+  }
+  SetExpressionScannerStart(start);
+}
+
+/// Collects the names that a rename loses, over the expressions that use its symbol.
+class LossSearch final {
+ public:
+  LossSearch(const TemplateCore& core, std::string_view oldSymbol, std::string_view newSymbol)
+      : oldName(oldSymbol), newName(newSymbol) {
+    for (const auto& name : core.UndefinedSymbols()) undefined.insert(name->symbol);
+  }
+
+  void LookAt(std::string_view expression) {
+    ReplaceWordAt(Quoted(expression), oldName, newName, places);
+    auto place = places.cbegin();
+    ForEachToken(expression, [this, &place, expression](TokenCode /*code*/, std::string_view lexeme) {
+      const auto begin = static_cast<std::size_t>(lexeme.data() - expression.data()) + kQuote;
+      while (place != places.cend() && *place < begin) ++place;  // in a comment
+      std::string becomes;
+      std::size_t copied = 0;
+      for (; place != places.cend() && *place < begin + lexeme.size(); ++place) {
+        becomes.append(lexeme.substr(copied, *place - begin - copied)).append(newName);
+        copied = *place - begin + oldName.size();
+      }
+      if (copied == 0 || lexeme == oldName || undefined.contains(lexeme)) return;
+      becomes += lexeme.substr(copied);
+      if (noted.insert(std::string(lexeme)).second) {
+        lost.push_back({std::string(lexeme), std::move(becomes)});
+      }
+    });
+  }
+
+  std::vector<LostName> Take() { return std::move(lost); }
+
+ private:
+  /// The opening quote of the stored form, in which the places count.
+  static constexpr std::size_t kQuote = 1;
+
+  std::string_view oldName;
+  std::string_view newName;
+  std::unordered_set<std::string_view> undefined;
+  std::vector<std::size_t> places;
+  std::unordered_set<std::string> noted;
+  std::vector<LostName> lost;
+};
+
+/// The record of a symbol that may become the new one; none when there is no such.
+const SymbolRecord* RecordToRename(const TemplateCore& core, std::string_view oldSymbol,
+                                   std::string_view newSymbol) {
+  std::uint32_t sequence = 0;
+  if (core.SymbolExists(newSymbol) || !core.FindSymbol(oldSymbol, sequence)) return nullptr;
+  const SymbolRecord* record = core.FindRecordBySequence(sequence);
+  return record->element->symbol.Editable() ? record : nullptr;
+}
+
+/// Calls the visitor with each expression of each element that uses the record's.
+template <class Visitor>
+void ForEachUsingExpression(const TemplateCore& core, const SymbolRecord& used, Visitor visit) {
+  const CEL_Element* previous = nullptr;
+  for (const std::uint32_t sequence : used.referencedBy) {
+    const CEL_Element* user = core.FindRecordBySequence(sequence)->element;
+    // The two records of a movement are side by side.
+    if (user == previous) continue;
+    previous = user;
+    user->ForEachExpression([&visit](const PropertyRow&, CEL_Property& expression) { visit(expression); });
+  }
+}
+
+}  // namespace
+
+std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord) {
+  std::vector<std::size_t> places;
+  return ReplaceWordAt(text, oldWord, newWord, places);
+}
+
 std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
                                 std::string_view newWord) {
-  const std::string rewritten = ReplaceWord('"' + std::string(expression) + '"', oldWord, newWord);
+  const std::string rewritten = ReplaceWord(Quoted(expression), oldWord, newWord);
   return std::string(StripExpressionQuotes(rewritten));
+}
+
+std::string ReplaceName(std::string_view expression, std::string_view oldName, std::string_view newName) {
+  std::string result;
+  const char* copied = expression.data();
+  ForEachToken(expression, [&result, &copied, oldName, newName](TokenCode code, std::string_view lexeme) {
+    if (code != TokenCode::Identifier || lexeme != oldName) return;
+    result.append(copied, lexeme.data()).append(newName);
+    copied = lexeme.data() + lexeme.size();
+  });
+  return result.append(copied, expression.data() + expression.size());
+}
+
+std::vector<LostName> LostByRename(const TemplateCore& core, std::string_view oldSymbol,
+                                   std::string_view newSymbol) {
+  const SymbolRecord* renamed = RecordToRename(core, oldSymbol, newSymbol);
+  if (renamed == nullptr) return {};
+  LossSearch search(core, oldSymbol, newSymbol);
+  ForEachUsingExpression(core, *renamed,
+                         [&search](const CEL_Property& expression) { search.LookAt(expression.Text()); });
+  return search.Take();
+}
+
+std::string LossText(const TemplateCore& core, const LostName& lost) {
+  const bool isTaken = core.SymbolExists(lost.becomes);
+  return "'" + lost.name + "' to '" + lost.becomes +
+         (isTaken ? "', which is another symbol" : "', which is undefined");
 }
 
 std::string RenameRefusal(const TemplateCore& core, std::string_view newSymbol) {
   const std::string quoted = "'" + std::string(newSymbol) + "'";
   if (!IsValidSymbolSpelling(newSymbol)) return quoted + " is not a valid identifier!";
-  if (IsReservedName(newSymbol)) return quoted + " is invalid because it is an Tessal keyword!";
+  if (IsReservedName(newSymbol) || !IsValidSymbol(newSymbol)) {
+    return quoted + " is invalid because it is an Tessal keyword!";
+  }
   if (core.SymbolExists(newSymbol)) return "An item with the name " + quoted + " already exists!";
   return {};
 }
@@ -57,20 +186,33 @@ std::string RenameFailure(std::string_view newSymbol) {
 
 bool TemplateCore::RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol,
                                 bool replaceInExpressions) {
-  const SymbolRecord* renamed = state.table.BySymbol(oldSymbol);
-  if (renamed == nullptr || !renamed->element->symbol.Editable() || SymbolExists(newSymbol)) return false;
-  state.flags.modified = true;
+  return Rename(oldSymbol, newSymbol, replaceInExpressions ? Rewriting::ByLetters : Rewriting::None);
+}
+
+bool TemplateCore::Rename(std::string_view oldSymbol, std::string_view newSymbol, Rewriting rewriting) {
+  const SymbolRecord* renamed = RecordToRename(*this, oldSymbol, newSymbol);
+  if (renamed == nullptr) return false;
+  // The caller's may be a view into what is about to change.
+  const std::string oldName(oldSymbol);
+  const std::string newName(newSymbol);
+  const bool wasModified = state.flags.modified;
   {
     // The rewrites must not change the table under the walk.
     const RebuildsOff noRebuilds(state.flags);
-    if (replaceInExpressions) {
-      state.table.ForEachElement(renamed->referencedBy, [oldSymbol, newSymbol](const SymbolRecord& user) {
-        user.element->ForEachExpression([oldSymbol, newSymbol](const PropertyRow&, CEL_Property& expression) {
-          expression.SetText(ReplaceInExpression(expression.Text(), oldSymbol, newSymbol));
-        });
+    CEL_Property& symbol = renamed->element->symbol;
+    symbol.SetText(newName);
+    if (symbol.Text() != newName) {
+      // The element has rules of its own and kept its symbol.
+      state.flags.modified = wasModified;
+      return false;
+    }
+    state.flags.modified = true;
+    if (rewriting != Rewriting::None) {
+      const auto replace = rewriting == Rewriting::ByLetters ? ReplaceInExpression : ReplaceName;
+      ForEachUsingExpression(*this, *renamed, [replace, &oldName, &newName](CEL_Property& expression) {
+        expression.SetText(replace(expression.Text(), oldName, newName));
       });
     }
-    renamed->element->symbol.SetText(newSymbol);
   }
   RebuildSymbolTable();
   return true;

@@ -2,12 +2,21 @@
 // the references again.
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace tessal {
 
 class TemplateCore;
+
+/// What a rename does to the expressions that use the symbol.
+enum class Rewriting : std::uint8_t {
+  None,        ///< nothing: the uses become undefined
+  ByLetters,   ///< `ReplaceInExpression`, which changes longer names too
+  WholeNames,  ///< `ReplaceName`
+};
 
 /// Replaces each whole occurrence of a word. Only letters bind: digits and the underscore do not make a word
 /// longer, so renaming `a` changes `a_1` and `a2` too. The result of a replacement is not looked at again.
@@ -17,6 +26,26 @@ std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::st
 /// opening one.
 std::string ReplaceInExpression(std::string_view expression, std::string_view oldWord,
                                 std::string_view newWord);
+
+/// Replaces a name where it is the whole of an identifier, as the language reads it: `a_1`, numbers and
+/// comments stay. What the rename looks at leaves no trace in the scanner.
+std::string ReplaceName(std::string_view expression, std::string_view oldName, std::string_view newName);
+
+/// A longer name, or a number, that a rename by letters would change into one that means nothing, or
+/// something else.
+struct LostName {
+  std::string name;
+  std::string becomes;
+};
+
+/// What the expressions that use a symbol would lose by a rename by letters, in the order of their first use.
+/// A name that is undefined already is none of them. Empty when the rename is safe, or refused for the old
+/// symbol.
+std::vector<LostName> LostByRename(const TemplateCore& core, std::string_view oldSymbol,
+                                   std::string_view newSymbol);
+
+/// What becomes of it, in words for the user.
+std::string LossText(const TemplateCore& core, const LostName& lost);
 
 /// Why an element may not take a new symbol, in words for the user; empty when it may. Blanks at both ends of
 /// the new symbol are the caller's to cut.

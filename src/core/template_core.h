@@ -19,6 +19,8 @@
 
 namespace tessal {
 
+enum class Rewriting : std::uint8_t;
+
 /// The symbol of the message that a load leaves when it could not keep the file's further top-level sections.
 inline constexpr std::string_view kNotKeptSymbol = "could not read template: ";
 
@@ -149,10 +151,13 @@ class TemplateCore final : public ElementOwner {
   std::optional<CreationOffer> NextOffer();
   /// The same question about one symbol, whether it was asked about or not; none when it is not undefined.
   std::optional<CreationOffer> OfferOf(std::string_view symbol);
-  /// Gives an element a new symbol and, if asked to, rewrites every expression that uses it. False, with
-  /// nothing changed, when the new symbol exists, or the old one does not or is not editable: derived outputs
-  /// and movements have captions, no symbols that a file holds.
+  /// Gives an element a new symbol and, if asked to, rewrites every expression that uses it, by letters.
+  /// False, with nothing changed, when the new symbol exists, the element does not take it, or the old one
+  /// does not exist or is not editable: derived outputs and movements have captions, no symbols that a file
+  /// holds.
   bool RenameSymbol(std::string_view oldSymbol, std::string_view newSymbol, bool replaceInExpressions);
+  /// The same with any of the ways to rewrite the uses.
+  bool Rename(std::string_view oldSymbol, std::string_view newSymbol, Rewriting rewriting);
 
   // The structural pass and the check pass.
   /// Numbers the elements, makes the symbol table and finds who uses whom. Reports nothing.
@@ -210,6 +215,13 @@ class TemplateCore final : public ElementOwner {
   /// Loads the content of one file as that of another, which a plain save then replaces; of none where `path`
   /// is empty. Fails as a load does.
   bool LoadCopy(const std::string& source, const std::string& path);
+  /// What the file of the load holds beside the template, as text; each save writes it after the template.
+  const std::string& KeptText() const { return state.keptText; }
+  /// What the file of the load holds that the load did not take over; empty after a save.
+  const LoadAccount& Account() const { return state.account; }
+  /// Takes over what the load passed over, and forgets it. False when there is more that is to be set by
+  /// hand.
+  bool TakeOverPassedOver();
   /// Saves: under its own name plainly, under another with fresh version stamps and a restarted revision.
   /// False when it failed; the registry then holds the reason, and the file on disk is as it was.
   bool SaveWrapper(const std::string& path);

@@ -8,6 +8,7 @@
 #include <QFileInfo>
 #include <QKeyEvent>
 #include <QMessageBox>
+#include <QPushButton>
 #include <QUrl>
 
 #include "platform/busy_notice.h"
@@ -82,6 +83,14 @@ class BoxDialogs final : public UserDialogs {
 
   Answer AskOneOfMany(QWidget* parent, const QString& question) override {
     return QuestionBox(parent, question, QMessageBox::Yes | QMessageBox::No | QMessageBox::NoToAll).Run();
+  }
+
+  Answer AskToReplace(QWidget* parent, const QString& question) override {
+    QuestionBox box(parent, question, QMessageBox::Yes | QMessageBox::No);
+    const QPushButton* wholeNames = box.addButton(strings::kLeaveLongerNames, QMessageBox::AcceptRole);
+    box.setDefaultButton(QMessageBox::Yes);
+    const Answer answer = box.Run();
+    return box.clickedButton() == wholeNames ? Answer::WholeNames : answer;
   }
 
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override {

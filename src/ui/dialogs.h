@@ -11,7 +11,7 @@ class QWidget;
 namespace tessal {
 
 /// What a question was answered with. A box that is closed without an answer counts as cancelled.
-enum class Answer : std::uint8_t { Yes, No, NoToAll, Cancelled };
+enum class Answer : std::uint8_t { Yes, No, NoToAll, WholeNames, Cancelled };
 
 class UserDialogs : public DocumentDialogs {
  public:
@@ -23,6 +23,8 @@ class UserDialogs : public DocumentDialogs {
   virtual Answer Ask(QWidget* parent, const QString& question) = 0;
   /// Asks one of several questions of a kind, with No to all of them as a further answer.
   virtual Answer AskOneOfMany(QWidget* parent, const QString& question) = 0;
+  /// Asks whether a rename changes the uses, with whole names only as a further answer.
+  virtual Answer AskToReplace(QWidget* parent, const QString& question) = 0;
   /// Lets the user choose what an undefined symbol shall become; -1 when it is skipped.
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
   /// Lets the user choose a documentation file; empty when declined.

@@ -287,7 +287,7 @@ void CElementForm::RenameInTyped(const std::string& former, const std::string& p
     if (control.field->editor != FieldEditor::Expression || !IsEdited(control)) continue;
     auto* expression = qobject_cast<CAutoRichEditCtrl*>(control.editor);
     const QString typed = expression->ContentText();
-    const QString renamed = ToScreen(ReplaceInExpression(typed.toStdString(), former, present));
+    const QString renamed = ToScreen(ReplaceName(typed.toStdString(), former, present));
     if (renamed != typed) expression->Retype(renamed);
   }
 }

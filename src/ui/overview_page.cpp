@@ -84,11 +84,11 @@ void COverviewPpg::CopyToClipboard() {
 }
 
 void COverviewPpg::ExportPage() {
-  const std::string path = PrepareUsualPagePath(Core().TemplateFileName());
+  std::string failure;
+  const std::optional<std::string> path = PrepareUsualPagePath(Core().TemplateFileName(), failure);
   // There is no way to cancel.
   const bool embedMathJax = Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes;
-  std::string failure;
-  if (!ExportHtmlDocumentation(Core(), path, embedMathJax, failure)) {
+  if (!path || !ExportHtmlDocumentation(Core(), *path, embedMathJax, failure)) {
     Dialogs().ShowFailure(this, ToScreen(failure));
   }
   Dialogs().ShowMessage(strings::kPageExported.arg(ToScreen(Core().TemplateFileName())).toStdString());

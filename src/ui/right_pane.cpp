@@ -7,6 +7,7 @@
 #include "core/rename.h"
 #include "ui/dialogs.h"
 #include "ui/offered_creation.h"
+#include "ui/strings.h"
 #include "ui/text_bytes.h"
 
 namespace tessal {
@@ -16,6 +17,17 @@ namespace {
 /// What was not asked about counts as asked from now on.
 void DeclineOffers(TemplateCore& core) {
   while (core.NextOffer()) continue;
+}
+
+Rewriting RewritingOf(Answer replaces) {
+  switch (replaces) {
+    case Answer::Yes:
+      return Rewriting::ByLetters;
+    case Answer::WholeNames:
+      return Rewriting::WholeNames;
+    default:
+      return Rewriting::None;
+  }
 }
 
 }  // namespace
@@ -102,22 +114,31 @@ void CRightPaneBase::JumpTo(Uid uid) {
   Document().UpdateAllViews(nullptr, hint::kSelectElement, &argument);
 }
 
+Answer CRightPaneBase::AskToReplace(const std::string& oldSymbol, const std::string& newSymbol) {
+  QString question = ToScreen("Replace all occurence of '" + oldSymbol + "' with '" + newSymbol + "'?");
+  const std::vector<LostName> lost = LostByRename(Core(), oldSymbol, newSymbol);
+  if (lost.empty()) return Dialogs().Ask(this, question);
+  constexpr std::size_t kShown = 10;
+  question += "\n\n" + strings::kLongerNames.arg(lost.size());
+  for (std::size_t place = 0; place < std::min(kShown, lost.size()); ++place) {
+    question += "\n" + ToScreen(LossText(Core(), lost[place]));
+  }
+  if (lost.size() > kShown) question += "\n" + strings::kMoreNames.arg(lost.size() - kShown);
+  return Dialogs().AskToReplace(this, question);
+}
+
 bool CRightPaneBase::Rename(const std::string& newSymbol) {
   const CEL_Element* element = Element();
   const std::string oldSymbol = element->symbol.Text();
   std::string refusal = RenameRefusal(Core(), newSymbol);
   Answer replaces = Answer::Yes;
   if (refusal.empty()) {
-    if (Core().IsReferenced(element->GetUid())) {
-      replaces = Dialogs().Ask(
-          this, ToScreen("Replace all occurence of '" + oldSymbol + "' with '" + newSymbol + "'?"));
-    }
+    if (Core().IsReferenced(element->GetUid())) replaces = AskToReplace(oldSymbol, newSymbol);
     if (replaces == Answer::Cancelled) return false;
-    if (!Core().RenameSymbol(oldSymbol, newSymbol, replaces == Answer::Yes))
-      refusal = RenameFailure(newSymbol);
+    if (!Core().Rename(oldSymbol, newSymbol, RewritingOf(replaces))) refusal = RenameFailure(newSymbol);
   }
   if (!refusal.empty()) Dialogs().Warn(this, ToScreen(refusal));
-  return refusal.empty() && replaces == Answer::Yes;
+  return refusal.empty() && replaces != Answer::No;
 }
 
 }  // namespace tessal

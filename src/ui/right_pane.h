@@ -85,6 +85,8 @@ class CRightPaneBase : public QWidget {
  private:
   /// Asks about each undefined symbol that was not asked about yet; true when an element was created.
   bool OfferUndefinedSymbols();
+  /// Asks whether a rename changes the uses; the question shows which longer names it would change too.
+  Answer AskToReplace(const std::string& oldSymbol, const std::string& newSymbol);
   Answer AskAbout(const CreationOffer& offer);
   bool IsDeaf() const { return loading || committing || closed; }
 

@@ -55,6 +55,11 @@ inline const QString kDeleteLevel = QStringLiteral("Delete the level");
 inline const QString kIncludeItem = QStringLiteral("Include the item in the level");
 inline const QString kExcludeItem = QStringLiteral("Take the item out of the level");
 
+// Renames.
+inline const QString kLongerNames = QStringLiteral("Longer names would change too (%1):");
+inline const QString kMoreNames = QStringLiteral("and %1 more");
+inline const QString kLeaveLongerNames = QStringLiteral("&Leave Longer Names Alone");
+
 // The main view.
 inline const QString kElements = QStringLiteral("Elements of the template");
 inline const QString kMessages = QStringLiteral("Messages");

@@ -8,6 +8,7 @@
 #include <stdarg.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <sys/types.h>
 #include <unistd.h>
@@ -66,6 +67,10 @@ int close(int descriptor) {
 int fstat(int descriptor, struct stat* status) { return strikes() ? -1 : NEXT(fstat)(descriptor, status); }
 
 int stat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(stat)(path, status); }
+
+int lstat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(lstat)(path, status); }
+
+int flock(int descriptor, int operation) { return strikes() ? -1 : NEXT(flock)(descriptor, operation); }
 
 int access(const char* path, int mode) { return strikes() ? -1 : NEXT(access)(path, mode); }
 

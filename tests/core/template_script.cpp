@@ -430,6 +430,18 @@ std::string TemplateScript::State() const {
   return text.str();
 }
 
+std::string TemplateScript::Account() const {
+  constexpr std::array<const char*, 4> kKinds = {"absent", "unread", "changed", "dropped"};
+  std::string text;
+  for (const AccountEntry& entry : core.Account().Entries()) {
+    const bool canBeTaken = entry.value || entry.ofVisibility;
+    text += std::to_string(entry.line) + " " + std::string(entry.code) + " " +
+            kKinds.at(static_cast<std::size_t>(entry.kind)) + (canBeTaken ? "+" : "") + " " + entry.symbol +
+            ": " + entry.text + "\n";
+  }
+  return text;
+}
+
 std::string TemplateScript::Save(const std::string& name) {
   core.SetModified(false);
   const bool saved = core.SaveWrapper(name.starts_with("/") ? name : folder.File(name));
@@ -460,6 +472,12 @@ CEL_Lagrange_Specie* TemplateScript::ClassIn(const Words& words, std::size_t pla
   return place < words.size() ? &dynamic_cast<CEL_Lagrange_Specie&>(Element(words[place])) : nullptr;
 }
 
+std::string TemplateScript::Lost(const std::string& oldSymbol, const std::string& newSymbol) const {
+  std::string lines;
+  for (const LostName& lost : LostByRename(core, oldSymbol, newSymbol)) lines += LossText(core, lost) + "\n";
+  return lines;
+}
+
 std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
   Uid predecessor = UidOf(name);
   const bool moved = core.MoveBeforeFirstUser(UidOf(name), predecessor);
@@ -478,6 +496,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"file", [](S s, W w) { return s.File(w.empty() ? std::string(kModel) : w[0]); }},
       {"edit-file", [](S s, W w) { return s.EditFile(w.at(0), w.at(1)); }},
       {"messages", [](S, W) { return Messages(); }},
+      {"account", [](S s, W) { return s.Account(); }},
       {"counts", [](S, W) { return Counts(); }},
       {"forget", [](S, W) { return Errors().ClearErrors(), ""; }},
       {"table", [](S s, W) { return s.Table(); }},
@@ -508,6 +527,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"can-move", [](S s, W w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
       {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},
       {"rename-failure", [](S, W w) { return RenameFailure(w.at(0)); }},
+      {"lost-by-rename", [](S s, W w) { return s.Lost(w.at(0), w.at(1)); }},
       {"replace", [](S, W w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
   };
   return kQuestions;
@@ -519,6 +539,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
   using S = TemplateScript&;
   using W = const Words&;
   static const std::map<std::string, Operation> kChanges = {
+      {"take-over", [](S s, W) { return YesNo(s.core.TakeOverPassedOver()); }},
       {"add", [](S s, W w) { return AddElement(s.core, KindOf(w.at(0)), s.ClassIn(w, 1)).symbol.Text(); }},
       {"add-function", [](S s, W) { return s.core.GetMisc()->AddExternalFunction().symbol.Text(); }},
       {"remove-function",
@@ -533,6 +554,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"create", [](S s, W w) { return s.Create(w); }},
       {"offer", [](S s, W w) { return s.Offer(w); }},
       {"rename", [](S s, W w) { return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3)); }},
+      {"rename-whole",
+       [](S s, W w) { return YesNo(s.core.Rename(w.at(0), w.at(1), Rewriting::WholeNames)); }},
       {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
       {"reset", [](S s, W w) { return s.Element(w.at(0)).Reset(), ""; }},
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},

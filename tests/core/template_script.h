@@ -37,6 +37,7 @@ class TemplateScript final {
   CEL_Lagrange_Specie* ClassIn(const Words& words, std::size_t place);
 
   std::string Load(const std::string& path);
+  std::string Account() const;
   std::string Save(const std::string& name);
   std::string File(const std::string& name) const;
   std::string EditFile(const std::string& part, const std::string& by);
@@ -50,6 +51,7 @@ class TemplateScript final {
   std::string Set(const std::string& name, const std::string& field, const std::string& value);
   std::string MoveBeforeFirstUser(const std::string& name);
   std::string Create(const Words& words);
+  std::string Lost(const std::string& oldSymbol, const std::string& newSymbol) const;
   std::string Offer(const Words& words);
   std::string Groups();
   std::string Items(const Words& words);

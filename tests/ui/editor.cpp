@@ -37,6 +37,12 @@ tessal::Answer ScriptedUser::AskOneOfMany(QWidget* parent, const QString& questi
   return answer;
 }
 
+tessal::Answer ScriptedUser::AskToReplace(QWidget* parent, const QString& question) {
+  const tessal::Answer answer = Ask(parent, question);
+  log.append(QStringLiteral("(or whole names only)"));
+  return answer;
+}
+
 int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::uint32_t mask) {
   log.append(QStringLiteral("kind of %1 in %2").arg(symbol).arg(mask));
   return TakeFirst(choices, -1);

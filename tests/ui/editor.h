@@ -38,6 +38,7 @@ class ScriptedUser final : public UserDialogs {
   void ShowFailure(QWidget* /*parent*/, const QString& text) override { log.append(text); }
   tessal::Answer Ask(QWidget* parent, const QString& question) override;
   tessal::Answer AskOneOfMany(QWidget* parent, const QString& question) override;
+  tessal::Answer AskToReplace(QWidget* parent, const QString& question) override;
   int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) override;
   QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
     return documentationFile;

@@ -298,7 +298,10 @@ TEST(Questions, AreNotAnsweredByEscapeOrTheCloseButton) {
                       {&UserDialogs::Ask, "Escape", Answer::Cancelled},
                       {&UserDialogs::Ask, "close", Answer::Cancelled},
                       {&UserDialogs::AskOneOfMany, "N&o to All", Answer::NoToAll},
-                      {&UserDialogs::AskOneOfMany, "close", Answer::Cancelled}};
+                      {&UserDialogs::AskOneOfMany, "close", Answer::Cancelled},
+                      {&UserDialogs::AskToReplace, "&Yes", Answer::Yes},
+                      {&UserDialogs::AskToReplace, "&Leave Longer Names Alone", Answer::WholeNames},
+                      {&UserDialogs::AskToReplace, "Escape", Answer::Cancelled}};
   for (const Row& row : rows) {
     QTimer::singleShot(0, qApp, [&row] {
       QWidget* box = QApplication::activeModalWidget();

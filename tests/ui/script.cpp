@@ -269,6 +269,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        const std::map<char, tessal::Answer> letters = {{'y', tessal::Answer::Yes},
                                                        {'n', tessal::Answer::No},
                                                        {'a', tessal::Answer::NoToAll},
+                                                       {'w', tessal::Answer::WholeNames},
                                                        {'c', tessal::Answer::Cancelled}};
        for (const char letter : words.all) editor.User().answers.push_back(letters.at(letter));
      }},
