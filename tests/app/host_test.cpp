@@ -120,6 +120,7 @@ class HostScript final {
  public:
   explicit HostScript(const std::string& files) {
     QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
+    ClearRecentFiles();
     qputenv("XDG_STATE_HOME", QByteArray::fromStdString(state.Path().string()));
     std::istringstream input(files);
     for (std::string name, value; input >> name >> value;) Write(name, value);
@@ -196,6 +197,7 @@ class HostScript final {
     if (!QTest::qWaitFor([bar] { return bar->isVisible(); }, patience)) return false;
     // A second look may find more.
     if (button.isEmpty()) QTest::qWait(patience / 8);
+    if (!bar->isVisible()) return false;
     for (auto* label : bar->findChildren<QLabel*>())
       if (button.isEmpty() && !label->text().isEmpty()) boxes.texts.append(label->text());
     for (auto* each : bar->findChildren<QAbstractButton*>()) {
