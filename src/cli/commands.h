@@ -6,6 +6,10 @@
 
 #include "cli/output.h"
 
+namespace tessal {
+struct PageOptions;
+}
+
 namespace tessal::cli {
 
 enum class Format { Text, Json, Sarif };
@@ -31,7 +35,7 @@ struct RenameCall {
 };
 ExitCode RunRename(const RenameCall& call);
 ExitCode RunOverview(const std::string& file);
-ExitCode RunHtml(const std::string& file, bool withMathJax, const std::string& output);
+ExitCode RunHtml(const std::string& file, const PageOptions& options, const std::string& output);
 
 // Key files.
 ExitCode RunTree(const std::string& file);

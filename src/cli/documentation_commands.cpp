@@ -14,12 +14,12 @@ ExitCode RunOverview(const std::string& file) {
   return kFine;
 }
 
-ExitCode RunHtml(const std::string& file, bool withMathJax, const std::string& output) {
+ExitCode RunHtml(const std::string& file, const PageOptions& options, const std::string& output) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
   const std::string page = output.empty() ? PrepareUsualPagePath(file) : output;
   std::string failure;
-  if (!ExportHtmlDocumentation(core, page, withMathJax, failure)) {
+  if (!ExportHtmlDocumentation(core, page, options, failure)) {
     Complain(failure);
     return kCallFault;
   }

@@ -15,6 +15,7 @@
 #include "cli/help_text.h"
 #include "cli/numbers.h"
 #include "cli/output.h"
+#include "docgen/html_documentation.h"
 #include "expr/carbonate/options.h"
 
 namespace tessal::cli {
@@ -33,7 +34,8 @@ struct CommandLine {
   std::vector<std::string> ignored;
   bool onlyKeywords = false;
   bool force = false;
-  bool mathJax = false;
+  std::string mathJax;  ///< a flag: the word "true" where no address is given
+  PageOptions page;
   bool asPage = false;
   Format format = Format::Text;
   int lowestLevel = 0;
@@ -113,6 +115,12 @@ void AddCheck(CLI::App& app, CommandLine& line) {
       ->type_name("LEVEL");
 }
 
+PageOptions PageOf(const CommandLine& line) {
+  PageOptions page = line.page;
+  page.mathJax = line.mathJax == "true" ? UsualMathJax() : line.mathJax;
+  return page;
+}
+
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddCheck(app, line);
   AddExplain(app, line);
@@ -149,9 +157,11 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddFile(*overview, line.file);
 
   CLI::App* html = AddCommand(app, line, kTemplates, "html", "writes the HTML documentation",
-                              [&line] { return RunHtml(line.file, line.mathJax, line.output); });
+                              [&line] { return RunHtml(line.file, PageOf(line), line.output); });
   AddFile(*html, line.file);
-  html->add_flag("--mathjax", line.mathJax, "has MathJax render the equations");
+  html->add_flag("--mathjax", line.mathJax,
+                 "has MathJax render the equations; --mathjax=ADDRESS names its script");
+  html->add_flag("--safe", line.page.isSafe, "writes texts so that no markup in them takes effect");
   AddOutput(*html, line.output, "the page to write; without it HTML_doc beside the template takes it");
 }
 

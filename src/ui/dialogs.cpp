@@ -1,11 +1,13 @@
 #include "ui/dialogs.h"
 
 #include <QApplication>
+#include <QCheckBox>
 #include <QCloseEvent>
 #include <QDesktopServices>
 #include <QDir>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QGridLayout>
 #include <QKeyEvent>
 #include <QMessageBox>
 #include <QPushButton>
@@ -13,6 +15,7 @@
 
 #include "platform/busy_notice.h"
 #include "ui/auto_create_dialog.h"
+#include "ui/child.h"
 #include "ui/help_window.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
@@ -65,6 +68,16 @@ class QuestionBox final : public QMessageBox {
   }
 };
 
+/// Adds a ticked box below the fields of a file dialog; none for an empty text.
+QCheckBox* AddOption(QFileDialog& dialog, const QString& text) {
+  auto* layout = qobject_cast<QGridLayout*>(dialog.layout());
+  if (text.isEmpty() || layout == nullptr) return nullptr;
+  auto* box = MakeChild<QCheckBox>(text, &dialog);
+  box->setChecked(true);
+  layout->addWidget(box, layout->rowCount(), 0, 1, -1);
+  return box;
+}
+
 class BoxDialogs final : public UserDialogs {
  public:
   void ShowMessage(const std::string& text) override { Warn(QApplication::activeWindow(), ToScreen(text)); }
@@ -104,22 +117,26 @@ class BoxDialogs final : public UserDialogs {
                                         strings::kDocumentationFilter);
   }
 
-  QString ChooseExportFile(QWidget* parent, const QString& title, const QString& proposal,
-                           const QString& filter) override {
-    QFileDialog dialog(parent, title, QFileInfo(proposal).path(), filter);
+  ExportAnswer ChooseExportFile(QWidget* parent, const ExportQuestion& question) override {
+    const QString& proposal = question.proposal;
+    QFileDialog dialog(parent, question.title, QFileInfo(proposal).path(), question.filter);
     dialog.setAcceptMode(QFileDialog::AcceptSave);
     dialog.setDefaultSuffix(QFileInfo(proposal).suffix());
     const QFileInfo folder(QFileInfo(proposal).path());
+    // Not every dialog of a desktop takes a box, or a name in a folder that is not there yet.
+    if (!folder.isDir() || !question.option.isEmpty()) dialog.setOption(QFileDialog::DontUseNativeDialog);
     if (folder.isDir()) {
       dialog.selectFile(proposal);
     } else {
-      // The folder is made when the user agrees: until then it is a part of the name. Not every dialog of a
-      // desktop takes such a name.
-      dialog.setOption(QFileDialog::DontUseNativeDialog);
+      // The folder is made when the user agrees: until then it is a part of the name.
       dialog.setDirectory(folder.path());
       dialog.selectFile(folder.fileName() + u'/' + QFileInfo(proposal).fileName());
     }
-    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
+    QCheckBox* option = AddOption(dialog, question.option);
+    ExportAnswer answer;
+    if (dialog.exec() == QDialog::Accepted) answer.path = dialog.selectedFiles().value(0);
+    if (option != nullptr) answer.option = option->isChecked();
+    return answer;
   }
 
   bool OpenWithSystem(const QString& target) override {

@@ -86,9 +86,10 @@ void COverviewPpg::CopyToClipboard() {
 void COverviewPpg::ExportPage() {
   const std::string path = PrepareUsualPagePath(Core().TemplateFileName());
   // There is no way to cancel.
-  const bool embedMathJax = Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes;
+  PageOptions options;
+  if (Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes) options.mathJax = UsualMathJax();
   std::string failure;
-  if (!ExportHtmlDocumentation(Core(), path, embedMathJax, failure)) {
+  if (!ExportHtmlDocumentation(Core(), path, options, failure)) {
     Dialogs().ShowFailure(this, ToScreen(failure));
   }
   Dialogs().ShowMessage(strings::kPageExported.arg(ToScreen(Core().TemplateFileName())).toStdString());

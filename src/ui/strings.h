@@ -40,6 +40,8 @@ inline const QString kAskMathJax = QStringLiteral(
     "Export template as HTML documentation.\n\nEmbedd MathJax (jscript MathML render) for equations ?");
 inline const QString kPageExported = QStringLiteral("Template documentation exported to '%1'");
 
+inline const QString kSafePage = QStringLiteral("&Markup and scripts in texts have no effect");
+
 // The visibility pages.
 inline const QString kDefinedLevels = QStringLiteral("Defined levels");
 inline const QString kGroupName = QStringLiteral("Group Name:");

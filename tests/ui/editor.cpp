@@ -48,10 +48,11 @@ int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::ui
   return TakeFirst(choices, -1);
 }
 
-QString ScriptedUser::ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
-                                       const QString& filter) {
-  log.append(title + QStringLiteral(" to ") + proposal + QStringLiteral(" of ") + filter);
-  return exportFile.isNull() ? proposal : exportFile;
+ExportAnswer ScriptedUser::ChooseExportFile(QWidget* /*parent*/, const ExportQuestion& question) {
+  log.append(question.title + QStringLiteral(" to ") + question.proposal + QStringLiteral(" of ") +
+             question.filter);
+  if (!question.option.isEmpty()) log.append(QStringLiteral("[x] ") + question.option);
+  return {exportFile.isNull() ? question.proposal : exportFile, exportOption};
 }
 
 bool ScriptedUser::OpenWithSystem(const QString& target) {

@@ -43,8 +43,7 @@ class ScriptedUser final : public UserDialogs {
   QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
     return documentationFile;
   }
-  QString ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
-                           const QString& filter) override;
+  ExportAnswer ChooseExportFile(QWidget* /*parent*/, const ExportQuestion& question) override;
   bool OpenWithSystem(const QString& target) override;
   void ShowHelp(QWidget* /*parent*/, int topic) override { log.append("help " + QString::number(topic)); }
 
@@ -54,8 +53,9 @@ class ScriptedUser final : public UserDialogs {
   QList<tessal::Answer> answers;  ///< to questions; Yes when used up
   QList<int> choices;             ///< of kinds; skips when used up
   QString documentationFile;
-  QString exportFile;    ///< where exports go; to the proposal when it is null
-  QStringList openable;  ///< what the system can open
+  QString exportFile;        ///< where exports go; to the proposal when it is null
+  bool exportOption = true;  ///< whether the box of an export stays ticked
+  QStringList openable;      ///< what the system can open
 
  private:
   QStringList log;
