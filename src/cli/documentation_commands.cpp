@@ -10,7 +10,7 @@ namespace tessal::cli {
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
-  Print(OverviewText(core, BuildOverview(core)));
+  Print(ForTerminal(OverviewText(core, BuildOverview(core))));
   return kFine;
 }
 
@@ -23,7 +23,7 @@ ExitCode RunHtml(const std::string& file, const PageOptions& options, const std:
     Complain(failure);
     return kCallFault;
   }
-  PrintLine(page);
+  PrintLine(ForTerminal(page));
   return kFine;
 }
 
