@@ -10,7 +10,7 @@ namespace tessal::cli {
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
-  Print(ForTerminal(OverviewText(core, BuildOverview(core))));
+  WriteOverviewText(core, BuildOverview(core), [](const std::string& part) { Print(ForTerminal(part)); });
   return kFine;
 }
 
