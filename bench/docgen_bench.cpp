@@ -37,7 +37,7 @@ void Page(benchmark::State& state) {
   Make(core, state.range(0));
   const std::tm time = {};
   for ([[maybe_unused]] auto turn : state)
-    benchmark::DoNotOptimize(HtmlDocumentation(core, false, time).size());
+    benchmark::DoNotOptimize(HtmlDocumentation(core, {}, time).size());
 }
 
 void Overview(benchmark::State& state) {

@@ -15,14 +15,14 @@ using Json = nlohmann::ordered_json;
 
 void PrintText(const TemplateMessages& messages) {
   for (const TemplateMessage& message : messages.errors) {
-    PrintLine(messages.path + ": " + Coloured(message.word, message.level) + ": " +
+    PrintLine(OnOneLine(messages.path) + ": " + Coloured(message.word, message.level) + ": " +
               (message.symbol.empty() ? "generic" : OnOneLine(message.symbol)) + ": " +
               OnOneLine(message.text));
   }
   for (const UndefinedName& undefined : messages.undefined) {
     for (const UndefinedName::User& user : undefined.usedBy) {
-      PrintLine(messages.path + ": " + Coloured(kUndefinedWord, 0) + ": " + OnOneLine(user.symbol) + ": " +
-                Finding("undefined-symbol", {undefined.symbol}).text);
+      PrintLine(OnOneLine(messages.path) + ": " + Coloured(kUndefinedWord, 0) + ": " +
+                OnOneLine(user.symbol) + ": " + Finding("undefined-symbol", {undefined.symbol}).text);
     }
   }
   for (const AccountEntry& entry : messages.account) PrintLine(AccountLine(messages.path, entry));
@@ -79,7 +79,7 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
     for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
     PrintLine(Json{{"files", list}}.dump());
   } else if (format == Format::Sarif) {
-    PrintLine(SarifText(all));
+    PrintSarif(all);
   }
   return exitCode;
 }

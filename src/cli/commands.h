@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "cli/output.h"
+#include "docgen/html_documentation.h"
 
 namespace tessal::cli {
 
@@ -44,7 +45,7 @@ ExitCode RunOverview(const std::string& file);
 /// never there.
 struct HtmlCall {
   std::string file;
-  bool withMathJax = false;
+  PageOptions page;
   std::string output;
   bool force = false;
 };

@@ -30,7 +30,7 @@ std::optional<std::string> PagePath(const HtmlCall& call, std::string& failure) 
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
-  Print(OverviewText(core, BuildOverview(core)));
+  WriteOverviewText(core, BuildOverview(core), [](const std::string& part) { Print(ForTerminal(part)); });
   return kFine;
 }
 
@@ -39,11 +39,11 @@ ExitCode RunHtml(const HtmlCall& call) {
   if (!LoadOrComplain(core, call.file)) return kCallFault;
   std::string failure;
   const std::optional<std::string> page = PagePath(call, failure);
-  if (!page || !ExportHtmlDocumentation(core, *page, call.withMathJax, failure)) {
+  if (!page || !ExportHtmlDocumentation(core, *page, call.page, failure)) {
     Complain(failure);
     return kCallFault;
   }
-  PrintLine(*page);
+  PrintLine(ForTerminal(*page));
   return kFine;
 }
 

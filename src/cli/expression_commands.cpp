@@ -1,6 +1,7 @@
 // Commands on single expressions.
 #include <algorithm>
 #include <functional>
+#include <optional>
 #include <string_view>
 
 #include "cli/commands.h"
@@ -33,17 +34,16 @@ std::string OnOneLine(std::string_view text, char separator) {
   return line;
 }
 
-/// Asks about each line of standard input; lines end at line feeds alone.
+/// Asks about each line of standard input; lines end at line feeds alone. The answers to the lines that are
+/// there are written before more is waited for.
 ExitCode AskEachLine(const Question& question) {
-  const std::string input = ReadStandardInput();
   ExitCode worst = kFine;
-  std::size_t start = 0;
-  while (start < input.size()) {
-    const std::size_t end = std::min(input.find('\n', start), input.size());
-    const Answer answer = question(input.substr(start, end - start));
+  InputLines lines;
+  while (const std::optional<std::string> line = lines.Next()) {
+    const Answer answer = question(*line);
     PrintLine(OnOneLine(answer.text, '\t'));
     worst = Worse(worst, answer.exitCode);
-    start = end + 1;
+    if (!lines.HasMore()) FlushOutput();
   }
   return worst;
 }

@@ -35,7 +35,7 @@ ExitCode RunTree(const std::string& file) {
   if (read != kFine) return read;
   std::ostringstream text;
   tree.Write(text);
-  Print(text.str());
+  Print(ForTerminal(text.str()));
   return kFine;
 }
 
@@ -57,6 +57,10 @@ ExitCode RunDiff(const std::string& left, const std::string& right, const std::v
     Print(report.str());
     return same ? kFine : kContentFault;
   } catch (const std::regex_error& failure) {
+    if (failure.code() == std::regex_constants::error_complexity) {
+      Complain("a name to ignore has a back reference, which no search takes");
+      return kCallFault;
+    }
     Complain(std::string("a name to ignore is no regular expression: ") + failure.what());
     return kCallFault;
   }

@@ -10,6 +10,9 @@
 #include <cstdlib>
 #include <cstring>
 #include <system_error>
+#include <utility>
+
+#include "platform/text_encoding.h"
 
 namespace tessal::cli {
 
@@ -44,6 +47,63 @@ void WriteOut(Pending& pending) {
   pending.text.clear();
 }
 
+/// Reads what is there of standard input; false at its end.
+bool ReadMore(std::string& text) {
+  std::array<char, 1U << 14U> buffer{};
+  ssize_t count = 0;
+  while ((count = read(STDIN_FILENO, buffer.data(), buffer.size())) < 0) {
+    if (errno != EINTR)
+      throw std::system_error(errno, std::generic_category(), "can not read standard input");
+  }
+  text.append(buffer.data(), static_cast<std::size_t>(count));
+  return count > 0;
+}
+
+constexpr unsigned char kFirstPrintable = 0x20;
+constexpr unsigned char kDelete = 0x7F;
+constexpr unsigned char kHighControls = 0x80;
+constexpr unsigned char kFirstHighPrintable = 0xA0;
+
+unsigned char ByteAt(std::string_view text, std::size_t place) {
+  return place < text.size() ? static_cast<unsigned char>(text[place]) : 0;
+}
+
+/// How many bytes there make a control character; 0 for none. A byte that continues a character of UTF-8 is
+/// none.
+std::size_t ControlAt(std::string_view text, std::size_t place) {
+  constexpr unsigned char kUtf8Lead = 0xC2;
+  const unsigned char byte = ByteAt(text, place);
+  const auto isHigh = [](unsigned char each) { return each >= kHighControls && each < kFirstHighPrintable; };
+  if (byte < kFirstPrintable || byte == kDelete || isHigh(byte)) return 1;
+  return byte == kUtf8Lead && isHigh(ByteAt(text, place + 1)) ? 2 : 0;
+}
+
+/// How many bytes the character there has: one where the bytes are not UTF-8.
+std::size_t LengthAt(std::string_view text, std::size_t place) {
+  for (std::size_t length = 2; length <= 4; ++length) {
+    const std::string_view sequence = text.substr(place, length);
+    if (ByteAt(text, place) >= 0xC2 && sequence.size() == length && IsUtf8(sequence)) return length;
+  }
+  return 1;
+}
+
+/// Blanks in the place of control characters but the kept ones.
+std::string Cleaned(std::string_view text, std::string_view kept) {
+  std::string clean;
+  clean.reserve(text.size());
+  for (std::size_t place = 0; place < text.size();) {
+    const std::size_t control = ControlAt(text, place);
+    const std::size_t length = control > 0 ? control : LengthAt(text, place);
+    if (control > 0 && kept.find(text[place]) == std::string_view::npos) {
+      clean += ' ';
+    } else {
+      clean += text.substr(place, length);
+    }
+    place += length;
+  }
+  return clean;
+}
+
 }  // namespace
 
 ExitCode Worse(ExitCode left, ExitCode right) {
@@ -68,19 +128,29 @@ bool FlushOutput() {
 }
 
 void Complain(std::string_view text) {
-  std::fprintf(stderr, "tessal: %.*s\n", static_cast<int>(text.size()), text.data());
+  const std::string shown = isatty(STDERR_FILENO) != 0 ? Cleaned(text, "\n\t") : std::string(text);
+  std::fprintf(stderr, "tessal: %s\n", shown.c_str());
+}
+
+std::optional<std::string> InputLines::Next() {
+  std::size_t searched = start;
+  std::size_t end = 0;
+  while ((end = buffered.find('\n', searched)) == std::string::npos && !ended) {
+    // Only what no line has taken is kept.
+    buffered.erase(0, start);
+    start = 0;
+    searched = buffered.size();
+    ended = !ReadMore(buffered);
+  }
+  if (end == std::string::npos && start == buffered.size()) return std::nullopt;
+  std::string line = buffered.substr(start, end - start);
+  start = std::min(end, buffered.size() - 1) + 1;
+  return line;
 }
 
 std::string ReadStandardInput() {
   std::string text;
-  std::array<char, 1U << 14U> buffer{};
-  ssize_t count = 0;
-  while ((count = read(STDIN_FILENO, buffer.data(), buffer.size())) != 0) {
-    if (count < 0 && errno != EINTR) {
-      throw std::system_error(errno, std::generic_category(), "can not read standard input");
-    }
-    if (count > 0) text.append(buffer.data(), static_cast<std::size_t>(count));
-  }
+  while (ReadMore(text)) continue;
   return text;
 }
 
@@ -100,11 +170,13 @@ std::string OnOneLine(std::string_view text) {
   std::string line(text);
   for (char& character : line) {
     const auto byte = static_cast<unsigned char>(character);
-    constexpr unsigned char kFirstPrintable = 0x20;
-    constexpr unsigned char kDelete = 0x7F;
     if (byte < kFirstPrintable || byte == kDelete) character = ' ';
   }
-  return line;
+  return ForTerminal(std::move(line));
+}
+
+std::string ForTerminal(std::string text) {
+  return isatty(STDOUT_FILENO) != 0 ? Cleaned(text, "\r\n\t") : std::move(text);
 }
 
 std::string_view WithoutLineFeed(std::string_view text) {

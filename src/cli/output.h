@@ -1,6 +1,7 @@
 // Where the tool's words go: results to standard output, diagnostics to standard error.
 #pragma once
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -27,6 +28,20 @@ bool FlushOutput();
 /// One line on standard error, with the tool's name.
 void Complain(std::string_view text);
 
+/// The lines of standard input, one at a time: those that are there can be answered before the next is read.
+class InputLines final {
+ public:
+  /// The next line, without its line feed; nothing at the end. Raises as `ReadStandardInput` does.
+  std::optional<std::string> Next();
+  /// Whether the next line is here already, at least its start: it will be answered in one go with this one.
+  bool HasMore() const { return start < buffered.size(); }
+
+ private:
+  std::string buffered;
+  std::size_t start = 0;
+  bool ended = false;
+};
+
 /// The whole of standard input. Raises `std::system_error` when it cannot be read to its end.
 std::string ReadStandardInput();
 
@@ -38,6 +53,10 @@ std::string Coloured(std::string_view word, unsigned level);
 
 /// A text made to fit on one line: control characters, line feeds and tabs among them, become blanks.
 std::string OnOneLine(std::string_view text);
+
+/// A text as a terminal may have it: control characters but line ends and tabs become blanks, those of ISO
+/// 6429 as single bytes and in UTF-8 among them. The same text where standard output is no terminal.
+std::string ForTerminal(std::string text);
 
 /// A text without its trailing line feed.
 std::string_view WithoutLineFeed(std::string_view text);

@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include "cli/explanation.h"
+#include "cli/output.h"
 
 namespace tessal::cli {
 
@@ -60,34 +61,70 @@ Json ResultOf(std::string_view code, std::uint32_t level, const std::string& pat
           {"locations", Json::array({location})}};
 }
 
-void AddResults(Json& results, const TemplateMessages& file) {
-  for (const TemplateMessage& message : file.errors) {
-    const std::string symbol = message.symbol.empty() ? "generic" : message.symbol;
-    results.push_back(
-        ResultOf(message.code, message.level, file.path, message.line, symbol + ": " + message.text));
-  }
-  for (const UndefinedName& undefined : file.undefined) {
-    const Finding finding("undefined-symbol", {undefined.symbol});
-    for (const UndefinedName::User& user : undefined.usedBy) {
-      results.push_back(ResultOf(finding.message->code, static_cast<std::uint32_t>(finding.message->level),
-                                 file.path, user.line, user.symbol + ": " + finding.text));
+constexpr int kIndent = 2;
+
+/// Prints the results one after the other as the elements of a list whose brackets are there.
+class ResultPrinter final {
+ public:
+  void PrintResults(const TemplateMessages& file) {
+    for (const TemplateMessage& message : file.errors) {
+      const std::string symbol = message.symbol.empty() ? "generic" : message.symbol;
+      PrintResult(
+          ResultOf(message.code, message.level, file.path, message.line, symbol + ": " + message.text));
+    }
+    for (const UndefinedName& undefined : file.undefined) {
+      const Finding finding("undefined-symbol", {undefined.symbol});
+      for (const UndefinedName::User& user : undefined.usedBy) {
+        PrintResult(ResultOf(finding.message->code, static_cast<std::uint32_t>(finding.message->level),
+                             file.path, user.line, user.symbol + ": " + finding.text));
+      }
     }
   }
-}
+
+  /// Ends the list's last line.
+  void End() const {
+    if (!isFirst) Print(std::string("\n") + kOuterMargin);
+  }
+
+ private:
+  static constexpr const char* kOuterMargin = "      ";
+  static constexpr const char* kMargin = "\n        ";
+
+  void PrintResult(const Json& result) {
+    if (!isFirst) Print(",");
+    isFirst = false;
+    Print(kMargin);
+    // A text in JSON has no line feeds: each is one between the lines of the result.
+    const std::string text = result.dump(kIndent);
+    std::size_t start = 0;
+    for (std::size_t end = 0; (end = text.find('\n', start)) != std::string::npos; start = end + 1) {
+      Print(std::string_view(text).substr(start, end - start));
+      Print(kMargin);
+    }
+    Print(std::string_view(text).substr(start));
+  }
+
+  bool isFirst = true;
+};
 
 }  // namespace
 
-std::string SarifText(const std::vector<TemplateMessages>& files) {
+void PrintSarif(const std::vector<TemplateMessages>& files) {
   Json rules = Json::array();
   for (const MessageRow& row : AllMessages()) rules.push_back(RuleOf(row));
-  Json results = Json::array();
-  for (const TemplateMessages& file : files) AddResults(results, file);
   const Json driver = {{"name", "tessal"}, {"version", TESSAL_VERSION}, {"rules", rules}};
-  const Json run = {{"tool", {{"driver", driver}}}, {"results", results}};
+  const Json run = {{"tool", {{"driver", driver}}}, {"results", Json::array()}};
   const Json log = {{"$schema", "https://json.schemastore.org/sarif-2.1.0.json"},
                     {"version", "2.1.0"},
                     {"runs", Json::array({run})}};
-  return log.dump(2);
+  const std::string text = log.dump(kIndent);
+  constexpr std::string_view kNoResults = "\"results\": []";
+  const std::size_t place = text.rfind(kNoResults) + kNoResults.size() - 1;
+  Print(std::string_view(text).substr(0, place));
+  ResultPrinter printer;
+  for (const TemplateMessages& file : files) printer.PrintResults(file);
+  printer.End();
+  PrintLine(std::string_view(text).substr(place));
 }
 
 }  // namespace tessal::cli

@@ -2,13 +2,13 @@
 // and continuous integration show beside the file.
 #pragma once
 
-#include <string>
 #include <vector>
 
 #include "cli/template_messages.h"
 
 namespace tessal::cli {
 
-std::string SarifText(const std::vector<TemplateMessages>& files);
+/// Prints one log over all files, result by result: it may be much longer than the messages.
+void PrintSarif(const std::vector<TemplateMessages>& files);
 
 }  // namespace tessal::cli

@@ -81,11 +81,29 @@ bool CTessalDoc::Open(const std::string& source, const std::string& path) {
   return loaded;
 }
 
+bool CTessalDoc::MayLose(const std::string& path) {
+  if (path != core.SaveFileName() || !core.Account().Loses()) return true;
+  std::vector<std::string> losses;
+  for (const AccountEntry& entry : core.Account().Entries()) {
+    if (entry.kind != AccountKind::Absent) losses.push_back(entry.text);
+  }
+  const LossAnswer answer = dialogs.AskAboutLosses(path, losses);
+  if (answer.wish != LossAnswer::Wish::SaveCopy) return answer.wish == LossAnswer::Wish::Replace;
+  std::string reason;
+  const std::optional<std::string> text = Copy(reason);
+  if (text) reason = ReplaceFile(answer.copyPath, *text);
+  if (!reason.empty()) {
+    dialogs.ShowMessage("Failed to save file '" + answer.copyPath + "'\n\n" + reason + ".");
+  }
+  return false;
+}
+
 bool CTessalDoc::OnSaveDocument(const std::string& path) {
   if (Errors().GetErrorCount(kAllLevels) > 0 &&
       !dialogs.AskYesNo("This setup contains some errors or warnings.\nProceed anyway?")) {
     return false;
   }
+  if (!MayLose(path)) return false;
   const bool hadMisc = core.GetMisc() != nullptr;
   const bool saved = core.SaveWrapper(path);
   if (saved) {

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "core/template_core.h"
 #include "platform/docview.h"
@@ -34,6 +35,14 @@ struct NumberHint final : UpdateHint {
   std::int32_t number;
 };
 
+/// What the user wants of a save that would lose something of the file it replaces.
+struct LossAnswer {
+  enum class Wish { Replace, SaveCopy, Cancel };
+
+  Wish wish = Wish::Cancel;
+  std::string copyPath;  ///< where the copy goes
+};
+
 /// How the document speaks with its user.
 class DocumentDialogs {
  public:
@@ -41,6 +50,8 @@ class DocumentDialogs {
 
   virtual void ShowMessage(const std::string& text) = 0;
   virtual bool AskYesNo(const std::string& question) = 0;
+  /// Asks what to do about a file that holds what a save would lose, given as lines.
+  virtual LossAnswer AskAboutLosses(const std::string& path, const std::vector<std::string>& losses) = 0;
 
  protected:
   DocumentDialogs() = default;
@@ -55,7 +66,8 @@ class CTessalDoc final : public CDocument {
   /// A new document holds nothing that a save would miss.
   bool OnNewDocument() override;
   bool OnOpenDocument(const std::string& path) override;
-  /// Asks first when the registry holds anything; false, with nothing written, on No.
+  /// Asks first when the registry holds anything, and when the file holds what the save would lose; false,
+  /// with the file as it was, when the user declines or has a copy saved.
   bool OnSaveDocument(const std::string& path) override;
   std::optional<std::string> Copy(std::string& reason) override;
   bool OnOpenCopy(const std::string& source, const std::string& path) override;

@@ -120,12 +120,12 @@ std::vector<const CEL_Element*> TemplateCore::ReferencedElements(const CEL_Eleme
   return elements;
 }
 
-std::set<std::int32_t> TemplateCore::ItemsToRecordNumbers(const std::set<Uid>& uids) const {
-  std::set<std::int32_t> numbers;
+std::map<Uid, std::int32_t> TemplateCore::RecordNumbers(const std::set<Uid>& uids) const {
+  std::map<Uid, std::int32_t> numbers;
   if (uids.empty()) return numbers;
   // The second record of a movement counts as its first.
   state.table.ForEachElement([&uids, &numbers](const SymbolRecord& record) {
-    if (uids.contains(record.uid)) numbers.insert(static_cast<std::int32_t>(record.sequence));
+    if (uids.contains(record.uid)) numbers.emplace(record.uid, static_cast<std::int32_t>(record.sequence));
   });
   return numbers;
 }

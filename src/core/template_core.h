@@ -206,7 +206,7 @@ class TemplateCore final : public ElementOwner {
   // What elements ask of their template.
   std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const override;
   std::size_t SpecieCount() const override { return Species().size(); }
-  std::set<std::int32_t> ItemsToRecordNumbers(const std::set<Uid>& uids) const override;
+  std::map<Uid, std::int32_t> RecordNumbers(const std::set<Uid>& uids) const override;
   void RefreshSearchFunctionChoices() override;
 
   /// Loads a file in the place of the present template. False when it could not be read; the registry then

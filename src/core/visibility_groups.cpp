@@ -296,8 +296,8 @@ void TemplateCore::CollectItems(std::int32_t group, std::int32_t level, std::vec
   for (std::size_t place = first; place < last; ++place) {
     uids.insert(levels[place].items.begin(), levels[place].items.end());
   }
-  const std::set<std::int32_t> numbers = ItemsToRecordNumbers(uids);
-  items.assign(numbers.begin(), numbers.end());
+  for (const auto& [uid, number] : RecordNumbers(uids)) items.push_back(number);
+  std::sort(items.begin(), items.end());
 }
 
 std::vector<std::int32_t> TemplateCore::IncludedItems(std::int32_t group, std::int32_t level) const {

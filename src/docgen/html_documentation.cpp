@@ -7,20 +7,24 @@
 #include <span>
 #include <string_view>
 #include <system_error>
+#include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "core/template_core.h"
 #include "docgen/mathml.h"
 #include "docgen/page_style.h"
+#include "docgen/safe_text.h"
+#include "elements/choices.h"
 #include "expr/parser.h"
 #include "platform/file_replacement.h"
-#include "platform/unit_names.h"
+#include "platform/text_encoding.h"
 
 namespace tessal {
 
 namespace {
 
-constexpr std::string_view kScriptAddress = TESSAL_MATHJAX_SCRIPT;
+constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 constexpr std::string_view kProjectAddress = TESSAL_MATHJAX_PROJECT;
 
 // The slash before the public identifier has always been there.
@@ -101,8 +105,8 @@ bool HasUnitName(std::string_view key) {
 
 class PageWriter final {
  public:
-  PageWriter(const TemplateCore& templateCore, bool embedMathJax)
-      : core(templateCore), mathJax(embedMathJax) {}
+  PageWriter(const TemplateCore& templateCore, const PageOptions& pageOptions)
+      : core(templateCore), options(pageOptions) {}
 
   std::string Write(const std::tm& created) {
     WriteHead();
@@ -118,6 +122,8 @@ class PageWriter final {
     WriteElementSections(true, kElementKeys);
     Line("</div>");
     WriteFooter(created);
+    const bool isAscii = std::none_of(page.begin(), page.end(), [](char each) { return (each & 0x80) != 0; });
+    if (!isAscii && IsUtf8(page)) page.insert(0, kByteOrderMark);
     return std::move(page);
   }
 
@@ -137,14 +143,10 @@ class PageWriter final {
     Line(kDoctype);
     Line("<html>");
     Line("<head>");
-    const std::string& description = core.Root().description.Text();
+    const std::string description = Text(core.Root().description.Text());
     if (!description.empty()) Line("<title>Model description for " + description + "</title>");
-    if (mathJax) {
-      for (const std::string_view query : {"?config=MML_HTMLorMML", ""}) {
-        Line("<script type=text/javascript");
-        Line("src=\"" + std::string(kScriptAddress) + std::string(query) + "\">");
-        Line("</script>");
-      }
+    if (!options.mathJax.empty()) {
+      WriteScripts();
       Line("<meta http-equiv=X-UA-Compatible content=IE=EmulateIE7>");
     }
     Line(kPageStyle);
@@ -153,8 +155,20 @@ class PageWriter final {
     Line("<div id=container>");
     Line("<div id=header>");
     if (!description.empty()) Line("<h1>Model description for " + description + "</h1>");
-    Line("<h2>Template file : " + core.TemplateFileName() + "</h2>");
-    if (mathJax) Line("<br>This document uses MathML and may render quite slow in IE8!");
+    Line("<h2>Template file : " + Text(core.TemplateFileName()) + "</h2>");
+    if (!options.mathJax.empty()) Line("<br>This document uses MathML and may render quite slow in IE8!");
+  }
+
+  void WriteScripts() {
+    // The script of MathJax 2 takes its configuration from the query, and is there twice. One by another name
+    // is taken as it is.
+    static constexpr std::array<std::string_view, 2> kQueries = {"?config=MML_HTMLorMML", ""};
+    const bool isSecond = options.mathJax.ends_with("/MathJax.js");
+    for (const std::string_view query : std::span(kQueries).last(isSecond ? 2 : 1)) {
+      Line("<script type=text/javascript");
+      Line("src=\"" + SafeText(options.mathJax) + std::string(query) + "\">");
+      Line("</script>");
+    }
   }
 
   void WriteSummary() {
@@ -199,7 +213,7 @@ class PageWriter final {
       page += "<br>Document created : ";
       Line(time.data());
     }
-    if (mathJax) {
+    if (!options.mathJax.empty()) {
       Line("<br>Math rendered by <a href=\"" + std::string(kProjectAddress) + "\">MathJax</a>");
     }
     for (const std::string_view end : {"</div>", "</div>", "</body>", "</html>"}) Line(end);
@@ -238,7 +252,7 @@ class PageWriter final {
   }
 
   void WriteSpecie(const CEL_Lagrange_Specie& specie, bool detail, Keys keys) {
-    Line("<li> <h2> Particle Class &quot" + specie.symbol.Text() + "&quot</h2>");
+    Line("<li> <h2> Particle Class &quot" + Text(specie.symbol.Text()) + "&quot</h2>");
     WriteElementEntry(specie, detail, keys, true);
     ForEachMemberList([this, &specie, detail, keys](const auto& list) {
       WriteCollection(list.kind, specie.*list.members, detail, keys);
@@ -255,9 +269,31 @@ class PageWriter final {
     Line("</ul>");
   }
 
-  /// The name of an element's anchor: its symbol field, or, for a movement, which has none, the composed
-  /// symbol.
-  std::string AnchorOf(const CEL_Element& element, const std::vector<ElementField>& fields) const {
+  /// A text of the template as the page has it.
+  std::string Text(const std::string& text) const { return options.isSafe ? SafeText(text) : text; }
+
+  /// An attribute that names the anchor of an element.
+  std::string Attribute(std::string_view start, const CEL_Element& element, const std::string& symbol) {
+    if (!options.isSafe) return std::string(start) + "ref_" + symbol;
+    const std::size_t name = start.find('=') + 1;
+    return std::string(start.substr(0, name)) + '"' + std::string(start.substr(name)) + "ref_" +
+           SafeAnchor(element, symbol) + '"';
+  }
+
+  /// A name that no other element has, also where two have one symbol.
+  const std::string& SafeAnchor(const CEL_Element& element, const std::string& symbol) {
+    std::string& anchor = anchors[&element];
+    if (anchor.empty()) {
+      const std::string text = AnchorText(symbol);
+      const std::size_t number = ++anchorCounts[text];
+      anchor = number == 1 ? text : text + "--" + std::to_string(number);
+    }
+    return anchor;
+  }
+
+  /// The symbol that an element's anchor is named after: its symbol field, or, for a movement, which has
+  /// none, the composed symbol.
+  std::string AnchorSymbol(const CEL_Element& element, const std::vector<ElementField>& fields) const {
     if (const ElementField* symbol = FindField(fields, "Symbol")) return symbol->text;
     const bool isMovement =
         element.Kind() == ElementKind::HorizontalVector || element.Kind() == ElementKind::VerticalEquation;
@@ -281,14 +317,15 @@ class PageWriter final {
     std::vector<ElementField> fields;
     element.GetFields(fields);
     Line("<ul><li>");
-    const std::string anchor = AnchorOf(element, fields);
-    if (!anchor.empty()) {
-      Line((detail ? "<h4> <a id=ref_" : "<h4> <a href=#ref_") + anchor + ">" + anchor + "</a></h4>");
+    const std::string symbol = AnchorSymbol(element, fields);
+    if (!symbol.empty()) {
+      Line("<h4> <a " + Attribute(detail ? "id=" : "href=#", element, symbol) + ">" + Text(symbol) +
+           "</a></h4>");
     }
     if (detail) {
       Line("<table border=0 > ");
       Line("<colgroup> <col width=30%> <col width=70%> </colgroup> ");
-      for (const std::string_view key : keys) WriteRow(element, fields, key, anchor);
+      for (const std::string_view key : keys) WriteRow(element, fields, key, symbol);
       if (withReferences) WriteReferences(element);
       Line("</table> ");
     }
@@ -307,9 +344,9 @@ class PageWriter final {
     if (field->kind == FieldKind::Expression) {
       const bool isDerivative =
           element.Kind() == ElementKind::StateVariable || element.Kind() == ElementKind::SpecieStateVariable;
-      Line(MathMLOf(element, *field, symbol, isDerivative));
+      Line(MathMLOf(element, *field, Text(symbol), isDerivative));
     } else {
-      Line(FieldText(*field));
+      Line(Text(FieldText(*field)));
     }
     std::string unitName;
     if (HasUnitName(key) && unqGetItemTypeKey(field->intValue, unitName) != 0) Line(" (" + unitName + ")");
@@ -325,9 +362,14 @@ class PageWriter final {
     Line("<td>");
     std::string links;
     if (const SymbolRecord* record = core.RecordOfElement(element)) {
-      for (const std::string& name : core.ReferrerSymbols(*record)) {
+      const CEL_Element* previous = nullptr;
+      for (const std::uint32_t sequence : record->referencedBy) {
+        const SymbolRecord& user = *core.FindRecordBySequence(sequence);
+        // The two records of a movement are side by side.
+        if (std::exchange(previous, user.element) == user.element) continue;
+        const std::string name = core.RecordSymbol(user);
         if (!links.empty()) links += ", ";
-        links.append("<a href=#ref_").append(name).append(">").append(name).append("</a>");
+        links += "<a " + Attribute("href=#", *user.element, name) + ">" + Text(name) + "</a>";
       }
     }
     Line(links.empty() ? "- not used -" : links);
@@ -336,14 +378,21 @@ class PageWriter final {
   }
 
   const TemplateCore& core;
-  bool mathJax;
+  const PageOptions& options;
   std::string page;
+  /// Of safe pages: the anchors so far by element, and how many elements share a name.
+  std::unordered_map<const CEL_Element*, std::string> anchors;
+  std::unordered_map<std::string, std::size_t> anchorCounts;
 };
 
 }  // namespace
 
-std::string HtmlDocumentation(const TemplateCore& core, bool embedMathJax, const std::tm& created) {
-  return PageWriter(core, embedMathJax).Write(created);
+std::string_view UsualMathJax() {
+  return TESSAL_MATHJAX_ADDRESS;
+}
+
+std::string HtmlDocumentation(const TemplateCore& core, const PageOptions& options, const std::tm& created) {
+  return PageWriter(core, options).Write(created);
 }
 
 std::string UsualPagePath(const std::string& templateFile) {
@@ -380,7 +429,7 @@ std::string PageRefusal(const std::string& path) {
              : "'" + path + "' exists already and is no page of this program";
 }
 
-bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, bool embedMathJax,
+bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, const PageOptions& options,
                              std::string& failure) {
   std::error_code notThere;
   if (std::filesystem::equivalent(path, core.TemplateFileName(), notThere)) {
@@ -390,7 +439,7 @@ bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, 
   const std::time_t now = std::time(nullptr);
   std::tm local = {};
   localtime_r(&now, &local);
-  failure = WriteOutputFile(path, HtmlDocumentation(core, embedMathJax, local));
+  failure = WriteOutputFile(path, HtmlDocumentation(core, options, local));
   return failure.empty();
 }
 

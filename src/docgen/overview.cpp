@@ -133,8 +133,10 @@ void AppendRow(const Cells& cells, const Widths& longest, std::string& text) {
   for (std::size_t column = 0; column < cells.size(); ++column) {
     if (column > 0) text += '\t';
     const std::size_t width = longest[column] + 1;
-    const std::string padding(width - std::min(width, cells[column].size()), ' ');
-    text += kOverviewColumns[column].rightAligned ? padding + cells[column] : cells[column] + padding;
+    const std::size_t padding = width - std::min(width, cells[column].size());
+    if (kOverviewColumns[column].rightAligned) text.append(padding, ' ');
+    text += cells[column];
+    if (!kOverviewColumns[column].rightAligned) text.append(padding, ' ');
   }
   text += "\r\n";
 }
@@ -145,23 +147,32 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core) {
   return OverviewBuilder(core).Build();
 }
 
-std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows) {
+void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows,
+                       const std::function<void(const std::string& part)>& write) {
   std::string text = "Template " + core.TemplateFileName() + "\r\n";
   // No line end follows the revision: the header row begins right after it.
   if (core.GetMisc() != nullptr && core.GetDocumentRevision() > 0) {
     text += "\nRevision " + std::to_string(core.GetDocumentRevision());
   }
-  std::vector<Cells> table;
-  table.reserve(rows.size());
   Widths longest{};
   for (const OverviewRow& row : rows) {
-    table.push_back(TextCells(row.cells));
+    const Cells cells = TextCells(row.cells);
     for (std::size_t column = 0; column < longest.size(); ++column) {
-      longest[column] = std::max(longest[column], table.back()[column].size());
+      longest[column] = std::max(longest[column], cells[column].size());
     }
   }
   AppendRow(TextTitles(), longest, text);
-  for (const Cells& cells : table) AppendRow(cells, longest, text);
+  write(text);
+  for (const OverviewRow& row : rows) {
+    text.clear();
+    AppendRow(TextCells(row.cells), longest, text);
+    write(text);
+  }
+}
+
+std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows) {
+  std::string text;
+  WriteOverviewText(core, rows, [&text](const std::string& part) { text += part; });
   return text;
 }
 

@@ -5,6 +5,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -44,6 +45,10 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core);
 /// The rows as aligned text, after the template's file name and, above 0, its revision. Rows end in carriage
 /// return and line feed. Widths go by the rows alone: a longer title pushes its own row out of line.
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows);
+
+/// The same, handed out row by row: each row is as wide as the longest expression.
+void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows,
+                       const std::function<void(const std::string& part)>& write);
 
 /// Writes that text. False, with the reason in words, when not every byte reached the file, or when the path
 /// is that of the template itself, which is then left alone.

@@ -118,6 +118,16 @@ const UnitTypeRow* FindUnitType(const UnitTypes& types, std::int32_t unqType) {
   return hit == types.rows.end() ? nullptr : &*hit;
 }
 
+int unqGetItemTypeKey(std::int32_t unqType, std::string& text) {
+  for (const UnitTypes* types : {&kInputUnitTypes, &kStateVariableUnitTypes, &kParticleUnitTypes}) {
+    const UnitTypeRow* row = FindUnitType(*types, unqType);
+    if (row == nullptr) continue;
+    text = row->display;
+    return 1;
+  }
+  return 0;
+}
+
 const ChoiceList& UnitTypeChoices(const UnitTypes& types) {
   static std::map<const UnitTypeRow*, ChoiceList> lists;
   ChoiceList& list = lists[types.rows.data()];

@@ -57,6 +57,10 @@ extern const UnitTypes kParticleUnitTypes;       ///< of the values of particle 
 /// The row of a unit type, or none.
 const UnitTypeRow* FindUnitType(const UnitTypes& types, std::int32_t unqType);
 
+/// The unit library's look-up: the name of a unit type of any family, as forms show it. Not 0 when there is
+/// one; else 0, with the text untouched.
+int unqGetItemTypeKey(std::int32_t unqType, std::string& text);
+
 /// Numbered choices over the unit types, one list for each family.
 const ChoiceList& UnitTypeChoices(const UnitTypes& types);
 

@@ -3,6 +3,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <map>
 #include <set>
 #include <string_view>
 #include <vector>
@@ -33,9 +34,9 @@ class ElementOwner {
   /// How many particle classes there are.
   virtual std::size_t SpecieCount() const = 0;
 
-  /// The numbers of the symbol records of elements, given by their identities; an identity without a record
-  /// is left out.
-  virtual std::set<std::int32_t> ItemsToRecordNumbers(const std::set<Uid>& uids) const = 0;
+  /// The numbers of the symbol records of elements, by their identities; an identity without a record is left
+  /// out. Costs a walk over the whole table: ask once for many.
+  virtual std::map<Uid, std::int32_t> RecordNumbers(const std::set<Uid>& uids) const = 0;
 
   /// Fills the choice lists of all search functions from the present classes and their values.
   virtual void RefreshSearchFunctionChoices() = 0;

@@ -103,6 +103,7 @@ void CEL_Visibility::Read(KvfNode settings, ReadStatus& status) {
 }
 
 void CEL_Visibility::Write(KvfHandle file, int& status) {
+  const std::map<Uid, std::int32_t> numbers = RecordNumbersOfItems();
   kvfAddSection(file, section::kVisibilityGroups);
   WriteBase(file, status);
   WriteInteger(static_cast<std::int32_t>(groups.size()), file, key::kGroups, *this, status);
@@ -114,7 +115,7 @@ void CEL_Visibility::Write(KvfHandle file, int& status) {
     WriteInteger(static_cast<std::int32_t>(levels.size()), file, key::kLevels, *this, status);
     for (std::size_t level = 0; level < levels.size(); ++level) {
       kvfAddSection(file, Numbered(section::kLevelPrefix, level + 1));
-      WriteLevel(levels[level], file, status);
+      WriteLevel(levels[level], numbers, file, status);
       kvfEndSection(file);
     }
     kvfEndSection(file);
@@ -122,10 +123,23 @@ void CEL_Visibility::Write(KvfHandle file, int& status) {
   kvfEndSection(file);
 }
 
-void CEL_Visibility::WriteLevel(const VisibilityLevel& level, KvfHandle file, int& status) {
+std::map<Uid, std::int32_t> CEL_Visibility::RecordNumbersOfItems() const {
+  if (Owner() == nullptr) return {};
+  std::set<Uid> uids;
+  for (const VisibilityGroup& group : groups) {
+    for (const VisibilityLevel& level : group.levels) uids.insert(level.items.begin(), level.items.end());
+  }
+  return Owner()->RecordNumbers(uids);
+}
+
+void CEL_Visibility::WriteLevel(const VisibilityLevel& level, const std::map<Uid, std::int32_t>& numbers,
+                                KvfHandle file, int& status) {
   // The identities stay in memory: a second save starts from them again.
-  const std::set<std::int32_t> records =
-      Owner() == nullptr ? std::set<std::int32_t>() : Owner()->ItemsToRecordNumbers(level.items);
+  std::set<std::int32_t> records;
+  for (const Uid item : level.items) {
+    const auto number = numbers.find(item);
+    if (number != numbers.end()) records.insert(number->second);
+  }
   WriteText(level.name, file, key::kLevel, *this, status);
   WriteText(level.description, file, key::kDescription, *this, status);
   WriteInteger(static_cast<std::int32_t>(records.size()), file, key::kItemCount, *this, status);

@@ -2,6 +2,7 @@
 // template. The definitions list, for each level, the elements that belong to it.
 #pragma once
 
+#include <map>
 #include <set>
 #include <string>
 #include <vector>
@@ -44,7 +45,10 @@ class CEL_Visibility final : public CEL_Element {
   std::vector<VisibilityGroup> groupsPassedOver;
 
  private:
-  void WriteLevel(const VisibilityLevel& level, KvfHandle file, int& status);
+  /// The record number of every element that belongs to any level.
+  std::map<Uid, std::int32_t> RecordNumbersOfItems() const;
+  void WriteLevel(const VisibilityLevel& level, const std::map<Uid, std::int32_t>& numbers, KvfHandle file,
+                  int& status);
 };
 
 }  // namespace tessal

@@ -21,15 +21,13 @@ std::regex CompileOne(const std::string& expression) {
     throw std::regex_error(std::regex_constants::error_complexity);
   }
 #ifdef __GLIBCXX__
-  try {
-    // Without the flag a search may try every way through the expression, for longer than anyone waits.
-    return std::regex(expression, std::regex::ECMAScript | std::regex_constants::__polynomial);
-  } catch (const std::regex_error& failure) {
-    // Only back references are refused so.
-    if (failure.code() != std::regex_constants::error_complexity) throw;
-  }
+  // Without the flag a search may try every way through the expression, for longer than anyone waits and in
+  // as many nested calls as the name has bytes. Back references cannot be searched so, and are refused.
+  constexpr auto kGrammar = std::regex::ECMAScript | std::regex_constants::__polynomial;
+#else
+  constexpr auto kGrammar = std::regex::ECMAScript;
 #endif
-  return std::regex(expression);
+  return std::regex(expression, kGrammar);
 }
 
 std::vector<std::regex> Compile(const IgnoredNames* names) {

@@ -1,11 +1,13 @@
 #include "ui/dialogs.h"
 
 #include <QApplication>
+#include <QCheckBox>
 #include <QCloseEvent>
 #include <QDesktopServices>
 #include <QDir>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QGridLayout>
 #include <QKeyEvent>
 #include <QMessageBox>
 #include <QPushButton>
@@ -13,6 +15,7 @@
 
 #include "platform/busy_notice.h"
 #include "ui/auto_create_dialog.h"
+#include "ui/child.h"
 #include "ui/help_window.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
@@ -29,6 +32,18 @@ void ShowBox(QWidget* parent, const QString& title, const QString& text) {
 }
 
 /// A question whose escape key and close button are no answer, where the toolkit takes them for a No.
+/// The first of the texts, a line each, and how many more there are.
+QString FirstOf(const std::vector<std::string>& texts) {
+  constexpr std::size_t kMostShown = 10;
+  QStringList lines;
+  for (const std::string& text : texts) {
+    if (static_cast<std::size_t>(lines.size()) == kMostShown) break;
+    lines.append(ToScreen(text).simplified());
+  }
+  if (texts.size() > kMostShown) lines.append(strings::kMoreLosses.arg(texts.size() - kMostShown));
+  return lines.join(u'\n');
+}
+
 class QuestionBox final : public QMessageBox {
  public:
   QuestionBox(QWidget* parent, const QString& question, StandardButtons buttons)
@@ -65,6 +80,16 @@ class QuestionBox final : public QMessageBox {
   }
 };
 
+/// Adds a ticked box below the fields of a file dialog; none for an empty text.
+QCheckBox* AddOption(QFileDialog& dialog, const QString& text) {
+  auto* layout = qobject_cast<QGridLayout*>(dialog.layout());
+  if (text.isEmpty() || layout == nullptr) return nullptr;
+  auto* box = MakeChild<QCheckBox>(text, &dialog);
+  box->setChecked(true);
+  layout->addWidget(box, layout->rowCount(), 0, 1, -1);
+  return box;
+}
+
 class BoxDialogs final : public UserDialogs {
  public:
   void ShowMessage(const std::string& text) override { Warn(QApplication::activeWindow(), ToScreen(text)); }
@@ -79,6 +104,40 @@ class BoxDialogs final : public UserDialogs {
 
   Answer Ask(QWidget* parent, const QString& question) override {
     return QuestionBox(parent, question, QMessageBox::Yes | QMessageBox::No).Run();
+  }
+
+  LossAnswer AskAboutLosses(const std::string& path, const std::vector<std::string>& losses) override {
+    QMessageBox box(QMessageBox::Warning, strings::kEditorName,
+                    strings::kAskAboutLosses.arg(ToScreen(path), FirstOf(losses)), QMessageBox::Cancel,
+                    QApplication::activeWindow());
+    box.setTextFormat(Qt::PlainText);
+    const QPushButton* copy = box.addButton(strings::kSaveCopy, QMessageBox::ActionRole);
+    const QPushButton* replace = box.addButton(strings::kReplace, QMessageBox::DestructiveRole);
+    box.setDefaultButton(QMessageBox::Cancel);
+    box.exec();
+    if (box.clickedButton() == replace) return {LossAnswer::Wish::Replace, {}};
+    if (box.clickedButton() != copy) return {};
+    const QString chosen =
+        QFileDialog::getSaveFileName(QApplication::activeWindow(), strings::kSaveCopy, ToScreen(path));
+    if (chosen.isEmpty() || chosen == ToScreen(path)) return {};
+    return {LossAnswer::Wish::SaveCopy, chosen.toStdString()};
+  }
+
+  void ShowDetails(QWidget* parent, const QString& title, const QString& text) override {
+    QDialog dialog(parent);
+    dialog.setWindowTitle(title);
+    auto* shown = MakeChild<QPlainTextEdit>(text, &dialog);
+    shown->setReadOnly(true);
+    shown->setTabChangesFocus(true);
+    shown->setAccessibleName(title);
+    auto* buttons = MakeChild<QDialogButtonBox>(QDialogButtonBox::Close, &dialog);
+    QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
+    auto* layout = MakeChild<QVBoxLayout>(&dialog);
+    layout->addWidget(shown);
+    layout->addWidget(buttons);
+    constexpr QSize kUsualSize(700, 400);
+    dialog.resize(kUsualSize);
+    dialog.exec();
   }
 
   Answer AskOneOfMany(QWidget* parent, const QString& question) override {
@@ -104,22 +163,26 @@ class BoxDialogs final : public UserDialogs {
                                         strings::kDocumentationFilter);
   }
 
-  QString ChooseExportFile(QWidget* parent, const QString& title, const QString& proposal,
-                           const QString& filter) override {
-    QFileDialog dialog(parent, title, QFileInfo(proposal).path(), filter);
+  ExportAnswer ChooseExportFile(QWidget* parent, const ExportQuestion& question) override {
+    const QString& proposal = question.proposal;
+    QFileDialog dialog(parent, question.title, QFileInfo(proposal).path(), question.filter);
     dialog.setAcceptMode(QFileDialog::AcceptSave);
     dialog.setDefaultSuffix(QFileInfo(proposal).suffix());
     const QFileInfo folder(QFileInfo(proposal).path());
+    // Not every dialog of a desktop takes a box, or a name in a folder that is not there yet.
+    if (!folder.isDir() || !question.option.isEmpty()) dialog.setOption(QFileDialog::DontUseNativeDialog);
     if (folder.isDir()) {
       dialog.selectFile(proposal);
     } else {
-      // The folder is made when the user agrees: until then it is a part of the name. Not every dialog of a
-      // desktop takes such a name.
-      dialog.setOption(QFileDialog::DontUseNativeDialog);
+      // The folder is made when the user agrees: until then it is a part of the name.
       dialog.setDirectory(folder.path());
       dialog.selectFile(folder.fileName() + u'/' + QFileInfo(proposal).fileName());
     }
-    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
+    QCheckBox* option = AddOption(dialog, question.option);
+    ExportAnswer answer;
+    if (dialog.exec() == QDialog::Accepted) answer.path = dialog.selectedFiles().value(0);
+    if (option != nullptr) answer.option = option->isChecked();
+    return answer;
   }
 
   bool OpenWithSystem(const QString& target) override {

@@ -13,6 +13,19 @@ namespace tessal {
 /// What a question was answered with. A box that is closed without an answer counts as cancelled.
 enum class Answer : std::uint8_t { Yes, No, NoToAll, WholeNames, Cancelled };
 
+/// Where to an export goes by proposal, whose folder need not be there yet.
+struct ExportQuestion {
+  QString title;
+  QString proposal;
+  QString filter;
+  QString option;  ///< the text of a box that is ticked at first; no box for an empty one
+};
+
+struct ExportAnswer {
+  QString path;  ///< empty when declined
+  bool option = true;
+};
+
 class UserDialogs : public DocumentDialogs {
  public:
   /// Shows a text in a box with an exclamation icon.
@@ -29,10 +42,10 @@ class UserDialogs : public DocumentDialogs {
   virtual int ChooseKind(QWidget* parent, const QString& symbol, std::uint32_t mask) = 0;
   /// Lets the user choose a documentation file; empty when declined.
   virtual QString ChooseDocumentationFile(QWidget* parent, const QString& start) = 0;
-  /// Lets the user choose where a file is written, from a proposal whose folder need not be there yet; empty
-  /// when declined.
-  virtual QString ChooseExportFile(QWidget* parent, const QString& title, const QString& proposal,
-                                   const QString& filter) = 0;
+  /// Lets the user choose where a file is written, and how.
+  virtual ExportAnswer ChooseExportFile(QWidget* parent, const ExportQuestion& question) = 0;
+  /// Shows a long text that can be scrolled and copied.
+  virtual void ShowDetails(QWidget* parent, const QString& title, const QString& text) = 0;
   /// Asks the system to open a file or an address; false when it cannot.
   virtual bool OpenWithSystem(const QString& target) = 0;
   /// Opens the help at the topic with this number.

@@ -25,7 +25,9 @@ struct Export {
   const char* title;
   const char* filter;
   std::string (*usualPath)(const std::string& templateFile);
-  bool (*write)(const TemplateCore& core, const std::string& path, std::string& failure);
+  /// The text of a box that the user may leave unticked, or none.
+  QString option;
+  bool (*write)(const TemplateCore& core, const std::string& path, bool option, std::string& failure);
 };
 
 std::string UsualOverviewPath(const std::string& templateFile) {
@@ -34,15 +36,25 @@ std::string UsualOverviewPath(const std::string& templateFile) {
 }
 
 /// Browsers show equations without a script.
-bool WritePage(const TemplateCore& core, const std::string& path, std::string& failure) {
-  return ExportHtmlDocumentation(core, path, false, failure);
+bool WritePage(const TemplateCore& core, const std::string& path, bool option, std::string& failure) {
+  PageOptions page;
+  page.isSafe = option;
+  return ExportHtmlDocumentation(core, path, page, failure);
 }
 
-constexpr std::array<Export, 2> kExports = {{
+bool WriteOverview(const TemplateCore& core, const std::string& path, bool /*option*/, std::string& failure) {
+  return ExportOverview(core, path, failure);
+}
+
+const std::array<Export, 2> kExports = {{
     {"Export &Documentation...", "Export Documentation", "HTML pages (*.html *.htm);;All files (*)",
-     UsualPagePath, WritePage},
-    {"Export O&verview...", "Export Overview", "Text files (*.txt);;All files (*)", UsualOverviewPath,
-     ExportOverview},
+     UsualPagePath, strings::kSafePage, WritePage},
+    {"Export O&verview...",
+     "Export Overview",
+     "Text files (*.txt);;All files (*)",
+     UsualOverviewPath,
+     {},
+     WriteOverview},
 }};
 
 QString ProposalOf(const Export& what, const CTessalDoc& document) {
@@ -52,21 +64,25 @@ QString ProposalOf(const Export& what, const CTessalDoc& document) {
 }
 
 /// Empty after a success, otherwise the reason in words. The folder that was proposed may not be there yet.
-QString Write(const Export& what, const CTessalDoc& document, const QString& path, QWidget& view) {
+QString Write(const Export& what, const CTessalDoc& document, const ExportAnswer& answer, QWidget& view) {
+  const QString& path = answer.path;
   const BusyNotice busy(view, strings::kExporting.arg(path));
   const QFileInfo folder(QFileInfo(path).absolutePath());
   if (!folder.exists()) QDir().mkdir(folder.filePath());
   std::string failure;
-  return what.write(document.Core(), QFile::encodeName(path).toStdString(), failure) ? QString()
-                                                                                     : ToScreen(failure);
+  return what.write(document.Core(), QFile::encodeName(path).toStdString(), answer.option, failure)
+             ? QString()
+             : ToScreen(failure);
 }
 
 void Run(const Export& what, CTessalDoc& document, UserDialogs& dialogs, QWidget& view) {
   document.UpdateAllViews(nullptr, hint::kCommit);
-  const QString path = dialogs.ChooseExportFile(&view, QString::fromLatin1(what.title),
-                                                ProposalOf(what, document), QString::fromLatin1(what.filter));
+  const ExportAnswer answer =
+      dialogs.ChooseExportFile(&view, {QString::fromLatin1(what.title), ProposalOf(what, document),
+                                       QString::fromLatin1(what.filter), what.option});
+  const QString& path = answer.path;
   if (path.isEmpty()) return;
-  const QString failure = Write(what, document, path, view);
+  const QString failure = Write(what, document, answer, view);
   if (!failure.isEmpty()) {
     dialogs.ShowFailure(&view, strings::kNotExported.arg(path, failure));
   } else if (dialogs.Ask(&view, strings::kExported.arg(path)) == Answer::Yes &&

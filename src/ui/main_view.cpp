@@ -14,6 +14,7 @@
 #include <algorithm>
 
 #include "core/document.h"
+#include "ui/account_strip.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
 #include "ui/create_hint.h"
@@ -99,6 +100,9 @@ void CMainView::OnInitialUpdate() {
   BuildLayout();
   connect(errorList, &CErrorList::Refreshed, this,
           [this] { tree->ShowMessages(errorList->MessagesOfElements()); });
+  connect(errorList, &CErrorList::Refreshed, this, [this] { accountStrip->Show(Core().Account()); });
+  connect(accountStrip, &CAccountStrip::ReadRequested, this, &CMainView::ReadPassedOver);
+  connect(accountStrip, &CAccountStrip::DetailsRequested, this, &CMainView::ShowAccount);
   connect(errorList, &CErrorList::CreateSymbolRequested, this, &CMainView::CreateSymbol);
   tree->Build(Core());
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
@@ -141,8 +145,6 @@ void CMainView::BuildLayout() {
   tree = MakeChild<CElementTree>(this);
   tree->setMinimumWidth(kSmallestTree);
   tree->installEventFilter(this);
-  errorList = MakeChild<CErrorList>(this);
-  errorList->setMinimumHeight(kSmallestErrors);
 
   auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
   treeDetail->setObjectName(QStringLiteral("TreeDetail"));
@@ -157,7 +159,7 @@ void CMainView::BuildLayout() {
   auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
   topBottom->setObjectName(QStringLiteral("TopBottom"));
   topBottom->addWidget(treeDetail);
-  topBottom->addWidget(errorList);
+  topBottom->addWidget(MakeMessages());
   topBottom->setStretchFactor(0, 1);
   topBottom->setChildrenCollapsible(false);
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
@@ -168,6 +170,40 @@ void CMainView::BuildLayout() {
   layout->setSpacing(0);
   layout->addWidget(toolBar);
   layout->addWidget(topBottom, 1);
+}
+
+QWidget* CMainView::MakeMessages() {
+  auto* messages = MakeChild<QWidget>(this);
+  accountStrip = MakeChild<CAccountStrip>(messages);
+  errorList = MakeChild<CErrorList>(messages);
+  errorList->setMinimumHeight(kSmallestErrors);
+  auto* layout = MakeChild<QVBoxLayout>(messages);
+  layout->setContentsMargins(0, 0, 0, 0);
+  layout->setSpacing(0);
+  layout->addWidget(accountStrip);
+  layout->addWidget(errorList, 1);
+  return messages;
+}
+
+void CMainView::ReadPassedOver() {
+  // What is being entered belongs to the values of before.
+  CommitAll();
+  Core().TakeOverPassedOver();
+  const CEL_Miscanellous* settings = Core().GetMisc();
+  if (settings != nullptr) {
+    const auto& groups = settings->Visibilities().groups;
+    for (std::size_t place = tree->GroupItems().size(); place < groups.size(); ++place) {
+      tree->AddGroup(groups[place].name);
+    }
+  }
+  ReplaceForm(tree->currentItem());
+  RefreshCaption(shown);
+  MarkDocument();
+  errorList->RefreshErrorList(Core());
+}
+
+void CMainView::ShowAccount() {
+  dialogs.ShowDetails(this, strings::kAccountTitle, AccountDetails(Core().Account()));
 }
 
 QWidget* CMainView::MakeTitleDetail() {

@@ -22,6 +22,7 @@ namespace tessal {
 
 class CEL_Element;
 class CElementTree;
+class CAccountStrip;
 class CErrorList;
 class CLabel;
 class CRightPaneBase;
@@ -50,6 +51,7 @@ class CMainView final : public QWidget, public CView {
   CTessalDoc& Document() const { return document; }
   CElementTree& Tree() const { return *tree; }
   CErrorList& ErrorList() const { return *errorList; }
+  CAccountStrip& AccountStrip() const { return *accountStrip; }
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
   /// The number of the help topic for the selected node.
@@ -77,6 +79,11 @@ class CMainView final : public QWidget, public CView {
   void ReplaceForm(QTreeWidgetItem* item);
   void CloseForm();
   void Commit();
+  /// Takes over what the load passed over, and shows it.
+  void ReadPassedOver();
+  void ShowAccount();
+  /// The strip over the list of messages.
+  QWidget* MakeMessages();
   /// Commits until nothing is left unwritten, for when the form goes or the document is saved.
   void CommitAll();
   void RefreshCaption(QTreeWidgetItem* item);
@@ -110,6 +117,7 @@ class CMainView final : public QWidget, public CView {
   CLabel* title = nullptr;
   CElementTree* tree = nullptr;
   CErrorList* errorList = nullptr;
+  CAccountStrip* accountStrip = nullptr;
   QWidget* holder = nullptr;
   QVBoxLayout* holderLayout = nullptr;
   std::unique_ptr<CRightPaneBase> form;

@@ -87,8 +87,9 @@ void COverviewPpg::ExportPage() {
   std::string failure;
   const std::optional<std::string> path = PrepareUsualPagePath(Core().TemplateFileName(), failure);
   // There is no way to cancel.
-  const bool embedMathJax = Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes;
-  if (!path || !ExportHtmlDocumentation(Core(), *path, embedMathJax, failure)) {
+  PageOptions options;
+  if (Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes) options.mathJax = UsualMathJax();
+  if (!path || !ExportHtmlDocumentation(Core(), *path, options, failure)) {
     Dialogs().ShowFailure(this, ToScreen(failure));
   }
   Dialogs().ShowMessage(strings::kPageExported.arg(ToScreen(Core().TemplateFileName())).toStdString());

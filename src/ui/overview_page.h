@@ -1,5 +1,5 @@
-// The table of all elements of a template, as it was when the page was first seen: a row leads to its element,
-// and the whole goes to the clipboard as text.
+// The table of all elements of a template, as it was when the page was first seen: a row leads to its
+// element, and the whole goes to the clipboard as text.
 #pragma once
 
 #include <vector>

@@ -40,6 +40,8 @@ inline const QString kAskMathJax = QStringLiteral(
     "Export template as HTML documentation.\n\nEmbedd MathJax (jscript MathML render) for equations ?");
 inline const QString kPageExported = QStringLiteral("Template documentation exported to '%1'");
 
+inline const QString kSafePage = QStringLiteral("&Markup and scripts in texts have no effect");
+
 // The visibility pages.
 inline const QString kDefinedLevels = QStringLiteral("Defined levels");
 inline const QString kGroupName = QStringLiteral("Group Name:");
@@ -69,6 +71,23 @@ inline const QString kGeneric = QStringLiteral("generic");
 inline const QString kUndefinedSymbol = QStringLiteral("Undefined symbol ");
 inline const QString kCreateNew = QStringLiteral("Create new");
 inline const QString kDelete = QStringLiteral("Delete");
+
+// What a load left behind in the file.
+inline const QString kOneUnread = QStringLiteral("%1 value of this file could not be read.");
+inline const QString kUnread = QStringLiteral("%1 values of this file could not be read.");
+inline const QString kOneNotKept =
+    QStringLiteral("%1 part of this file will not be kept as it is by a save.");
+inline const QString kNotKept =
+    QStringLiteral("%1 parts of this file will not be kept as they are by a save.");
+inline const QString kDetails = QStringLiteral("De&tails");
+inline const QString kReadThem = QStringLiteral("&Read Them");
+inline const QString kAtLine = QStringLiteral("Line %1: %2");
+inline const QString kAccountTitle = QStringLiteral("Not taken over from the file");
+inline const QString kAskAboutLosses =
+    QStringLiteral("The file '%1' holds what this save would lose or change:\n\n%2\n\nReplace it?");
+inline const QString kMoreLosses = QStringLiteral("and %1 more");
+inline const QString kReplace = QStringLiteral("&Replace");
+inline const QString kSaveCopy = QStringLiteral("Save a &Copy...");
 
 // The forms.
 inline const QString kNoView = QStringLiteral("There is no view for current selectoin.");

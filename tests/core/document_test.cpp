@@ -2,6 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <string>
+#include <vector>
+
 #include "core/error_registry.h"
 #include "support/template_text.h"
 #include "support/temporary_folder.h"
@@ -20,6 +23,12 @@ class ScriptedDialogs final : public DocumentDialogs {
     asked = question;
     return yes;
   }
+  LossAnswer AskAboutLosses(const std::string& /*path*/, const std::vector<std::string>& texts) override {
+    losses = texts;
+    return lossAnswer;
+  }
+  std::vector<std::string> losses;
+  LossAnswer lossAnswer;
   std::string shown;
   std::string asked;
   bool yes = true;
@@ -32,6 +41,28 @@ TEST(Document, AFailedOpenShowsEveryMessage) {
   EXPECT_EQ(dialogs.shown,
             "Failed to load file '/nowhere.tessal'\n\n-FATAL-Can not open file /nowhere.tessal\n\n.");
   EXPECT_TRUE(NotifyChanges());
+}
+
+TEST(Document, AFileThatASaveWouldHarmIsReplacedOnlyOnDemand) {
+  const TemporaryFolder folder;
+  const std::string text = TemplateText().Constant("k", "3").Without("UNIT").Text();
+  const std::string path = folder.Write("m.tessal", text);
+  ScriptedDialogs dialogs;
+  CTessalDoc document(dialogs);
+  ASSERT_TRUE(document.OnOpenDocument(path));
+  EXPECT_FALSE(document.OnSaveDocument(path)) << "cancelled";
+  EXPECT_EQ(dialogs.losses.size(), 3U) << "the values, and not the missing unit";
+  dialogs.lossAnswer = {LossAnswer::Wish::SaveCopy, folder.File("copy.tessal")};
+  EXPECT_FALSE(document.OnSaveDocument(path));
+  EXPECT_EQ(ReadFile(path), text);
+  EXPECT_NE(ReadFile(folder.File("copy.tessal")).find("DEFAULT_VALUE = 0\r"), std::string::npos);
+  dialogs.losses.clear();
+  EXPECT_TRUE(document.OnSaveDocument(folder.File("other.tessal"))) << "harms no file";
+  EXPECT_TRUE(dialogs.losses.empty());
+  ASSERT_TRUE(document.OnOpenDocument(path));
+  dialogs.lossAnswer.wish = LossAnswer::Wish::Replace;
+  EXPECT_TRUE(document.OnSaveDocument(path));
+  EXPECT_NE(ReadFile(path), text);
 }
 
 TEST(Document, AsksBeforeItSavesWhatHasMessages) {

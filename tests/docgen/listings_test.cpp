@@ -47,7 +47,7 @@ TEST_P(Documentation, IsOnePage) {
   std::tm created = {};
   created.tm_year = 126;
   created.tm_mday = 4;
-  std::string page = HtmlDocumentation(core, false, created);
+  std::string page = HtmlDocumentation(core, {}, created);
   // The style is the same in all.
   const std::size_t style = page.find("<style>");
   page.erase(style, page.find("</style>") - style);
@@ -67,7 +67,7 @@ TEST(EmptyTemplate, HasAPageAndAnOverviewWithoutRows) {
   TemplateCore core;
   EXPECT_EQ(OverviewText(core, BuildOverview(core)),
             "Template \r\nNo.\tSymbol\tType\tExpression/ Default value\tDescription\r\n");
-  test::ExpectListing("docgen/cases/empty_page.txt", HtmlDocumentation(core, true, std::tm{}));
+  test::ExpectListing("docgen/cases/empty_page.txt", HtmlDocumentation(core, {std::string(UsualMathJax())}, std::tm{}));
 }
 
 }  // namespace

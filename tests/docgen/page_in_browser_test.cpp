@@ -78,7 +78,7 @@ std::string PageOfConstructs(bool mathJax) {
   for (std::string line; std::getline(constructs, line);) core.AddAuxiliary().expression.SetText(line);
   core.AddStateVariable().equation.SetText("a+b/c");
   core.RebuildSymbolTable();
-  return HtmlDocumentation(core, mathJax, {});
+  return HtmlDocumentation(core, {mathJax ? std::string(UsualMathJax()) : ""}, {});
 }
 
 class PageInBrowser : public testing::Test {
@@ -147,7 +147,7 @@ TEST_F(PageInBrowser, TheExamplesShow) {
     if (entry.path().extension() != ".tessal") continue;
     TemplateCore core;
     ASSERT_TRUE(core.LoadWrapper(entry.path().string())) << entry.path();
-    pages += HtmlDocumentation(core, false, {});
+    pages += HtmlDocumentation(core, {}, {});
   }
   ExpectGoodLayout(pages);
 }

@@ -43,15 +43,23 @@ tessal::Answer ScriptedUser::AskToReplace(QWidget* parent, const QString& questi
   return answer;
 }
 
+LossAnswer ScriptedUser::AskAboutLosses(const std::string& /*path*/, const std::vector<std::string>& losses) {
+  QStringList lines("asked about losses");
+  for (const std::string& loss : losses) lines.append(QString::fromStdString(loss));
+  log.append(lines.join(QStringLiteral("\n")));
+  return lossAnswer;
+}
+
 int ScriptedUser::ChooseKind(QWidget* /*parent*/, const QString& symbol, std::uint32_t mask) {
   log.append(QStringLiteral("kind of %1 in %2").arg(symbol).arg(mask));
   return TakeFirst(choices, -1);
 }
 
-QString ScriptedUser::ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
-                                       const QString& filter) {
-  log.append(title + QStringLiteral(" to ") + proposal + QStringLiteral(" of ") + filter);
-  return exportFile.isNull() ? proposal : exportFile;
+ExportAnswer ScriptedUser::ChooseExportFile(QWidget* /*parent*/, const ExportQuestion& question) {
+  log.append(question.title + QStringLiteral(" to ") + question.proposal + QStringLiteral(" of ") +
+             question.filter);
+  if (!question.option.isEmpty()) log.append(QStringLiteral("[x] ") + question.option);
+  return {exportFile.isNull() ? question.proposal : exportFile, exportOption};
 }
 
 bool ScriptedUser::OpenWithSystem(const QString& target) {

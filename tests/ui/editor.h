@@ -34,6 +34,10 @@ class ScriptedUser final : public UserDialogs {
   bool AskYesNo(const std::string& question) override {
     return Ask(nullptr, QString::fromStdString(question)) == tessal::Answer::Yes;
   }
+  LossAnswer AskAboutLosses(const std::string& path, const std::vector<std::string>& losses) override;
+  void ShowDetails(QWidget* /*parent*/, const QString& /*title*/, const QString& text) override {
+    log.append(text);
+  }
   void Warn(QWidget* /*parent*/, const QString& text) override { log.append(text); }
   void ShowFailure(QWidget* /*parent*/, const QString& text) override { log.append(text); }
   tessal::Answer Ask(QWidget* parent, const QString& question) override;
@@ -43,8 +47,7 @@ class ScriptedUser final : public UserDialogs {
   QString ChooseDocumentationFile(QWidget* /*parent*/, const QString& /*start*/) override {
     return documentationFile;
   }
-  QString ChooseExportFile(QWidget* /*parent*/, const QString& title, const QString& proposal,
-                           const QString& filter) override;
+  ExportAnswer ChooseExportFile(QWidget* /*parent*/, const ExportQuestion& question) override;
   bool OpenWithSystem(const QString& target) override;
   void ShowHelp(QWidget* /*parent*/, int topic) override { log.append("help " + QString::number(topic)); }
 
@@ -52,10 +55,12 @@ class ScriptedUser final : public UserDialogs {
   QStringList TakeLog() { return std::exchange(log, {}); }
 
   QList<tessal::Answer> answers;  ///< to questions; Yes when used up
-  QList<int> choices;             ///< of kinds; skips when used up
+  LossAnswer lossAnswer{LossAnswer::Wish::Replace, {}};
+  QList<int> choices;  ///< of kinds; skips when used up
   QString documentationFile;
-  QString exportFile;    ///< where exports go; to the proposal when it is null
-  QStringList openable;  ///< what the system can open
+  QString exportFile;        ///< where exports go; to the proposal when it is null
+  bool exportOption = true;  ///< whether the box of an export stays ticked
+  QStringList openable;      ///< what the system can open
 
  private:
   QStringList log;
