@@ -30,6 +30,8 @@ Function Resolve(QLibrary& library, const char* name) {
 
 QStringList EditorModule::UsualPlaces(const QString& programFolder) {
   QStringList places;
+  // A folder that is not known would be the current one, which holds whatever somebody put there.
+  if (QDir::isRelativePath(programFolder)) return places;
   for (const char* folder : kFolders) {
     places.append(
         QDir::cleanPath(QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + kModuleFile)));

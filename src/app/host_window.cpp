@@ -1,8 +1,11 @@
 #include "app/host_window.h"
 
+#include <malloc.h>
+
 #include <QAction>
 #include <QApplication>
 #include <QCloseEvent>
+#include <QDir>
 #include <QDragEnterEvent>
 #include <QDropEvent>
 #include <QFileDialog>
@@ -16,9 +19,16 @@
 #include <QSettings>
 #include <QStackedWidget>
 #include <QStatusBar>
+#include <QStyle>
+#include <QTabBar>
 #include <QTabWidget>
+#include <QVBoxLayout>
 #include <algorithm>
 
+#include "app/comparison_dialog.h"
+#include "app/document_lock.h"
+#include "app/document_opening.h"
+#include "app/notice_bar.h"
 #include "app/open_document.h"
 #include "app/recent_files.h"
 #include "app/start_page.h"
@@ -47,7 +57,9 @@ QStringList LocalFiles(const QMimeData& mime) {
 QString FullPath(const QString& path) {
   const QFileInfo file(path);
   const QString canonical = file.canonicalFilePath();
-  return canonical.isEmpty() ? file.absoluteFilePath() : canonical;
+  if (!canonical.isEmpty()) return canonical;
+  const QString folder = QFileInfo(file.absolutePath()).canonicalFilePath();
+  return folder.isEmpty() ? file.absoluteFilePath() : QDir(folder).filePath(file.fileName());
 }
 
 QString Shortened(const QString& text, int mostCharacters) {
@@ -61,14 +73,13 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
       name(editorName),
       pages(std::make_unique<QStackedWidget>(this).release()),
       tabs(std::make_unique<QTabWidget>(this).release()),
-      startPage(std::make_unique<StartPage>(this).release()) {
+      startPage(std::make_unique<StartPage>(this).release()),
+      notice(std::make_unique<NoticeBar>(this).release()) {
   tabs->setDocumentMode(true);
   tabs->setTabsClosable(true);
   tabs->setMovable(true);
   tabs->setAccessibleName(tr("Open documents"));
-  pages->addWidget(startPage);
-  pages->addWidget(tabs);
-  setCentralWidget(pages);
+  LayOut();
   setAcceptDrops(true);
   // Made now, it shows what the widgets of the window have to say.
   statusBar();
@@ -82,7 +93,23 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
     tabs->setCurrentIndex(index);
     CloseCurrent();
   });
+  connect(notice, &NoticeBar::ReloadRequested, this, &HostWindow::ReloadCurrent);
+  connect(notice, &NoticeBar::KeepRequested, this, &HostWindow::KeepCurrent);
+  connect(notice, &NoticeBar::CompareRequested, this, &HostWindow::CompareCurrent);
+  connect(&workTimer, &WorkTimer::Due, this, &HostWindow::KeepWork);
   ShowFront();
+}
+
+void HostWindow::LayOut() {
+  pages->addWidget(startPage);
+  pages->addWidget(tabs);
+  auto* middle = std::make_unique<QWidget>(this).release();
+  auto* rows = std::make_unique<QVBoxLayout>(middle).release();
+  rows->setContentsMargins(0, 0, 0, 0);
+  rows->setSpacing(0);
+  rows->addWidget(notice);
+  rows->addWidget(pages, 1);
+  setCentralWidget(middle);
 }
 
 void HostWindow::FitToScreen() {
@@ -170,12 +197,10 @@ bool HostWindow::OpenFile(const QString& path) {
     tabs->setCurrentWidget(open->Widget());
     return true;
   }
-  const BusyNotice busy(*this, tr("Opening %1...").arg(full));
   OpenDocument* untouched = FindUntouched();
-  auto opened = std::make_unique<OpenDocument>(docTemplate->CreateNewDocument());
-  if (!opened->Open(full)) {
+  auto opened = DocumentOpening(*docTemplate, *this, name).Open(full);
+  if (!opened) {
     // The messages of the file that failed give way to those of the document in front.
-    opened.reset();
     Activate();
     return false;
   }
@@ -185,8 +210,21 @@ bool HostWindow::OpenFile(const QString& path) {
   return true;
 }
 
+void HostWindow::OfferLeftWork(const QStringList& except) {
+  QStringList asked;
+  for (const QString& path : except) asked.append(FullPath(path));
+  for (const FoundWork& work : FindAllWork()) {
+    if (asked.contains(work.path)) continue;
+    auto recovered = DocumentOpening(*docTemplate, *this, name).OfferWork(work);
+    if (!recovered) continue;
+    if (!work.path.isEmpty()) AddRecentFile(work.path);
+    AddTab(std::move(recovered));
+  }
+  Activate();
+}
+
 OpenDocument* HostWindow::FindUntouched() const {
-  if (documents.size() != 1 || !documents.front()->Path().isEmpty()) return nullptr;
+  if (documents.size() != 1 || !documents.front()->IsFresh()) return nullptr;
   // What is being entered is work too.
   documents.front()->View().OnCommit();
   return documents.front()->Document().IsModified() ? nullptr : documents.front().get();
@@ -195,6 +233,7 @@ OpenDocument* HostWindow::FindUntouched() const {
 void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
   opened->Show(*docTemplate);
   opened->View().SetFrameTitleUpdate([this] { UpdateTitles(); });
+  connect(&opened->File(), &WatchedFile::StateChanged, this, &HostWindow::ShowNotice);
   documents.push_back(std::move(opened));
   OpenDocument& shown = *documents.back();
   {
@@ -232,8 +271,8 @@ int HostWindow::DocumentCount() const {
 bool HostWindow::SaveCurrent() {
   OpenDocument* saved = Current();
   if (saved == nullptr) return false;
-  if (saved->Path().isEmpty()) return SaveUnderNewName(*saved);
-  if (saved->IsFileChanged() &&
+  if (saved->Path().isEmpty() || saved->IsReadOnly()) return SaveUnderNewName(*saved);
+  if (saved->File().Look() == FileState::Changed &&
       QMessageBox::warning(this, name,
                            tr("The file '%1' was changed by somebody else since it was read.\n\nReplace it?")
                                .arg(saved->Path()),
@@ -262,7 +301,16 @@ bool HostWindow::SaveUnderNewName(OpenDocument& saved) {
     QMessageBox::warning(this, name, tr("The file '%1' is open in another tab.").arg(path));
     return false;
   }
+  TakenLock taken;
+  const bool isOwnFile = FullPath(path) == FullPath(saved.Path()) && !saved.IsReadOnly();
+  if (!isOwnFile) taken = LockDocument(FullPath(path));
+  if (!taken.holder.isEmpty()) {
+    QMessageBox::warning(this, name,
+                         tr("The file '%1' is open in another editor (%2).").arg(path, taken.holder));
+    return false;
+  }
   if (!Save(saved, path)) return false;
+  if (!isOwnFile) saved.SetLock(std::move(taken.lock));
   AddRecentFile(path);
   return true;
 }
@@ -279,7 +327,8 @@ bool HostWindow::Save(OpenDocument& saved, const QString& path) {
 bool HostWindow::MayClose(OpenDocument& closing) {
   tabs->setCurrentWidget(closing.Widget());
   closing.View().OnCommit();
-  if (!closing.Document().IsModified()) return true;
+  // Of a file that is gone, the document is all that is left.
+  if (!closing.Document().IsModified() && closing.File().State() != FileState::Gone) return true;
   const auto answer = QMessageBox::warning(
       this, name,
       tr("Save the changes to '%1'?").arg(closing.Path().isEmpty() ? closing.Title() : closing.Path()),
@@ -296,13 +345,88 @@ bool HostWindow::CloseCurrent() {
 
 void HostWindow::Drop(OpenDocument& closed) {
   closed.Document().OnCloseDocument();
+  closed.DropWork();
   const auto hit = std::find_if(documents.begin(), documents.end(),
                                 [&closed](const auto& open) { return open.get() == &closed; });
-  const std::unique_ptr<OpenDocument> gone = std::move(*hit);
+  std::unique_ptr<OpenDocument> gone = std::move(*hit);
   documents.erase(hit);
   tabs->removeTab(tabs->indexOf(gone->Widget()));
   gone->Widget()->setParent(nullptr);
+  gone.reset();
+  // The allocator would hold on to the memory of a large document.
+  malloc_trim(0);
   ShowFront();
+}
+
+void HostWindow::KeepWork() {
+  for (const auto& open : documents) {
+    const QString failure = open->KeepWork();
+    if (!failure.isEmpty())
+      statusBar()->showMessage(tr("Unsaved work can not be kept for a recovery: %1").arg(failure));
+  }
+}
+
+void HostWindow::ShowNotice() {
+  const QIcon warning = style()->standardIcon(QStyle::SP_MessageBoxWarning);
+  for (const auto& open : documents) {
+    const bool isAsKnown = open->File().State() == FileState::AsKnown;
+    tabs->setTabIcon(tabs->indexOf(open->Widget()), isAsKnown ? QIcon() : warning);
+  }
+  OpenDocument* front = Current();
+  notice->ShowState(front == nullptr ? FileState::AsKnown : front->File().State(),
+                    front == nullptr ? QString() : front->Path());
+}
+
+void HostWindow::ReloadCurrent() {
+  OpenDocument* former = Current();
+  if (former == nullptr) return;
+  const QString path = former->Path();
+  const bool hasWork = former->Document().IsModified() || former->View().HasUncommitted();
+  if (hasWork && QMessageBox::warning(this, name, tr("Discard the changes to '%1'?").arg(path),
+                                      QMessageBox::Discard | QMessageBox::Cancel,
+                                      QMessageBox::Cancel) != QMessageBox::Discard) {
+    return;
+  }
+  const BusyNotice busy(*this, tr("Opening %1...").arg(path));
+  auto opened = std::make_unique<OpenDocument>(docTemplate->CreateNewDocument());
+  if (!opened->Open(path)) {
+    opened.reset();
+    Activate();
+    return;
+  }
+  opened->SetLock(former->TakeLock());
+  if (former->IsReadOnly()) opened->SetReadOnly();
+  const int place = tabs->indexOf(former->Widget());
+  AddTab(std::move(opened));
+  Drop(*former);
+  tabs->tabBar()->moveTab(tabs->count() - 1, place);
+}
+
+void HostWindow::KeepCurrent() {
+  OpenDocument* kept = Current();
+  if (kept == nullptr) return;
+  kept->File().TakeAsKnown();
+  // It is what the file does not hold.
+  kept->Document().SetModifiedFlag(true);
+  workTimer.NoteInput();
+  UpdateTitles();
+}
+
+void HostWindow::CompareCurrent() {
+  OpenDocument* compared = Current();
+  if (compared == nullptr) return;
+  DocumentComparison comparison;
+  compared->View().WithUncommitted([compared, &comparison] {
+    comparison = compared->Document().CompareWithFile(compared->Document().PathName());
+  });
+  ComparisonDialog(comparison, tr("In the file"), tr("In the editor"), this).exec();
+}
+
+void HostWindow::changeEvent(QEvent* change) {
+  QMainWindow::changeEvent(change);
+  // Where a file cannot be watched, coming back from another program is the moment to look.
+  if (change->type() != QEvent::ActivationChange || !isActiveWindow()) return;
+  for (const auto& open : documents) open->File().Look();
 }
 
 void HostWindow::Activate() {
@@ -337,6 +461,7 @@ void HostWindow::UpdateTitles() {
                      ? name
                      : Shortened(front->Title(), kMostTitleCharacters) + QStringLiteral(" \u2013 ") + name);
   for (QAction* action : documentActions) action->setEnabled(front != nullptr);
+  ShowNotice();
 }
 
 void HostWindow::closeEvent(QCloseEvent* close) {
@@ -346,6 +471,7 @@ void HostWindow::closeEvent(QCloseEvent* close) {
     close->ignore();
     return;
   }
+  for (const auto& open : documents) open->DropWork();
   QSettings().setValue(kGeometryKey, saveGeometry());
   close->accept();
 }

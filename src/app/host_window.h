@@ -7,6 +7,8 @@
 #include <memory>
 #include <vector>
 
+#include "app/work_timer.h"
+
 class QMenu;
 class QStackedWidget;
 class QTabWidget;
@@ -14,6 +16,7 @@ class QTabWidget;
 namespace tessal {
 
 class CMultiDocTemplate;
+class NoticeBar;
 class OpenDocument;
 class StartPage;
 class ViewCommands;
@@ -30,6 +33,8 @@ class HostWindow final : public QMainWindow {
   /// document has then shown why.
   bool OpenFile(const QString& path);
   void OpenFiles(const QStringList& paths);
+  /// Offers unsaved work that the last run left, but for that of the files at the paths.
+  void OfferLeftWork(const QStringList& except);
   /// The document in front; none when no document is open.
   OpenDocument* Current() const;
   int DocumentCount() const;
@@ -38,8 +43,11 @@ class HostWindow final : public QMainWindow {
   /// Closes the document in front, and asks first when it holds unsaved work. False when the user
   /// declines.
   bool CloseCurrent();
+  /// Decides when the unsaved work of all documents is kept for a recovery.
+  WorkTimer& Timer() { return workTimer; }
 
  protected:
+  void changeEvent(QEvent* change) override;
   void closeEvent(QCloseEvent* close) override;
   void dragEnterEvent(QDragEnterEvent* drag) override;
   void dropEvent(QDropEvent* drop) override;
@@ -52,6 +60,7 @@ class HostWindow final : public QMainWindow {
   void ShowAbout();
   QString FileFilter() const;
 
+  void LayOut();
   void AddTab(std::unique_ptr<OpenDocument> opened);
   /// The document that gives way to the first file: new, alone, and nobody has touched it.
   OpenDocument* FindUntouched() const;
@@ -62,7 +71,13 @@ class HostWindow final : public QMainWindow {
   /// Whether a document may go: it is unmodified, or the user has saved it or given it up.
   bool MayClose(OpenDocument& closing);
   void Drop(OpenDocument& closed);
+  void KeepWork();
   void UpdateTitles();
+  // What can be done about a file that others have changed.
+  void ShowNotice();
+  void ReloadCurrent();
+  void KeepCurrent();
+  void CompareCurrent();
   QString TabText(const QString& title) const;
   /// The view of the document in front takes over the messages and the menus; without one, the start page is
   /// shown.
@@ -74,9 +89,11 @@ class HostWindow final : public QMainWindow {
   QStackedWidget* pages;
   QTabWidget* tabs;
   StartPage* startPage;
+  NoticeBar* notice;
   ViewCommands* viewCommands = nullptr;
   QMenu* recentMenu = nullptr;
   QList<QAction*> documentActions;  ///< those that need a document in front
+  WorkTimer workTimer;
   std::vector<std::unique_ptr<OpenDocument>> documents;
   int newDocuments = 0;
 };

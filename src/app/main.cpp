@@ -38,6 +38,7 @@ int RunHost(QApplication& application) {
   tessal::HostWindow window(module.MakeDocTemplate(), module.EditorName());
   window.show();
   window.OpenFiles(line.positionalArguments());
+  window.OfferLeftWork(line.positionalArguments());
   if (window.DocumentCount() == 0 && line.positionalArguments().isEmpty()) window.NewDocument();
   return QApplication::exec();
 }

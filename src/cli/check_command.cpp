@@ -4,6 +4,7 @@
 #include "cli/commands.h"
 #include "cli/explanation.h"
 #include "cli/sarif.h"
+#include "cli/template_files.h"
 #include "cli/template_messages.h"
 
 namespace tessal::cli {
@@ -24,6 +25,7 @@ void PrintText(const TemplateMessages& messages) {
                 OnOneLine(user.symbol) + ": " + Finding("undefined-symbol", {undefined.symbol}).text);
     }
   }
+  for (const AccountEntry& entry : messages.account) PrintLine(AccountLine(messages.path, entry));
 }
 
 Json ToJson(const TemplateMessages& messages) {
@@ -43,10 +45,18 @@ Json ToJson(const TemplateMessages& messages) {
     for (const UndefinedName::User& user : name.usedBy) users.push_back(JsonText(user.symbol));
     undefined.push_back({{"symbol", JsonText(name.symbol)}, {"usedBy", users}});
   }
+  Json account = Json::array();
+  for (const AccountEntry& entry : messages.account) {
+    account.push_back({{"code", entry.code},
+                       {"symbol", JsonText(entry.symbol)},
+                       {"text", JsonText(entry.text)},
+                       {"line", entry.line}});
+  }
   return {{"path", JsonText(messages.path)},
           {"loaded", messages.loaded},
           {"errors", errors},
-          {"undefined", undefined}};
+          {"undefined", undefined},
+          {"account", account}};
 }
 
 }  // namespace

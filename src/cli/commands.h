@@ -6,10 +6,6 @@
 
 #include "cli/output.h"
 
-namespace tessal {
-struct PageOptions;
-}
-
 namespace tessal::cli {
 
 enum class Format { Text, Json, Sarif };
@@ -21,8 +17,16 @@ ExitCode RunExplain(const std::string& code);
 ExitCode RunExplainAll();
 ExitCode RunExplainPage();
 ExitCode RunSymbols(const std::string& file, Format format);
-/// With an empty output a plain save in place, else a save under that name.
-ExitCode RunSave(const std::string& file, const std::string& output);
+/// With an empty output a plain save in place, else a save under that name, which is refused when a file has
+/// it, unless forced.
+struct SaveCall {
+  std::string file;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunSave(const SaveCall& call);
+/// Takes over what the load passes over, prints its account, and saves.
+ExitCode RunRepair(const std::string& file, const std::string& output);
 ExitCode RunNew(const std::string& output, bool overwrite);
 struct RenameCall {
   std::string file;
@@ -32,10 +36,20 @@ struct RenameCall {
   bool wholeWords = false;
   bool letterRule = false;
   std::string output;
+  bool force = false;
 };
 ExitCode RunRename(const RenameCall& call);
 ExitCode RunOverview(const std::string& file);
-ExitCode RunHtml(const std::string& file, const PageOptions& options, const std::string& output);
+/// With an empty output the page goes to its usual place. What is no page is replaced only when forced, and
+/// never there.
+struct HtmlCall {
+  std::string file;
+  std::string mathJax;  ///< a flag: the word "true" where no address is given
+  bool isSafe = false;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunHtml(const HtmlCall& call);
 
 // Key files.
 ExitCode RunTree(const std::string& file);

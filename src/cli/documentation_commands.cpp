@@ -1,4 +1,8 @@
 // Commands that document a template: the page and the overview.
+#include <filesystem>
+#include <optional>
+#include <system_error>
+
 #include "cli/commands.h"
 #include "cli/template_files.h"
 #include "core/template_core.h"
@@ -7,6 +11,33 @@
 
 namespace tessal::cli {
 
+namespace {
+
+/// Where the page goes. Nothing, with the reason, when something else is there.
+std::optional<std::string> PagePath(const HtmlCall& call, std::string& failure) {
+  if (call.output.empty()) return PrepareUsualPagePath(call.file, failure);
+  std::error_code notThere;
+  // The export refuses the template itself, forced or not.
+  if (call.force || std::filesystem::equivalent(call.output, call.file, notThere)) return call.output;
+  failure = PageRefusal(call.output);
+  if (failure.empty()) return call.output;
+  failure += "; --force replaces it";
+  return std::nullopt;
+}
+
+}  // namespace
+
+namespace {
+
+PageOptions PageOf(const HtmlCall& call) {
+  PageOptions page;
+  page.mathJax = call.mathJax == "true" ? UsualMathJax() : call.mathJax;
+  page.isSafe = call.isSafe;
+  return page;
+}
+
+}  // namespace
+
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
@@ -14,16 +45,16 @@ ExitCode RunOverview(const std::string& file) {
   return kFine;
 }
 
-ExitCode RunHtml(const std::string& file, const PageOptions& options, const std::string& output) {
+ExitCode RunHtml(const HtmlCall& call) {
   TemplateCore core;
-  if (!LoadOrComplain(core, file)) return kCallFault;
-  const std::string page = output.empty() ? PrepareUsualPagePath(file) : output;
+  if (!LoadOrComplain(core, call.file)) return kCallFault;
   std::string failure;
-  if (!ExportHtmlDocumentation(core, page, options, failure)) {
+  const std::optional<std::string> page = PagePath(call, failure);
+  if (!page || !ExportHtmlDocumentation(core, *page, PageOf(call), failure)) {
     Complain(failure);
     return kCallFault;
   }
-  PrintLine(ForTerminal(page));
+  PrintLine(ForTerminal(*page));
   return kFine;
 }
 

@@ -1,27 +1,50 @@
-// Commands that write a template: save, new and rename.
-#include <filesystem>
-#include <system_error>
-
+// Commands that write a template: save, repair, new and rename.
 #include "cli/commands.h"
 #include "cli/template_files.h"
 #include "core/rename.h"
 #include "core/template_core.h"
+#include "elements/load_account.h"
 #include "elements/property_io.h"
 
 namespace tessal::cli {
 
-ExitCode RunSave(const std::string& file, const std::string& output) {
+namespace {
+
+/// Whether the output of a call, if it names one, may be written.
+template <class Call>
+bool MayWriteOutput(const Call& call) {
+  return call.output.empty() || call.force || IsFreeOrComplain(call.output);
+}
+
+/// Whether the file may be replaced, or an output written that lacks what the load left behind.
+template <class Call>
+bool MayLose(const TemplateCore& core, const Call& call) {
+  if (call.output.empty()) return call.force || MayReplaceOrComplain(core, call.file);
+  ComplainOfLosses(core, call.file);
+  return true;
+}
+
+}  // namespace
+
+ExitCode RunSave(const SaveCall& call) {
   TemplateCore core;
-  if (!LoadToSave(core, file)) return kCallFault;
-  return SaveOrComplain(core, output.empty() ? file : output) ? kFine : kCallFault;
+  if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
+  if (!MayLose(core, call)) return kContentFault;
+  return SaveOrComplain(core, call.output.empty() ? call.file : call.output) ? kFine : kCallFault;
+}
+
+ExitCode RunRepair(const std::string& file, const std::string& output) {
+  TemplateCore core;
+  if (!output.empty() && !IsFreeOrComplain(output)) return kCallFault;
+  if (!LoadOrComplain(core, file)) return kCallFault;
+  for (const AccountEntry& entry : core.Account().Entries()) PrintLine(AccountLine(file, entry));
+  const bool isWhole = core.TakeOverPassedOver();
+  if (!SaveOrComplain(core, output.empty() ? file : output)) return kCallFault;
+  return isWhole ? kFine : kContentFault;
 }
 
 ExitCode RunNew(const std::string& output, bool overwrite) {
-  std::error_code error;
-  if (!overwrite && std::filesystem::exists(std::filesystem::symlink_status(output, error))) {
-    Complain("'" + output + "' exists already; --force replaces it");
-    return kCallFault;
-  }
+  if (!overwrite && !IsFreeOrComplain(output)) return kCallFault;
   TemplateCore core;
   return SaveOrComplain(core, output) ? kFine : kCallFault;
 }
@@ -34,7 +57,7 @@ Rewriting RewritingOf(const RenameCall& call) {
 }
 
 /// Lists what a rename by letters would lose, unless it loses nothing, or was asked for.
-bool ComplainOfLosses(const TemplateCore& core, const RenameCall& call, const std::string& newSymbol) {
+bool ComplainOfLostNames(const TemplateCore& core, const RenameCall& call, const std::string& newSymbol) {
   if (RewritingOf(call) != Rewriting::ByLetters || call.letterRule) return false;
   const std::vector<LostName> lost = LostByRename(core, call.oldSymbol, newSymbol);
   if (lost.empty()) return false;
@@ -48,10 +71,11 @@ bool ComplainOfLosses(const TemplateCore& core, const RenameCall& call, const st
 
 ExitCode RunRename(const RenameCall& call) {
   TemplateCore core;
-  if (!LoadToSave(core, call.file)) return kCallFault;
+  if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
+  if (!MayLose(core, call)) return kContentFault;
   const std::string newSymbol(CleanText(call.newSymbol));
   std::string refusal = RenameRefusal(core, newSymbol);
-  if (refusal.empty() && ComplainOfLosses(core, call, newSymbol)) return kContentFault;
+  if (refusal.empty() && ComplainOfLostNames(core, call, newSymbol)) return kContentFault;
   if (refusal.empty() && !core.Rename(call.oldSymbol, newSymbol, RewritingOf(call))) {
     refusal = RenameFailure(newSymbol);
   }

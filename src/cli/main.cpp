@@ -5,6 +5,7 @@
 #include <exception>
 #include <functional>
 #include <memory>
+#include <new>
 #include <string>
 #include <system_error>
 #include <vector>
@@ -15,7 +16,6 @@
 #include "cli/help_text.h"
 #include "cli/numbers.h"
 #include "cli/output.h"
-#include "docgen/html_documentation.h"
 #include "expr/carbonate/options.h"
 
 namespace tessal::cli {
@@ -27,19 +27,18 @@ struct CommandLine {
   std::vector<std::string> files;
   std::string file;
   std::string otherFile;
-  std::string output;
   std::string name;
   std::vector<std::string> values;
   std::vector<std::string> settings;
   std::vector<std::string> ignored;
   bool onlyKeywords = false;
   bool force = false;
-  std::string mathJax;  ///< a flag: the word "true" where no address is given
-  PageOptions page;
   bool asPage = false;
   Format format = Format::Text;
   int lowestLevel = 0;
+  SaveCall save;
   RenameCall rename;
+  HtmlCall html;
   ExpressionCall expression;
   std::function<ExitCode()> run;
 };
@@ -61,8 +60,17 @@ CLI::Option* AddFile(CLI::App& command, std::string& file) {
   return command.add_option("FILE", file, "a template file")->required();
 }
 
+/// An empty name means that none was given, so it can not be one.
 CLI::Option* AddOutput(CLI::App& command, std::string& output, const char* description) {
-  return command.add_option("--output", output, description)->type_name("OUT");
+  const auto read = [&output](const std::string& name) {
+    if (name.empty()) throw CLI::ValidationError("--output", "the name of the file is empty");
+    output = name;
+  };
+  return command.add_option_function<std::string>("--output", read, description)->type_name("OUT");
+}
+
+CLI::Option* AddForce(CLI::App& command, bool& force) {
+  return command.add_flag("--force", force, "replaces an existing file");
 }
 
 CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
@@ -115,12 +123,6 @@ void AddCheck(CLI::App& app, CommandLine& line) {
       ->type_name("LEVEL");
 }
 
-PageOptions PageOf(const CommandLine& line) {
-  PageOptions page = line.page;
-  page.mathJax = line.mathJax == "true" ? UsualMathJax() : line.mathJax;
-  return page;
-}
-
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddCheck(app, line);
   AddExplain(app, line);
@@ -131,14 +133,20 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddFormat(*symbols, line, kTableFormats);
 
   CLI::App* save = AddCommand(app, line, kTemplates, "save", "loads a template and saves it",
-                              [&line] { return RunSave(line.file, line.output); });
-  AddFile(*save, line.file);
-  AddOutput(*save, line.output, "saves under this name, not in place");
+                              [&line] { return RunSave(line.save); });
+  AddFile(*save, line.save.file);
+  AddOutput(*save, line.save.output, "saves under this name, not in place");
+  AddForce(*save, line.save.force);
+
+  CLI::App* repair = AddCommand(app, line, kTemplates, "repair", "takes over values that a load passes over",
+                                [&line] { return RunRepair(line.save.file, line.save.output); });
+  AddFile(*repair, line.save.file);
+  AddOutput(*repair, line.save.output, "saves under this name, not in place");
 
   CLI::App* create = AddCommand(app, line, kTemplates, "new", "saves an empty template",
                                 [&line] { return RunNew(line.file, line.force); });
   create->add_option("OUT", line.file, "the new file")->required();
-  create->add_flag("--force", line.force, "replaces an existing file");
+  AddForce(*create, line.force);
 
   CLI::App* rename = AddCommand(app, line, kTemplates, "rename", "renames a symbol with all its uses",
                                 [&line] { return RunRename(line.rename); });
@@ -151,18 +159,20 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   rename->add_flag("--letter-rule", line.rename.letterRule, "changes longer names too, defined or not")
       ->excludes(wholeWords);
   AddOutput(*rename, line.rename.output, "saves under this name, not in place");
+  AddForce(*rename, line.rename.force);
 
   CLI::App* overview = AddCommand(app, line, kTemplates, "overview", "prints the overview table",
                                   [&line] { return RunOverview(line.file); });
   AddFile(*overview, line.file);
 
   CLI::App* html = AddCommand(app, line, kTemplates, "html", "writes the HTML documentation",
-                              [&line] { return RunHtml(line.file, PageOf(line), line.output); });
-  AddFile(*html, line.file);
-  html->add_flag("--mathjax", line.mathJax,
+                              [&line] { return RunHtml(line.html); });
+  AddFile(*html, line.html.file);
+  html->add_flag("--mathjax", line.html.mathJax,
                  "has MathJax render the equations; --mathjax=ADDRESS names its script");
-  html->add_flag("--safe", line.page.isSafe, "writes texts so that no markup in them takes effect");
-  AddOutput(*html, line.output, "the page to write; without it HTML_doc beside the template takes it");
+  html->add_flag("--safe", line.html.isSafe, "writes texts so that no markup in them takes effect");
+  AddOutput(*html, line.html.output, "the page to write; without it HTML_doc beside the template takes it");
+  html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
 }
 
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
@@ -250,8 +260,9 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 
 void ShowNumbers(CommandLine& line) {
   for (std::string* text :
-       {&line.file, &line.otherFile, &line.output, &line.name, &line.rename.file, &line.rename.oldSymbol,
-        &line.rename.newSymbol, &line.rename.output, &line.expression.text, &line.expression.symbol}) {
+       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
+        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.html.file,
+        &line.html.output, &line.expression.text, &line.expression.symbol}) {
     *text = ShownNumber(*text);
   }
   for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {
@@ -281,7 +292,7 @@ int RunTool(int count, char** arguments) {
   const ExitCode exitCode = line.run();
   // The option file and its log fail no command, but nobody should compute with other settings than those
   // meant.
-  if (!CarbonateProblem().empty()) Complain(CarbonateProblem());
+  if (!CarbonateProblem().empty()) Complain(OnOneLine(CarbonateProblem()));
   return FlushOutput() ? exitCode : kCallFault;
 }
 
@@ -294,6 +305,9 @@ int main(int count, char** arguments) {
   std::signal(SIGPIPE, SIG_IGN);
   try {
     return tessal::cli::RunTool(count, arguments);
+  } catch (const std::bad_alloc&) {
+    tessal::cli::Complain("out of memory");
+    return tessal::cli::kCallFault;
   } catch (const std::exception& failure) {
     tessal::cli::Complain(failure.what());
     return tessal::cli::kCallFault;

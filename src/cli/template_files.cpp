@@ -1,8 +1,12 @@
 #include "cli/template_files.h"
 
+#include <filesystem>
+#include <system_error>
+
 #include "cli/output.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
+#include "elements/load_account.h"
 
 namespace tessal::cli {
 
@@ -27,14 +31,30 @@ bool LoadOrComplain(TemplateCore& core, const std::string& file) {
   return loaded;
 }
 
-bool LoadToSave(TemplateCore& core, const std::string& file) {
-  if (!LoadOrComplain(core, file)) return false;
-  for (const ErrorRecord& record : Errors().Records()) {
-    if (record.symbol != kNotKeptSymbol) continue;
-    Complain("'" + file + "': sections beside TESSAL_SETUP, if there are any, are not kept: " +
-             std::string(WithoutLineFeed(record.text)));
+std::string AccountLine(const std::string& file, const AccountEntry& entry) {
+  constexpr std::uint32_t kNotice = static_cast<std::uint32_t>(ErrorLevel::Notice);
+  return OnOneLine(file) + ": " + Coloured(LevelWord(kNotice), kNotice) + ": " +
+         (entry.symbol.empty() ? "generic" : OnOneLine(entry.symbol)) + ": " + OnOneLine(entry.text);
+}
+
+bool MayReplaceOrComplain(const TemplateCore& core, const std::string& file) {
+  if (!core.Account().Loses()) return true;
+  ComplainOfLosses(core, file);
+  Complain("'" + file + "' holds what a save would lose; --force saves all the same, --output to another file");
+  return false;
+}
+
+void ComplainOfLosses(const TemplateCore& core, const std::string& file) {
+  for (const AccountEntry& entry : core.Account().Entries()) {
+    if (entry.kind != AccountKind::Absent) Complain(AccountLine(file, entry));
   }
-  return true;
+}
+
+bool IsFreeOrComplain(const std::string& output) {
+  std::error_code shownByTheSave;
+  if (!std::filesystem::exists(std::filesystem::symlink_status(output, shownByTheSave))) return true;
+  Complain("'" + output + "' exists already; --force replaces it");
+  return false;
 }
 
 bool SaveOrComplain(TemplateCore& core, const std::string& file) {

@@ -5,6 +5,7 @@
 
 namespace tessal {
 class TemplateCore;
+struct AccountEntry;
 }
 
 namespace tessal::cli {
@@ -12,8 +13,18 @@ namespace tessal::cli {
 /// Loads a file. False, with every message of the load on standard error, when it could not be loaded.
 bool LoadOrComplain(TemplateCore& core, const std::string& file);
 
-/// The same for a file that will be saved again: warns when a save would leave its further sections out.
-bool LoadToSave(TemplateCore& core, const std::string& file);
+/// An entry of a load's account as `check` lists it.
+std::string AccountLine(const std::string& file, const AccountEntry& entry);
+
+/// Lists on standard error what a save of the loaded file would lose.
+void ComplainOfLosses(const TemplateCore& core, const std::string& file);
+
+/// Whether the file may be replaced by the template that was loaded from it: not, with what would be lost on
+/// standard error, when the load did not take over all of it.
+bool MayReplaceOrComplain(const TemplateCore& core, const std::string& file);
+
+/// Whether a new file may have this name. False, with the reason on standard error, when something has it.
+bool IsFreeOrComplain(const std::string& output);
 
 /// Saves a template. False, with the reasons on standard error, when it could not be saved.
 bool SaveOrComplain(TemplateCore& core, const std::string& file);

@@ -98,6 +98,7 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   for (const auto& undefined : core.UndefinedSymbols()) {
     messages.undefined.push_back(Describe(*undefined, elements, core));
   }
+  if (lowestLevel <= static_cast<int>(ErrorLevel::Notice)) messages.account = core.Account().Entries();
   return messages;
 }
 

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "elements/element_kind.h"
+#include "elements/load_account.h"
 #include "platform/uid.h"
 
 namespace tessal::cli {
@@ -37,7 +38,9 @@ struct TemplateMessages {
   bool loaded = false;
   std::vector<TemplateMessage> errors;
   std::vector<UndefinedName> undefined;
+  std::vector<AccountEntry> account;
 
+  /// Whether the template has no message; what is in the account alone is no fault of it.
   bool IsClean() const { return errors.empty() && undefined.empty(); }
 };
 

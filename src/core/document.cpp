@@ -1,6 +1,11 @@
 #include "core/document.h"
 
+#include <utility>
+#include <vector>
+
+#include "core/comparison.h"
 #include "core/error_registry.h"
+#include "expr/scanner.h"
 #include "platform/file_replacement.h"
 
 namespace tessal {
@@ -8,6 +13,7 @@ namespace tessal {
 namespace {
 
 constexpr std::string_view kModifiedMark = " - Modified";
+constexpr std::uint32_t kAllLevels = 0;
 
 std::string FailureText(std::string_view what, const std::string& path) {
   return "Failed to " + std::string(what) + " file '" + path + "'\n\n" + Errors().JoinErrors() + ".";
@@ -19,6 +25,31 @@ TextEncoding EncodingOfFile(const std::string& path) {
   return EncodingOf(ReadWholeFile(path, failure).value_or(std::string()));
 }
 
+std::string WordOf(ChangeKind change) {
+  switch (change) {
+    case ChangeKind::Removed:
+      return "Removed";
+    case ChangeKind::Added:
+      return "Added";
+    case ChangeKind::Changed:
+      break;
+  }
+  return "Changed";
+}
+
+/// A row for each field of a changed item; one for an item that was added or removed.
+void AppendRows(const SymbolChange& change, std::vector<DocumentDifference>& rows) {
+  const DocumentDifference item{WordOf(change.change), change.kind, ToUtf8(change.symbol), "", "", ""};
+  if (change.change != ChangeKind::Changed) rows.push_back(item);
+  for (const FieldChange& field : change.fields) {
+    DocumentDifference row = item;
+    row.field = field.field;
+    row.before = ToUtf8(field.before);
+    row.after = ToUtf8(field.after);
+    rows.push_back(std::move(row));
+  }
+}
+
 }  // namespace
 
 bool CTessalDoc::OnNewDocument() {
@@ -28,15 +59,22 @@ bool CTessalDoc::OnNewDocument() {
 }
 
 bool CTessalDoc::OnOpenDocument(const std::string& path) {
-  if (!CDocument::OnOpenDocument(path)) return false;
-  encoding = EncodingOfFile(path);
-  const bool loaded = core.LoadWrapper(path);
+  return CDocument::OnOpenDocument(path) && Open(path, path);
+}
+
+bool CTessalDoc::OnOpenCopy(const std::string& source, const std::string& path) {
+  return Open(source, path);
+}
+
+bool CTessalDoc::Open(const std::string& source, const std::string& path) {
+  encoding = EncodingOfFile(source);
+  const bool loaded = core.LoadCopy(source, path);
   if (loaded) {
     visibilityGroup = 0;
     visibilityLevel = 0;
     visibilityRecursive = true;
   } else {
-    dialogs.ShowMessage(FailureText("load", path));
+    dialogs.ShowMessage(FailureText("load", source));
   }
   // From here on changes of values reach their listeners.
   SetNotifyChanges(true);
@@ -44,7 +82,6 @@ bool CTessalDoc::OnOpenDocument(const std::string& path) {
 }
 
 bool CTessalDoc::OnSaveDocument(const std::string& path) {
-  constexpr std::uint32_t kAllLevels = 0;
   if (Errors().GetErrorCount(kAllLevels) > 0 &&
       !dialogs.AskYesNo("This setup contains some errors or warnings.\nProceed anyway?")) {
     return false;
@@ -61,6 +98,23 @@ bool CTessalDoc::OnSaveDocument(const std::string& path) {
     UpdateAllViews(nullptr, hint::kShowMisc, &shown);
   }
   return saved;
+}
+
+std::optional<std::string> CTessalDoc::Copy(std::string& reason) {
+  const MessagesAside aside;
+  std::optional<std::string> text = core.CopyText(reason);
+  if (!text && Errors().GetErrorCount(kAllLevels) > 0) reason += "\n" + Errors().JoinErrors();
+  return text;
+}
+
+DocumentComparison CTessalDoc::CompareWithFile(const std::string& path) const {
+  const MessagesAside aside;
+  const ScannerRest rest;
+  TemplateCore file;
+  if (!file.LoadWrapper(path)) return {{}, FailureText("load", path)};
+  DocumentComparison comparison;
+  for (const SymbolChange& change : CompareBySymbol(file, core)) AppendRows(change, comparison.differences);
+  return comparison;
 }
 
 void CTessalDoc::SetModifiedFlag(bool flag) {

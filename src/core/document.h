@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 
 #include "core/template_core.h"
@@ -56,6 +57,9 @@ class CTessalDoc final : public CDocument {
   bool OnOpenDocument(const std::string& path) override;
   /// Asks first when the registry holds anything; false, with nothing written, on No.
   bool OnSaveDocument(const std::string& path) override;
+  std::optional<std::string> Copy(std::string& reason) override;
+  bool OnOpenCopy(const std::string& source, const std::string& path) override;
+  DocumentComparison CompareWithFile(const std::string& path) const override;
   /// Marks the title too. The mark is taken off by the title that a save gives.
   void SetModifiedFlag(bool flag) override;
 
@@ -70,6 +74,9 @@ class CTessalDoc final : public CDocument {
   bool visibilityRecursive = false;
 
  private:
+  /// Loads from a file, by one of the template's loads, and reports a failure.
+  bool Open(const std::string& source, const std::string& path);
+
   DocumentDialogs& dialogs;
   TemplateCore core;
   TextEncoding encoding = TextEncoding::Utf8;

@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "core/messages.h"
@@ -92,5 +93,18 @@ class ErrorRegistry final {
 
 /// The registry of the process.
 ErrorRegistry& Errors();
+
+/// Work whose messages are not for the user's list: the registry is empty at its start, and at its end holds
+/// again what it held before.
+class MessagesAside final {
+ public:
+  MessagesAside() : kept(std::exchange(Errors(), ErrorRegistry())) {}
+  MessagesAside(const MessagesAside&) = delete;
+  MessagesAside& operator=(const MessagesAside&) = delete;
+  ~MessagesAside() { Errors() = std::move(kept); }
+
+ private:
+  ErrorRegistry kept;
+};
 
 }  // namespace tessal

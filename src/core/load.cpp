@@ -3,6 +3,7 @@
 #include <exception>
 
 #include "core/error_registry.h"
+#include "core/file_remains.h"
 #include "core/template_core.h"
 #include "core/visibility_groups.h"
 #include "elements/list_section.h"
@@ -67,10 +68,9 @@ void ReportFailedLoad(const OpenFile& file, const std::string& path) {
 }
 
 /// Why the item tree could not be read, in words for the modeller.
-std::string TreeFailureText(const std::string& path) {
+std::string TreeFailureText(bool isEmpty) {
   if (!LastKeyError().empty()) return LastKeyError();
-  // The reader calls such a file missing.
-  return KeyFileSize(path) == 0 ? "the file is empty, or no regular file" : KeyFileFailureText();
+  return isEmpty ? "the file is empty, or no regular file" : KeyFileFailureText();
 }
 
 /// A target that holds nothing is an empty template, and misses no key.
@@ -93,18 +93,20 @@ class Reading final {
   /// them.
   bool CheckIdRange();
   bool ReadSections(KvfHandle file, int targetNumber);
-  void ReadSettings(KvfNode target, int& status);
+  void ReadSettings(KvfNode target, ReadStatus& status);
   template <class Element>
-  void ReadCollection(const Collection<Element>& row, KvfNode target, int& status);
-  void ReadTemplateEquations(KvfNode target, int& status);
+  void ReadCollection(const Collection<Element>& row, KvfNode target, ReadStatus& status);
+  void ReadTemplateEquations(KvfNode target, ReadStatus& status);
 
   TemplateCore& core;
   TemplateState& state;
 };
 
 bool Reading::ReadFile(const std::string& path) {
+  std::string text;
+  bool isEmpty = false;
   {
-    // Closed before the second reading: a large file need not lie in memory twice.
+    // Closed before the second reading, which takes the text and not the file: a pipe gives its content once.
     const OpenFile file(path);
     if (file.Error() != kKvfOk || file.Handle() == 0) {
       ReportFailedLoad(file, path);
@@ -113,18 +115,22 @@ bool Reading::ReadFile(const std::string& path) {
     state.saveFileName = path;
     state.templateFileName = path;
     if (!ReadSections(file.Handle(), 1)) return false;
+    text = kvfTakeText(file.Handle());
+    isEmpty = text.empty() && kvfGetBytesCut(file.Handle()) == 0;
   }
   state.keptTree.Clear();
-  if (LoadKeyFileTree(path, state.keptTree) == 0) {
-    Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(path)}});
+  if (ParseKeyFileTree(text, state.keptTree) == 0) {
+    Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(isEmpty)}});
   }
   return true;
 }
 
 bool Reading::ReadSections(KvfHandle file, int targetNumber) {
-  int status = 0;
+  ReadStatus status(state.account);
   const KvfNode target = kvfTargetByNameNum(file, section::kTarget, targetNumber);
-  if (target != nullptr) {
+  if (target == nullptr) {
+    state.account.Note(AccountKind::Absent, "", 0, {"section-absent", {section::kTarget}});
+  } else {
     const RebuildsOff noRebuilds(state.flags);
     if (!IsEmptyTarget(target)) state.root.Read(target, status);
     ReadSettings(target, status);
@@ -141,25 +147,31 @@ bool Reading::ReadSections(KvfHandle file, int targetNumber) {
   }
   core.RebuildSymbolTable();
   if (state.hasMisc) VisibilityGroups(state).TakeRecordNumbers();
+  state.keptText = kvfTextBeside(file, target);
+  NoteWhatNobodyRead(file, target, state);
   if (Errors().GetErrorCount(static_cast<std::uint32_t>(ErrorLevel::Fatal)) > 0) return false;
   state.flags.modified = false;
   return true;
 }
 
-void Reading::ReadSettings(KvfNode target, int& status) {
+void Reading::ReadSettings(KvfNode target, ReadStatus& status) {
   const KvfNode settings = kvfSectionByNameNum(target, section::kMisc, 1);
   state.hasMisc = settings != nullptr;
   if (state.hasMisc) state.misc.Read(settings, status);
 }
 
 template <class Element>
-void Reading::ReadCollection(const Collection<Element>& row, KvfNode target, int& status) {
+void Reading::ReadCollection(const Collection<Element>& row, KvfNode target, ReadStatus& status) {
   CEL_Element* head = row.HasHead() ? &state.ListHead(row.listKind) : nullptr;
+  if (head != nullptr) status.NoteAbsentSection(target, row.section);
   ReadList(target, row.section, head, status,
            [this, &row]() -> CEL_Element& { return *core.AddElement(row.kind); });
 }
 
-void Reading::ReadTemplateEquations(KvfNode target, int& status) {
+void Reading::ReadTemplateEquations(KvfNode target, ReadStatus& status) {
+  if (!state.collections.stateVariables.empty()) {
+    status.NoteAbsentSection(target, section::kStateVariableEquations);
+  }
   const KvfNode equations = kvfSectionByNameNum(target, section::kStateVariableEquations, 1);
   if (equations == nullptr) return;
   if (static_cast<std::size_t>(kvfGetNoSections(equations)) > state.collections.stateVariables.size()) {
@@ -208,6 +220,13 @@ bool Reading::Load(const std::string& path) {
 bool TemplateCore::LoadWrapper(const std::string& path) {
   // A copy: the path may be the template's own file name, which the load empties first.
   return Reading(*this, state).Load(std::string(path));
+}
+
+bool TemplateCore::LoadCopy(const std::string& source, const std::string& path) {
+  if (!LoadWrapper(source)) return false;
+  state.templateFileName = path;
+  state.saveFileName = path;
+  return true;
 }
 
 }  // namespace tessal

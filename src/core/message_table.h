@@ -74,9 +74,167 @@ inline constexpr MessageRow kMessages[] = {
         "sections-not-kept",
         ErrorLevel::Warning,
         "%1",
-        "What lies in the file beside TESSAL_SETUP could not be read; a save leaves it out.",
+        "What lies in the file beside TESSAL_SETUP is no item tree; a save keeps its text all the same.",
         "An empty file, or a section that uses a notation which only other programs read.",
         "Repair the place that is named, or keep a copy of the file before you save.",
+    },
+    // The account of a load: what it did not take over as it is in the file. None of these is in the list of
+    // messages.
+    {
+        "key-absent",
+        ErrorLevel::Notice,
+        "%1 of %2 is missing",
+        "The file lacks a keyword; the value is empty, or the default of its kind. Nothing of the file is "
+        "lost.",
+        "A constant without a line UNIT.",
+        "Set the value and save, so that the file has it.",
+    },
+    {
+        "section-absent",
+        ErrorLevel::Notice,
+        "the section %1 is missing",
+        "The file lacks a section that every saved template has; what it holds is empty. Nothing of the file "
+        "is "
+        "lost.",
+        "A file without [CONSTANTS].",
+        "Nothing, unless the section was removed by mistake.",
+    },
+    {
+        "value-not-read",
+        ErrorLevel::Notice,
+        "%1 of %2 was not read, since %3",
+        "A number is in the file, but numbers are not read after a key that is missing; a save writes "
+        "another "
+        "value in its place.",
+        "DEFAULT_VALUE = 0.2 of a constant that has no UNIT.",
+        "Use \"Read Them\" in the editor or tessal repair, which take the values over.",
+    },
+    {
+        "value-of-wrong-type",
+        ErrorLevel::Notice,
+        "%1 of %2 is no %3 and was not read",
+        "A value is in the file in another type than its keyword has; a save writes another value in its "
+        "place.",
+        "DEFAULT_VALUE = 'about 2'",
+        "Take it over with \"Read Them\" or tessal repair where it is a number between quotes, or set the "
+        "value.",
+    },
+    {
+        "value-replaced",
+        ErrorLevel::Notice,
+        "%1 of %2 is no choice, and was replaced by %3",
+        "A value is none of those that its keyword can have, and another took its place; a save writes that "
+        "one.",
+        "FRAMEWORK = 'GRID' of a search function.",
+        "Choose the value that was meant, and save.",
+    },
+    {
+        "value-cut",
+        ErrorLevel::Notice,
+        "%1 of %2 was cut to %3",
+        "A value does not fit, and a part of it or its nearest limit was read; a save writes that.",
+        "RANDSEED = 99999999999",
+        "Set the value that was meant, and save.",
+    },
+    {
+        "equation-misnamed",
+        ErrorLevel::Notice,
+        "%1 of %2 was not read, since it has another name than the state variable",
+        "The keyword of an equation is the symbol of its state variable; under another name it is not read, "
+        "and "
+        "a save writes the default in its place.",
+        "NO3 = '\"-denitrification\"' as the equation of NH4.",
+        "Use \"Read Them\" in the editor or tessal repair, if it is the equation of this variable.",
+    },
+    {
+        "groups-not-read",
+        ErrorLevel::Notice,
+        "%1 visibility groups were not read, since %2",
+        "The file holds visibility groups that were passed over after a key that is missing; a save leaves "
+        "them "
+        "out.",
+        "A section VISIBILITY_GROUPS without DOCUMENTATION.",
+        "Use \"Read Them\" in the editor or tessal repair, which take the groups over.",
+    },
+    {
+        "items-not-read",
+        ErrorLevel::Notice,
+        "the items of the level %1 were not read, since %2",
+        "The file holds the items of a level, which were passed over after a key that is missing; a save "
+        "leaves "
+        "them out.",
+        "A level with ITEMS and without ITEMCOUNT.",
+        "Use \"Read Them\" in the editor or tessal repair, which take the items over.",
+    },
+    {
+        "item-dropped",
+        ErrorLevel::Notice,
+        "item %1 of the level %2 is no element and will not be kept",
+        "A level lists the number of an element that the template does not have.",
+        "ITEMS = 1, 99 in a template of ten elements.",
+        "Nothing, or include the element that was meant in the level.",
+    },
+    {
+        "keyword-dropped",
+        ErrorLevel::Notice,
+        "%1 in %2 is not read and will not be kept",
+        "A section of the template holds a keyword that it does not have, or has twice; a save leaves it "
+        "out.",
+        "COLOUR = 'red' in CONSTANT_3.",
+        "Keep the text elsewhere, in a description or in a section of its own after the template.",
+    },
+    {
+        "values-dropped",
+        ErrorLevel::Notice,
+        "%1 in %2 has more values than are read; the others will not be kept",
+        "A keyword has several values where one is read, or values of a type that it cannot have.",
+        "UNIT = 'g', 'kg'",
+        "Keep the other values elsewhere.",
+    },
+    {
+        "section-dropped",
+        ErrorLevel::Notice,
+        "the section %1 in %2 is not read and will not be kept",
+        "The template's section holds one that it does not have, or has twice; a save leaves it out.",
+        "A second section [CONSTANTS].",
+        "Move its content to where it belongs, or to a section of its own after the template.",
+    },
+    {
+        "comment-dropped",
+        ErrorLevel::Notice,
+        "the comment %1 will not be kept",
+        "A comment inside the template's section or in the head of the file; a save writes a fresh file "
+        "without "
+        "it.",
+        "// calibrated in May",
+        "Move it to the description of the element, or after the template's section.",
+    },
+    {
+        "head-texts-dropped",
+        ErrorLevel::Notice,
+        "the texts of %1 will not be kept: a save writes those of %2",
+        "The list head of the auxiliaries has texts of its own in the file; the format has always written "
+        "those "
+        "of the constants in their place.",
+        "A DESCRIPTION of AUXILIARY_VARIABLES that differs from that of CONSTANTS.",
+        "Keep the text in the description of an element or of the template.",
+    },
+    {
+        "text-dropped",
+        ErrorLevel::Notice,
+        "%1 bytes after a zero byte are not read and will not be kept",
+        "Key-file text ends at a zero byte; what follows it in the file is left out of a save.",
+        "A file that a crash has filled up with zeros.",
+        "Look at the file with a viewer for bytes; take a copy from before the damage if the text breaks "
+        "off.",
+    },
+    {
+        "symbol-twice",
+        ErrorLevel::Notice,
+        "%1 is the symbol of several elements",
+        "Two elements of the file have one symbol; expressions use the first.",
+        "Two constants kp.",
+        "Rename one of them.",
     },
     {
         "key-not-written",

@@ -1,16 +1,13 @@
-// Saving a template: its text is written through the key-file library, joined with the top-level sections
-// that only the kept tree knows, and put in the target's place in one step.
+// Saving a template: its text is written through the key-file library, joined with what its file held
+// beside the template, and put in the target's place in one step.
 #include <exception>
-#include <locale>
 #include <optional>
-#include <sstream>
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "elements/list_section.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
-#include "platform/ascii.h"
 #include "platform/file_replacement.h"
 
 namespace tessal {
@@ -82,15 +79,9 @@ class Stamps final {
   std::string trigonometrics;
 };
 
-/// Each line feed as carriage return and line feed.
-std::string WithCarriageReturns(const std::string& text) {
-  std::string result;
-  result.reserve(text.size() + text.size() / 16);
-  for (const char character : text) {
-    if (character == '\n') result += '\r';
-    result += character;
-  }
-  return result;
+/// What the file held beside the template, to follow it, with a blank line after it.
+std::string KeptPart(const std::string& keptText) {
+  return keptText.empty() ? std::string() : keptText + "\r\n\r\n";
 }
 
 /// The writing of one template.
@@ -109,7 +100,6 @@ class Writing final {
 
  private:
   bool WriteSections(KvfHandle file);
-  std::string KeptSectionsText() const;
 
   TemplateState& state;
 };
@@ -156,6 +146,8 @@ bool Writing::SaveInPlace(const std::string& path) {
   state.templateFileName = path;
   state.saveFileName = path;
   state.flags.modified = false;
+  // From here on the file holds what the template does.
+  state.account.Clear();
   return true;
 }
 
@@ -165,7 +157,7 @@ std::optional<std::string> Writing::FileText(std::string& reason) {
     reason = "the template holds what the file format can not";
     return std::nullopt;
   }
-  return WithTypeLine(kvfGetText(image.Handle()) + KeptSectionsText());
+  return WithTypeLine(kvfGetText(image.Handle()) + KeptPart(state.keptText));
 }
 
 std::optional<std::string> Writing::CopyText(std::string& reason) {
@@ -180,20 +172,6 @@ std::optional<std::string> Writing::CopyText(std::string& reason) {
   state.misc.documentRevision.SetInt(formerRevision);
   state.flags.modified = formerlyModified;
   return text;
-}
-
-std::string Writing::KeptSectionsText() const {
-  std::ostringstream text;
-  text.imbue(std::locale::classic());
-  // The first target of the template's name is the one that was read; it is not always the first of all.
-  bool targetSeen = false;
-  for (const auto& child : state.keptTree.Children()) {
-    if (child->ItemKind() != CKvfBaseItem::kSection) continue;
-    const bool isTarget = !targetSeen && EqualIgnoringCase(child->name, section::kTarget);
-    targetSeen = targetSeen || isTarget;
-    if (!isTarget) child->Write(text);
-  }
-  return WithCarriageReturns(text.str());
 }
 
 bool Writing::WriteSections(KvfHandle file) {

@@ -62,6 +62,8 @@ void TemplateCore::Clear() {
   ForEachCollection([this](const auto& row) { (state.collections.*row.elements).clear(); });
   state.groupCounter = 0;
   state.keptTree.Clear();
+  state.keptText.clear();
+  state.account.Clear();
   state.table.Clear();
   ClearLastKeyError();
   Errors().ClearErrors();

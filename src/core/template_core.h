@@ -212,6 +212,16 @@ class TemplateCore final : public ElementOwner {
   /// Loads a file in the place of the present template. False when it could not be read; the registry then
   /// holds the reason.
   bool LoadWrapper(const std::string& path);
+  /// Loads the content of one file as that of another, which a plain save then replaces; of none where `path`
+  /// is empty. Fails as a load does.
+  bool LoadCopy(const std::string& source, const std::string& path);
+  /// What the file of the load holds beside the template, as text; each save writes it after the template.
+  const std::string& KeptText() const { return state.keptText; }
+  /// What the file of the load holds that the load did not take over; empty after a save.
+  const LoadAccount& Account() const { return state.account; }
+  /// Takes over what the load passed over, and forgets it. False when there is more that is to be set by
+  /// hand.
+  bool TakeOverPassedOver();
   /// Saves: under its own name plainly, under another with fresh version stamps and a restarted revision.
   /// False when it failed; the registry then holds the reason, and the file on disk is as it was.
   bool SaveWrapper(const std::string& path);

@@ -9,6 +9,7 @@
 
 #include "core/collections.h"
 #include "core/symbol_table.h"
+#include "elements/load_account.h"
 #include "elements/miscellaneous.h"
 #include "keyfile/item_tree.h"
 
@@ -44,6 +45,8 @@ struct TemplateState {
   Collections collections;
   SymbolTable table;
   CKvfSectionItem keptTree;  ///< of the file that was loaded
+  std::string keptText;      ///< what that file holds beside the template, as it is in it
+  LoadAccount account;       ///< what the load did not take over
   std::uint32_t groupCounter = 0;
   std::string templateFileName;
   std::string saveFileName;

@@ -1,6 +1,9 @@
 #include "core/visibility_groups.h"
 
 #include <algorithm>
+#include <iterator>
+#include <unordered_map>
+#include <utility>
 
 #include "core/template_core.h"
 #include "elements/free_name.h"
@@ -67,22 +70,64 @@ std::vector<std::int32_t> ItemsOfLevel(const TemplateState& state, std::int32_t 
 }  // namespace
 
 void VisibilityGroups::TakeRecordNumbers() {
+  const auto take = [this](const VisibilityLevel& level, std::set<std::int32_t>& records,
+                           std::set<Uid>& items) {
+    for (const std::int32_t sequence : records) {
+      const SymbolRecord* record =
+          sequence < 1 ? nullptr : state.table.BySequence(static_cast<std::uint32_t>(sequence));
+      // Both records of a movement are one member.
+      if (record != nullptr) {
+        items.insert(record->uid);
+      } else {
+        state.account.Note(AccountKind::Dropped, level.name, 0,
+                           {"item-dropped", {std::to_string(sequence), level.name}});
+      }
+    }
+    records.clear();
+  };
+  const auto takeAll = [&take](std::vector<VisibilityGroup>& groups) {
+    for (VisibilityGroup& group : groups) {
+      for (VisibilityLevel& level : group.levels) {
+        take(level, level.records, level.items);
+        take(level, level.recordsPassedOver, level.passedOver);
+      }
+    }
+  };
+  takeAll(Groups());
+  takeAll(state.misc.Visibilities().groupsPassedOver);
+  EnterElements();
+}
+
+void VisibilityGroups::EnterElements() {
+  std::unordered_map<Uid, CEL_Element*> elements;
+  state.table.ForEachElement(
+      [&elements](const SymbolRecord& record) { elements.emplace(record.uid, record.element); });
   std::int32_t group = 0;
-  for (VisibilityGroup& each : Groups()) {
+  for (const VisibilityGroup& each : Groups()) {
     ++group;
     std::int32_t number = 0;
-    for (VisibilityLevel& level : each.levels) {
+    for (const VisibilityLevel& level : each.levels) {
       ++number;
-      for (const std::int32_t sequence : level.records) {
-        const SymbolRecord* record =
-            sequence < 1 ? nullptr : state.table.BySequence(static_cast<std::uint32_t>(sequence));
-        if (record == nullptr) continue;
-        // Both records of a movement are one member.
-        if (level.items.insert(record->uid).second) record->element->SetVisibility(group, number);
+      for (const Uid uid : level.items) {
+        const auto hit = elements.find(uid);
+        if (hit == elements.end()) continue;
+        const auto& pairs = hit->second->Visibility();
+        const bool isIn = std::find(pairs.begin(), pairs.end(), std::pair(group, number)) != pairs.end();
+        if (!isIn) hit->second->SetVisibility(group, number);
       }
-      level.records.clear();
     }
   }
+}
+
+void VisibilityGroups::TakeOverPassedOver() {
+  CEL_Visibility& visibilities = state.misc.Visibilities();
+  std::move(visibilities.groupsPassedOver.begin(), visibilities.groupsPassedOver.end(),
+            std::back_inserter(visibilities.groups));
+  visibilities.groupsPassedOver.clear();
+  for (VisibilityGroup& group : visibilities.groups) {
+    for (VisibilityLevel& level : group.levels) level.items.merge(std::exchange(level.passedOver, {}));
+  }
+  EnterElements();
 }
 
 void VisibilityGroups::Leave(CEL_Element& element) {
@@ -126,9 +171,7 @@ std::int32_t VisibilityGroups::CreateLevel(std::int32_t group) {
   auto& levels = found->levels;
   levels.push_back({FirstFreeName("Level_", levels.size() + 1,
                                   [&levels](const std::string& name) { return HasName(levels, name); }),
-                    "",
-                    {},
-                    {}});
+                    ""});
   state.flags.modified = true;
   return static_cast<std::int32_t>(levels.size());
 }

@@ -17,6 +17,8 @@ class VisibilityGroups final {
 
   /// Makes memberships of the record numbers that a file holds.
   void TakeRecordNumbers();
+  /// Adds the groups and items that the load passed over.
+  void TakeOverPassedOver();
   std::int32_t AddGroup();
   void RemoveGroup(std::int32_t group);
   bool SetGroupName(std::int32_t group, std::string_view name);
@@ -31,6 +33,8 @@ class VisibilityGroups final {
   void Leave(CEL_Element& element);
 
  private:
+  /// Gives each element its memberships by the items of the levels.
+  void EnterElements();
   template <class Named>
   bool Rename(const std::vector<Named>& siblings, Named& renamed, std::string_view name);
   void Describe(std::string& description, std::string_view text);

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <filesystem>
+#include <fstream>
 #include <span>
 #include <string_view>
 #include <system_error>
@@ -23,13 +24,14 @@ namespace tessal {
 
 namespace {
 
-constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 constexpr std::string_view kProjectAddress = TESSAL_MATHJAX_PROJECT;
 
 // The slash before the public identifier has always been there.
 constexpr std::string_view kDoctype =
     "<!DOCTYPE HTML PUBLIC /\"-//W3C//DTD HTML 4.01 Transitional//EN\" "
     "\"http://www.w3.org/TR/html4/loose.dtd\">";
+
+constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 
 constexpr std::array<std::string_view, 13> kMiscKeys = {
     "Description",          "Documentation",      "Online help",
@@ -120,7 +122,7 @@ class PageWriter final {
     Line("</div>");
     WriteFooter(created);
     const bool isAscii = std::none_of(page.begin(), page.end(), [](char each) { return (each & 0x80) != 0; });
-    if (!isAscii && IsUtf8(page)) page.insert(0, kByteOrderMark);
+    if (!isAscii && IsUtf8(page)) page.insert(0, kUtf8Mark);
     return std::move(page);
   }
 
@@ -397,11 +399,33 @@ std::string UsualPagePath(const std::string& templateFile) {
   return (file.parent_path() / "HTML_doc" / file.filename().replace_extension(".html")).string();
 }
 
-std::string PrepareUsualPagePath(const std::string& templateFile) {
+std::optional<std::string> PrepareUsualPagePath(const std::string& templateFile, std::string& failure) {
   std::string page = UsualPagePath(templateFile);
+  const std::filesystem::path folder = std::filesystem::path(page).parent_path();
   std::error_code shownByTheWrite;
-  std::filesystem::create_directory(std::filesystem::path(page).parent_path(), shownByTheWrite);
-  return page;
+  std::filesystem::create_directory(folder, shownByTheWrite);
+  if (std::filesystem::is_symlink(std::filesystem::symlink_status(folder, shownByTheWrite))) {
+    failure = "can not write into '" + folder.string() + "': it is a symbolic link";
+  } else if (IsStream(page)) {
+    failure = "can not replace '" + page + "': it is no plain file";
+  } else {
+    failure = PageRefusal(page);
+  }
+  return failure.empty() ? std::optional(std::move(page)) : std::nullopt;
+}
+
+std::string PageRefusal(const std::string& path) {
+  std::error_code shownByTheWrite;
+  if (!std::filesystem::is_regular_file(std::filesystem::symlink_status(path, shownByTheWrite))) return {};
+  std::ifstream file(path, std::ios::binary);
+  if (!file) return "'" + path + "' exists already and can not be read";
+  std::string start(kUtf8Mark.size() + kDoctype.size(), '\0');
+  file.read(start.data(), static_cast<std::streamsize>(start.size()));
+  start.resize(static_cast<std::size_t>(file.gcount()));
+  if (start.starts_with(kUtf8Mark)) start.erase(0, kUtf8Mark.size());
+  return start.empty() || start.starts_with(kDoctype)
+             ? std::string()
+             : "'" + path + "' exists already and is no page of this program";
 }
 
 bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, const PageOptions& options,
@@ -414,7 +438,7 @@ bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, 
   const std::time_t now = std::time(nullptr);
   std::tm local = {};
   localtime_r(&now, &local);
-  failure = WriteWholeFile(path, HtmlDocumentation(core, options, local));
+  failure = WriteOutputFile(path, HtmlDocumentation(core, options, local));
   return failure.empty();
 }
 

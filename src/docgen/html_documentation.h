@@ -2,6 +2,7 @@
 #pragma once
 
 #include <ctime>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -13,8 +14,14 @@ class TemplateCore;
 /// and in it the file's plain name.
 std::string UsualPagePath(const std::string& templateFile);
 
-/// The same, with the folder made; one that cannot be made shows when the page is written.
-std::string PrepareUsualPagePath(const std::string& templateFile);
+/// The same, with the folder made. Nothing, with the reason in words, when what lies there is not for us to
+/// replace: others may have made the folder, so a link in the place of the folder or of the page, and a file
+/// that is no page of ours, are left alone. A folder that cannot be made shows when the page is written.
+std::optional<std::string> PrepareUsualPagePath(const std::string& templateFile, std::string& failure);
+
+/// Why a page may not take the place of what has this path, or the empty text: what is there is neither an
+/// older page nor an empty file.
+std::string PageRefusal(const std::string& path);
 
 /// How a page is written.
 struct PageOptions {

@@ -182,7 +182,7 @@ bool ExportOverview(const TemplateCore& core, const std::string& path, std::stri
     failure = "can not write the overview over its template '" + path + "'";
     return false;
   }
-  failure = WriteWholeFile(path, OverviewText(core, BuildOverview(core)));
+  failure = WriteOutputFile(path, OverviewText(core, BuildOverview(core)));
   return failure.empty();
 }
 

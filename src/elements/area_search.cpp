@@ -7,6 +7,7 @@
 #include "core/error_registry.h"
 #include "elements/element_checks.h"
 #include "elements/element_owner.h"
+#include "elements/property_io.h"
 #include "keyfile/keywords.h"
 
 namespace tessal {
@@ -115,11 +116,25 @@ void CEL_Lagrange_Spatial_Function::Reset() {
   RestoreSelections();
 }
 
-void CEL_Lagrange_Spatial_Function::Read(KvfNode section, int& status) {
+void CEL_Lagrange_Spatial_Function::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   CEL_Element::Read(section, status);
+  struct Choice {
+    CEL_Property* property;
+    std::string_view keyword;
+    std::string inFile;
+  };
+  const std::array<Choice, 3> choices = {{{&framework, key::kFramework, framework.Text()},
+                                          {&purpose, key::kPurpose, purpose.Text()},
+                                          {&math, key::kMath, math.Text()}}};
   RebuildChoices();
   RestoreSelections();
+  for (const Choice& choice : choices) {
+    const bool isThere = HasKeyword(section, choice.keyword);
+    if (isThere && choice.property->Text() != choice.inFile) {
+      status.NoteReplaced(section, choice.keyword, choice.property->Text());
+    }
+  }
 }
 
 bool CEL_Lagrange_Spatial_Function::SearchesGrid() const {

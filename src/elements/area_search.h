@@ -17,7 +17,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
 
   explicit CEL_Lagrange_Spatial_Function(std::string_view caption);
 
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;

@@ -175,7 +175,7 @@ void ResetElementUids() {
   UidCounter() = 0;
 }
 
-void CEL_Element::Read(KvfNode section, int& status) {
+void CEL_Element::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   ReadBase(section, status);
   ReadOwn(section, status);
@@ -187,8 +187,9 @@ void CEL_Element::Write(KvfHandle file, int& status) {
   WriteOwn(file, status);
 }
 
-void CEL_Element::ReadBase(KvfNode section, int& status) {
+void CEL_Element::ReadBase(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
+  status.Begin(*this, section);
   if (hasSymbol) ReadProperty(symbol, section, key::kSymbol, status);
   if (hasId) ReadProperty(id, section, key::kId, status);
   if (hasDescription) {
@@ -230,13 +231,16 @@ void CEL_Element::WriteBase(KvfHandle file, int& status) {
   }
 }
 
-void CEL_Element::ReadOwn(KvfNode section, int& status) {
+void CEL_Element::ReadOwn(KvfNode section, ReadStatus& status) {
   for (const bool last : {false, true}) {
     for (const OwnProperty& own : ownProperties) {
       const PropertyRow& row = *own.row;
       if (row.readLast != last || row.keyword.empty()) continue;
       if (!row.onlyWith.empty() && !HasKeyword(section, row.onlyWith)) continue;
-      ReadProperty(*own.property, section, row.keyword, status);
+      const bool isElsewhere =
+          !row.writtenAs.empty() && !HasKeyword(section, row.keyword) && HasKeyword(section, row.writtenAs);
+      if (isElsewhere) status.ReportMissing(section, row.keyword);
+      ReadProperty(*own.property, section, isElsewhere ? row.writtenAs : row.keyword, status);
     }
   }
   SelectPresentValues();
@@ -244,7 +248,8 @@ void CEL_Element::ReadOwn(KvfNode section, int& status) {
 
 void CEL_Element::WriteOwn(KvfHandle file, int& status) {
   for (const OwnProperty& own : ownProperties) {
-    if (!own.row->keyword.empty()) WriteProperty(*own.property, file, own.row->keyword, *this, status);
+    const std::string_view keyword = own.row->writtenAs.empty() ? own.row->keyword : own.row->writtenAs;
+    if (!keyword.empty()) WriteProperty(*own.property, file, keyword, *this, status);
   }
 }
 
@@ -340,6 +345,16 @@ int CEL_Element::SetOwnFields(const std::vector<ElementField>& fields) {
 
 int CEL_Element::SetFields(const std::vector<ElementField>& fields) {
   return SetBaseFields(fields) + SetOwnFields(fields);
+}
+
+std::string_view CEL_Element::LabelOf(const CEL_Property& property) const {
+  for (const BaseRow& row : kBaseRows) {
+    if (&(this->*row.property) == &property) return row.label;
+  }
+  for (const OwnProperty& own : ownProperties) {
+    if (own.property == &property) return own.row->label;
+  }
+  return {};
 }
 
 bool CEL_Element::ParseExpression() {

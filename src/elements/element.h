@@ -20,6 +20,7 @@
 namespace tessal {
 
 class ElementOwner;
+class ReadStatus;
 
 /// One row of the table that an element class is described by: how a property is called in the file and by
 /// people, what it may hold, and what it starts with.
@@ -33,7 +34,9 @@ struct PropertyRow {
   bool readLast = false;        ///< a value that is read after the bounds that limit it
   bool listedLast = false;      ///< comes after the others in the field list
   std::string_view onlyWith{};  ///< read only when the section has this keyword; without it the value stays
-  std::string_view caption{};   ///< the item under which a failed parse is reported; else the symbol
+  /// Another keyword, under which a save writes the value. A load finds it there when its own is missing.
+  std::string_view writtenAs{};
+  std::string_view caption{};  ///< the item under which a failed parse is reported; else the symbol
 };
 
 // A row with one of its less common columns.
@@ -47,6 +50,10 @@ constexpr PropertyRow ListedLast(PropertyRow row) {
 }
 constexpr PropertyRow OnlyWith(std::string_view keyword, PropertyRow row) {
   row.onlyWith = keyword;
+  return row;
+}
+constexpr PropertyRow WrittenAs(std::string_view keyword, PropertyRow row) {
+  row.writtenAs = keyword;
   return row;
 }
 constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
@@ -68,7 +75,7 @@ class CEL_Element : public PropertyListener {
   virtual ~CEL_Element() = default;
 
   /// Fills the properties from a key-file section; a node that is no section leaves the element alone.
-  virtual void Read(KvfNode section, int& status);
+  virtual void Read(KvfNode section, ReadStatus& status);
   /// Writes the properties as keywords into the section that the caller has opened.
   virtual void Write(KvfHandle file, int& status);
   /// Returns the properties to the defaults of the class.
@@ -95,6 +102,9 @@ class CEL_Element : public PropertyListener {
       visit(*ownProperties[place].row, *ownProperties[place].property);
     }
   }
+
+  /// The label of one of the element's properties; empty for any other.
+  std::string_view LabelOf(const CEL_Property& property) const;
 
   bool HasExpression() const { return firstExpression < endOfExpressions; }
   /// What the symbol table holds for an element without expressions: the number of an input, the name that a
@@ -173,10 +183,10 @@ class CEL_Element : public PropertyListener {
   void Bind(std::span<const PropertyRow> rows, std::initializer_list<CEL_Property*> properties);
   void ListenTo(std::initializer_list<CEL_Property*> properties);
 
-  void ReadBase(KvfNode section, int& status);
+  void ReadBase(KvfNode section, ReadStatus& status);
   void WriteBase(KvfHandle file, int& status);
   /// The properties of the class's table, in its order, those that are read last after the others.
-  void ReadOwn(KvfNode section, int& status);
+  void ReadOwn(KvfNode section, ReadStatus& status);
   void WriteOwn(KvfHandle file, int& status);
   void ResetOwn();
 

@@ -54,7 +54,7 @@ void CEL_ExternalFunction::Reset() {
   claim.Claim(publicName.Text());
 }
 
-void CEL_ExternalFunction::Read(KvfNode section, int& status) {
+void CEL_ExternalFunction::Read(KvfNode section, ReadStatus& status) {
   CEL_Element::Read(section, status);
   claim.Claim(publicName.Text());
 }

@@ -11,7 +11,7 @@ class CEL_ExternalFunction final : public CEL_Element {
  public:
   explicit CEL_ExternalFunction(std::string_view caption);
 
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   void Reset() override;
   void OnPropertyChanged(CEL_Property& changed) override;
   void UpdateLocks() override;

@@ -83,7 +83,7 @@ void CEL_Input::Reset() {
   CEL_Input::UpdateLocks();
 }
 
-void CEL_Input::Read(KvfNode section, int& status) {
+void CEL_Input::Read(KvfNode section, ReadStatus& status) {
   CEL_Element::Read(section, status);
   // Again, so that a deprecated id that the file holds stays in the list.
   if (kvfIsSection(section)) RebuildBuiltInChoices(showDeprecated);

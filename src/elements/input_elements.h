@@ -16,7 +16,7 @@ struct InputKind {
 
 class CEL_Input : public CEL_Element {
  public:
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;

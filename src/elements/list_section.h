@@ -15,7 +15,7 @@ namespace tessal {
 /// Reads the section of that name, if there is one: the texts of the list head, if it has one, then an
 /// element made by `add` for each sub-section.
 template <class AddElement>
-void ReadList(KvfNode parent, std::string_view name, CEL_Element* head, int& status, AddElement add) {
+void ReadList(KvfNode parent, std::string_view name, CEL_Element* head, ReadStatus& status, AddElement add) {
   const KvfNode list = kvfSectionByNameNum(parent, name, 1);
   if (list == nullptr) return;
   if (head != nullptr) head->Read(list, status);
@@ -52,11 +52,14 @@ void WriteList(const Elements& elements, std::string_view name, std::string_view
 /// Equations lie in a section apart, in the order of their state variables, each under its symbol as keyword.
 /// More sub-sections than state variables raise the subscript failure.
 template <class StateVariables>
-void ReadEquations(KvfNode equations, const StateVariables& stateVariables, int& status) {
+void ReadEquations(KvfNode equations, const StateVariables& stateVariables, ReadStatus& status) {
   const int count = kvfGetNoSections(equations);
   for (int number = 1; number <= count; ++number) {
     auto& variable = At(stateVariables, static_cast<std::size_t>(number - 1));
-    ReadProperty(variable.equation, kvfSectionByNum(equations, number), variable.symbol.Text(), status);
+    const KvfNode section = kvfSectionByNum(equations, number);
+    status.Begin(variable, section);
+    ReadProperty(variable.equation, section, variable.symbol.Text(), status);
+    if (!HasKeyword(section, variable.symbol.Text())) status.NoteMisnamed(section, variable.equation);
   }
 }
 

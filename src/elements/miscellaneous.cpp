@@ -1,6 +1,7 @@
 #include "elements/miscellaneous.h"
 
 #include <array>
+#include <cmath>
 #include <limits>
 
 #include "elements/element_checks.h"
@@ -8,6 +9,7 @@
 #include "elements/property_io.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -53,6 +55,17 @@ constexpr std::array<PropertyRow, 11> kRows = {{
              {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree"}),
 }};
 
+/// Rounds a version that was read. What that takes away, beyond the noise of earlier saves, is in the
+/// account.
+void RoundRead(CEL_Property& version, KvfNode section, std::string_view key, ReadStatus& status) {
+  constexpr double kNoise = 1e-9;
+  const double read = version.RealValue();
+  version.SetReal(RoundVersion(read));
+  if (std::abs(version.RealValue() - read) > kNoise && HasKeyword(section, key)) {
+    status.NoteCut(section, key, ShortestNumberText(version.RealValue()));
+  }
+}
+
 }  // namespace
 
 CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
@@ -79,12 +92,12 @@ void CEL_Miscanellous::SetAbsentValues(KvfNode section) {
   if (!HasKeyword(section, key::kTrigonometrics)) trigonometrics.SetText(kRadians);
 }
 
-void CEL_Miscanellous::Read(KvfNode section, int& status) {
+void CEL_Miscanellous::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   SetAbsentValues(section);
   CEL_Element::Read(section, status);
-  tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
-  parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));
+  RoundRead(tessalVersion, section, key::kTessalVersion, status);
+  RoundRead(parserVersion, section, key::kParserVersion, status);
   ReadList(section, section::kExternalFunctions, &functionHead, status,
            [this]() -> CEL_Element& { return AddExternalFunction(); });
   visibilities.Read(section, status);
@@ -101,6 +114,13 @@ void CEL_Miscanellous::Write(KvfHandle file, int& status) {
               status);
   }
   if (!visibilities.groups.empty()) visibilities.Write(file, status);
+}
+
+int CEL_Miscanellous::SetFields(const std::vector<ElementField>& fields) {
+  const int found = CEL_Element::SetFields(fields);
+  tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
+  parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));
+  return found;
 }
 
 bool CEL_Miscanellous::Check() {

@@ -15,10 +15,12 @@ class CEL_Miscanellous final : public CEL_Element {
  public:
   CEL_Miscanellous();
 
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   /// Raises the document revision before it writes it, unless it is -1, the mark of a file that had none.
   void Write(KvfHandle file, int& status) override;
   void Reset() override;
+  /// Versions have three decimals.
+  int SetFields(const std::vector<ElementField>& fields) override;
   bool Check() override;
   void SetModifiedFlag(bool* flag) override;
   void SetOwner(ElementOwner* template_) override;

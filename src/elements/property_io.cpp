@@ -6,6 +6,7 @@
 #include "elements/element.h"
 #include "elements/property.h"
 #include "expr/scanner.h"
+#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -18,38 +19,72 @@ std::string& LastKeyErrorText() {
   return text;
 }
 
-void ReportMissing(KvfNode section, std::string_view key, int& status) {
-  status = kStatusMissingKey;
-  const Finding finding("missing-key", {key, kvfGetNameGlb(section)});
-  Errors().ReportInFile("", kvfGetLine(section), finding);
-  LastKeyErrorText() = finding.text;
-}
-
 KvfNode FirstParameter(KvfNode section, std::string_view key) {
   const KvfNode keyword = kvfKeywordByNameNum(section, key, 1);
   return keyword == nullptr ? nullptr : kvfParamByNum(keyword, 1);
 }
 
 /// The parameter's text as it is, with the report when there is none.
-bool ReadRawText(std::string& text, KvfNode section, std::string_view key, int& status) {
+bool ReadRawText(std::string& text, KvfNode section, std::string_view key, ReadStatus& status) {
   const KvfNode parameter = FirstParameter(section, key);
   if (parameter == nullptr || kvfGetString(parameter, text) != kKvfOk) {
-    ReportMissing(section, key, status);
+    status.ReportMissing(section, key);
+    status.NoteUnread(section, key, nullptr);
     return false;
   }
-  status = 0;
+  status.TextWasRead();
   return true;
 }
 
-void ReadReal(CEL_Property& property, KvfNode section, std::string_view key, int& status) {
-  if (status != 0) return;
-  const KvfNode parameter = FirstParameter(section, key);
-  double value = 0.0;
-  if (parameter == nullptr || kvfGetDouble(parameter, value) != kKvfOk) {
-    ReportMissing(section, key, status);
-    return;
+/// How the library reads a number of one type.
+struct Reals {
+  using Number = double;
+  static constexpr auto kGet = kvfGetDouble;
+  static constexpr auto kFits = kvfFitsDouble;
+};
+struct Integers {
+  using Number = std::int32_t;
+  static constexpr auto kGet = kvfGetInt;
+  static constexpr auto kFits = kvfFitsInt;
+};
+
+/// Reads a number while numbers are read, and notes in the account what becomes of it otherwise.
+template <class Type, class Take>
+bool ReadNumber(KvfNode section, std::string_view key, const CEL_Property* property, ReadStatus& status,
+                Take take) {
+  if (status.ReadsNumbers()) {
+    const KvfNode parameter = FirstParameter(section, key);
+    typename Type::Number value{};
+    if (parameter != nullptr && Type::kGet(parameter, value) == kKvfOk) {
+      if (!Type::kFits(parameter)) {
+        status.NoteCut(section, key, ShortestNumberText(static_cast<double>(value)));
+      }
+      take(value);
+      return true;
+    }
+    status.ReportMissing(section, key);
   }
-  property.SetReal(value);
+  status.NoteUnread(section, key, property);
+  return false;
+}
+
+void ReadBoolean(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status) {
+  std::string text;
+  const bool isThere = ReadRawText(text, section, key, status);
+  property.SetBool(isThere && text == kYes);
+  if (isThere && text != kYes && text != kNo) status.NoteReplaced(section, key, kNo);
+}
+
+void ReadExpression(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status) {
+  std::string stored;
+  ReadRawText(stored, section, key, status);
+  const std::string_view expression = StripExpressionQuotes(stored);
+  property.SetText(CleanText(expression));
+  const auto start = static_cast<std::size_t>(expression.data() - stored.data());
+  const std::string outside = stored.substr(0, start) + stored.substr(start + expression.size());
+  if (outside.find_first_not_of("\" \n\r\t") != std::string::npos) {
+    status.NoteCut(section, key, property.Text());
+  }
 }
 
 std::string_view WriteFailureReason(int error) {
@@ -72,47 +107,44 @@ std::string_view CleanText(std::string_view text) {
   return text.substr(first, last - first + 1);
 }
 
-bool ReadText(std::string& text, KvfNode section, std::string_view key, int& status) {
+bool ReadText(std::string& text, KvfNode section, std::string_view key, ReadStatus& status) {
   std::string raw;
   if (!ReadRawText(raw, section, key, status)) return false;
   text = CleanText(raw);
   return true;
 }
 
-bool ReadInteger(std::int32_t& value, KvfNode section, std::string_view key, int& status) {
-  if (status != 0) return false;
-  const KvfNode parameter = FirstParameter(section, key);
-  if (parameter != nullptr && kvfGetInt(parameter, value) == kKvfOk) return true;
-  ReportMissing(section, key, status);
-  return false;
+bool ReadInteger(std::int32_t& value, KvfNode section, std::string_view key, ReadStatus& status) {
+  return ReadNumber<Integers>(section, key, nullptr, status,
+                              [&value](std::int32_t number) { value = number; });
 }
 
 bool HasKeyword(KvfNode section, std::string_view key) {
   return kvfKeywordByNameNum(section, key, 1) != nullptr;
 }
 
-void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key, int& status) {
-  std::string text;
+void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status) {
   switch (property.Type()) {
     case ValueType::Real:
-      ReadReal(property, section, key, status);
+      ReadNumber<Reals>(section, key, &property, status,
+                        [&property](double number) { property.SetReal(number); });
       break;
-    case ValueType::Integer: {
-      std::int32_t value = 0;
-      if (ReadInteger(value, section, key, status)) property.SetInt(value);
+    case ValueType::Integer:
+      ReadNumber<Integers>(section, key, &property, status,
+                           [&property](std::int32_t number) { property.SetInt(number); });
       break;
-    }
     case ValueType::Boolean:
-      property.SetBool(ReadRawText(text, section, key, status) && text == kYes);
+      ReadBoolean(property, section, key, status);
       break;
     case ValueType::Expression:
-      ReadRawText(text, section, key, status);
-      property.SetText(CleanText(StripExpressionQuotes(text)));
+      ReadExpression(property, section, key, status);
       break;
-    default:
+    default: {
+      std::string text;
       ReadRawText(text, section, key, status);
       property.SetText(CleanText(text));
       break;
+    }
   }
 }
 
@@ -168,6 +200,10 @@ void WriteProperty(const CEL_Property& property, KvfHandle file, std::string_vie
 
 const std::string& LastKeyError() {
   return LastKeyErrorText();
+}
+
+void NoteKeyError(std::string_view text) {
+  LastKeyErrorText() = text;
 }
 
 void ClearLastKeyError() {

@@ -4,6 +4,7 @@
 #include <string>
 #include <string_view>
 
+#include "elements/read_status.h"
 #include "platform/kvf2004.h"
 
 namespace tessal {
@@ -11,19 +12,17 @@ namespace tessal {
 class CEL_Element;
 class CEL_Property;
 
-/// The status that a missing key leaves.
-inline constexpr int kStatusMissingKey = 1003;
-
 /// Reads the keyword into the property. A missing key, and a parameter of the wrong type, is reported at
-/// level 3 and sets the status. Numbers are read, and reported, only while the status is 0; a text that was
-/// read sets it back to 0, so that of a run of missing numbers one is reported.
-void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key, int& status);
+/// level 3 and sets the status. Numbers are read, and reported, only while it is good; a text that was
+/// read makes it good again, so that of a run of missing numbers one is reported. What is not read is in the
+/// account of the load in any case.
+void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status);
 
 /// Reads a keyword as text, cleaned at both ends. False, with a report, when it is missing.
-bool ReadText(std::string& text, KvfNode section, std::string_view key, int& status);
+bool ReadText(std::string& text, KvfNode section, std::string_view key, ReadStatus& status);
 
 /// Reads an integer keyword; false, with a report, when it is missing or no integer.
-bool ReadInteger(std::int32_t& value, KvfNode section, std::string_view key, int& status);
+bool ReadInteger(std::int32_t& value, KvfNode section, std::string_view key, ReadStatus& status);
 
 bool HasKeyword(KvfNode section, std::string_view key);
 
@@ -44,6 +43,7 @@ std::string_view CleanText(std::string_view text);
 
 /// The text of the last key that could not be read, process-wide.
 const std::string& LastKeyError();
+void NoteKeyError(std::string_view text);
 void ClearLastKeyError();
 
 }  // namespace tessal

@@ -40,7 +40,7 @@ class CEL_Lagrange_Specie final : public CEL_Element {
 
   explicit CEL_Lagrange_Specie(std::string_view caption);
 
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   void Write(KvfHandle file, int& status) override;
   void Reset() override;
   bool Check() override;

@@ -23,7 +23,7 @@ constexpr std::array<TextKeyword, 4> kTexts = {{
 
 }  // namespace
 
-void CEL_Lagrange_Specie::Read(KvfNode section, int& status) {
+void CEL_Lagrange_Specie::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   DropMembers();
   ReadBase(section, status);
@@ -33,14 +33,17 @@ void CEL_Lagrange_Specie::Read(KvfNode section, int& status) {
   const auto readLists = [this, section, &status](bool withHead) {
     ForEachMemberList([this, section, &status, withHead](const auto& list) {
       if (list.hasHead != withHead) return;
+      status.NoteAbsentSection(section, list.section);
       ReadList(section, list.section, withHead ? &Head(list.listKind) : nullptr, status,
                [this, &list]() -> CEL_Element& { return *AddMember(list.kind); });
     });
   };
   readLists(true);
+  if (!stateVariables.empty()) status.NoteAbsentSection(section, section::kLagrangeEquations);
   const KvfNode equations = kvfSectionByNameNum(section, section::kLagrangeEquations, 1);
   if (equations != nullptr) ReadEquations(equations, stateVariables, status);
   readLists(false);
+  status.NoteAbsentSection(section, section::kVerticalSpeedEquation);
   const KvfNode vertical = kvfSectionByNameNum(section, section::kVerticalSpeedEquation, 1);
   if (vertical != nullptr) verticalEquation->Read(vertical, status);
 }

@@ -4,7 +4,6 @@
 #include <limits>
 
 #include "elements/element_checks.h"
-#include "elements/property_io.h"
 #include "keyfile/keywords.h"
 #include "platform/number_text.h"
 
@@ -33,7 +32,8 @@ constexpr std::array<PropertyRow, 5> kConstantRows = {{
 }};
 
 constexpr std::array<PropertyRow, 5> kForcingRows = {{
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_SPECIE"},
+    WrittenAs(key::kScope,
+              {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_SPECIE"}),
     {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
     {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", kForcingDefault},
     {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", kForcingDefault},
@@ -113,20 +113,11 @@ CEL_Lagrange_Forcing::CEL_Lagrange_Forcing(std::string_view caption) : CEL_Speci
   Bind(kForcingRows, {&spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
 }
 
-void CEL_Lagrange_Forcing::Read(KvfNode section, int& status) {
+void CEL_Lagrange_Forcing::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   minValue.SetReal(std::numeric_limits<double>::lowest());
   maxValue.SetReal(std::numeric_limits<double>::max());
   CEL_Element::Read(section, status);
-}
-
-void CEL_Lagrange_Forcing::Write(KvfHandle file, int& status) {
-  WriteBase(file, status);
-  WriteProperty(spatialVariation, file, key::kScope, *this, status);
-  WriteProperty(unit, file, key::kUnit, *this, status);
-  WriteProperty(defaultValue, file, key::kDefaultValue, *this, status);
-  WriteProperty(minValue, file, key::kMinValue, *this, status);
-  WriteProperty(maxValue, file, key::kMaxValue, *this, status);
 }
 
 }  // namespace tessal

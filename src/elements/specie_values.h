@@ -51,10 +51,7 @@ class CEL_Lagrange_Forcing final : public CEL_SpecieValue {
  public:
   explicit CEL_Lagrange_Forcing(std::string_view caption);
 
-  void Read(KvfNode section, int& status) override;
-  /// Writes its spatial variation under the keyword of a scope, which it does not read back: that is how
-  /// these sections have always been.
-  void Write(KvfHandle file, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
 
   CEL_Property spatialVariation{ValueType::Text};
 };

@@ -52,7 +52,7 @@ void CEL_StateVariable::UpdateLocks() {
   unit.SetEditable(LeavesUnitOpen(kStateVariableUnitTypes));
 }
 
-void CEL_StateVariable::Read(KvfNode section, int& status) {
+void CEL_StateVariable::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   ReadBase(section, status);
   ReadProperty(scope, section, key::kScope, status);

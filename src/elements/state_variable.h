@@ -9,7 +9,7 @@ class CEL_StateVariable final : public CEL_Element {
  public:
   explicit CEL_StateVariable(std::string_view caption);
 
-  void Read(KvfNode section, int& status) override;
+  void Read(KvfNode section, ReadStatus& status) override;
   void Reset() override;
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;

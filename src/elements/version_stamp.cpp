@@ -56,7 +56,7 @@ double VersionFromStamps(std::string_view branchStamp, std::string_view revision
   } else if (const auto year = YearOf(buildDate)) {
     release = *year + kUnreleasedOffset;
   }
-  return release + NumberAfter(kRevisionPrefix, revisionStamp).value_or(1) * 0.001;
+  return RoundVersion(release + NumberAfter(kRevisionPrefix, revisionStamp).value_or(1) * 0.001);
 }
 
 double SoftwareVersion() {
@@ -68,7 +68,8 @@ double ParserVersion() {
 }
 
 double RoundVersion(double version) {
-  return std::floor(version * 1000.0 + 0.5) * 0.001;
+  // Divided and not multiplied, so that the value is the nearest to its three decimals, and has a short text.
+  return std::floor(version * 1000.0 + 0.5) / 1000.0;
 }
 
 }  // namespace tessal

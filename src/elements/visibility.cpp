@@ -8,25 +8,42 @@ namespace tessal {
 
 namespace {
 
-void ReadItems(KvfNode section, std::set<std::int32_t>& records) {
-  const KvfNode keyword = kvfKeywordByNameNum(section, key::kItems, 1);
+std::set<std::int32_t> ReadItems(KvfNode keyword) {
+  std::set<std::int32_t> records;
   const int count = keyword == nullptr ? 0 : kvfGetNoParams(keyword);
   for (int number = 1; number <= count; ++number) {
     std::int32_t item = 0;
     if (kvfGetInt(kvfParamByNum(keyword, number), item) == kKvfOk) records.insert(item);
   }
+  return records;
 }
 
-VisibilityLevel ReadLevel(KvfNode section, int& status) {
+/// The items lie after their count, and are read only with one above 0.
+void ReadCountedItems(VisibilityLevel& level, KvfNode section, ReadStatus& status) {
+  const KvfNode items = kvfKeywordByNameNum(section, key::kItems, 1);
+  std::int32_t count = 0;
+  if (ReadInteger(count, section, key::kItemCount, status)) {
+    if (count <= 0) return;
+    level.records = ReadItems(items);
+    if (items != nullptr) return;
+    status.ReportMissing(section, key::kItems);
+    status.NoteUnread(section, key::kItems, nullptr);
+  } else if (items != nullptr) {
+    level.recordsPassedOver = ReadItems(items);
+    status.Account().NoteOfVisibility(level.name, kvfGetLine(items),
+                                      {"items-not-read", {level.name, status.Reason()}});
+  }
+}
+
+VisibilityLevel ReadLevel(KvfNode section, ReadStatus& status) {
   VisibilityLevel level;
   ReadText(level.name, section, key::kLevel, status);
   ReadText(level.description, section, key::kDescription, status);
-  std::int32_t count = 0;
-  if (ReadInteger(count, section, key::kItemCount, status) && count > 0) ReadItems(section, level.records);
+  ReadCountedItems(level, section, status);
   return level;
 }
 
-VisibilityGroup ReadGroup(KvfNode section, int number, int& status) {
+VisibilityGroup ReadGroup(KvfNode section, int number, ReadStatus& status) {
   VisibilityGroup group;
   group.name = "kvfGroup_" + std::to_string(number);
   ReadText(group.name, section, key::kGroup, status);
@@ -39,6 +56,16 @@ VisibilityGroup ReadGroup(KvfNode section, int number, int& status) {
     group.levels.push_back(ReadLevel(kvfSectionByNum(section, level), status));
   }
   return group;
+}
+
+std::vector<VisibilityGroup> ReadGroups(KvfNode definitions, ReadStatus& status) {
+  std::vector<VisibilityGroup> groups;
+  const int sections = kvfGetNoSections(definitions);
+  groups.reserve(static_cast<std::size_t>(sections));
+  for (int group = 1; group <= sections; ++group) {
+    groups.push_back(ReadGroup(kvfSectionByNum(definitions, group), group, status));
+  }
+  return groups;
 }
 
 std::string Numbered(std::string_view prefix, std::size_t number) {
@@ -55,20 +82,24 @@ CEL_Visibility::CEL_Visibility() : CEL_Element("Visibility Group Definitions") {
 void CEL_Visibility::Reset() {
   ClearTexts();
   groups.clear();
+  groupsPassedOver.clear();
 }
 
-void CEL_Visibility::Read(KvfNode settings, int& status) {
+void CEL_Visibility::Read(KvfNode settings, ReadStatus& status) {
   const KvfNode definitions = kvfSectionByNameNum(settings, section::kVisibilityGroups, 1);
   if (definitions == nullptr) return;
   ReadBase(definitions, status);
   std::int32_t count = 0;
-  if (!ReadInteger(count, definitions, key::kGroups, status) || count <= 0) return;
-  groups.clear();
-  const int sections = kvfGetNoSections(definitions);
-  groups.reserve(static_cast<std::size_t>(sections));
-  for (int group = 1; group <= sections; ++group) {
-    groups.push_back(ReadGroup(kvfSectionByNum(definitions, group), group, status));
+  if (ReadInteger(count, definitions, key::kGroups, status)) {
+    if (count > 0) groups = ReadGroups(definitions, status);
+    return;
   }
+  ReadStatus silent = ReadStatus::WithoutReports(status.Account());
+  groupsPassedOver = ReadGroups(definitions, silent);
+  if (groupsPassedOver.empty()) return;
+  const std::string number = std::to_string(groupsPassedOver.size());
+  status.Account().NoteOfVisibility(kvfGetNameGlb(definitions), kvfGetLine(definitions),
+                                    {"groups-not-read", {number, status.Reason()}});
 }
 
 void CEL_Visibility::Write(KvfHandle file, int& status) {

@@ -12,11 +12,14 @@
 namespace tessal {
 
 struct VisibilityLevel {
-  std::string name;
-  std::string description;
-  std::set<Uid> items;  ///< the identities of its elements
+  std::string name{};
+  std::string description{};
+  std::set<Uid> items{};  ///< the identities of its elements
   /// The numbers of symbol records that a file holds in their place; none after the template has its table.
-  std::set<std::int32_t> records;
+  std::set<std::int32_t> records{};
+  /// The same, as the load passed it over: to be taken over on demand.
+  std::set<Uid> passedOver{};
+  std::set<std::int32_t> recordsPassedOver{};
 };
 
 struct VisibilityGroup {
@@ -30,7 +33,7 @@ class CEL_Visibility final : public CEL_Element {
   CEL_Visibility();
 
   /// Reads the sub-section of the settings; without one nothing changes.
-  void Read(KvfNode settings, int& status) override;
+  void Read(KvfNode settings, ReadStatus& status) override;
   /// Writes the sub-section, with the numbers of symbol records in the place of identities.
   void Write(KvfHandle file, int& status) override;
   void Reset() override;
@@ -38,6 +41,8 @@ class CEL_Visibility final : public CEL_Element {
   int SetFields(const std::vector<ElementField>& /*fields*/) override { return 0; }
 
   std::vector<VisibilityGroup> groups;
+  /// Groups that the load passed over, to be taken over on demand.
+  std::vector<VisibilityGroup> groupsPassedOver;
 
  private:
   /// The record number of every element that belongs to any level.

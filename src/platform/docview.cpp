@@ -10,6 +10,19 @@ bool CDocument::OnOpenDocument(const std::string& path) {
   return !path.empty();
 }
 
+std::optional<std::string> CDocument::Copy(std::string& reason) {
+  reason = "documents of this kind have no copies";
+  return std::nullopt;
+}
+
+bool CDocument::OnOpenCopy(const std::string& /*source*/, const std::string& /*path*/) {
+  return false;
+}
+
+DocumentComparison CDocument::CompareWithFile(const std::string& /*path*/) const {
+  return {{}, "documents of this kind can not be compared"};
+}
+
 void CDocument::SetPathName(const std::string& path) {
   pathName = path;
   title = std::filesystem::path(path).filename().string();

@@ -4,6 +4,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -25,6 +26,22 @@ class UpdateHint {
   UpdateHint& operator=(const UpdateHint&) = default;
 };
 
+/// One row of what a document holds otherwise than a file does. All texts are UTF-8, for people.
+struct DocumentDifference {
+  std::string change;  ///< a word: what became of the item from the file to the document
+  std::string kind;
+  std::string name;
+  std::string field;  ///< empty where the item as a whole was added or removed
+  std::string before;
+  std::string after;
+};
+
+/// The differences between a file and a document; or, where the file could not be read, why.
+struct DocumentComparison {
+  std::vector<DocumentDifference> differences;
+  std::string failure;
+};
+
 class CDocument {
  public:
   CDocument() = default;
@@ -37,6 +54,15 @@ class CDocument {
   virtual bool OnOpenDocument(const std::string& path);
   virtual bool OnSaveDocument(const std::string& path) = 0;
   virtual void OnCloseDocument() {}
+
+  /// What a save would write, with the document left as it is. Nothing, with the reason in words, when that
+  /// cannot be written.
+  virtual std::optional<std::string> Copy(std::string& reason);
+  /// Opens the content of a file as that of another, whose name the host gives the document; of none where
+  /// `path` is empty.
+  virtual bool OnOpenCopy(const std::string& source, const std::string& path);
+  /// What has changed from a file of this kind to the document, which stays as it is.
+  virtual DocumentComparison CompareWithFile(const std::string& path) const;
 
   virtual bool IsModified() const { return modified; }
   virtual void SetModifiedFlag(bool flag) { modified = flag; }
@@ -84,6 +110,11 @@ class CView {
   virtual void OnInitialUpdate() {}
   /// Puts what the user has entered and not yet committed into the document, before a save or a close.
   virtual void OnCommit() {}
+  /// Whether there is something that the user has entered and not yet committed.
+  virtual bool HasUncommitted() const { return false; }
+  /// Runs something while the document holds what the user has entered and not yet committed. After it both
+  /// are as before; the user sees nothing of it.
+  virtual void WithUncommitted(const std::function<void()>& run) { run(); }
   /// The view comes to the front among the views of other documents.
   virtual void OnActivate() {}
   /// What the view offers for the menus of a host, in order. Asked for again after a command has run.

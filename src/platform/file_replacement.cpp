@@ -4,14 +4,13 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <cerrno>
-#include <cstdio>
-#include <cstdlib>
 #include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <system_error>
-#include <utility>
+
+#include "platform/descriptor.h"
+#include "platform/temporary_file.h"
 
 namespace tessal {
 
@@ -24,43 +23,14 @@ std::string Reason(std::string_view what, const std::string& path, int error) {
   return text;
 }
 
-/// An open file descriptor. Closing it is a step that can fail, so it is not left to the destructor.
-class Descriptor final {
- public:
-  explicit Descriptor(int number) : descriptor(number) {}
-  Descriptor(const Descriptor&) = delete;
-  Descriptor& operator=(const Descriptor&) = delete;
-  ~Descriptor() {
-    if (descriptor >= 0) close(descriptor);
-  }
-
-  bool IsOpen() const { return descriptor >= 0; }
-  int Number() const { return descriptor; }
-  bool Close() { return close(std::exchange(descriptor, -1)) == 0; }
-
- private:
-  int descriptor;
-};
-
-bool WriteAll(int descriptor, std::string_view content) {
-  while (!content.empty()) {
-    const ssize_t written = write(descriptor, content.data(), content.size());
-    if (written < 0) {
-      if (errno == EINTR) continue;
-      return false;
-    }
-    content.remove_prefix(static_cast<std::size_t>(written));
-  }
-  return true;
-}
-
 /// Flushes to the disk. What is on no disk, a pipe or a terminal, is no failure.
 bool Flush(int descriptor) {
   return fsync(descriptor) == 0 || errno == EINVAL || errno == ENOTSUP;
 }
 
 /// Writes everything and closes. The empty text, or what failed; `errno` then holds the cause.
-std::string_view WriteAndClose(Descriptor& file, std::string_view content) {
+template <class File>
+std::string_view WriteAndClose(File& file, std::string_view content) {
   if (!WriteAll(file.Number(), content)) return "can not write file";
   if (!Flush(file.Number())) return "can not flush file";
   if (!file.Close()) return "can not close file";
@@ -97,7 +67,7 @@ bool TakeAttributes(int descriptor, const std::string& target) {
   struct stat fresh = {};
   if (fstat(descriptor, &fresh) != 0) return false;
   mode_t mode = 0;
-  if (stat(target.c_str(), &old) == 0) {
+  if (lstat(target.c_str(), &old) == 0) {
     if (!TakeOwner(descriptor, old, fresh)) return false;
     mode = old.st_mode & kPermissionBits;
   } else {
@@ -133,30 +103,68 @@ std::optional<std::filesystem::path> RealTarget(const std::string& path, int& er
   return std::nullopt;
 }
 
-/// Why what is at the target may not be replaced, or the empty text. A rename would pass over a write
+/// Why a file may not take the place of what is there, or the empty text. A rename would pass over a write
 /// protection, and would put a plain file in the place of a pipe or a device.
-std::string Protection(const std::string& target) {
-  struct stat old = {};
-  if (stat(target.c_str(), &old) != 0) {
-    return errno == ENOENT ? std::string() : Reason("can not write file", target, errno);
-  }
+std::string Protection(const std::string& target, const struct stat& old) {
   if (S_ISDIR(old.st_mode)) return Reason("can not write file", target, EISDIR);
   if (!S_ISREG(old.st_mode)) return "can not replace '" + target + "': it is no plain file";
   if (access(target.c_str(), W_OK) != 0) return Reason("can not write file", target, errno);
   return {};
 }
 
+/// The same for a file that may have several names: the others would keep the old content from now on.
+std::string ProtectionOfAllNames(const std::string& target) {
+  struct stat old = {};
+  if (stat(target.c_str(), &old) != 0) {
+    return errno == ENOENT ? std::string() : Reason("can not write file", target, errno);
+  }
+  if (S_ISREG(old.st_mode) && old.st_nlink > 1) {
+    return "can not replace '" + target + "': it is one of " + std::to_string(old.st_nlink) +
+           " names (hard links) of a file, and the others would keep the old content; save under a new name";
+  }
+  return Protection(target, old);
+}
+
+/// The same for a file that others may have put there: what it leads to, or shares, is not touched.
+std::string ProtectionOfName(const std::string& target) {
+  struct stat old = {};
+  if (lstat(target.c_str(), &old) != 0) {
+    return errno == ENOENT ? std::string() : Reason("can not write file", target, errno);
+  }
+  return S_ISLNK(old.st_mode) ? "can not replace '" + target + "': it is a symbolic link"
+                              : Protection(target, old);
+}
+
 /// Writes the content into the new file and lets it take the target's place. The empty text, or what failed.
-std::string_view FillAndRename(Descriptor& file, std::string_view content, const std::string& fresh,
-                               const std::string& target) {
+std::string_view FillAndTakePlace(TemporaryFile& file, std::string_view content, const std::string& target) {
   if (!TakeAttributes(file.Number(), target)) return "can not keep the permissions of file";
   if (const std::string_view failed = WriteAndClose(file, content); !failed.empty()) return failed;
-  return rename(fresh.c_str(), target.c_str()) == 0 ? "" : "can not replace file";
+  return file.TakePlace() ? "" : "can not replace file";
+}
+
+/// Puts the content in the place of whatever has the name `target`; messages call it `shown`.
+std::string PutInPlace(const std::filesystem::path& target, const std::string& shown,
+                       std::string_view content) {
+  RemoveTemporaryRests(target);
+  TemporaryFile fresh(target);
+  if (!fresh.IsOpen()) return Reason("can not create a file beside", shown, errno);
+  const std::string_view failed = FillAndTakePlace(fresh, content, target.native());
+  if (!failed.empty()) return Reason(failed, shown, errno);
+  return FlushFolder(target.parent_path()) ? std::string()
+                                           : Reason("can not flush the folder of file", shown, errno);
+}
+
+std::string WriteStream(const std::string& path, std::string_view content) {
+  Descriptor stream(open(path.c_str(), O_WRONLY | O_NOCTTY | O_CLOEXEC));
+  if (!stream.IsOpen()) return Reason("can not write file", path, errno);
+  const std::string_view failed = WriteAndClose(stream, content);
+  return failed.empty() ? std::string() : Reason(failed, path, errno);
 }
 
 }  // namespace
 
 std::optional<std::string> ReadWholeFile(const std::string& path, std::string& failure) {
+  constexpr std::size_t kPiece = 1U << 16U;
   std::error_code unknown;
   const auto type = std::filesystem::status(path, unknown).type();
   if (type == std::filesystem::file_type::character || type == std::filesystem::file_type::block) {
@@ -164,32 +172,29 @@ std::optional<std::string> ReadWholeFile(const std::string& path, std::string& f
     failure = "can not read file '" + path + "': it is a device";
     return std::nullopt;
   }
-  std::ifstream file(path, std::ios::binary);
-  std::ostringstream content;
-  if (!file) {
+  const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  if (!file.IsOpen()) {
     failure = Reason("can not read file", path, errno);
     return std::nullopt;
   }
-  if (file.peek() != std::ifstream::traits_type::eof()) content << file.rdbuf();
-  if (file.bad() || content.fail()) {
-    failure = Reason("can not read file", path, errno != 0 ? errno : EIO);
-    return std::nullopt;
+  std::string content;
+  std::array<char, kPiece> piece{};
+  ssize_t count = 0;
+  while ((count = read(file.Number(), piece.data(), piece.size())) != 0) {
+    if (count > 0) {
+      content.append(piece.data(), static_cast<std::size_t>(count));
+    } else if (errno != EINTR) {
+      failure = Reason("can not read file", path, errno);
+      return std::nullopt;
+    }
   }
-  return std::move(content).str();
+  return content;
 }
 
 std::uintmax_t FileSize(const std::string& path) {
   std::error_code error;
   const std::uintmax_t size = std::filesystem::file_size(path, error);
   return error || access(path.c_str(), R_OK) != 0 ? 0 : size;
-}
-
-std::string WriteWholeFile(const std::string& path, std::string_view content) {
-  constexpr mode_t kReadWriteForAll = 0666;
-  Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, kReadWriteForAll));
-  if (!file.IsOpen()) return Reason("can not open file for writing", path, errno);
-  const std::string_view failed = WriteAndClose(file, content);
-  return failed.empty() ? std::string() : Reason(failed, path, errno);
 }
 
 std::string WriteFreshFile(const std::string& path, std::string_view content) {
@@ -208,18 +213,20 @@ std::string ReplaceFile(const std::string& target, std::string_view content) {
   int error = 0;
   const std::optional<std::filesystem::path> real = RealTarget(target, error);
   if (!real) return Reason("can not write file", target, error);
-  if (std::string reason = Protection(real->string()); !reason.empty()) return reason;
-  std::string fresh = real->string() + "$XXXXXX";
-  Descriptor file(mkostemp(fresh.data(), O_CLOEXEC));
-  if (!file.IsOpen()) return Reason("can not create a file beside", target, errno);
-  const std::string_view failed = FillAndRename(file, content, fresh, real->string());
-  if (!failed.empty()) {
-    std::string reason = Reason(failed, target, errno);
-    unlink(fresh.c_str());
-    return reason;
-  }
-  return FlushFolder(real->parent_path()) ? std::string()
-                                          : Reason("can not flush the folder of file", target, errno);
+  std::string reason = ProtectionOfAllNames(real->native());
+  return reason.empty() ? PutInPlace(*real, target, content) : reason;
+}
+
+bool IsStream(const std::string& path) {
+  struct stat status = {};
+  if (stat(path.c_str(), &status) != 0) return false;
+  return S_ISCHR(status.st_mode) || S_ISFIFO(status.st_mode) || S_ISSOCK(status.st_mode);
+}
+
+std::string WriteOutputFile(const std::string& path, std::string_view content) {
+  if (IsStream(path)) return WriteStream(path, content);
+  std::string reason = ProtectionOfName(path);
+  return reason.empty() ? PutInPlace(path, path, content) : reason;
 }
 
 std::string RemoveFile(const std::string& path) {

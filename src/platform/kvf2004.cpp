@@ -1,8 +1,10 @@
 #include "platform/kvf2004.h"
 
+#include <algorithm>
 #include <cmath>
 #include <map>
 #include <memory>
+#include <utility>
 
 #include "platform/ascii.h"
 #include "platform/file_replacement.h"
@@ -54,6 +56,12 @@ KvfNode NthOfName(const std::vector<KvfItem*>& items, std::string_view name, int
     if (EqualIgnoringCase(item->text, name) && --number == 0) return item;
   }
   return nullptr;
+}
+
+/// A section that somebody asked for.
+KvfNode Asked(KvfNode section) {
+  if (section != nullptr) section->wasRead = true;
+  return section;
 }
 
 KvfNode Nth(const std::vector<KvfItem*>& items, int number) {
@@ -117,7 +125,9 @@ KvfHandle kvfLoadText(std::string_view bytes) {
   library.lastError = kKvfOk;
   library.syntaxError = {};
   auto image = std::make_unique<KvfImage>();
-  if (!ReadKvfImage(KvfReadableText(bytes), *image, library.syntaxError)) {
+  image->source = KvfReadableText(bytes);
+  image->bytesCut = bytes.size() - std::min(bytes.find('\0'), bytes.size());
+  if (!ReadKvfImage(*image, library.syntaxError)) {
     Note(kKvfSyntaxError);
     return 0;
   }
@@ -149,11 +159,11 @@ void kvfClose(KvfHandle* handle) {
 
 KvfNode kvfTargetByNameNum(KvfHandle handle, std::string_view name, int number) {
   KvfImage* image = ImageOf(handle);
-  return image == nullptr ? nullptr : NthOfName(image->Root().sections, name, number);
+  return image == nullptr ? nullptr : Asked(NthOfName(image->Root().sections, name, number));
 }
 
 KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number) {
-  return Is(node, KvfItem::Type::Section) ? NthOfName(node->sections, name, number) : nullptr;
+  return Is(node, KvfItem::Type::Section) ? Asked(NthOfName(node->sections, name, number)) : nullptr;
 }
 
 int kvfGetNoSections(KvfNode node) {
@@ -161,11 +171,15 @@ int kvfGetNoSections(KvfNode node) {
 }
 
 KvfNode kvfSectionByNum(KvfNode node, int number) {
-  return Is(node, KvfItem::Type::Section) ? Nth(node->sections, number) : nullptr;
+  return Is(node, KvfItem::Type::Section) ? Asked(Nth(node->sections, number)) : nullptr;
 }
 
 bool kvfIsSection(KvfNode node) {
   return node != nullptr && node->type == KvfItem::Type::Section;
+}
+
+bool kvfHasSection(KvfNode node, std::string_view name) {
+  return Is(node, KvfItem::Type::Section) && NthOfName(node->sections, name, 1) != nullptr;
 }
 
 std::string kvfGetNameGlb(KvfNode node) {
@@ -193,6 +207,7 @@ int kvfGetInt(KvfNode parameter, std::int32_t& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
   if (parameter->value != KvfItem::Value::Integer) return Note(kKvfWrongType);
   value = KvfInteger(parameter->text);
+  parameter->wasRead = true;
   return kKvfOk;
 }
 
@@ -200,13 +215,87 @@ int kvfGetDouble(KvfNode parameter, double& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
   if (IsText(*parameter) || parameter->value == KvfItem::Value::Boolean) return Note(kKvfWrongType);
   value = KvfReal(parameter->text);
+  parameter->wasRead = true;
   return kKvfOk;
 }
 
 int kvfGetString(KvfNode parameter, std::string& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
   value = parameter->text;
+  parameter->wasRead = true;
   return kKvfOk;
+}
+
+std::vector<KvfUnread> kvfGetUnread(KvfNode section) {
+  std::vector<KvfUnread> unread;
+  if (!Is(section, KvfItem::Type::Section)) return unread;
+  struct Step {
+    KvfNode section;
+    std::size_t next;
+  };
+  // Sections may nest deeper than calls.
+  std::vector<Step> path{{section, 0}};
+  while (!path.empty()) {
+    const KvfNode parent = path.back().section;
+    if (path.back().next >= parent->order.size()) {
+      path.pop_back();
+      continue;
+    }
+    const KvfNode item = parent->order[path.back().next++];
+    if (item->type == KvfItem::Type::Section) {
+      if (item->wasRead) {
+        path.push_back({item, 0});
+      } else {
+        unread.push_back({KvfUnread::What::Section, item, parent});
+      }
+      continue;
+    }
+    const auto& values = item->keywords;
+    const auto read =
+        std::count_if(values.begin(), values.end(), [](const KvfItem* v) { return v->wasRead; });
+    if (static_cast<std::size_t>(read) == values.size()) continue;
+    unread.push_back({read == 0 ? KvfUnread::What::Keyword : KvfUnread::What::FurtherValues, item, parent});
+  }
+  return unread;
+}
+
+void kvfMarkRead(KvfNode keyword) {
+  if (!Is(keyword, KvfItem::Type::Keyword)) return;
+  for (const KvfItem* value : keyword->keywords) value->wasRead = true;
+}
+
+std::string kvfGetSource(KvfNode keyword) {
+  std::string text;
+  if (Is(keyword, KvfItem::Type::Keyword)) AppendKvfKeyword(*keyword, text);
+  return text;
+}
+
+bool kvfFitsInt(KvfNode parameter) {
+  return !Is(parameter, KvfItem::Type::Parameter) || KvfIntegerFits(parameter->text);
+}
+
+bool kvfFitsDouble(KvfNode parameter) {
+  return !Is(parameter, KvfItem::Type::Parameter) || KvfRealFits(parameter->text);
+}
+
+std::string kvfTakeText(KvfHandle handle) {
+  KvfImage* image = ImageOf(handle);
+  return image == nullptr ? std::string() : std::exchange(image->source, {});
+}
+
+std::string kvfTextBeside(KvfHandle handle, KvfNode target) {
+  const KvfImage* image = ImageOf(handle);
+  return image == nullptr ? std::string() : KvfTextBeside(*image, target);
+}
+
+std::vector<KvfRemark> kvfGetRemarks(KvfHandle handle, KvfNode target) {
+  const KvfImage* image = ImageOf(handle);
+  return image == nullptr ? std::vector<KvfRemark>() : KvfRemarksOf(*image, target);
+}
+
+std::size_t kvfGetBytesCut(KvfHandle handle) {
+  const KvfImage* image = ImageOf(handle);
+  return image == nullptr ? 0 : image->bytesCut;
 }
 
 int kvfAddTarget(KvfHandle handle, std::string_view name) {

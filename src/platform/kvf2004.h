@@ -4,9 +4,11 @@
 // to case. A node lives as long as its handle is open.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace tessal {
 
@@ -52,6 +54,8 @@ KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number);
 int kvfGetNoSections(KvfNode node);
 KvfNode kvfSectionByNum(KvfNode node, int number);
 bool kvfIsSection(KvfNode node);
+/// Whether there is a sub-section of that name. Asking is no reading.
+bool kvfHasSection(KvfNode node, std::string_view name);
 std::string kvfGetNameGlb(KvfNode node);
 /// The line of the file, from 1, on which a target, section or keyword begins; 0 for none.
 int kvfGetLine(KvfNode node);
@@ -66,6 +70,43 @@ int kvfGetInt(KvfNode parameter, std::int32_t& value);
 int kvfGetDouble(KvfNode parameter, double& value);
 /// Quoted and path strings, and numbers and booleans as the text that is in the file.
 int kvfGetString(KvfNode parameter, std::string& value);
+
+// What the readers above have not asked for. Asking whether something is there counts for nothing.
+
+/// A part of a file that nobody has read.
+struct KvfUnread {
+  enum class What { Section, Keyword, FurtherValues };
+
+  What what;
+  KvfNode node;    ///< the section or keyword
+  KvfNode parent;  ///< the section that it lies in
+};
+
+/// A comment of a file: its line, from 1, and its text.
+struct KvfRemark {
+  int line;
+  std::string text;
+};
+
+/// The unread parts of a section, in the order of the file; of a section that is unread as a whole no parts.
+std::vector<KvfUnread> kvfGetUnread(KvfNode section);
+/// Counts a keyword as read, with all its values.
+void kvfMarkRead(KvfNode keyword);
+/// A keyword with its values as the file has them, on one line but for line feeds in its texts.
+std::string kvfGetSource(KvfNode keyword);
+/// Whether a number fits the type that it is read as; otherwise its nearest limit is read.
+bool kvfFitsInt(KvfNode parameter);
+bool kvfFitsDouble(KvfNode parameter);
+
+/// The text of a loaded file, for another reader. The library gives it away.
+std::string kvfTakeText(KvfHandle handle);
+/// The text beside a target, from the first top-level section on, with CRLF line ends and no blank lines at
+/// its ends. With none for the target, all of it.
+std::string kvfTextBeside(KvfHandle handle, KvfNode target);
+/// The comments in the head of the file and inside the target, without those that the library itself writes.
+std::vector<KvfRemark> kvfGetRemarks(KvfHandle handle, KvfNode target);
+/// How many bytes of the file lie after a zero byte, and so were not read.
+std::size_t kvfGetBytesCut(KvfHandle handle);
 
 /// Writing: the image holds a stack of open sections; a keyword takes the parameters added after it.
 /// Each returns 0 when done, else an error number, and adds nothing then.

@@ -19,10 +19,51 @@ constexpr std::string_view kHeader =
 constexpr std::size_t kBlanksPerLevel = 3;
 constexpr std::size_t kLongestNear = 40;
 
+std::string_view Trimmed(std::string_view text) {
+  constexpr std::string_view kBlanks = " \t\r";
+  const std::size_t first = text.find_first_not_of(kBlanks);
+  if (first == std::string_view::npos) return {};
+  return text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
+}
+
+std::string_view CommentText(const KvfImage& image, const KvfComment& comment) {
+  return std::string_view(image.source).substr(comment.start, comment.size);
+}
+
+/// Whether a comment is a line of the header that every written file has.
+bool IsOfHeader(std::string_view comment) {
+  constexpr std::string_view kTypePrefix = "type = ";
+  constexpr std::string_view kSlashes = "// ";
+  if (comment.starts_with(kTypePrefix)) return true;
+  std::string_view header = kHeader;
+  while (header.starts_with(kSlashes)) {
+    const std::size_t end = header.find('\n');
+    if (header.substr(kSlashes.size(), end - kSlashes.size()) == comment) return true;
+    header.remove_prefix(end + 1);
+  }
+  return false;
+}
+
+const KvfSpan* SpanOf(const KvfImage& image, const KvfItem* section) {
+  const auto hit = std::find_if(image.targets.begin(), image.targets.end(),
+                                [section](const KvfSpan& span) { return span.section == section; });
+  return hit == image.targets.end() ? nullptr : &*hit;
+}
+
+std::string_view WithoutBlankLines(std::string_view text) {
+  while (true) {
+    const std::size_t end = text.find('\n');
+    if (end == std::string_view::npos || !Trimmed(text.substr(0, end)).empty()) break;
+    text.remove_prefix(end + 1);
+  }
+  const std::size_t last = text.find_last_not_of(" \t\r\n");
+  return text.substr(0, last == std::string_view::npos ? 0 : last + 1);
+}
+
 /// Reads one text, item by item. Sections nest in a list of its own, not in calls.
 class ImageReader final {
  public:
-  ImageReader(std::string_view fileText, KvfImage& fileImage) : text(fileText), image(fileImage) {}
+  explicit ImageReader(KvfImage& fileImage) : text(fileImage.source), image(fileImage) {}
 
   bool Run() {
     open.push_back(&image.Root());
@@ -58,7 +99,10 @@ class ImageReader final {
   }
 
   void SkipComment() {
-    while (!AtEnd() && text[place] != '\n') ++place;
+    constexpr std::size_t kSlashes = 2;
+    const std::size_t start = place + kSlashes;
+    place = std::min(text.find('\n', place), text.size());
+    image.comments.push_back({line, start, place - start});
   }
 
   bool AtComment() const { return text.substr(place).starts_with("//"); }
@@ -96,13 +140,16 @@ class ImageReader final {
 
   bool ReadHead() {
     const int headLine = line;
+    const std::size_t start = lineStart;
     ++place;
     SkipBlanks();
     const std::string_view name = TakeWord();
     SkipBlanks();
     if (name.empty() || Peek() != ']') return false;
     ++place;
+    const bool isTarget = open.size() == 1;
     open.push_back(&image.AddSection(*open.back(), name, headLine));
+    if (isTarget) image.targets.push_back({open.back(), start, start});
     return EndLine();
   }
 
@@ -121,8 +168,17 @@ class ImageReader final {
       place = start;
       return false;
     }
+    const std::size_t comments = image.comments.size();
+    const std::string_view closed = open.back()->text;
     open.pop_back();
-    return EndLine();
+    if (!EndLine()) return false;
+    // Every writer of such files names the section there.
+    if (image.comments.size() > comments && Trimmed(CommentText(image, image.comments.back())) == closed) {
+      image.comments.pop_back();
+    }
+    // The line feed is read with the next item.
+    if (open.size() == 1) image.targets.back().end = std::min(place + 1, text.size());
+    return true;
   }
 
   bool ReadValues(KvfItem& keyword) {
@@ -226,18 +282,16 @@ std::string ParameterText(const KvfItem& parameter) {
   }
 }
 
-void WriteKeyword(const KvfItem& keyword, const std::string& indent, std::string& text) {
-  text += indent;
+}  // namespace
+
+void AppendKvfKeyword(const KvfItem& keyword, std::string& text) {
   text += keyword.text;
   text += " = ";
   for (std::size_t place = 0; place < keyword.keywords.size(); ++place) {
     if (place > 0) text += ", ";
     text += ParameterText(*keyword.keywords[place]);
   }
-  text += '\n';
 }
-
-}  // namespace
 
 KvfItem& KvfImage::AddSection(KvfItem& parent, std::string_view name, int line) {
   KvfItem& section = items.emplace_back();
@@ -267,11 +321,38 @@ void KvfImage::AddParameter(KvfItem& keyword, KvfItem::Value value, std::string 
   keyword.keywords.push_back(&parameter);
 }
 
-bool ReadKvfImage(std::string_view text, KvfImage& image, KvfSyntaxError& error) {
-  ImageReader reader(text, image);
+bool ReadKvfImage(KvfImage& image, KvfSyntaxError& error) {
+  ImageReader reader(image);
   if (reader.Run()) return true;
   error = reader.Where();
   return false;
+}
+
+std::string KvfTextBeside(const KvfImage& image, const KvfItem* section) {
+  if (image.targets.empty()) return {};
+  const std::string_view source = image.source;
+  const std::size_t first = image.targets.front().start;
+  const KvfSpan* span = SpanOf(image, section);
+  if (span == nullptr) return std::string(WithoutBlankLines(source.substr(first)));
+  const std::string_view before = WithoutBlankLines(source.substr(first, span->start - first));
+  const std::string_view after = WithoutBlankLines(source.substr(span->end));
+  std::string text(before);
+  if (!before.empty() && !after.empty()) text += "\r\n\r\n";
+  text += after;
+  return text;
+}
+
+std::vector<KvfRemark> KvfRemarksOf(const KvfImage& image, const KvfItem* section) {
+  const std::size_t first = image.targets.empty() ? image.source.size() : image.targets.front().start;
+  const KvfSpan* span = SpanOf(image, section);
+  std::vector<KvfRemark> remarks;
+  for (const KvfComment& comment : image.comments) {
+    const bool inHead = comment.start < first;
+    const bool inSection = span != nullptr && comment.start >= span->start && comment.start < span->end;
+    const std::string_view text = Trimmed(CommentText(image, comment));
+    if (inSection || (inHead && !IsOfHeader(text))) remarks.push_back({comment.line, std::string(text)});
+  }
+  return remarks;
 }
 
 std::string WriteKvfImage(KvfImage& image) {
@@ -288,7 +369,9 @@ std::string WriteKvfImage(KvfImage& image) {
       const KvfItem& item = *section.order[path.back().written++];
       const std::string indent(kBlanksPerLevel * depth, ' ');
       if (item.type == KvfItem::Type::Keyword) {
-        WriteKeyword(item, indent, text);
+        text += indent;
+        AppendKvfKeyword(item, text);
+        text += '\n';
       } else {
         text += indent + '[' + item.text + "]\n";
         path.push_back({&item, 0});

@@ -27,6 +27,14 @@ bool IsHuge(std::string_view digits) {
   return magnitude + exponent > 0;
 }
 
+template <class Number>
+bool Fits(std::string_view text) {
+  if (text.starts_with('+')) text.remove_prefix(1);
+  Number value{};
+  const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
+  return read.ec != std::errc::result_out_of_range;
+}
+
 }  // namespace
 
 std::int32_t KvfInteger(std::string_view text) {
@@ -46,6 +54,14 @@ double KvfReal(std::string_view text) {
   if (read.ec != std::errc::result_out_of_range) return value;
   const double limit = IsHuge(text) ? std::numeric_limits<double>::max() : 0.0;
   return negative ? -limit : limit;
+}
+
+bool KvfIntegerFits(std::string_view text) {
+  return Fits<std::int32_t>(text);
+}
+
+bool KvfRealFits(std::string_view text) {
+  return Fits<double>(text);
 }
 
 }  // namespace tessal

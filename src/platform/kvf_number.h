@@ -12,4 +12,8 @@ std::int32_t KvfInteger(std::string_view text);
 /// The real of a text of an optional sign, digits, and optionally a point, digits and an exponent.
 double KvfReal(std::string_view text);
 
+// Whether such a text fits its type, and so reads as what it says.
+bool KvfIntegerFits(std::string_view text);
+bool KvfRealFits(std::string_view text);
+
 }  // namespace tessal

@@ -322,16 +322,43 @@ bool CElementForm::Store(const Control& control, CEL_Element& element) {
   const FormField& field = *control.field;
   if (!IsStored(field.editor)) return false;
   CEL_Property& property = field.property(element);
-  if (field.onlyWhileEnabled && !IsEnabled(field, property)) return false;
   if (const auto* combo = qobject_cast<const QComboBox*>(control.editor))
-    return StoreChoice(*combo, property);
+    return (!field.onlyWhileEnabled || IsEnabled(field, property)) && StoreChoice(*combo, property);
   // A text that nobody edited stays, however it looks on the screen.
-  if (!IsEdited(control)) return false;
-  const QString text = TextIn(*control.editor);
-  const bool isNumber = field.editor == FieldEditor::Number || field.editor == FieldEditor::Integer;
-  const bool isStored = isNumber ? StoreNumber(text, property) : StoreText(text, property);
+  if (!IsTyped(control, property)) return false;
+  const bool isStored = StoreTyped(control, property);
   if (auto* lines = qobject_cast<CPlainTextField*>(control.editor)) lines->TakeAsShown();
   return isStored;
+}
+
+bool CElementForm::IsTyped(const Control& control, const CEL_Property& property) const {
+  return IsEdited(control) && (!control.field->onlyWhileEnabled || IsEnabled(*control.field, property));
+}
+
+bool CElementForm::StoreTyped(const Control& control, CEL_Property& property) const {
+  const FieldEditor editor = control.field->editor;
+  const QString text = TextIn(*control.editor);
+  const bool isNumber = editor == FieldEditor::Number || editor == FieldEditor::Integer;
+  return isNumber ? StoreNumber(text, property) : StoreText(text, property);
+}
+
+std::vector<TypedValue> CElementForm::TypedValues() const {
+  std::vector<TypedValue> typed;
+  CEL_Element* element = Element();
+  if (element == nullptr) return typed;
+  for (const Control& control : controls) {
+    if (!IsStored(control.field->editor) || qobject_cast<QComboBox*>(control.editor) != nullptr) continue;
+    CEL_Property& property = control.field->property(*element);
+    if (!IsTyped(control, property)) continue;
+    typed.push_back(
+        {[this, &control, &property] { StoreTyped(control, property); },
+         [&property, text = property.Text(), real = property.RealValue(), whole = property.IntValue()] {
+           property.SetText(text);
+           property.SetReal(real);
+           property.SetInt(whole);
+         }});
+  }
+  return typed;
 }
 
 bool CElementForm::StoreText(const QString& text, CEL_Property& property) const {

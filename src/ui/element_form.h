@@ -73,6 +73,7 @@ class CElementForm : public CRightPaneBase {
 
   QSize minimumSizeHint() const override;
   bool HasUnwritten() const override;
+  std::vector<TypedValue> TypedValues() const override;
 
  protected:
   void resizeEvent(QResizeEvent* resize) override;
@@ -104,7 +105,11 @@ class CElementForm : public CRightPaneBase {
   bool IsEnabled(const FormField& field, const CEL_Property& property) const;
   /// An expression that was typed and is not written yet follows a rename of its own element.
   void RenameInTyped(const std::string& former, const std::string& present);
+  /// Whether a commit would write what was typed into the control.
+  bool IsTyped(const Control& control, const CEL_Property& property) const;
   bool Store(const Control& control, CEL_Element& element);
+  /// Puts what was typed into the property, and leaves the control alone.
+  bool StoreTyped(const Control& control, CEL_Property& property) const;
   void AddField(const FormField& field);
   /// Labels the fields, each with an Alt key of its own.
   void LabelFields();

@@ -39,6 +39,8 @@ QTextBrowser& HelpWindowOf(QWidget& owner) {
 /// The path of the page, or of the first place where it was looked for when it lies nowhere.
 QString HelpPagePath() {
   const QDir programs(QCoreApplication::applicationDirPath());
+  // A folder that is not known would be the current one, which holds whatever somebody put there.
+  if (programs.isRelative()) return kPage;
   for (const char* folder : kFolders) {
     const QString path = programs.filePath(QString::fromLatin1(folder) + u'/' + kPage);
     if (QFileInfo::exists(path)) return QDir::cleanPath(path);
@@ -50,7 +52,7 @@ QString HelpPagePath() {
 
 void OpenHelp(QWidget* parent, int topic) {
   const QString path = HelpPagePath();
-  if (!QFileInfo::exists(path)) {
+  if (QDir::isRelativePath(path) || !QFileInfo::exists(path)) {
     QMessageBox::warning(parent, strings::kError, QStringLiteral("The help page %1 is missing.").arg(path));
     return;
   }

@@ -54,6 +54,27 @@ std::int32_t NumberOf(const UpdateHint* argument) {
   return number == nullptr ? 0 : number->number;
 }
 
+/// What is typed, in the model for its lifetime.
+class TypedInModel final {
+ public:
+  TypedInModel(std::vector<TypedValue> typedValues, TemplateCore& template_)
+      : core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
+    for (const TypedValue& value : values) value.store();
+  }
+  TypedInModel(const TypedInModel&) = delete;
+  TypedInModel& operator=(const TypedInModel&) = delete;
+  ~TypedInModel() {
+    for (const TypedValue& value : values) value.takeBack();
+    core.SetModified(wasModified);
+  }
+
+ private:
+  NotificationsOff silent;
+  TemplateCore& core;
+  bool wasModified;
+  std::vector<TypedValue> values;
+};
+
 }  // namespace
 
 CMainView::CMainView(CTessalDoc& shownDocument, UserDialogs& userDialogs)
@@ -290,6 +311,15 @@ void CMainView::Commit() {
 void CMainView::CommitAll() {
   Commit();
   if (form && form->HasUnwritten()) Commit();
+}
+
+bool CMainView::HasUncommitted() const {
+  return form && !form->TypedValues().empty();
+}
+
+void CMainView::WithUncommitted(const std::function<void()>& run) {
+  const TypedInModel typed(form ? form->TypedValues() : std::vector<TypedValue>(), Core());
+  run();
 }
 
 void CMainView::RefreshCaption(QTreeWidgetItem* item) {

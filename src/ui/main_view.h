@@ -40,6 +40,8 @@ class CMainView final : public QWidget, public CView {
   void OnUpdate(const CView* sender, int hint, const UpdateHint* argument) override;
   /// Commits the open form.
   void OnCommit() override { CommitAll(); }
+  bool HasUncommitted() const override;
+  void WithUncommitted(const std::function<void()>& run) override;
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
   std::vector<ViewCommand> Commands() override;

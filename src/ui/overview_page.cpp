@@ -84,12 +84,12 @@ void COverviewPpg::CopyToClipboard() {
 }
 
 void COverviewPpg::ExportPage() {
-  const std::string path = PrepareUsualPagePath(Core().TemplateFileName());
+  std::string failure;
+  const std::optional<std::string> path = PrepareUsualPagePath(Core().TemplateFileName(), failure);
   // There is no way to cancel.
   PageOptions options;
   if (Dialogs().Ask(this, strings::kAskMathJax) == Answer::Yes) options.mathJax = UsualMathJax();
-  std::string failure;
-  if (!ExportHtmlDocumentation(Core(), path, options, failure)) {
+  if (!path || !ExportHtmlDocumentation(Core(), *path, options, failure)) {
     Dialogs().ShowFailure(this, ToScreen(failure));
   }
   Dialogs().ShowMessage(strings::kPageExported.arg(ToScreen(Core().TemplateFileName())).toStdString());

@@ -4,7 +4,9 @@
 
 #include <QWidget>
 #include <cstdint>
+#include <functional>
 #include <string>
+#include <vector>
 
 #include "ui/item_data.h"
 
@@ -24,6 +26,13 @@ struct FormContext {
   CItemData& item;
 };
 
+/// A value that the user has typed and not yet committed: how it gets into the model for a moment, unseen by
+/// listeners, and out of it again.
+struct TypedValue {
+  std::function<void()> store;
+  std::function<void()> takeBack;
+};
+
 class CRightPaneBase : public QWidget {
   Q_OBJECT
 
@@ -38,6 +47,8 @@ class CRightPaneBase : public QWidget {
   void Commit();
   /// Whether the commit has left something to the next one: a rename leaves what was typed into expressions.
   virtual bool HasUnwritten() const { return false; }
+  /// What the next commit would write, without the symbol: a rename asks first.
+  virtual std::vector<TypedValue> TypedValues() const { return {}; }
 
   /// Elements or groups were made, moved or deleted elsewhere: a page that lists them shows them again.
   virtual void OnStructureChanged() {}

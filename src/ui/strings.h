@@ -94,6 +94,12 @@ inline const QString kNotExported = QStringLiteral("Failed to export to\n%1\n\n%
 inline const QString kExported = QStringLiteral("Exported to\n%1\n\nOpen it?");
 inline const QString kNotOpened = QStringLiteral("No program on this system opens\n%1");
 
+// What a template names as its documentation.
+inline const QString kAskOpenTarget =
+    QStringLiteral("The template names what is no usual document. Open it?\n\n%1");
+inline const QString kTargetRefused = QStringLiteral(
+    "Only documents and addresses are opened. This is a program, can start one, or is no file:\n\n%1");
+
 // The list of messages and the marks in the tree.
 inline const QString kCreateSymbol = QStringLiteral("&Create symbol '%1'...");
 inline const QString kHasMessages = QStringLiteral("%1 in the list of messages: %2");

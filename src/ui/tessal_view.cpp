@@ -37,6 +37,10 @@ void CTessalView::ItemToForm() {
   pages->setCurrentIndex(QString::fromStdString(Item().viewState[kActiveTab]).toInt());
 }
 
+std::vector<TypedValue> CTessalView::TypedValues() const {
+  return general->TypedValues();
+}
+
 void CTessalView::FormToItem() {
   general->Commit();
   Item().viewState[kActiveTab] = std::to_string(pages->currentIndex());

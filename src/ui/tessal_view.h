@@ -14,6 +14,8 @@ class CTessalView final : public CRightPaneBase {
  public:
   CTessalView(const FormContext& context, QWidget* parent);
 
+  std::vector<TypedValue> TypedValues() const override;
+
  protected:
   /// Fills the pages, and opens the one that was open at the last visit.
   void ItemToForm() override;

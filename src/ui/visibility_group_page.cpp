@@ -257,6 +257,29 @@ void CVisibilityGroupDlg::FormToItem() {
   Document().UpdateAllViews(nullptr, hint::kRenameGroup, &argument);
 }
 
+std::vector<TypedValue> CVisibilityGroupDlg::TypedValues() const {
+  std::vector<TypedValue> typed;
+  TemplateCore& core = Core();
+  const TextEncoding encoding = Document().Encoding();
+  const auto add = [&typed, encoding](const QLineEdit& line, const std::string& former, const auto& set) {
+    const std::string entered = Entered(line, former, encoding);
+    if (entered != former)
+      typed.push_back({[set, entered] { set(entered); }, [set, former] { set(former); }});
+  };
+  const std::int32_t group = Number();
+  if (Group() == nullptr) return typed;
+  add(*name, Group()->name, [&core, group](const std::string& text) { core.SetGroupName(group, text); });
+  add(*description, Group()->description,
+      [&core, group](const std::string& text) { core.SetGroupDescription(group, text); });
+  const std::int32_t level = current;
+  if (Level() == nullptr) return typed;
+  add(*levelName, Level()->name,
+      [&core, group, level](const std::string& text) { core.SetLevelName(group, level, text); });
+  add(*levelDescription, Level()->description,
+      [&core, group, level](const std::string& text) { core.SetLevelDescription(group, level, text); });
+  return typed;
+}
+
 void CVisibilityGroupDlg::StoreGroup() {
   const VisibilityGroup* group = Group();
   if (group == nullptr) return;

@@ -20,6 +20,8 @@ class CVisibilityGroupDlg final : public CRightPaneBase {
  public:
   CVisibilityGroupDlg(const FormContext& context, QWidget* parent);
 
+  std::vector<TypedValue> TypedValues() const override;
+
  protected:
   void ItemToForm() override;
   void FormToItem() override;

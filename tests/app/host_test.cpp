@@ -3,10 +3,12 @@
 #include <unistd.h>
 
 #include <QAbstractButton>
+#include <QAbstractItemView>
 #include <QApplication>
 #include <QDir>
 #include <QDropEvent>
 #include <QFileDialog>
+#include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
 #include <QMenuBar>
@@ -17,6 +19,9 @@
 #include <QTest>
 #include <QTimer>
 #include <QTreeWidget>
+#include <array>
+#include <chrono>
+#include <cstdio>
 #include <filesystem>
 #include <fstream>
 #include <map>
@@ -25,8 +30,11 @@
 #include <stdexcept>
 #include <utility>
 
+#include "app/comparison_dialog.h"
+#include "app/document_places.h"
 #include "app/editor_module.h"
 #include "app/host_window.h"
+#include "app/notice_bar.h"
 #include "app/open_document.h"
 #include "app/recent_files.h"
 #include "app/start_page.h"
@@ -68,13 +76,25 @@ class BoxAnswers final : public QObject {
       texts.append(box->text());
       const QString answer = answers.isEmpty() ? "OK" : answers.takeFirst();
       for (QAbstractButton* button : box->buttons()) {
-        if (button->text().remove(u'&') == answer) return button->click();
+        if (button->text().remove(u'&').remove("...") == answer) return button->click();
       }
       box->reject();
+    } else if (auto* comparison = qobject_cast<ComparisonDialog*>(modal)) {
+      auto* rows = comparison->findChild<QTreeWidget*>();
+      for (int row = 0; row < rows->topLevelItemCount(); ++row) {
+        QStringList columns;
+        for (int column = 0; column < rows->columnCount(); ++column)
+          columns.append(rows->topLevelItem(row)->text(column));
+        texts.append(columns.join(" | "));
+      }
+      comparison->reject();
     } else if (auto* files = qobject_cast<QFileDialog*>(modal); files != nullptr && files->isEnabled()) {
       // Answered once; a box that this brings up must find the timer free.
       files->setEnabled(false);
       QTimer::singleShot(0, files, [this, files] {
+        // A name that is typed takes the selection away.
+        for (auto* list : files->findChildren<QAbstractItemView*>())
+          if (list->selectionModel() != nullptr) list->clearSelection();
         files->findChild<QLineEdit*>()->setText(saveAs);
         static_cast<QDialog&>(*files).accept();
       });
@@ -98,13 +118,12 @@ Function* Export(const char* name) {
 /// refused, and all that there is to see when that has changed.
 class HostScript final {
  public:
-  explicit HostScript(const std::string& files) : window(Module().MakeDocTemplate(), Module().EditorName()) {
+  explicit HostScript(const std::string& files) {
     QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
+    qputenv("XDG_STATE_HOME", QByteArray::fromStdString(state.Path().string()));
     std::istringstream input(files);
     for (std::string name, value; input >> name >> value;) Write(name, value);
-    window.show();
-    window.activateWindow();
-    EXPECT_TRUE(QTest::qWaitForWindowActive(&window));
+    Show(0);
   }
 
   std::string Answer(const test::CaseCall& call) {
@@ -114,10 +133,78 @@ class HostScript final {
     lines = std::exchange(boxes.texts, {}) + lines;
     const QStringList present = Look();
     if (std::exchange(former, present) != present) lines += present;
-    return lines.isEmpty() ? "" : lines.join(u'\n').replace(Path(""), "FOLDER/").toStdString() + "\n";
+    QString text = lines.join(u'\n').replace(Path(""), "FOLDER/");
+    text.replace(QRegularExpression(R"(process \d+ on [^ )]+)"), "PROCESS");
+    return text.isEmpty() ? "" : text.toStdString() + "\n";
   }
 
  private:
+  HostWindow& Window() const { return *windows.at(editor); }
+
+  /// Brings an editor to the front, and starts it when it is not there.
+  void Show(std::size_t number) {
+    editor = number;
+    if (!windows.at(editor)) {
+      windows[editor] = std::make_unique<HostWindow>(Module().MakeDocTemplate(), Module().EditorName());
+      Window().Timer().SetIntervals(kNever, kNever);
+    }
+    Window().show();
+    Window().activateWindow();
+    EXPECT_TRUE(QTest::qWaitForWindowActive(&Window()));
+  }
+
+  /// The editor ends as by a signal, and is started again.
+  bool Crash() {
+    windows.at(editor).reset();
+    Show(editor);
+    Window().OfferLeftWork({});
+    return true;
+  }
+
+  /// One of the two intervals passes.
+  bool Pass(std::chrono::milliseconds pause, std::chrono::milliseconds wait) {
+    Window().Timer().SetIntervals(pause, wait);
+    QTest::qWait(20);
+    Window().Timer().SetIntervals(kNever, kNever);
+    return true;
+  }
+
+  /// The files that an editor keeps beside others and in the state folder, with their permissions.
+  bool LookBehind() {
+    for (const QString& name : {Path(""), StateFolder()}) {
+      const QDir hidden(name);
+      const bool isState = name == StateFolder();
+      for (const QString& entry : hidden.entryList(QDir::Files | QDir::Hidden, QDir::Name)) {
+        if (!isState && !entry.startsWith(".~")) continue;
+        const QString file = hidden.filePath(entry);
+        const QString text = QString::fromStdString(test::ReadFile(file.toStdString()));
+        QString line =
+            (isState ? "state " : "") +
+            QString(entry).replace(QRegularExpression("[0-9a-f]{8}-[0-9a-f-]{27}|[0-9a-f]{40}"), "ID");
+        if (entry.endsWith(".recovery"))
+          line += " " + QString::number(int(std::filesystem::status(file.toStdString()).permissions()), 8) +
+                  " " + QRegularExpression("ONLINE_HELP = '.+'").match(text).captured();
+        boxes.texts.append(line);
+      }
+    }
+    return true;
+  }
+
+  /// What the bar says and offers, once it is there; one of its buttons is pressed, if it is named.
+  bool UseNotice(const QString& button, int patience) {
+    auto* bar = Window().findChild<NoticeBar*>();
+    if (!QTest::qWaitFor([bar] { return bar->isVisible(); }, patience)) return false;
+    // A second look may find more.
+    if (button.isEmpty()) QTest::qWait(patience / 8);
+    for (auto* label : bar->findChildren<QLabel*>())
+      if (button.isEmpty() && !label->text().isEmpty()) boxes.texts.append(label->text());
+    for (auto* each : bar->findChildren<QAbstractButton*>()) {
+      if (each->isVisible() && button.isEmpty()) boxes.texts.append("  " + each->text());
+      if (each->isVisible() && each->text().remove("...") == button) return each->click(), true;
+    }
+    return button.isEmpty();
+  }
+
   QString Path(const QString& name) const { return QString::fromStdString(folder.File(name.toStdString())); }
 
   void Write(const std::string& name, const std::string& value) const {
@@ -127,8 +214,8 @@ class HostScript final {
 
   /// The title, the tabs, and the files of the folder with their online help.
   QStringList Look() const {
-    QStringList lines{window.isVisible() ? window.windowTitle() : "no window"};
-    const auto* tabs = window.findChild<QTabWidget*>();
+    QStringList lines{Window().isVisible() ? Window().windowTitle() : "no window"};
+    const auto* tabs = Window().findChild<QTabWidget*>();
     for (int tab = 0; tab < tabs->count(); ++tab)
       lines.append((tab == tabs->currentIndex() ? "* " : "  ") + tabs->tabText(tab));
     for (const QString& name : QDir(Path("")).entryList(QDir::Files)) {
@@ -140,7 +227,7 @@ class HostScript final {
 
   /// Types into the online help of the constant; nothing is committed yet.
   bool Edit(const QString& text) {
-    QWidget* shown = window.Current()->Widget();
+    QWidget* shown = Window().Current()->Widget();
     auto* tree = shown->findChild<QTreeWidget*>("1127");
     tree->setCurrentItem(tree->findItems("k", Qt::MatchExactly | Qt::MatchRecursive).at(0));
     // The form that was left waits for the event loop to delete it.
@@ -153,13 +240,15 @@ class HostScript final {
 
   /// Makes a constant by the menu of their folder.
   bool Touch() {
-    auto* tree = window.Current()->Widget()->findChild<QTreeWidget*>("1127");
+    auto* tree = Window().Current()->Widget()->findChild<QTreeWidget*>("1127");
     QTimer::singleShot(0, tree, [] {
       auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
       menu->actions().at(0)->trigger();
       menu->close();
     });
     emit tree->customContextMenuRequested(tree->visualItemRect(tree->topLevelItem(0)->child(1)).center());
+    // The click that a user makes.
+    QTest::keyClick(tree, Qt::Key_Shift);
     return true;
   }
 
@@ -169,15 +258,15 @@ class HostScript final {
     for (const QString& name : names) urls.append(QUrl::fromLocalFile(Path(name)));
     dropped.setUrls(urls);
     QDragEnterEvent enter(QPoint(1, 1), Qt::CopyAction, &dropped, Qt::LeftButton, {});
-    QApplication::sendEvent(&window, &enter);
+    QApplication::sendEvent(&Window(), &enter);
     QDropEvent drop(QPointF(1, 1), Qt::CopyAction, &dropped, Qt::LeftButton, {});
-    QApplication::sendEvent(&window, &drop);
+    QApplication::sendEvent(&Window(), &drop);
     return enter.isAccepted();
   }
 
   /// The entries of a menu; one of them is chosen, if it is named.
   bool UseMenu(const QString& title, const QString& entry) {
-    for (const QAction* menu : window.menuBar()->actions()) {
+    for (const QAction* menu : Window().menuBar()->actions()) {
       if (menu->text().remove(u'&') != title || !menu->isVisible()) continue;
       for (QAction* action : menu->menu()->actions()) {
         const QString text = action->text().remove(u'&');
@@ -195,7 +284,7 @@ class HostScript final {
   /// What the page without a document offers; one of it is pressed, if it is named.
   bool UseStartPage(const QString& name) {
     QCoreApplication::processEvents();
-    for (auto* link : window.findChild<StartPage*>()->findChildren<QAbstractButton*>()) {
+    for (auto* link : Window().findChild<StartPage*>()->findChildren<QAbstractButton*>()) {
       const QString text = link->accessibleName();
       if (!link->isVisible() || text.isEmpty()) continue;
       if (name.isEmpty()) boxes.texts.append(text);
@@ -207,6 +296,10 @@ class HostScript final {
   /// Somebody else writes a file.
   bool Change(const std::string& name) const {
     Write(name, "2");
+    return Touch(name);
+  }
+
+  bool Touch(const std::string& name) const {
     const auto later = std::filesystem::file_time_type::clock::now() + std::chrono::hours(1);
     std::filesystem::last_write_time(folder.File(name), later);
     return true;
@@ -215,49 +308,78 @@ class HostScript final {
   using Call = bool (*)(HostScript& host, const QStringList& words);
   static const std::map<QString, Call> kCalls;
 
+  static constexpr std::chrono::hours kNever{1};
+
   TemporaryFolder folder;
+  TemporaryFolder state;
   BoxAnswers boxes;
-  HostWindow window;
+  std::array<std::unique_ptr<HostWindow>, 2> windows;
+  std::size_t editor = 0;
   QStringList former;
 };
 
 const std::map<QString, HostScript::Call> HostScript::kCalls = {
-    {"open", [](auto& host, auto& words) { return host.window.OpenFile(host.Path(words[0])); }},
+    {"open", [](auto& host, auto& words) { return host.Window().OpenFile(host.Path(words[0])); }},
     {"drop", [](auto& host, auto& words) { return host.Drop(words); }},
-    {"new", [](auto& host, auto& /*words*/) { return host.window.NewDocument(), true; }},
+    {"new", [](auto& host, auto& /*words*/) { return host.Window().NewDocument(), true; }},
     {"edit", [](auto& host, auto& words) { return host.Edit(words.join(u' ')); }},
-    {"commit", [](auto& host, auto& /*words*/) { return host.window.Current()->View().OnCommit(), true; }},
+    {"commit", [](auto& host, auto& /*words*/) { return host.Window().Current()->View().OnCommit(), true; }},
     // A folder's menu makes an element.
     {"touch", [](auto& host, auto& /*words*/) { return host.Touch(); }},
     {"menu",
      [](auto& host, auto& words) { return host.UseMenu(words[0], QStringList(words.mid(1)).join(u' ')); }},
     {"start", [](auto& host, auto& words) { return host.UseStartPage(words.join(u' ')); }},
     {"name", [](auto& host, auto& words) { return host.boxes.saveAs = host.Path(words[0]), true; }},
-    {"save", [](auto& host, auto& /*words*/) { return host.window.SaveCurrent(); }},
-    {"save-as", [](auto& host, auto& /*words*/) { return host.window.SaveCurrentAs(); }},
-    {"close", [](auto& host, auto& /*words*/) { return host.window.CloseCurrent(); }},
-    {"quit", [](auto& host, auto& /*words*/) { return host.window.close(); }},
+    {"save", [](auto& host, auto& /*words*/) { return host.Window().SaveCurrent(); }},
+    {"save-as", [](auto& host, auto& /*words*/) { return host.Window().SaveCurrentAs(); }},
+    {"close", [](auto& host, auto& /*words*/) { return host.Window().CloseCurrent(); }},
+    {"quit", [](auto& host, auto& /*words*/) { return host.Window().close(); }},
     {"tab",
      [](auto& host, auto& words) {
-       return host.window.template findChild<QTabWidget*>()->setCurrentIndex(words[0].toInt()), true;
+       return host.Window().template findChild<QTabWidget*>()->setCurrentIndex(words[0].toInt()), true;
      }},
     {"focus",
      [](auto& host, auto& /*words*/) {
        return host.boxes.texts.append(QApplication::focusWidget()->objectName()), true;
      }},
-    {"press", [](auto& host, auto& words) { return host.boxes.answers = words, true; }},
+    // A blank in a caption is an underscore.
+    {"press",
+     [](auto& host, auto& words) {
+       host.boxes.answers = words;
+       return host.boxes.answers.replaceInStrings("_", " "), true;
+     }},
     {"recent", [](auto& host, auto& /*words*/) { return host.boxes.texts = RecentFiles(), true; }},
     {"delete", [](auto& host, auto& words) { return QFile::remove(host.Path(words[0])); }},
     {"make-folder", [](auto& host, auto& words) { return QDir().mkdir(host.Path(words[0])); }},
     {"change", [](auto& host, auto& words) { return host.Change(words[0].toStdString()); }},
+    {"touch-file", [](auto& host, auto& words) { return host.Touch(words[0].toStdString()); }},
+    {"rename-file",
+     [](auto& host, auto& words) {
+       return std::rename(host.folder.File(words[0].toStdString()).c_str(),
+                          host.folder.File(words[1].toStdString()).c_str()) == 0;
+     }},
+    {"editor", [](auto& host, auto& words) { return host.Show(words[0].toUInt() - 1), true; }},
+    {"crash", [](auto& host, auto& /*words*/) { return host.Crash(); }},
+    {"pause",
+     [](auto& host, auto& /*words*/) { return host.Pass(std::chrono::milliseconds(1), HostScript::kNever); }},
+    {"work-on",
+     [](auto& host, auto& /*words*/) { return host.Pass(HostScript::kNever, std::chrono::milliseconds(1)); }},
+    {"kept", [](auto& host, auto& /*words*/) { return host.LookBehind(); }},
+    {"notice", [](auto& host, auto& words) { return host.UseNotice(words.join(u' '), 2000); }},
+    {"quiet", [](auto& host, auto& /*words*/) { return !host.UseNotice({}, 400); }},
 };
 
-TEST(Host, DoesWhatTheCasesSay) {
-  test::RunCases("app/cases/host.txt", [](const test::Case& each) {
+class Cases : public ::testing::TestWithParam<const char*> {};
+
+TEST_P(Cases, SayWhatTheHostDoes) {
+  test::RunCases("app/cases/" + std::string(GetParam()) + ".txt", [](const test::Case& each) {
     const auto script = std::make_shared<HostScript>(each.input);
     return [script](const test::CaseCall& call) { return script->Answer(call); };
   });
 }
+
+INSTANTIATE_TEST_SUITE_P(Host, Cases, ::testing::Values("host", "recovery"),
+                         [](const auto& file) { return std::string(file.param); });
 
 TEST(Module, GivesItsOneDocumentTemplate) {
   auto* const get = Export<CMultiDocTemplate*(int)>("CvGetDocTemplatePtr");

@@ -19,20 +19,28 @@ std::size_t CountOf(const std::string& text, const std::string& part) {
   return count;
 }
 
-TEST(KeptContent, SectionsStayWhereverTheyStood) {
+TEST(KeptContent, SectionsStayByteForByteWhereverTheyStood) {
   const std::string setup = TemplateText().Constant("k").Text().substr(1);
-  const std::string first = "[FIRST] // ahead\n   // of it\n   A = 1\nEndSect\n\n";
-  const std::string last = "[LAST]\n   B = 'two\nlines'\n   [INNER]\n   EndSect\nEndSect\n\n";
-  for (const std::string& text : {"\n" + setup + first + last, "\n" + first + setup + last,
-                                  "\n" + first + last + setup, "\n" + first + last}) {
+  const std::string first =
+      "[FIRST] // ahead\r\n\t // of it\r\n\r\n   A = 007 ,1.2345678901234567 // x\r\nEndSect";
+  const std::string last =
+      "// of the last\r\n[LAST]\r\n B = 'two\r\nlines'\r\n[INNER]\r\nEndSect\r\nEndSect //";
+  std::string remarks;
+  for (int line = 0; line < 10000; ++line) remarks += "// " + std::to_string(line) + "\r\n";
+  const std::string both = first + "\r\n" + last;
+  for (const std::string& text :
+       {"\n" + setup + both + "\n", "\n" + first + "\n" + setup + last + "\n", "\n" + both + "\n" + setup,
+        "\n" + both + "\n", setup + both, first + "\n" + setup + last + "\n" + remarks,
+        setup + "\r\n" + remarks + both}) {
     LoadedTemplate loaded(text);
     ASSERT_TRUE(loaded.Loaded()) << test::Messages();
     for (int save = 1; save <= 2; ++save) {
       ASSERT_TRUE(loaded->SaveWrapper(loaded.Path()));
       const std::string saved = ReadFile(loaded.Path());
-      EXPECT_EQ(CountOf(saved, "[FIRST] // ahead\r\n   // of it\r\n   A = 1\r\nEndSect"), 1U) << saved;
-      EXPECT_EQ(CountOf(saved, "   B = 'two\r\nlines'\r\n   [INNER]\r\n"), 1U) << saved;
+      EXPECT_EQ(CountOf(saved, first + "\r\n"), 1U) << saved;
+      EXPECT_EQ(CountOf(saved, last + "\r\n"), 1U) << saved;
       EXPECT_EQ(CountOf(saved, "[TESSAL_SETUP]"), 1U) << saved;
+      EXPECT_EQ(CountOf(saved, remarks), CountOf(text, remarks)) << saved;
       ASSERT_TRUE(loaded->LoadWrapper(loaded.Path()));
     }
   }

@@ -77,6 +77,11 @@ using Operation = void (*)(OpenTemplate&, const std::string& rest);
 const std::map<std::string, Operation> kOperations = {
     {"load",
      [](OpenTemplate& open, const std::string& rest) { open.core.LoadWrapper(open.folder.File(rest)); }},
+    {"load-with-zeros",
+     [](OpenTemplate& open, const std::string&) {
+       const std::string text = TextOf("constant k 1");
+       open.core.LoadWrapper(open.folder.Write("zeros", text + std::string(3, '\0') + "[X]"));
+     }},
     {"save",
      [](OpenTemplate& open, const std::string& rest) { open.core.SaveWrapper(open.folder.File(rest)); }},
     {"rename-class",
@@ -87,7 +92,18 @@ const std::map<std::string, Operation> kOperations = {
     {"process-rule", [](OpenTemplate& open, const std::string&) { open.core.CheckProcessRule(); }},
 };
 
+/// The entries of the load's account.
+std::string AccountOf(const TemplateCore& core) {
+  std::string listed;
+  for (const AccountEntry& entry : core.Account().Entries()) {
+    CodesSeen().insert(entry.code);
+    listed += std::string(entry.code) + " " + entry.symbol + ": " + entry.text + "\n";
+  }
+  return listed;
+}
+
 std::string AnswerTo(const CaseCall& call, OpenTemplate& open) {
+  if (call.words == "account") return AccountOf(open.core);
   const std::size_t end = std::min(call.words.find(' '), call.words.size());
   const std::string rest = call.words.substr(std::min(end + 1, call.words.size()));
   if (call.words != "messages") {

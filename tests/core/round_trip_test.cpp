@@ -210,10 +210,8 @@ TEST(RoundTrip, EveryKindComesBackWithEveryValue) {
     ASSERT_TRUE(again.LoadWrapper(filled.Path())) << "seed " << seed << test::Messages();
     ASSERT_EQ(TemplateContent(again), content) << "seed " << seed;
     ASSERT_TRUE(again.SaveWrapper(filled.Path()));
-    ASSERT_TRUE(again.SaveWrapper(filled.Path()));
     std::string twice = ReadFile(filled.Path());
-    ASSERT_NE(twice, once);
-    // Only the key that particle forcings lose differs, see the content's own words on it.
+    ASSERT_EQ(WithoutRevision(twice), WithoutRevision(once)) << "seed " << seed;
     TemplateCore third;
     ASSERT_TRUE(third.LoadWrapper(filled.Path()));
     ASSERT_EQ(TemplateContent(third), content) << "seed " << seed;

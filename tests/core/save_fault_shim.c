@@ -1,5 +1,5 @@
-/* Preloaded into the save probe. Counts the calls by which a save reaches the disk, from the opening of its
-   temporary file on, and at the n-th (SAVE_FAULT_AT) ends the process (SAVE_FAULT_KIND=kill) or fails as a full disk does. */
+/* Preloaded into the probes. Counts the calls by which a save reaches the disk, from the opening of its
+   temporary file on or (SAVE_FAULT_FROM=start) from the first, and at the n-th (SAVE_FAULT_AT) ends the process (SAVE_FAULT_KIND=kill) or fails as a full disk does. */
 #define _GNU_SOURCE
 #include <dlfcn.h>
 #include <errno.h>
@@ -8,6 +8,7 @@
 #include <stdarg.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <sys/types.h>
 #include <unistd.h>
@@ -19,6 +20,7 @@ static int calls = 0;
 static int strikes(void) {
   const char* at = getenv("SAVE_FAULT_AT");
   const char* kind = getenv("SAVE_FAULT_KIND");
+  if (getenv("SAVE_FAULT_FROM") != NULL) counting = 1;
   if (!counting || at == NULL || ++calls != atoi(at)) return 0;
   if (kind != NULL && strcmp(kind, "kill") == 0) raise(SIGKILL);
   errno = ENOSPC;
@@ -66,6 +68,10 @@ int fstat(int descriptor, struct stat* status) { return strikes() ? -1 : NEXT(fs
 
 int stat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(stat)(path, status); }
 
+int lstat(const char* path, struct stat* status) { return strikes() ? -1 : NEXT(lstat)(path, status); }
+
+int flock(int descriptor, int operation) { return strikes() ? -1 : NEXT(flock)(descriptor, operation); }
+
 int access(const char* path, int mode) { return strikes() ? -1 : NEXT(access)(path, mode); }
 
 ssize_t readlink(const char* path, char* target, size_t room) {
@@ -79,5 +85,7 @@ int fchown(int descriptor, uid_t owner, gid_t group) {
 int fchmod(int descriptor, mode_t mode) { return strikes() ? -1 : NEXT(fchmod)(descriptor, mode); }
 
 int rename(const char* from, const char* to) { return strikes() ? -1 : NEXT(rename)(from, to); }
+
+int mkdir(const char* path, mode_t mode) { return strikes() ? -1 : NEXT(mkdir)(path, mode); }
 
 int unlink(const char* path) { return strikes() ? -1 : NEXT(unlink)(path); }

@@ -65,6 +65,7 @@ class SaveFaults : public ::testing::Test {
   static constexpr int kMostCalls = 40;
   // Making, writing, flushing and closing the new file, and the rename.
   static constexpr int kFewestFaults = 5;
+  static constexpr std::size_t kModelAndMessages = 2;
 
   TemporaryFolder folder;
   std::string text;
@@ -82,6 +83,8 @@ TEST_F(SaveFaults, KilledAtEachCall) {
     ++faults;
     hadOld = hadOld || left == text;
     hadNew = hadNew || left == complete;
+    Interrupt(0, "none");
+    EXPECT_EQ(FilesInFolder(), kModelAndMessages) << "the next save clears what was left at call " << at;
   }
   EXPECT_GE(faults, kFewestFaults) << "the shim strikes";
   EXPECT_LT(faults, kMostCalls) << "and all calls were tried";
@@ -89,7 +92,6 @@ TEST_F(SaveFaults, KilledAtEachCall) {
 }
 
 TEST_F(SaveFaults, AFullDiskAtEachCall) {
-  constexpr std::size_t kModelAndMessages = 2;
   int faults = 0;
   std::set<std::string> told;
   for (int at = 1; at <= kMostCalls; ++at) {

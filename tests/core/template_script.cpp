@@ -5,6 +5,7 @@
 #include <sstream>
 #include <stdexcept>
 
+#include "core/comparison.h"
 #include "core/error_registry.h"
 #include "core/loaded_template.h"
 #include "core/rename.h"
@@ -238,6 +239,20 @@ std::string TemplateScript::Undefined() const {
   return text;
 }
 
+std::string TemplateScript::Compare() const {
+  const MessagesAside aside;
+  TemplateCore file;
+  file.LoadWrapper(folder.File(kModel));
+  std::string text;
+  for (const SymbolChange& change : CompareBySymbol(file, core)) {
+    text += "-+*"[static_cast<std::size_t>(change.change)];
+    text += " " + change.kind + " '" + change.symbol + "'\n";
+    for (const FieldChange& field : change.fields)
+      text += "    " + field.field + ": '" + field.before + "' -> '" + field.after + "'\n";
+  }
+  return text + (NotifyChanges() ? "" : "notifications stay off");
+}
+
 std::string TemplateScript::Fields(const std::string& name) {
   std::vector<ElementField> fields;
   Element(name).GetFields(fields);
@@ -415,6 +430,18 @@ std::string TemplateScript::State() const {
   return text.str();
 }
 
+std::string TemplateScript::Account() const {
+  constexpr std::array<const char*, 4> kKinds = {"absent", "unread", "changed", "dropped"};
+  std::string text;
+  for (const AccountEntry& entry : core.Account().Entries()) {
+    const bool canBeTaken = entry.value || entry.ofVisibility;
+    text += std::to_string(entry.line) + " " + std::string(entry.code) + " " +
+            kKinds.at(static_cast<std::size_t>(entry.kind)) + (canBeTaken ? "+" : "") + " " + entry.symbol +
+            ": " + entry.text + "\n";
+  }
+  return text;
+}
+
 std::string TemplateScript::Save(const std::string& name) {
   core.SetModified(false);
   const bool saved = core.SaveWrapper(name.starts_with("/") ? name : folder.File(name));
@@ -469,12 +496,14 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"file", [](S s, W w) { return s.File(w.empty() ? std::string(kModel) : w[0]); }},
       {"edit-file", [](S s, W w) { return s.EditFile(w.at(0), w.at(1)); }},
       {"messages", [](S, W) { return Messages(); }},
+      {"account", [](S s, W) { return s.Account(); }},
       {"counts", [](S, W) { return Counts(); }},
       {"forget", [](S, W) { return Errors().ClearErrors(), ""; }},
       {"table", [](S s, W) { return s.Table(); }},
       {"order", [](S s, W) { return s.Order(); }},
       {"undefined", [](S s, W) { return s.Undefined(); }},
       {"state", [](S s, W) { return s.State(); }},
+      {"compare", [](S s, W) { return s.Compare(); }},
       {"fields", [](S s, W w) { return s.Fields(w.at(0)); }},
       {"look", [](S s, W w) { return s.Lookups(w.at(0)); }},
       {"groups", [](S s, W) { return s.Groups(); }},
@@ -510,6 +539,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
   using S = TemplateScript&;
   using W = const Words&;
   static const std::map<std::string, Operation> kChanges = {
+      {"take-over", [](S s, W) { return YesNo(s.core.TakeOverPassedOver()); }},
       {"add", [](S s, W w) { return AddElement(s.core, KindOf(w.at(0)), s.ClassIn(w, 1)).symbol.Text(); }},
       {"add-function", [](S s, W) { return s.core.GetMisc()->AddExternalFunction().symbol.Text(); }},
       {"remove-function",

@@ -37,6 +37,7 @@ class TemplateScript final {
   CEL_Lagrange_Specie* ClassIn(const Words& words, std::size_t place);
 
   std::string Load(const std::string& path);
+  std::string Account() const;
   std::string Save(const std::string& name);
   std::string File(const std::string& name) const;
   std::string EditFile(const std::string& part, const std::string& by);
@@ -44,6 +45,8 @@ class TemplateScript final {
   std::string Table() const;
   std::string Order() const;
   std::string Undefined() const;
+  /// What has changed from the file to the template.
+  std::string Compare() const;
   std::string Fields(const std::string& name);
   std::string Set(const std::string& name, const std::string& field, const std::string& value);
   std::string MoveBeforeFirstUser(const std::string& name);

@@ -3,6 +3,7 @@
 
 #include "core/error_registry.h"
 #include "elements/expression_elements.h"
+#include "elements/read_status.h"
 #include "elements/specie_expressions.h"
 #include "support/temporary_folder.h"
 
@@ -24,7 +25,8 @@ void WriteElement(CEL_Element& element, const std::string& path) {
 }
 
 void ReadElement(CEL_Element& element, const std::string& path) {
-  int status = 0;
+  LoadAccount account;
+  ReadStatus status(account);
   KvfHandle file = kvfLoadFile(path, 1);
   ASSERT_NE(file, 0U);
   element.Read(kvfTargetByNameNum(file, "T", 1), status);

@@ -2,7 +2,6 @@
 // For tests and fuzz targets alike.
 #pragma once
 
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -11,14 +10,12 @@
 namespace tessal::test {
 
 /// What a file does not hold: the names of derived outputs, which their places give; the units of elements
-/// without unit data; the key that the forcings of particle classes have always lost; and the revision, which
-/// counts the saves.
+/// without unit data; and the revision, which counts the saves.
 inline bool IsInNoFile(const CEL_Element& element, const std::string& field) {
   switch (element.Kind()) {
     case ElementKind::DerivedOutput:
       return field == "Symbol";
     case ElementKind::SpecieForcing:
-      return field.starts_with("UNQ ") || field == "Spatial Variation";
     case ElementKind::SpatialFunction:
     case ElementKind::ExternalFunction:
       return field.starts_with("UNQ ");
@@ -83,19 +80,10 @@ inline std::string SettingsContent(TemplateCore& core) {
   return text;
 }
 
-/// The sections that the editor only carries over.
-inline std::string FurtherSections(const TemplateCore& core) {
-  std::ostringstream text;
-  for (const auto& child : core.KeptTree().Children()) {
-    if (child->ItemKind() == CKvfBaseItem::kSection && child->name != "TESSAL_SETUP") child->Write(text);
-  }
-  return text.str();
-}
-
 inline std::string TemplateContent(TemplateCore& core) {
   std::string text = HeadsContent(core) + SettingsContent(core);
   for (const SymbolRecord& record : core.SymbolTable()) text += FieldsOf(*record.element);
-  return text + FurtherSections(core);
+  return text + core.KeptText();
 }
 
 }  // namespace tessal::test

@@ -350,5 +350,25 @@ TEST(Documentation, IsLookedForInThreePlaces) {
   test::ExpectListing("ui/cases/documentation.txt", text.toStdString());
 }
 
+TEST(Documentation, NoProgramIsStartedAndNothingUnusualOpensWithoutAQuestion) {
+  test::ScriptedUser user;
+  const test::TemporaryFolder folder;
+  const QString place = QString::fromStdString(folder.Path().string());
+  for (const char* name : {"model.pdf", "run.pdf", "tool.desktop", "data.xyz"}) folder.Write(name, "x");
+  std::filesystem::permissions(folder.File("run.pdf"), std::filesystem::perms::owner_all);
+  std::filesystem::create_symlink("run.pdf", folder.File("link.pdf"));
+  std::filesystem::create_symlink("tool.desktop", folder.File("other.pdf"));
+  QString text;
+  for (const QString name :
+       {"model.pdf", "https://example.org/a?b", "run.pdf", "link.pdf", "tool.desktop", "other.pdf", ".",
+        "data.xyz", "mailto:all@example.org", "file:///bin/sh", "smb://host/share/x.pdf"}) {
+    user.answers = {Answer::No};
+    const QString failure = OpenDocumentationFile(name, user, place);
+    text += "== " + name + '\n' + user.TakeLog().join(u'\n') + '\n' + failure.section(u'\n', 0, 0) + '\n';
+  }
+  text.replace(place, "FOLDER");
+  test::ExpectListing("ui/cases/documentation_trust.txt", text.toStdString());
+}
+
 }  // namespace
 }  // namespace tessal

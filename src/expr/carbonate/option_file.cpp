@@ -175,14 +175,14 @@ void ReportFailure(const std::string& path, const ReadingFailure& failure) {
                        failure.keyword + "': " + failure.reason + "; default settings are used");
 }
 
-void OpenLog(const std::string& optionPath, const std::string& logPath) {
+void NameLog(const std::string& optionPath, const std::string& logPath) {
   std::error_code error;
   if (std::filesystem::equivalent(optionPath, logPath, error)) {
     NoteCarbonateProblem("The option file '" + optionPath +
                          "' names itself as its log file; nothing is logged");
     return;
   }
-  CarbonateLog().Open(logPath);
+  CarbonateLog().Name(logPath);
 }
 
 void ApplyOptions(const OptionRecord& record) {
@@ -211,6 +211,18 @@ void ApplyNumbers(const OptionRecord& record) {
   SetSpecies(totals.boron, totals.fluoride, totals.sulphate, totals.phosphate, totals.silicate);
 }
 
+void ReadAndApply(const std::string& path, std::istream& file) {
+  OptionRecord record;
+  const std::optional<ReadingFailure> failure = ReadRecord(file, record);
+  if (!record.logName.empty()) NameLog(path, record.logName);
+  if (failure) {
+    SettleAfterFailure(record);
+    ReportFailure(path, *failure);
+  }
+  ApplyOptions(record);
+  ApplyNumbers(record);
+}
+
 }  // namespace
 
 void ReadOptionFile(const std::string& path) {
@@ -224,15 +236,9 @@ void ReadOptionFile(const std::string& path) {
     return;
   }
   file.imbue(std::locale::classic());
-  OptionRecord record;
-  const std::optional<ReadingFailure> failure = ReadRecord(file, record);
-  if (!record.logName.empty()) OpenLog(path, record.logName);
-  if (failure) {
-    SettleAfterFailure(record);
-    ReportFailure(path, *failure);
-  }
-  ApplyOptions(record);
-  ApplyNumbers(record);
+  CarbonateLog().BeginReading();
+  ReadAndApply(path, file);
+  CarbonateLog().EndReading();
 }
 
 }  // namespace tessal
