@@ -224,7 +224,7 @@ void LoadFurtherSections(TemplateCore& core) {
   const std::string path = fuzz::ScratchFile("start.tessal");
   static const bool kWritten =
       TemplateCore().SaveWrapper(path) &&
-      WriteWholeFile(path,
+      ReplaceFile(path,
                      StartText(path) +
                          "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // after it\r\n"
                          "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")

@@ -33,7 +33,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const std::string path = fuzz::ScratchFile("in.tessal");
   const std::string copy = fuzz::ScratchFile("out.tessal");
   ResetExpressionScanner();
-  Require(WriteWholeFile(path, {reinterpret_cast<const char*>(data), size}).empty(),
+  Require(ReplaceFile(path, {reinterpret_cast<const char*>(data), size}).empty(),
           "the scratch file is written");
   TemplateCore core;
   if (!core.LoadWrapper(path)) {

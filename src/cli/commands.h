@@ -5,7 +5,6 @@
 #include <vector>
 
 #include "cli/output.h"
-#include "docgen/html_documentation.h"
 
 namespace tessal::cli {
 
@@ -45,7 +44,8 @@ ExitCode RunOverview(const std::string& file);
 /// never there.
 struct HtmlCall {
   std::string file;
-  PageOptions page;
+  std::string mathJax;  ///< a flag: the word "true" where no address is given
+  bool isSafe = false;
   std::string output;
   bool force = false;
 };

@@ -27,6 +27,17 @@ std::optional<std::string> PagePath(const HtmlCall& call, std::string& failure) 
 
 }  // namespace
 
+namespace {
+
+PageOptions PageOf(const HtmlCall& call) {
+  PageOptions page;
+  page.mathJax = call.mathJax == "true" ? UsualMathJax() : call.mathJax;
+  page.isSafe = call.isSafe;
+  return page;
+}
+
+}  // namespace
+
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
@@ -39,7 +50,7 @@ ExitCode RunHtml(const HtmlCall& call) {
   if (!LoadOrComplain(core, call.file)) return kCallFault;
   std::string failure;
   const std::optional<std::string> page = PagePath(call, failure);
-  if (!page || !ExportHtmlDocumentation(core, *page, call.page, failure)) {
+  if (!page || !ExportHtmlDocumentation(core, *page, PageOf(call), failure)) {
     Complain(failure);
     return kCallFault;
   }

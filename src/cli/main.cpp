@@ -16,7 +16,6 @@
 #include "cli/help_text.h"
 #include "cli/numbers.h"
 #include "cli/output.h"
-#include "docgen/html_documentation.h"
 #include "expr/carbonate/options.h"
 
 namespace tessal::cli {
@@ -34,7 +33,6 @@ struct CommandLine {
   std::vector<std::string> ignored;
   bool onlyKeywords = false;
   bool force = false;
-  std::string mathJax;  ///< a flag: the word "true" where no address is given
   bool asPage = false;
   Format format = Format::Text;
   int lowestLevel = 0;
@@ -125,12 +123,6 @@ void AddCheck(CLI::App& app, CommandLine& line) {
       ->type_name("LEVEL");
 }
 
-HtmlCall HtmlCallOf(const CommandLine& line) {
-  HtmlCall call = line.html;
-  call.page.mathJax = line.mathJax == "true" ? UsualMathJax() : line.mathJax;
-  return call;
-}
-
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddCheck(app, line);
   AddExplain(app, line);
@@ -175,11 +167,11 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddFile(*overview, line.file);
 
   CLI::App* html = AddCommand(app, line, kTemplates, "html", "writes the HTML documentation",
-                              [&line] { return RunHtml(HtmlCallOf(line)); });
+                              [&line] { return RunHtml(line.html); });
   AddFile(*html, line.html.file);
-  html->add_flag("--mathjax", line.mathJax,
+  html->add_flag("--mathjax", line.html.mathJax,
                  "has MathJax render the equations; --mathjax=ADDRESS names its script");
-  html->add_flag("--safe", line.html.page.isSafe, "writes texts so that no markup in them takes effect");
+  html->add_flag("--safe", line.html.isSafe, "writes texts so that no markup in them takes effect");
   AddOutput(*html, line.html.output, "the page to write; without it HTML_doc beside the template takes it");
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
 }

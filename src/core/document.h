@@ -88,6 +88,8 @@ class CTessalDoc final : public CDocument {
  private:
   /// Loads from a file, by one of the template's loads, and reports a failure.
   bool Open(const std::string& source, const std::string& path);
+  /// Whether the file may lose what the load did not take over.
+  bool MayLose(const std::string& path);
 
   DocumentDialogs& dialogs;
   TemplateCore core;

@@ -24,7 +24,6 @@ namespace tessal {
 
 namespace {
 
-constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 constexpr std::string_view kProjectAddress = TESSAL_MATHJAX_PROJECT;
 
 // The slash before the public identifier has always been there.
@@ -123,7 +122,7 @@ class PageWriter final {
     Line("</div>");
     WriteFooter(created);
     const bool isAscii = std::none_of(page.begin(), page.end(), [](char each) { return (each & 0x80) != 0; });
-    if (!isAscii && IsUtf8(page)) page.insert(0, kByteOrderMark);
+    if (!isAscii && IsUtf8(page)) page.insert(0, kUtf8Mark);
     return std::move(page);
   }
 
