@@ -135,7 +135,7 @@ namespace {
 
 std::string FileOf(const ScratchFolder& folder, const std::string& text) {
   const std::string path = folder.File("model.tessal");
-  const std::string failure = WriteWholeFile(path, text);
+  const std::string failure = ReplaceFile(path, text);
   if (!failure.empty()) throw std::runtime_error(failure);
   return path;
 }

@@ -1,7 +1,6 @@
 #include "elements/miscellaneous.h"
 
 #include <array>
-#include <cmath>
 #include <limits>
 
 #include "elements/element_checks.h"
@@ -9,7 +8,6 @@
 #include "elements/property_io.h"
 #include "elements/version_stamp.h"
 #include "keyfile/keywords.h"
-#include "platform/number_text.h"
 
 namespace tessal {
 
@@ -55,17 +53,6 @@ constexpr std::array<PropertyRow, 11> kRows = {{
              {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree"}),
 }};
 
-/// Rounds a version that was read. What that takes away, beyond the noise of earlier saves, is in the
-/// account.
-void RoundRead(CEL_Property& version, KvfNode section, std::string_view key, ReadStatus& status) {
-  constexpr double kNoise = 1e-9;
-  const double read = version.RealValue();
-  version.SetReal(RoundVersion(read));
-  if (std::abs(version.RealValue() - read) > kNoise && HasKeyword(section, key)) {
-    status.NoteCut(section, key, ShortestNumberText(version.RealValue()));
-  }
-}
-
 }  // namespace
 
 CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
@@ -96,8 +83,8 @@ void CEL_Miscanellous::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   SetAbsentValues(section);
   CEL_Element::Read(section, status);
-  RoundRead(tessalVersion, section, key::kTessalVersion, status);
-  RoundRead(parserVersion, section, key::kParserVersion, status);
+  tessalVersion.SetReal(RoundVersion(tessalVersion.RealValue()));
+  parserVersion.SetReal(RoundVersion(parserVersion.RealValue()));
   ReadList(section, section::kExternalFunctions, &functionHead, status,
            [this]() -> CEL_Element& { return AddExternalFunction(); });
   visibilities.Read(section, status);
