@@ -16,7 +16,7 @@ bool MayWriteOutput(const Call& call) {
   return call.output.empty() || call.force || IsFreeOrComplain(call.output);
 }
 
-/// Whether the file may be replaced, or an output written that lacks what the load left behind.
+/// Whether the file may be replaced, or an output written that lacks what the load did not take over.
 template <class Call>
 bool MayLose(const TemplateCore& core, const Call& call) {
   if (call.output.empty()) return call.force || MayReplaceOrComplain(core, call.file);

@@ -69,6 +69,7 @@ bool CTessalDoc::OnOpenCopy(const std::string& source, const std::string& path) 
 bool CTessalDoc::Open(const std::string& source, const std::string& path) {
   encoding = EncodingOfFile(source);
   const bool loaded = core.LoadCopy(source, path);
+  if (loaded && source != path && !path.empty()) NoteLossesOf(path);
   if (loaded) {
     visibilityGroup = 0;
     visibilityLevel = 0;
@@ -79,6 +80,13 @@ bool CTessalDoc::Open(const std::string& source, const std::string& path) {
   // From here on changes of values reach their listeners.
   SetNotifyChanges(true);
   return loaded;
+}
+
+void CTessalDoc::NoteLossesOf(const std::string& path) {
+  const MessagesAside aside;
+  const ScannerRest rest;
+  TemplateCore file;
+  if (file.LoadWrapper(path)) core.AddToAccount(file.Account());
 }
 
 bool CTessalDoc::MayLose(const std::string& path) {

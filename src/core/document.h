@@ -88,6 +88,8 @@ class CTessalDoc final : public CDocument {
  private:
   /// Loads from a file, by one of the template's loads, and reports a failure.
   bool Open(const std::string& source, const std::string& path);
+  /// The file of that path holds what a copy of the work in it does not: a save that replaces it must ask.
+  void NoteLossesOf(const std::string& path);
   /// Whether the file may lose what the load did not take over.
   bool MayLose(const std::string& path);
 

@@ -219,6 +219,8 @@ class TemplateCore final : public ElementOwner {
   const std::string& KeptText() const { return state.keptText; }
   /// What the file of the load holds that the load did not take over; empty after a save.
   const LoadAccount& Account() const { return state.account; }
+  /// Counts what another load did not take over from the file that a save will replace.
+  void AddToAccount(const LoadAccount& ofThatFile) { state.account.AddEntriesOf(ofThatFile); }
   /// Takes over what the load passed over, and forgets it. False when there is more that is to be set by
   /// hand.
   bool TakeOverPassedOver();

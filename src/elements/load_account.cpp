@@ -31,6 +31,14 @@ void LoadAccount::NoteOfVisibility(std::string_view symbol, int line, const Find
   entries.back().ofVisibility = true;
 }
 
+void LoadAccount::AddEntriesOf(const LoadAccount& other) {
+  for (AccountEntry entry : other.entries) {
+    entry.value.reset();
+    entry.ofVisibility = false;
+    entries.push_back(std::move(entry));
+  }
+}
+
 void LoadAccount::SortByLine() {
   std::stable_sort(entries.begin(), entries.end(), [](const AccountEntry& left, const AccountEntry& right) {
     return left.line < right.line;

@@ -46,6 +46,9 @@ class LoadAccount final {
   void NotePassedOver(std::string_view symbol, int line, const Finding& finding, PassedOverValue value);
   void NoteOfVisibility(std::string_view symbol, int line, const Finding& finding);
   void Clear() { entries.clear(); }
+  /// Adds the entries of another load, with nothing to take over: their elements are not those of this
+  /// template.
+  void AddEntriesOf(const LoadAccount& other);
 
   const std::vector<AccountEntry>& Entries() const { return entries; }
   /// Entries in the order of the file, those without a line first.

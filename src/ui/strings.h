@@ -72,7 +72,7 @@ inline const QString kUndefinedSymbol = QStringLiteral("Undefined symbol ");
 inline const QString kCreateNew = QStringLiteral("Create new");
 inline const QString kDelete = QStringLiteral("Delete");
 
-// What a load left behind in the file.
+// What a load did not take over from the file.
 inline const QString kOneUnread = QStringLiteral("%1 value of this file could not be read.");
 inline const QString kUnread = QStringLiteral("%1 values of this file could not be read.");
 inline const QString kOneNotKept =

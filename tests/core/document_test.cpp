@@ -59,7 +59,9 @@ TEST(Document, AFileThatASaveWouldHarmIsReplacedOnlyOnDemand) {
   dialogs.losses.clear();
   EXPECT_TRUE(document.OnSaveDocument(folder.File("other.tessal"))) << "harms no file";
   EXPECT_TRUE(dialogs.losses.empty());
-  ASSERT_TRUE(document.OnOpenDocument(path));
+  ASSERT_TRUE(document.OnOpenCopy(folder.File("copy.tessal"), path));
+  dialogs.lossAnswer.wish = LossAnswer::Wish::Cancel;
+  EXPECT_FALSE(document.OnSaveDocument(path)) << "recovered work would replace the file";
   dialogs.lossAnswer.wish = LossAnswer::Wish::Replace;
   EXPECT_TRUE(document.OnSaveDocument(path));
   EXPECT_NE(ReadFile(path), text);
