@@ -17,12 +17,14 @@
 #include <set>
 
 #include "support/case_file.h"
+#include "ui/account_strip.h"
 #include "ui/auto_create_dialog.h"
 #include "ui/documentation_link.h"
 #include "ui/editor.h"
 #include "ui/element_form.h"
 #include "ui/expression_colours.h"
 #include "ui/icons.h"
+#include "ui/main_view.h"
 #include "ui/node_kinds.h"
 
 namespace tessal {
@@ -75,6 +77,33 @@ TEST(Texts, BeyondTheLimitStayAsTheFileHasThem) {
   EXPECT_EQ(constant.unit.Text(), "kg");
   EXPECT_EQ(constant.description.Text(), longText);
   EXPECT_EQ(constant.onlineHelp.Text(), longText);
+}
+
+TEST(Account, IsShownUntilWhatWasPassedOverIsRead) {
+  Editor editor(ModelText("constant kp 7 | -UNIT; COLOUR='red'"));
+  CAccountStrip& strip = editor.View().AccountStrip();
+  const auto text = [&strip] { return strip.findChild<QLabel*>()->text(); };
+  const auto button = [&strip](const QString& caption) {
+    for (QPushButton* each : strip.findChildren<QPushButton*>()) {
+      if (each->text().remove(u'&') == caption) return each;
+    }
+    return static_cast<QPushButton*>(nullptr);
+  };
+  ASSERT_TRUE(strip.isVisibleTo(&editor.View()));
+  EXPECT_EQ(
+      text(),
+      "3 values of this file could not be read. 1 part of this file will not be kept as it is by a save.");
+  editor.User().TakeLog();
+  button("Details")->click();
+  EXPECT_TRUE(editor.User().TakeLog().value(0).contains("DEFAULT_VALUE = 7 of kp was not read"));
+  button("Read Them")->click();
+  EXPECT_EQ(text(), "1 part of this file will not be kept as it is by a save.");
+  EXPECT_FALSE(button("Read Them")->isVisibleTo(&strip));
+  EXPECT_EQ(editor.Core().GetConstant(0).defaultValue.RealValue(), 7.0);
+  EXPECT_TRUE(editor.Document().IsModified());
+  ASSERT_TRUE(editor.Document().OnSaveDocument(editor.Path()));
+  editor.View().OnActivate();
+  EXPECT_FALSE(strip.isVisibleTo(&editor.View())) << "the file holds what the template does";
 }
 
 TEST(Forms, ShareTheirHeightBetweenExpressionsAndBoxTheirCounts) {
