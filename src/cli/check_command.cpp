@@ -66,6 +66,8 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
   std::vector<TemplateMessages> all;
   for (const std::string& file : files) {
     TemplateMessages messages = CollectMessages(file, lowestLevel);
+    // The other files may be smaller.
+    if (RanOutOfMemory()) ComplainOfMemory();
     if (!messages.loaded) exitCode = Worse(exitCode, kCallFault);
     if (!messages.IsClean()) exitCode = Worse(exitCode, kContentFault);
     if (format == Format::Text) {

@@ -307,7 +307,7 @@ int main(int count, char** arguments) {
   try {
     return tessal::cli::RunTool(count, arguments);
   } catch (const std::bad_alloc&) {
-    tessal::cli::Complain("out of memory");
+    tessal::cli::ComplainOfMemory();
     return tessal::cli::kCallFault;
   } catch (const std::exception& failure) {
     tessal::cli::Complain(failure.what());

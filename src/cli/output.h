@@ -28,6 +28,9 @@ bool FlushOutput();
 /// One line on standard error, with the tool's name.
 void Complain(std::string_view text);
 
+/// The same for want of memory; takes none.
+void ComplainOfMemory();
+
 /// The lines of standard input, one at a time: those that are there can be answered before the next is read.
 class InputLines final {
  public:

@@ -7,10 +7,12 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "keyfile/item_tree.h"
 #include "keyfile/keyfile_grammar.h"
+#include "platform/parser_memory.h"
 
 namespace tessal {
 
@@ -19,10 +21,12 @@ class ReadState final {
   /// The place of what is not there.
   static constexpr std::uint32_t kNothing = 0xFFFFFFFFU;
 
-  explicit ReadState(const std::string& text) { Install(text); }
+  explicit ReadState(std::string text) : scanned(std::move(text)) { Install(); }
   ReadState(const ReadState&) = delete;
   ReadState& operator=(const ReadState&) = delete;
   ~ReadState() { Uninstall(); }
+
+  ParserMemory& Memory() { return memory; }
 
   // The token side; `NextToken` is the generated scanner.
   int NextToken(std::uint32_t& text);
@@ -61,7 +65,8 @@ class ReadState final {
     std::int32_t lineStart = 0;
   };
 
-  void Install(const std::string& text);
+  /// Has the scanner read the text, in its place.
+  void Install();
   static void Uninstall();
   int Take(int token, const char* start, int length, std::uint32_t& text);
   int TakeLiteral(int token, std::uint32_t& text);
@@ -72,6 +77,8 @@ class ReadState final {
   CKvfSectionItem& SectionAt(std::uint32_t place) { return static_cast<CKvfSectionItem&>(*items[place]); }
   CKvfKeyItem& KeyAt(std::uint32_t place) { return static_cast<CKvfKeyItem&>(*items[place]); }
 
+  std::string scanned;
+  ParserMemory memory;
   Position position;
   std::int32_t sectionLine = 0;
   std::string literal;

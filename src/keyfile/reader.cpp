@@ -2,6 +2,7 @@
 
 #include <limits>
 #include <system_error>
+#include <utility>
 
 #include "keyfile/item_tree.h"
 #include "keyfile/keyfile_grammar.h"
@@ -45,12 +46,12 @@ int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target) {
 
 int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target) {
   FailureText().clear();
-  const std::string readable = KvfReadableText(text);
+  std::string readable = KvfReadableText(text);
   if (readable.size() > static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() / 2)) {
     FailureText() = "Error memory exhaustedin line 0, column 0";
     return 0;
   }
-  ReadState state(readable);
+  ReadState state(std::move(readable));
   if (tessal_keyfile_grammar_parse(state) != 0 || !state.Root()) {
     FailureText() = "Error " + state.Message() + "in line " + std::to_string(state.Line()) + ", column " +
                     std::to_string(state.Column());
