@@ -76,11 +76,13 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
       all.push_back(std::move(messages));
     }
   }
+  if (format == Format::Text) return exitCode;
+  const EndsWithoutMemory end;
   if (format == Format::Json) {
     Json list = Json::array();
     for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
     PrintLine(Json{{"files", list}}.dump());
-  } else if (format == Format::Sarif) {
+  } else {
     PrintSarif(all);
   }
   return exitCode;

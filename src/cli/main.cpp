@@ -285,6 +285,7 @@ int RunTool(int count, char** arguments) {
   try {
     app.parse(ArgumentsForParser(count, arguments));
   } catch (const CLI::ParseError& stop) {
+    const EndsWithoutMemory end;
     if (stop.get_exit_code() == 0) return app.exit(stop);
     Complain(CallFault(app, stop));
     return kCallFault;

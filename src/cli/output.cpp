@@ -138,6 +138,12 @@ void ComplainOfMemory() {
   [[maybe_unused]] const ssize_t written = write(STDERR_FILENO, kLine.data(), kLine.size());
 }
 
+EndsWithoutMemory::EndsWithoutMemory()
+    : former(std::set_new_handler([] {
+        ComplainOfMemory();
+        std::_Exit(kCallFault);
+      })) {}
+
 std::optional<std::string> InputLines::Next() {
   std::size_t searched = start;
   std::size_t end = 0;

@@ -34,7 +34,7 @@ struct Outcome {
   bool operator==(const Outcome&) const = default;
 };
 
-/// What the shim hands over.
+/// What the shim hands over; the sizes are of what the parent has printed.
 struct Report {
   long call = 0;
   long status = 0;
@@ -49,20 +49,28 @@ struct Row {
   const char* call;
   bool hasFaults;  ///< whether the template has some that messages and the account name
   long step;       ///< each so many allocations are tried
+  int exitCode = 0;
 };
 
 std::ostream& operator<<(std::ostream& stream, const Row& row) {
   return stream << row.name;
 }
 
+/// What commands share is tried at each allocation by the first of them.
 constexpr Row kRows[] = {
-    {"Check", "check model.tessal", true, 1},
-    {"Save", "save model.tessal", false, 1},
-    {"SaveOutput", "save model.tessal --output out.tessal", true, 1},
-    {"Repair", "repair model.tessal", true, 7},
-    {"Rename", "rename model.tessal k quota", false, 7},
-    {"Html", "html model.tessal", false, 7},
+    {"Check", "check FILE", true, 1, 1},
+    {"Save", "save FILE", false, 1},
+    {"SaveOutput", "save FILE --output FILE-saved", true, 3},
+    {"Repair", "repair FILE", true, 11},
+    {"Rename", "rename FILE k quota", false, 11},
+    {"Html", "html FILE", false, 11},
+    {"Json", "check FILE --format json", true, 11, 1},
+    {"Tree", "tree FILE", true, 11},
+    {"Help", "--help", true, 11},
 };
+
+/// A name that no string holds without memory.
+constexpr const char* kFile = "lake_templates_of_2026/summer_stratification.tessal";
 
 std::string Repeated(std::string_view text, int count) {
   std::string repeated;
@@ -73,7 +81,7 @@ std::string Repeated(std::string_view text, int count) {
 /// A template with each kind of section. Both parsers need a larger stack for it than they begin with.
 std::string TemplateText(bool hasFaults) {
   constexpr int kDepth = 210;
-  std::string lines = Repeated("before //\n", kDepth) + R"(constant k 0.3
+  std::string lines = R"(constant k 0.3
 forcing f
 state Algae p - loss
 auxiliary a )" + Repeated("(", kDepth) +
@@ -84,17 +92,16 @@ output Algae*2
 class Fish
 class.state Fish_s Fish_a
 class.constant Fish_k 1
-class.forcing Fish_f
-class.search Fish_d 1
+class.forcing Fish_f | -UNQ_TYPE; -UNQ_UNIT; -SCOPE
+class.search Fish_d 1 | -UNQ_TYPE; -UNQ_UNIT
 class.expression Fish_a Fish_s*Fish_k
 class.movement 1 1
 class.descent 0
 settings
 function USER
 after [OTHER]
-after X = 1
-after EndSect
-)";
+)" + Repeated("after // \n", kDepth) +
+                      "after EndSect\n";
   if (hasFaults) lines += "constant c 1 | -UNIT\nauxiliary b (k +\nauxiliary u missing_symbol*2\n";
   return test::TemplateFromNotation(lines);
 }
@@ -102,10 +109,11 @@ after EndSect
 class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::string>> {
  protected:
   AllocationFaults() : row(std::get<0>(GetParam())), kind(std::get<1>(GetParam())) {
-    before["model.tessal"] = TemplateText(row.hasFaults);
+    before[kFile] = TemplateText(row.hasFaults);
     Restore();
     complete = Wait(Start({}));
     Restore();
+    EXPECT_EQ(WEXITSTATUS(complete.status), row.exitCode) << complete.errors;
   }
 
   /// Puts the folder in the state before a run.
@@ -113,7 +121,10 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
     for (const auto& entry : std::filesystem::directory_iterator(folder.Path())) {
       std::filesystem::remove_all(entry.path());
     }
-    for (const auto& [name, content] : before) folder.Write(name, content);
+    for (const auto& [name, content] : before) {
+      std::filesystem::create_directories((folder.Path() / name).parent_path());
+      folder.Write(name, content);
+    }
   }
 
   Files FilesInFolder() const {
@@ -127,12 +138,14 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
 
   /// Starts the tool in the folder, under the shim.
   pid_t Start(std::vector<std::string> environment) const {
-    environment.insert(environment.end(),
-                       {"LD_PRELOAD=" TESSAL_ALLOCATION_SHIM, "ALLOCATION_FAULT_KIND=" + kind,
-                        "ALLOCATION_FAULT_STEP=" + std::to_string(row.step)});
+    environment.insert(environment.end(), {"LD_BIND_NOW=1", "LD_PRELOAD=" TESSAL_ALLOCATION_SHIM,
+                                           "ALLOCATION_FAULT_KIND=" + kind,
+                                           "ALLOCATION_FAULT_STEP=" + std::to_string(row.step)});
     std::vector<std::string> words = {"tessal"};
     std::istringstream call(row.call);
-    for (std::string word; call >> word;) words.push_back(word);
+    for (std::string word; call >> word;) {
+      words.push_back(word.starts_with("FILE") ? kFile + word.substr(4) : word);
+    }
     const auto pointersTo = [](std::vector<std::string>& texts) {
       std::vector<char*> pointers;
       for (std::string& text : texts) pointers.push_back(text.data());
@@ -187,6 +200,11 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
     if (run.files != before) Restore();
   }
 
+  /// Leaves in a file what the parent has printed.
+  static void CutBack(const std::string& file, const std::string& text, long size) {
+    if (text.size() != static_cast<std::size_t>(size)) std::filesystem::resize_file(file, size);
+  }
+
   /// Lets the allocations up to the first change on disk fail in children of one run. Returns the last of
   /// those, and the number of all.
   std::pair<long, long> FailInChildren() {
@@ -199,9 +217,10 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
     long last = 0;
     while (report.status != kEnd && read(ends[0], &report, sizeof report) == sizeof report) {
       if (report.status >= 0) {
-        Judge(report.call, Left(static_cast<int>(report.status)));
-        std::filesystem::resize_file(outputFile, static_cast<std::uintmax_t>(report.outputBefore));
-        std::filesystem::resize_file(errorsFile, static_cast<std::uintmax_t>(report.errorsBefore));
+        const Outcome run = Left(static_cast<int>(report.status));
+        Judge(report.call, run);
+        CutBack(outputFile, run.output, report.outputBefore);
+        CutBack(errorsFile, run.errors, report.errorsBefore);
       }
       if (report.status != kEnd) last = report.call;
       EXPECT_EQ(write(ends[0], "", 1), 1);
@@ -226,7 +245,7 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
 };
 
 TEST_P(AllocationFaults, EndWithOneLineOrNotAtAll) {
-  constexpr long kFewest = 3000;
+  constexpr long kFewest = 1000;
   const auto [last, all] = FailInChildren();
   for (long number = last + 1; number <= all; number += row.step) {
     Judge(number, Wait(Start({"ALLOCATION_FAULT_AT=" + std::to_string(number)})));
