@@ -92,6 +92,29 @@ void* realloc(void* block, size_t size) {
   return strikes() ? NULL : next(block, size);
 }
 
+#ifdef SANITIZED
+/* The sanitizer's `operator new` calls no `malloc`: these do, as those of the C++ library. */
+extern void (*_ZSt15get_new_handlerv(void))(void);
+extern void _ZSt17__throw_bad_allocv(void);
+
+static void* newOrRaise(size_t size) {
+  for (;;) {
+    void* const block = malloc(size > 0 ? size : 1);
+    if (block != NULL) return block;
+    void (*const handler)(void) = _ZSt15get_new_handlerv();
+    if (handler == NULL) _ZSt17__throw_bad_allocv();
+    handler();
+  }
+}
+
+void* _Znwm(size_t size) {
+  return newOrRaise(size);
+}
+void* _Znam(size_t size) {
+  return newOrRaise(size);
+}
+#endif
+
 int mkostemp(char* pattern, int flags) {
   endForks();
   return NEXT(mkostemp)(pattern, flags);
