@@ -1,7 +1,8 @@
-/* Preloaded into the tool. Counts the allocations from the start of `main` on and has one return NULL: the
-   n-th (ALLOCATION_FAULT_AT) alone, or with ALLOCATION_FAULT_KIND=on that one and all after it. What comes
-   before `main` is the start of libraries, which no code of the tool's can guard. `operator new` of the C++
-   library calls `malloc`. The clock is stopped, so that outputs with a date can be compared.
+/* Preloaded into the tool. Counts the allocations from the start of `main` on, or with
+   ALLOCATION_FAULT_FROM=open from the first file that is opened, and has one return NULL: the n-th
+   (ALLOCATION_FAULT_AT) alone, or with ALLOCATION_FAULT_KIND=on that one and all after it. What comes before
+   `main` is the start of libraries, which no code of the tool's can guard. `operator new` of the C++ library
+   calls `malloc`. The clock is stopped, so that outputs with a date can be compared.
 
    With ALLOCATION_FAULT_CONTROL, a socket, the process itself meets no fault: each child that it forks at an
    allocation does. That is the same run, without the start. It hands the status of each child over, with the
@@ -10,6 +11,8 @@
 #define _GNU_SOURCE
 #include <dlfcn.h>
 #include <errno.h>
+#include <fcntl.h>
+#include <stdarg.h>
 #include <stdlib.h>
 #include <string.h>
 #include <sys/stat.h>
@@ -25,6 +28,7 @@ struct Report {
 
 enum { kNoMoreChildren = -1, kEnd = -2, kLongestRun = 20 };
 
+static int started = 0;
 static int counting = 0;
 static int forks = 0;
 static int staysOn = 0;
@@ -115,6 +119,15 @@ void* _Znam(size_t size) {
 }
 #endif
 
+int open(const char* path, int flags, ...) {
+  va_list arguments;
+  va_start(arguments, flags);
+  const mode_t mode = (flags & O_CREAT) != 0 ? va_arg(arguments, mode_t) : 0;
+  va_end(arguments);
+  counting = started;
+  return NEXT(open)(path, flags, mode);
+}
+
 int mkostemp(char* pattern, int flags) {
   endForks();
   return NEXT(mkostemp)(pattern, flags);
@@ -141,12 +154,14 @@ static MainFunction toolMain = NULL;
 
 static int countedMain(int count, char** arguments, char** environment) {
   const char* kind = getenv("ALLOCATION_FAULT_KIND");
+  const char* from = getenv("ALLOCATION_FAULT_FROM");
   staysOn = kind != NULL && strcmp(kind, "on") == 0;
   at = numberIn("ALLOCATION_FAULT_AT", 0);
   step = numberIn("ALLOCATION_FAULT_STEP", 1);
   control = (int)numberIn("ALLOCATION_FAULT_CONTROL", -1);
   forks = control >= 0;
-  counting = 1;
+  started = 1;
+  counting = from == NULL || strcmp(from, "open") != 0;
   return toolMain(count, arguments, environment);
 }
 
@@ -158,6 +173,6 @@ int __libc_start_main(MainFunction start, int count, char** arguments, void (*fi
 }
 
 __attribute__((destructor)) static void reportEnd(void) {
-  counting = 0;
+  started = counting = 0;
   if (control >= 0 && at == 0) handOver(kEnd);
 }
