@@ -113,7 +113,7 @@ after [OTHER]
 class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::string>> {
  protected:
   AllocationFaults() : row(std::get<0>(GetParam())), kind(std::get<1>(GetParam())) {
-    row.step *= TESSAL_TRIED_PART;
+    row.step *= TESSAL_ONE_ALLOCATION_OF;
     before[kFile] = TemplateText(row.hasFaults);
     Restore();
     complete = Wait(Start({}));
