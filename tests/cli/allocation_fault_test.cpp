@@ -34,14 +34,14 @@ struct Outcome {
   bool operator==(const Outcome&) const = default;
 };
 
-/// What the shim hands over; the sizes are of what the parent has printed.
+/// What the shim hands over: the status is that of a child, or negative. The sizes are of what the parent has
+/// printed.
 struct Report {
   long call = 0;
   long status = 0;
   long outputBefore = 0;
   long errorsBefore = 0;
 };
-constexpr long kNoMoreChildren = -1;
 constexpr long kEnd = -2;
 
 constexpr const char* kMain = "ALLOCATION_FAULT_FROM=main";
@@ -145,8 +145,8 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
   pid_t Start(std::vector<std::string> environment) const {
     environment.insert(environment.end(),
                        {"ASAN_OPTIONS=verify_asan_link_order=0:alloc_dealloc_mismatch=0", "LD_BIND_NOW=1",
-                        "LD_PRELOAD=" TESSAL_ALLOCATION_SHIM, "ALLOCATION_FAULT_KIND=" + kind, row.from,
-                        "ALLOCATION_FAULT_STEP=" + std::to_string(row.step)});
+                        std::string("LD_PRELOAD=") + TESSAL_ALLOCATION_SHIM, "ALLOCATION_FAULT_KIND=" + kind,
+                        row.from, "ALLOCATION_FAULT_STEP=" + std::to_string(row.step)});
     std::vector<std::string> words = {"tessal"};
     std::istringstream call(row.call);
     for (std::string word; call >> word;) {
@@ -154,6 +154,7 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
     }
     const auto pointersTo = [](std::vector<std::string>& texts) {
       std::vector<char*> pointers;
+      pointers.reserve(texts.size() + 1);
       for (std::string& text : texts) pointers.push_back(text.data());
       pointers.push_back(nullptr);
       return pointers;
@@ -208,8 +209,9 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
   }
 
   /// Leaves in a file what the parent has printed.
-  static void CutBack(const std::string& file, const std::string& text, long size) {
-    if (text.size() != static_cast<std::size_t>(size)) std::filesystem::resize_file(file, size);
+  static void CutBack(const std::string& file, const std::string& text, long printed) {
+    const auto size = static_cast<std::size_t>(printed);
+    if (text.size() != size) std::filesystem::resize_file(file, size);
   }
 
   /// Lets the allocations up to the first change on disk fail in children of one run. Returns the last of
