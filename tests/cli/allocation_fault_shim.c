@@ -1,4 +1,4 @@
-/* Preloaded into the tool. Counts the allocations from the start of `main` on, or with
+/* Preloaded into the tool. Counts the allocations from the start of `main` to its end, or with
    ALLOCATION_FAULT_FROM=open from the first file that is opened, and has one return NULL: the n-th
    (ALLOCATION_FAULT_AT) alone, or with ALLOCATION_FAULT_KIND=on that one and all after it. What comes before
    `main` is the start of libraries, which no code of the tool's can guard. `operator new` of the C++ library
@@ -162,7 +162,10 @@ static int countedMain(int count, char** arguments, char** environment) {
   forks = control >= 0;
   started = 1;
   counting = from == NULL || strcmp(from, "open") != 0;
-  return toolMain(count, arguments, environment);
+  const int result = toolMain(count, arguments, environment);
+  /* What instruments the tool may write its results now. */
+  started = counting = 0;
+  return result;
 }
 
 /* The C library's way into `main`. */
@@ -173,6 +176,5 @@ int __libc_start_main(MainFunction start, int count, char** arguments, void (*fi
 }
 
 __attribute__((destructor)) static void reportEnd(void) {
-  started = counting = 0;
   if (control >= 0 && at == 0) handOver(kEnd);
 }
