@@ -1,6 +1,7 @@
 // Loading a template file. The key-file library gives the values that the elements are built from; the
 // reader of the item tree then checks the same text, and makes its tree when somebody asks for it.
 #include <exception>
+#include <new>
 
 #include "core/error_registry.h"
 #include "core/file_remains.h"
@@ -208,6 +209,12 @@ bool Reading::Load(const std::string& path) {
     core.ValidateTemplate();
     state.flags.modified = false;
     return true;
+  } catch (const std::bad_alloc&) {
+    // What was being built may be in halves, and the report needs memory. Should that fail too, the exception
+    // goes on.
+    core.Clear();
+    Errors().ReportInFile(kLoadSymbol, 0, {"out-of-memory"});
+    return false;
   } catch (const std::exception& failure) {
     // What was built so far stays; the reason must reach the user.
     Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});

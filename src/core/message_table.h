@@ -261,6 +261,14 @@ inline constexpr MessageRow kMessages[] = {
         "Change the value of the element so that the format can hold it, and save again.",
     },
     {
+        "out-of-memory",
+        ErrorLevel::Fatal,
+        "not enough memory",
+        "There was not enough memory to load or to save the template; the file on disk is unchanged.",
+        "A file of many gigabytes, or a limit that the system sets to each program.",
+        "Close other programs, or raise the limit.",
+    },
+    {
         "save-failed",
         ErrorLevel::Critical,
         "%1",

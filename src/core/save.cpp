@@ -1,6 +1,8 @@
 // Saving a template: its text is written through the key-file library, joined with what its file held
 // beside the template, and put in the target's place in one step.
+#include <array>
 #include <exception>
+#include <new>
 #include <optional>
 
 #include "core/error_registry.h"
@@ -34,9 +36,8 @@ class Image final {
   KvfHandle handle;
 };
 
-void ReportFailure(std::string_view reason) {
-  Errors().ReportInFile(kSaveSymbol, 0, {"save-failed", {reason}});
-}
+constexpr Message kSaveFailed("save-failed");
+constexpr Message kOutOfMemory("out-of-memory");
 
 /// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
 /// follows a text that ends in a line end.
@@ -128,22 +129,30 @@ bool Writing::SaveAs(const std::string& path) {
 
 bool Writing::SaveInPlace(const std::string& path) {
   const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
+  // Made before the file is replaced: nothing may fail after that.
+  std::array<std::string, 2> names;
+  std::optional<Message> failed;
   std::string reason;
   try {
+    names = {path, path};
     const std::optional<std::string> text = FileText(reason);
     if (text) reason = ReplaceFile(path, *text);
+    if (!reason.empty()) failed = kSaveFailed;
+  } catch (const std::bad_alloc&) {
+    failed = kOutOfMemory;
   } catch (const std::exception& failure) {
     reason = failure.what();
+    failed = kSaveFailed;
   }
-  if (!reason.empty()) {
+  if (failed) {
     // What is in memory stays unsaved, and its revision uncounted.
     state.misc.documentRevision.SetInt(formerRevision);
     state.flags.modified = true;
-    ReportFailure(reason);
+    Errors().ReportInFile(kSaveSymbol, 0, {*failed, {reason}});
     return false;
   }
-  state.templateFileName = path;
-  state.saveFileName = path;
+  state.templateFileName.swap(names[0]);
+  state.saveFileName.swap(names[1]);
   state.flags.modified = false;
   // From here on the file holds what the template does.
   state.account.Clear();
@@ -165,6 +174,8 @@ std::optional<std::string> Writing::CopyText(std::string& reason) {
   std::optional<std::string> text;
   try {
     text = FileText(reason);
+  } catch (const std::bad_alloc&) {
+    reason = kOutOfMemory->text;
   } catch (const std::exception& failure) {
     reason = failure.what();
   }

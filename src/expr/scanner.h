@@ -120,6 +120,9 @@ class ExpressionScan final {
   std::uint32_t Lines() const;
   /// Characters taken when the present line began.
   std::uint32_t LineStart() const;
+
+ private:
+  std::string scanned;
 };
 
 }  // namespace tessal

@@ -1,6 +1,10 @@
 %{
 // The grammar of key-file text, as an item tree is built from it.
 #include "keyfile/read_state.h"
+
+// The parse owns what its stack needs.
+#define YYMALLOC(size) state.Memory().Take(size)
+#define YYFREE(block) state.Memory().Release(block)
 %}
 
 %code requires {

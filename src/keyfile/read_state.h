@@ -9,6 +9,7 @@
 #include <string_view>
 
 #include "keyfile/keyfile_grammar.h"
+#include "platform/parser_memory.h"
 
 namespace tessal {
 
@@ -22,6 +23,8 @@ class ReadState {
   ReadState(const ReadState&) = delete;
   ReadState& operator=(const ReadState&) = delete;
   virtual ~ReadState() { Uninstall(); }
+
+  ParserMemory& Memory() { return memory; }
 
   /// The generated scanner.
   int NextToken(std::uint32_t& place);
@@ -71,6 +74,7 @@ class ReadState {
     std::int32_t lineStart = 0;
   };
 
+  /// Has the scanner read the text, in its place.
   void Install();
   void Uninstall();
 
@@ -81,6 +85,7 @@ class ReadState {
   virtual std::uint32_t KeepLiteral() { return kNothing; }
 
   std::string& text;
+  ParserMemory memory;
   Position position;
   std::int32_t sectionLine = 0;
   std::string message;

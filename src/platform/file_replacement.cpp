@@ -175,13 +175,14 @@ std::string_view FillAndTakePlace(TemporaryFile& file, const TextSource& content
 /// Puts the content in the place of whatever has the name `target`; messages call it `shown`.
 std::string PutInPlace(const std::filesystem::path& target, const std::string& shown,
                        const TextSource& content) {
+  // Made before the file is replaced: nothing may fail after that.
+  const std::filesystem::path folder = target.parent_path();
   RemoveTemporaryRests(target);
   TemporaryFile fresh(target);
   if (!fresh.IsOpen()) return Reason("can not create a file beside", shown, errno);
   const std::string_view failed = FillAndTakePlace(fresh, content, target.native());
   if (!failed.empty()) return Reason(failed, shown, errno);
-  return FlushFolder(target.parent_path()) ? std::string()
-                                           : Reason("can not flush the folder of file", shown, errno);
+  return FlushFolder(folder) ? std::string() : Reason("can not flush the folder of file", shown, errno);
 }
 
 std::string WriteStream(const std::string& path, const TextSource& content) {
