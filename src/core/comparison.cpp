@@ -145,6 +145,7 @@ class Listing final {
   }
 
   void AddFurtherSections() {
+    if (core.KeptText().empty()) return;
     bool targetSeen = false;
     for (const auto& child : core.KeptTree().Children()) {
       if (child->ItemKind() != CKvfBaseItem::kSection) continue;

@@ -30,6 +30,7 @@ class Image final {
   ~Image() { kvfClose(&handle); }
 
   KvfHandle Handle() const { return handle; }
+  std::string TakeText() { return kvfTakeText(&handle); }
 
  private:
   KvfHandle handle;
@@ -40,18 +41,16 @@ constexpr Message kOutOfMemory("out-of-memory");
 
 /// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
 /// follows a text that ends in a line end.
-std::string WithTypeLine(const std::string& text) {
+std::string WithTypeLine(std::string text) {
   std::size_t lineStart = 0;
   for (int line = 1; line < kTypeLineNumber; ++line) {
     const std::size_t lineEnd = text.find('\n', lineStart);
     if (lineEnd == std::string::npos) return text;
     lineStart = lineEnd + 1;
   }
-  std::string result = text.substr(0, lineStart);
-  result += kTypeLine;
-  result.append(text, lineStart);
-  result += "\r\n";
-  return result;
+  text.insert(lineStart, kTypeLine);
+  text += "\r\n";
+  return text;
 }
 
 /// The settings that a save under a new name stamps, so that one that fails can put them back.
@@ -161,12 +160,12 @@ bool Writing::SaveInPlace(const std::string& path) {
 }
 
 std::optional<std::string> Writing::FileText(std::string& reason) {
-  const Image image;
+  Image image;
   if (!WriteSections(image.Handle())) {
     reason = "the template holds what the file format can not";
     return std::nullopt;
   }
-  return WithTypeLine(kvfGetText(image.Handle()) + KeptPart(state.keptText));
+  return WithTypeLine(image.TakeText() + KeptPart(state.keptText));
 }
 
 std::optional<std::string> Writing::CopyText(std::string& reason) {

@@ -98,6 +98,9 @@ class ScannerRest final {
   ~ScannerRest() { ResetExpressionScanner(); }
 };
 
+/// Bytes of an expression that is still parsed. A tree takes a hundred times the memory of its text.
+inline constexpr std::size_t kLongestExpression = 1'000'000;
+
 /// The scanner as the parser and the lists pull from it. One scan at a time.
 class ExpressionScan final {
  public:

@@ -165,7 +165,7 @@ value_path_string:
 %%
 
 static int tessal_keyfile_grammar_lex(TESSAL_KEYFILE_GRAMMAR_STYPE* value, tessal::ReadState& state) {
-  return state.NextToken(value->place);
+  return state.IsFull() ? OTHER : state.NextToken(value->place);
 }
 
 static void tessal_keyfile_grammar_error(tessal::ReadState& state, const char* message) { state.Fail(message); }
