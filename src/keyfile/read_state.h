@@ -24,6 +24,7 @@ class ReadState {
   ReadState& operator=(const ReadState&) = delete;
   virtual ~ReadState() { Uninstall(); }
 
+  /// What the generated parser takes its stack from.
   ParserMemory& Memory() { return memory; }
 
   /// The generated scanner.
