@@ -10,20 +10,20 @@ namespace tessal {
 namespace {
 
 bool CanBeTakenOver(const AccountEntry& entry) {
-  return entry.value.has_value() || entry.ofVisibility;
+  return entry.value != nullptr || entry.ofVisibility;
 }
 
 }  // namespace
 
 void LoadAccount::Note(AccountKind kind, std::string_view symbol, int line, const Finding& finding) {
   entries.push_back(
-      {kind, finding.message->code, std::string(symbol), finding.text, line, std::nullopt, false});
+      {kind, finding.message->code, std::string(symbol), finding.text, line, nullptr, false});
 }
 
 void LoadAccount::NotePassedOver(std::string_view symbol, int line, const Finding& finding,
                                  PassedOverValue value) {
   Note(AccountKind::Unread, symbol, line, finding);
-  entries.back().value = std::move(value);
+  entries.back().value = std::make_shared<const PassedOverValue>(std::move(value));
 }
 
 void LoadAccount::NoteOfVisibility(std::string_view symbol, int line, const Finding& finding) {

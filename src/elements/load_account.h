@@ -4,7 +4,7 @@
 #pragma once
 
 #include <cstddef>
-#include <optional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -39,7 +39,7 @@ struct AccountEntry {
   std::string text;
   int line;  ///< of the file, from 1; 0 for none
   /// What can be taken over; none where that is for the modeller to do.
-  std::optional<PassedOverValue> value;
+  std::shared_ptr<const PassedOverValue> value;
   bool ofVisibility = false;  ///< taken over with all that was passed over of the visibility groups
 };
 
