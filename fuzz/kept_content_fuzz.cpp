@@ -82,9 +82,10 @@ void Print(int number, const std::string& line, const LoadAccount& account) {
 /// Every mark of the file is in what was saved or named by the account, by itself or with the whole section
 /// that it is in.
 void RequireNamed(const std::string& file, const std::string& saved, const LoadAccount& account) {
+  const Lines lines = LinesOf(file);
   std::vector<int> heads;
   int number = 0;
-  for (const std::string& line : LinesOf(file)) {
+  for (const std::string& line : lines) {
     ++number;
     const std::string_view text = Trimmed(line);
     if (text.starts_with("[")) heads.push_back(number);
@@ -103,7 +104,13 @@ void RequireNamed(const std::string& file, const std::string& saved, const LoadA
   }
   std::size_t comments = CommentLines(saved);
   for (const AccountEntry& entry : account.Entries()) {
-    if (entry.code == "comment-dropped") comments += LinesOfEntry(entry);
+    if (entry.code != "comment-dropped") continue;
+    const std::size_t count = LinesOfEntry(entry);
+    comments += count;
+    for (std::size_t line = 0; line < count; ++line) {
+      const std::string& text = lines.at(static_cast<std::size_t>(entry.line) - 1 + line);
+      Require(text.find("//") != std::string::npos, "an entry about comments is for lines that have some");
+    }
   }
   Require(comments >= CommentLines(file), "a comment that is lost is in the account");
 }

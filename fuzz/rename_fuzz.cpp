@@ -14,6 +14,7 @@
 #include "core/rename.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
+#include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
 #include "template_file.h"
 
@@ -23,27 +24,42 @@ using namespace tessal;
 using fuzz::Choices;
 using fuzz::Require;
 
-constexpr std::array<const char*, 20> kNames = {"a",  "b",  "aa", "a_1", "a2",   "ab",         "ba",
-                                                "K",  "K1", "e",  "e5",  "Oxy",  "Oxy_sat",    "Mix",
-                                                "_a", "a1", "A",  "x",   "Fish", "Fish_Number"};
+constexpr std::array<const char*, 14> kNames = {"a", "a_1", "a2",  "aa",      "K",   "K1",   "e",
+                                                "x", "e5",  "Oxy", "Oxy_sat", "Mix", "Fish", "Fish_Number"};
 constexpr std::array<const char*, 8> kNoNames = {"", "two words", "1a", "SIN", "IF", "Mass", "a+b", "\xE9"};
 constexpr std::array<const char*, 24> kOther = {
     "+", "*",  "(",    ")", "1e5 ", "2 ", "1.5 ",   " ", "/* a */", "\n",  "\"",  "'",
     "?", "/ ", "MAX(", ",", " IF ", "^",  " THEN ", ":", "::",      "->+", "[a]", "SIN("};
 
-/// No comment is left open: what follows one depends on where the last scan ended.
-std::string AnyExpression(Choices& choices) {
+/// Mostly names that are defined. No comment is left open: what follows one depends on where the last scan
+/// ended.
+std::string AnyExpression(Choices& choices, const std::vector<std::string>& defined) {
+  const auto anyName = [&choices, &defined] {
+    return choices.Pick(4) == 0 ? std::string(choices.AnyOf(kNames)) : choices.AnyOf(defined);
+  };
+  const bool isSound = choices.Pick(3) != 0;
   std::string text;
-  for (std::size_t count = choices.Pick(9); count > 0; --count) {
-    text += choices.Pick(2) == 0 ? choices.AnyOf(kNames) : choices.AnyOf(kOther);
+  for (std::size_t count = choices.Pick(6); count > 0; --count) {
+    if (isSound) {
+      text += anyName() + " + ";
+    } else {
+      text += choices.Pick(2) == 0 ? anyName() : choices.AnyOf(kOther);
+    }
   }
-  return text;
+  return isSound ? text + "1" : text;
 }
 
-/// Elements of all kinds under any of the names, also one name for several, and user functions.
+std::vector<std::string> SymbolsOf(const TemplateCore& core) {
+  std::vector<std::string> symbols;
+  for (const SymbolRecord& record : core.SymbolTable()) symbols.push_back(record.element->symbol.Text());
+  return symbols;
+}
+
+/// Elements of all kinds, a class among them, under any of the names, also one name for several, and user
+/// functions.
 void Fill(TemplateCore& core, Choices& choices) {
   const NotificationsOff silent;
-  core.AddSpecie();
+  core.AddSpecie().symbol.SetText(choices.AnyOf(kNames));
   for (std::size_t count = 2 + choices.Pick(8); count > 0; --count) {
     CreateRequest request;
     request.kind = KindAfter(ElementKind::StateVariable, choices.Pick(13));
@@ -54,12 +70,16 @@ void Fill(TemplateCore& core, Choices& choices) {
     SetNotifyChanges(false);
     if (made != nullptr && made->symbol.Editable()) made->symbol.SetText(choices.AnyOf(kNames));
   }
-  for (std::size_t count = choices.Pick(3); count > 0; --count) {
+  for (std::size_t count = choices.Pick(4); count > 0; --count) {
     core.GetMisc()->AddExternalFunction().publicName.SetText(choices.AnyOf(kNames));
   }
+  std::vector<std::string> defined = SymbolsOf(core);
+  std::erase_if(defined, [](const std::string& symbol) { return !IsValidSymbolSpelling(symbol); });
+  if (defined.empty()) defined.emplace_back(kNames[0]);
   for (const SymbolRecord& record : core.SymbolTable()) {
-    record.element->ForEachExpression(
-        [&choices](const PropertyRow&, CEL_Property& property) { property.SetText(AnyExpression(choices)); });
+    record.element->ForEachExpression([&choices, &defined](const PropertyRow&, CEL_Property& property) {
+      property.SetText(AnyExpression(choices, defined));
+    });
   }
   core.RebuildSymbolTable();
 }
@@ -77,8 +97,8 @@ State StateOf(TemplateCore& core) {
   State state;
   std::string reason;
   state.text = core.CopyText(reason).value_or(reason);
+  state.symbols = SymbolsOf(core);
   for (const SymbolRecord& record : core.SymbolTable()) {
-    state.symbols.push_back(record.element->symbol.Text());
     state.references.push_back(record.references);
     record.element->ForEachExpression([&state](const PropertyRow&, const CEL_Property& property) {
       state.expressions.push_back(property.Text());
@@ -133,15 +153,26 @@ void Print(const State& state) {
   for (const std::string& name : state.undefined) std::fprintf(stderr, "undefined: %s\n", name.c_str());
 }
 
-/// Every use means what it did. A name that nobody had defined may mean something from now on.
-void RequireSameMeaning(const State& before, const State& after) {
+/// Every use means what it did, and none but the known names are undefined. A name that nobody had defined
+/// may mean something from now on.
+void RequireSameMeaning(const State& before, const State& after, const std::set<std::string>& known) {
   for (std::size_t place = 0; place < before.references.size(); ++place) {
     for (const std::uint32_t used : before.references[place]) {
       const auto& uses = after.references[place];
       Require(std::find(uses.begin(), uses.end(), used) != uses.end(), "a use stays");
     }
   }
-  Require(after.undefined.size() <= before.undefined.size(), "no more names are undefined");
+  Require(std::includes(known.begin(), known.end(), after.undefined.begin(), after.undefined.end()),
+          "no name becomes undefined");
+}
+
+/// Undefined names, and what a rename by letters makes of them: it asks about none of them.
+std::set<std::string> RenamedByLetters(std::set<std::string> names, const std::string& oldName,
+                                       const std::string& newName) {
+  for (const std::string& name : std::set<std::string>(names)) {
+    names.insert(ReplaceInExpression(name, oldName, newName));
+  }
+  return names;
 }
 
 void CheckTaken(const State& before, const State& after, const std::string& oldName,
@@ -153,10 +184,11 @@ void CheckTaken(const State& before, const State& after, const std::string& oldN
   Require(after.symbols == symbols, "the first element of the name has the new one, and no other");
 }
 
-void Rename(TemplateCore& core, Choices& choices) {
+/// False when the new name is none that an expression can hold: what comes after it would mean little.
+bool Rename(TemplateCore& core, Choices& choices) {
   constexpr std::array<Rewriting, 3> kWays = {Rewriting::WholeNames, Rewriting::ByLetters, Rewriting::None};
   const Rewriting way = choices.AnyOf(kWays);
-  const std::string oldName = choices.AnyOf(kNames);
+  const std::string oldName = choices.AnyOf(SymbolsOf(core));
   const std::string newName = choices.Pick(8) == 7 ? choices.AnyOf(kNoNames) : choices.AnyOf(kNames);
   core.SetModified(false);
   const State before = StateOf(core);
@@ -167,7 +199,7 @@ void Rename(TemplateCore& core, Choices& choices) {
     Require(!core.Modified(), "a refused rename is no change");
     Require(after.text == before.text, "and a save writes the same");
     Require(after.symbols == before.symbols && after.references == before.references, "and the table stays");
-    return;
+    return true;
   }
   Require(core.Modified(), "a rename is a change");
   const State after = StateOf(core);
@@ -178,17 +210,20 @@ void Rename(TemplateCore& core, Choices& choices) {
   }
   CheckTaken(before, after, oldName, newName);
   if (way == Rewriting::None) Require(after.expressions == before.expressions, "the uses stay as they are");
-  if (!isValid) return;
-  if (way == Rewriting::WholeNames) RequireWholeWordsOnly(before, after, oldName, newName);
-  if (way == Rewriting::WholeNames || (way == Rewriting::ByLetters && lost.empty())) {
-    RequireSameMeaning(before, after);
+  if (!isValid) return false;
+  if (way == Rewriting::WholeNames) {
+    RequireWholeWordsOnly(before, after, oldName, newName);
+    RequireSameMeaning(before, after, before.undefined);
+  } else if (way == Rewriting::ByLetters && lost.empty()) {
+    RequireSameMeaning(before, after, RenamedByLetters(before.undefined, oldName, newName));
   }
+  return true;
 }
 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  constexpr int kMostRenames = 6;
+  constexpr int kMostRenames = 12;
   ResetExpressionScanner();
   ResetUserFunctionNames();
   Errors().Reset();
@@ -197,6 +232,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   // Settings, which user functions are part of, come with the first save.
   Require(core.SaveWrapper(fuzz::ScratchFile("start.tessal")), "the start is saved");
   Fill(core, choices);
-  for (int count = 0; count < kMostRenames && !choices.Done(); ++count) Rename(core, choices);
+  int count = 0;
+  while (count < kMostRenames && !choices.Done() && Rename(core, choices)) ++count;
   return 0;
 }
