@@ -224,8 +224,7 @@ inline constexpr MessageRow kMessages[] = {
         ErrorLevel::Notice,
         "the texts of %1 will not be kept: a save leaves out an empty list of this kind",
         "The list of user functions or of visibility groups has texts and nothing else; the format holds "
-        "such "
-        "a list only with what it lists.",
+        "such a list only with what it lists.",
         "A DESCRIPTION of VISIBILITY_GROUPS beside GROUPS = 0.",
         "Keep the text in the description of the template.",
     },

@@ -113,7 +113,10 @@ void ReadStatus::NoteUnread(KvfNode section, std::string_view key, const CEL_Pro
     return;
   }
   // A count holds nothing that its list does not.
-  if (property == nullptr) return kvfMarkRead(keyword);
+  if (property == nullptr) {
+    kvfMarkRead(keyword);
+    return;
+  }
   const ValueType type = property->Type();
   const std::string shown = Shown(keyword);
   const Finding finding = HasValueOfType(keyword, type)
