@@ -30,6 +30,9 @@ using fuzz::Require;
 using fuzz::RequireStable;
 using fuzz::Trimmed;
 
+/// A save writes a line with the present type in its place.
+constexpr std::string_view kTypeLine = "// type = ";
+
 std::size_t CountOf(std::string_view text, std::string_view part) {
   std::size_t count = 0;
   for (std::size_t place = text.find(part); place != std::string_view::npos;
@@ -90,7 +93,8 @@ void RequireNamed(const std::string& file, const std::string& saved, const LoadA
     const std::string_view text = Trimmed(line);
     if (text.starts_with("[")) heads.push_back(number);
     for (const std::string& mark : MarksIn(line)) {
-      if (saved.find(mark) != std::string::npos || text.starts_with(kComment) || IsDerived(text)) continue;
+      const bool isComment = text.starts_with(kComment) || text.starts_with(kTypeLine);
+      if (isComment || IsDerived(text) || saved.find(mark) != std::string::npos) continue;
       const auto& entries = account.Entries();
       const bool isNamed = std::any_of(entries.begin(), entries.end(), [&](const AccountEntry& entry) {
         return entry.kind != AccountKind::Absent &&

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 #include "core/template_core.h"
 #include "expr/scanner.h"
@@ -17,9 +18,13 @@ inline std::string Content(const std::string& path) {
   return *text;
 }
 
+/// Without the rest of each line that has the keyword: texts may hold it too.
 inline std::string WithoutRevision(std::string text) {
-  const std::size_t start = text.find("DOCUMENT_REVISION");
-  return start == std::string::npos ? text : text.erase(start, text.find('\n', start) - start);
+  constexpr std::string_view kKey = "DOCUMENT_REVISION";
+  for (std::size_t place = text.find(kKey); place != std::string::npos; place = text.find(kKey, place)) {
+    text.erase(place, text.find('\n', place) - place);
+  }
+  return text;
 }
 
 /// A second load of the file that a template was saved to gives the same template, with nothing that a save
