@@ -66,6 +66,8 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
   std::vector<TemplateMessages> all;
   for (const std::string& file : files) {
     TemplateMessages messages = CollectMessages(file, lowestLevel);
+    // The other files may be smaller.
+    if (RanOutOfMemory()) ComplainOfMemory();
     if (!messages.loaded) exitCode = Worse(exitCode, kCallFault);
     if (!messages.IsClean()) exitCode = Worse(exitCode, kContentFault);
     if (format == Format::Text) {
@@ -74,11 +76,13 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
       all.push_back(std::move(messages));
     }
   }
+  if (format == Format::Text) return exitCode;
+  const EndsWithoutMemory end;
   if (format == Format::Json) {
     Json list = Json::array();
     for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
     PrintLine(Json{{"files", list}}.dump());
-  } else if (format == Format::Sarif) {
+  } else {
     PrintSarif(all);
   }
   return exitCode;

@@ -41,7 +41,8 @@ PageOptions PageOf(const HtmlCall& call) {
 ExitCode RunOverview(const std::string& file) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
-  WriteOverviewText(core, BuildOverview(core), [](const std::string& part) { Print(ForTerminal(part)); });
+  WriteOverviewText(core, BuildOverview(core),
+                    [](std::string_view part) { Print(ForTerminal(std::string(part))); });
   return kFine;
 }
 

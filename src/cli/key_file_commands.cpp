@@ -2,12 +2,12 @@
 #include <algorithm>
 #include <optional>
 #include <regex>
-#include <sstream>
 
 #include "cli/commands.h"
 #include "keyfile/item_tree.h"
 #include "keyfile/reader.h"
 #include "platform/file_replacement.h"
+#include "platform/text_stream.h"
 
 namespace tessal::cli {
 
@@ -33,7 +33,7 @@ ExitCode RunTree(const std::string& file) {
   CKvfSectionItem tree;
   const ExitCode read = ReadTree(file, tree);
   if (read != kFine) return read;
-  std::ostringstream text;
+  TextStream text;
   tree.Write(text);
   Print(ForTerminal(text.str()));
   return kFine;
@@ -51,7 +51,7 @@ ExitCode RunDiff(const std::string& left, const std::string& right, const std::v
   // A file that is no key file cannot be compared: that is no difference.
   if (ReadTree(left, first) != kFine || ReadTree(right, second) != kFine) return kCallFault;
   const IgnoredNames names(ignored.begin(), ignored.end());
-  std::ostringstream report;
+  TextStream report;
   try {
     const bool same = first.Compare(second, &report, names.empty() ? nullptr : &names, onlyKeywords);
     Print(report.str());

@@ -285,6 +285,7 @@ int RunTool(int count, char** arguments) {
   try {
     app.parse(ArgumentsForParser(count, arguments));
   } catch (const CLI::ParseError& stop) {
+    const EndsWithoutMemory end;
     if (stop.get_exit_code() == 0) return app.exit(stop);
     Complain(CallFault(app, stop));
     return kCallFault;
@@ -307,7 +308,7 @@ int main(int count, char** arguments) {
   try {
     return tessal::cli::RunTool(count, arguments);
   } catch (const std::bad_alloc&) {
-    tessal::cli::Complain("out of memory");
+    tessal::cli::ComplainOfMemory();
     return tessal::cli::kCallFault;
   } catch (const std::exception& failure) {
     tessal::cli::Complain(failure.what());

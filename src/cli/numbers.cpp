@@ -21,6 +21,8 @@ constexpr char kHidden = '\x01';
 double RoundedOutOfRange(std::string_view text) {
   std::istringstream stream{std::string(text)};
   stream.imbue(std::locale::classic());
+  // Without memory there is no number, not another one.
+  stream.exceptions(std::ios::badbit);
   double value = 0.0;
   const bool inRange = static_cast<bool>(stream >> value);
   return inRange ? value : std::copysign(std::numeric_limits<double>::infinity(), value);

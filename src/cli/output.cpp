@@ -132,6 +132,18 @@ void Complain(std::string_view text) {
   std::fprintf(stderr, "tessal: %s\n", shown.c_str());
 }
 
+void ComplainOfMemory() {
+  constexpr std::string_view kLine = "tessal: not enough memory\n";
+  // Standard error is as it is; nobody is left who could be told of another failure.
+  [[maybe_unused]] const ssize_t written = write(STDERR_FILENO, kLine.data(), kLine.size());
+}
+
+EndsWithoutMemory::EndsWithoutMemory()
+    : former(std::set_new_handler([] {
+        ComplainOfMemory();
+        std::_Exit(kCallFault);
+      })) {}
+
 std::optional<std::string> InputLines::Next() {
   std::size_t searched = start;
   std::size_t end = 0;

@@ -1,6 +1,7 @@
 // Where the tool's words go: results to standard output, diagnostics to standard error.
 #pragma once
 
+#include <new>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -27,6 +28,23 @@ bool FlushOutput();
 
 /// One line on standard error, with the tool's name.
 void Complain(std::string_view text);
+
+/// The same when there is not enough memory; takes none.
+void ComplainOfMemory();
+
+/// While it lives, an allocation that fails ends the tool at once, with that line. It is for libraries that
+/// lose the exception: the JSON library needs memory to release a value, and the help is cut without a word.
+/// Nothing may be under way that has to be cleared up.
+class EndsWithoutMemory final {
+ public:
+  EndsWithoutMemory();
+  EndsWithoutMemory(const EndsWithoutMemory&) = delete;
+  EndsWithoutMemory& operator=(const EndsWithoutMemory&) = delete;
+  ~EndsWithoutMemory() { std::set_new_handler(former); }
+
+ private:
+  std::new_handler former;
+};
 
 /// The lines of standard input, one at a time: those that are there can be answered before the next is read.
 class InputLines final {

@@ -61,6 +61,11 @@ Json ResultOf(std::string_view code, std::uint32_t level, const std::string& pat
           {"locations", Json::array({location})}};
 }
 
+/// What a text begins with: the symbol that it is about.
+std::string Named(const std::string& symbol) {
+  return (symbol.empty() ? "generic" : symbol) + ": ";
+}
+
 constexpr int kIndent = 2;
 
 /// Prints the results one after the other as the elements of a list whose brackets are there.
@@ -68,16 +73,19 @@ class ResultPrinter final {
  public:
   void PrintResults(const TemplateMessages& file) {
     for (const TemplateMessage& message : file.errors) {
-      const std::string symbol = message.symbol.empty() ? "generic" : message.symbol;
-      PrintResult(
-          ResultOf(message.code, message.level, file.path, message.line, symbol + ": " + message.text));
+      PrintResult(ResultOf(message.code, message.level, file.path, message.line,
+                           Named(message.symbol) + message.text));
     }
     for (const UndefinedName& undefined : file.undefined) {
       const Finding finding("undefined-symbol", {undefined.symbol});
       for (const UndefinedName::User& user : undefined.usedBy) {
         PrintResult(ResultOf(finding.message->code, static_cast<std::uint32_t>(finding.message->level),
-                             file.path, user.line, user.symbol + ": " + finding.text));
+                             file.path, user.line, Named(user.symbol) + finding.text));
       }
+    }
+    for (const AccountEntry& entry : file.account) {
+      PrintResult(ResultOf(entry.code, static_cast<std::uint32_t>(ErrorLevel::Notice), file.path, entry.line,
+                           Named(entry.symbol) + entry.text));
     }
   }
 

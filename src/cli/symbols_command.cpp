@@ -31,6 +31,7 @@ ExitCode RunSymbols(const std::string& file, Format format) {
   TemplateCore core;
   if (!LoadOrComplain(core, file)) return kCallFault;
   if (format == Format::Json) {
+    const EndsWithoutMemory end;
     Json table = Json::array();
     for (const SymbolRecord& record : core.SymbolTable()) table.push_back(ToJson(record, core));
     PrintLine(table.dump());

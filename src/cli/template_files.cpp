@@ -1,7 +1,10 @@
 #include "cli/template_files.h"
 
+#include <algorithm>
 #include <filesystem>
+#include <new>
 #include <system_error>
+#include <vector>
 
 #include "cli/output.h"
 #include "core/error_registry.h"
@@ -13,6 +16,7 @@ namespace tessal::cli {
 namespace {
 
 void ComplainWithMessages(std::string_view what, const std::string& file) {
+  if (RanOutOfMemory()) throw std::bad_alloc();
   std::string text;
   Complain(std::string(what) + " '" + file + "'");
   for (std::size_t index = 0; index < Errors().Records().size(); ++index) {
@@ -22,6 +26,13 @@ void ComplainWithMessages(std::string_view what, const std::string& file) {
 }
 
 }  // namespace
+
+bool RanOutOfMemory() {
+  static constexpr Message kOutOfMemory("out-of-memory");
+  const std::vector<ErrorRecord>& records = Errors().Records();
+  return std::any_of(records.begin(), records.end(),
+                     [](const ErrorRecord& record) { return record.code == kOutOfMemory->code; });
+}
 
 bool LoadOrComplain(TemplateCore& core, const std::string& file) {
   const bool loaded = core.LoadWrapper(file);

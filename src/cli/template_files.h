@@ -10,7 +10,11 @@ struct AccountEntry;
 
 namespace tessal::cli {
 
-/// Loads a file. False, with every message of the load on standard error, when it could not be loaded.
+/// Whether the last load or save ended for want of memory, which is no fault of the file.
+bool RanOutOfMemory();
+
+/// Loads a file. False, with every message of the load on standard error, when it could not be loaded. Raises
+/// `std::bad_alloc` when there was no memory for it; so does a save.
 bool LoadOrComplain(TemplateCore& core, const std::string& file);
 
 /// An entry of a load's account as `check` lists it.

@@ -88,12 +88,11 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   TemplateCore core;
   messages.loaded = core.LoadWrapper(file);
   const ElementIndex elements(core);
-  std::set<std::tuple<std::uint32_t, std::string, std::string>> listed;
+  std::set<std::tuple<std::uint32_t, std::string_view, std::string_view>> listed;
   for (const ErrorRecord& record : Errors().Records()) {
     if (static_cast<int>(record.level) < lowestLevel) continue;
-    TemplateMessage message = Describe(record, elements);
-    const bool isNew = listed.emplace(message.level, message.symbol, message.text).second;
-    if (isNew) messages.errors.push_back(std::move(message));
+    const bool isNew = listed.emplace(record.level, record.symbol, WithoutLineFeed(record.text)).second;
+    if (isNew) messages.errors.push_back(Describe(record, elements));
   }
   for (const auto& undefined : core.UndefinedSymbols()) {
     messages.undefined.push_back(Describe(*undefined, elements, core));

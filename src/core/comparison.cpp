@@ -4,7 +4,6 @@
 #include <array>
 #include <map>
 #include <set>
-#include <sstream>
 #include <string_view>
 #include <unordered_map>
 #include <utility>
@@ -13,6 +12,7 @@
 #include "elements/element_field.h"
 #include "keyfile/keywords.h"
 #include "platform/ascii.h"
+#include "platform/text_stream.h"
 
 namespace tessal {
 
@@ -145,13 +145,14 @@ class Listing final {
   }
 
   void AddFurtherSections() {
+    if (core.KeptText().empty()) return;
     bool targetSeen = false;
     for (const auto& child : core.KeptTree().Children()) {
       if (child->ItemKind() != CKvfBaseItem::kSection) continue;
       const bool isTarget = !targetSeen && EqualIgnoringCase(child->name, section::kTarget);
       targetSeen = targetSeen || isTarget;
       if (isTarget) continue;
-      std::ostringstream text;
+      TextStream text;
       child->Write(text);
       Add("Further section", child->name).fields = {{"Text", text.str()}};
     }

@@ -19,12 +19,6 @@ std::string FailureText(std::string_view what, const std::string& path) {
   return "Failed to " + std::string(what) + " file '" + path + "'\n\n" + Errors().JoinErrors() + ".";
 }
 
-/// A file that cannot be read is reported by the load.
-TextEncoding EncodingOfFile(const std::string& path) {
-  std::string failure;
-  return EncodingOf(ReadWholeFile(path, failure).value_or(std::string()));
-}
-
 std::string WordOf(ChangeKind change) {
   switch (change) {
     case ChangeKind::Removed:
@@ -67,8 +61,8 @@ bool CTessalDoc::OnOpenCopy(const std::string& source, const std::string& path) 
 }
 
 bool CTessalDoc::Open(const std::string& source, const std::string& path) {
-  encoding = EncodingOfFile(source);
   const bool loaded = core.LoadCopy(source, path);
+  encoding = EncodingOf(core.SourceText());
   if (loaded && source != path && !path.empty()) NoteLossesOf(path);
   if (loaded) {
     visibilityGroup = 0;

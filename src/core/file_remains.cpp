@@ -3,7 +3,6 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
-#include <vector>
 
 #include "core/template_state.h"
 #include "keyfile/keywords.h"
@@ -12,44 +11,94 @@ namespace tessal {
 
 namespace {
 
-constexpr std::size_t kLongestShown = 200;
-
-std::string Shortened(const std::string& text) {
-  return text.size() <= kLongestShown ? text : text.substr(0, kLongestShown) + "...";
+std::string Shortened(std::string_view text) {
+  std::string shortened(text.substr(0, kLongestShown));
+  if (text.size() > kLongestShown) shortened += "...";
+  return shortened;
 }
 
-void NoteUnread(const KvfUnread& unread, LoadAccount& account) {
-  const std::string parent = kvfGetNameGlb(unread.parent);
-  const int line = kvfGetLine(unread.node);
+/// What is left out, in the order of the file. A list of more than anybody reads ends in the number of those
+/// that follow.
+class LeftOut final {
+ public:
+  explicit LeftOut(LoadAccount& loadAccount) : account(loadAccount) {}
+
+  void Note(std::string_view symbol, int line, const Finding& finding) {
+    if (++count <= kMostListed) account.Note(AccountKind::Dropped, symbol, line, finding);
+  }
+  void Finish() {
+    if (count <= kMostListed) return;
+    account.Note(AccountKind::Dropped, "", 0, {"more-dropped", {std::to_string(count - kMostListed)}});
+  }
+
+ private:
+  static constexpr std::size_t kMostListed = 100'000;
+
+  LoadAccount& account;
+  std::size_t count = 0;
+};
+
+Finding FindingOf(const KvfUnread& unread, const std::string& parent) {
   switch (unread.what) {
     case KvfUnread::What::Section:
-      account.Note(AccountKind::Dropped, parent, line,
-                   {"section-dropped", {kvfGetNameGlb(unread.node), parent}});
-      break;
+      return {"section-dropped", {Shortened(kvfGetNameGlb(unread.node)), parent}};
     case KvfUnread::What::Keyword:
-      account.Note(AccountKind::Dropped, parent, line,
-                   {"keyword-dropped", {Shortened(kvfGetSource(unread.node)), parent}});
-      break;
+      return {"keyword-dropped", {kvfGetSource(unread.node, kLongestShown), parent}};
     case KvfUnread::What::FurtherValues:
-      account.Note(AccountKind::Dropped, parent, line,
-                   {"values-dropped", {Shortened(kvfGetSource(unread.node)), parent}});
       break;
   }
+  return {"values-dropped", {kvfGetSource(unread.node, kLongestShown), parent}};
+}
+
+void NoteUnread(KvfNode target, LoadAccount& account) {
+  LeftOut list(account);
+  kvfForEachUnread(target, [&list](const KvfUnread& unread) {
+    const std::string parent = Shortened(kvfGetNameGlb(unread.parent));
+    list.Note(parent, kvfGetLine(unread.node), FindingOf(unread, parent));
+  });
+  list.Finish();
 }
 
 /// Comments on lines that follow each other are one entry, under the first of them.
-void NoteComments(const std::vector<KvfRemark>& remarks, LoadAccount& account) {
-  for (std::size_t first = 0; first < remarks.size();) {
-    std::size_t next = first + 1;
-    while (next < remarks.size() && remarks[next].line == remarks[next - 1].line + 1) ++next;
-    std::string shown = "'// " + Shortened(remarks[first].text) + "'";
-    const std::string line = std::to_string(remarks[first].line);
-    const std::string last = std::to_string(remarks[next - 1].line);
-    shown +=
-        next - first == 1 ? " in line " + line : " and those after it, lines " + line + " to " + last + ",";
-    account.Note(AccountKind::Dropped, "", remarks[first].line, {"comment-dropped", {shown}});
-    first = next;
+class CommentBlocks final {
+ public:
+  explicit CommentBlocks(LoadAccount& account) : list(account) {}
+
+  void Add(const KvfRemark& remark) {
+    if (count > 0 && remark.line == last + 1) {
+      ++count;
+    } else {
+      EndBlock();
+      first = remark;
+      count = 1;
+    }
+    last = remark.line;
   }
+  void Finish() {
+    EndBlock();
+    list.Finish();
+  }
+
+ private:
+  void EndBlock() {
+    if (count == 0) return;
+    const std::string line = std::to_string(first.line);
+    const std::string rest = count == 1
+                                 ? " in line " + line
+                                 : " and those after it, lines " + line + " to " + std::to_string(last) + ",";
+    list.Note("", first.line, {"comment-dropped", {"'// " + Shortened(first.text) + "'" + rest}});
+  }
+
+  LeftOut list;
+  KvfRemark first{};
+  int count = 0;
+  int last = 0;
+};
+
+void NoteComments(KvfHandle file, KvfNode target, LoadAccount& account) {
+  CommentBlocks blocks(account);
+  kvfForEachRemark(file, target, [&blocks](const KvfRemark& remark) { blocks.Add(remark); });
+  blocks.Finish();
 }
 
 void NoteSharedSymbols(const TemplateState& state, LoadAccount& account) {
@@ -102,12 +151,12 @@ void NoteTextsOfEmptyLists(CEL_Miscanellous& misc, LoadAccount& account) {
 void NoteWhatNobodyRead(KvfHandle file, KvfNode target, TemplateState& state) {
   LoadAccount& account = state.account;
   if (target != nullptr) {
-    for (const KvfUnread& unread : kvfGetUnread(target)) NoteUnread(unread, account);
+    NoteUnread(target, account);
     NoteSharedSymbols(state, account);
     NoteTransientTexts(state, account);
     if (state.hasMisc) NoteTextsOfEmptyLists(state.misc, account);
   }
-  NoteComments(kvfGetRemarks(file, target), account);
+  NoteComments(file, target, account);
   if (const std::size_t cut = kvfGetBytesCut(file); cut > 0) {
     account.Note(AccountKind::Dropped, "", 0, {"text-dropped", {std::to_string(cut)}});
   }

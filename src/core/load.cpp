@@ -1,6 +1,7 @@
 // Loading a template file. The key-file library gives the values that the elements are built from; the
-// reader of the item tree then reads the same file again for what the library cannot keep.
+// reader of the item tree then checks the same text, and makes its tree when somebody asks for it.
 #include <exception>
+#include <new>
 
 #include "core/error_registry.h"
 #include "core/file_remains.h"
@@ -10,6 +11,7 @@
 #include "elements/property_io.h"
 #include "keyfile/keywords.h"
 #include "keyfile/reader.h"
+#include "platform/file_replacement.h"
 
 namespace tessal {
 
@@ -27,6 +29,8 @@ class OpenFile final {
 
   KvfHandle Handle() const { return handle; }
   int Error() const { return error; }
+  /// Closes the file.
+  std::string TakeText() { return kvfTakeText(&handle); }
 
  private:
   KvfHandle handle;
@@ -47,6 +51,8 @@ Finding LoadFailure(int error, const SyntaxError& syntax, const std::string& pat
   switch (error) {
     case kKvfCannotOpen:
       return {"file-not-opened", {path}};
+    case kKvfTooLarge:
+      return {"file-too-large", {path, std::to_string(kLargestFile)}};
     case kKvfSyntaxError:
       return {"file-syntax", {std::to_string(syntax.line), std::to_string(syntax.position), syntax.near}};
     case kKvfCannotInitialiseStream:
@@ -103,23 +109,18 @@ class Reading final {
 };
 
 bool Reading::ReadFile(const std::string& path) {
-  std::string text;
-  bool isEmpty = false;
-  {
-    // Closed before the second reading, which takes the text and not the file: a pipe gives its content once.
-    const OpenFile file(path);
-    if (file.Error() != kKvfOk || file.Handle() == 0) {
-      ReportFailedLoad(file, path);
-      return false;
-    }
-    state.saveFileName = path;
-    state.templateFileName = path;
-    if (!ReadSections(file.Handle(), 1)) return false;
-    text = kvfTakeText(file.Handle());
-    isEmpty = text.empty() && kvfGetBytesCut(file.Handle()) == 0;
+  OpenFile file(path);
+  if (file.Error() != kKvfOk || file.Handle() == 0) {
+    ReportFailedLoad(file, path);
+    return false;
   }
-  state.keptTree.Clear();
-  if (ParseKeyFileTree(text, state.keptTree) == 0) {
+  state.saveFileName = path;
+  state.templateFileName = path;
+  if (!ReadSections(file.Handle(), 1)) return false;
+  const bool isCut = kvfGetBytesCut(file.Handle()) > 0;
+  state.source = file.TakeText();
+  const bool isEmpty = state.source.empty() && !isCut;
+  if (CheckKeyFileText(state.source) == 0) {
     Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(isEmpty)}});
   }
   return true;
@@ -208,6 +209,12 @@ bool Reading::Load(const std::string& path) {
     core.ValidateTemplate();
     state.flags.modified = false;
     return true;
+  } catch (const std::bad_alloc&) {
+    // What was being built may be in halves, and the report needs memory. Should that fail too, the exception
+    // goes on.
+    core.Clear();
+    Errors().ReportInFile(kLoadSymbol, 0, {"out-of-memory"});
+    return false;
   } catch (const std::exception& failure) {
     // What was built so far stays; the reason must reach the user.
     Errors().ReportInFile(kLoadSymbol, 0, {"load-failed", {failure.what()}});

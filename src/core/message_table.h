@@ -37,6 +37,14 @@ inline constexpr MessageRow kMessages[] = {
         "Check the path and the permissions of the file.",
     },
     {
+        "file-too-large",
+        ErrorLevel::Fatal,
+        "File %1 is larger than %2 bytes\n",
+        "No larger file is read: places in it are counted in 32 bits.",
+        "tessal check results.csv",
+        "Check that the path is that of a template. One of a million elements has some 400 MB.",
+    },
+    {
         "file-syntax",
         ErrorLevel::Fatal,
         "Synthax error near line %1 position %2 : %3\n",
@@ -200,6 +208,14 @@ inline constexpr MessageRow kMessages[] = {
         "Move its content to where it belongs, or to a section of its own after the template.",
     },
     {
+        "more-dropped",
+        ErrorLevel::Notice,
+        "Further parts of the file will not be kept: %1",
+        "Only the first hundred thousand that nobody reads are listed one by one.",
+        "[TESSAL_SETUP] with a hundred thousand keywords X1 = 1, X2 = 1 and so on",
+        "Look at the first of them: the file may be no template.",
+    },
+    {
         "comment-dropped",
         ErrorLevel::Notice,
         "the comment %1 will not be kept",
@@ -252,6 +268,14 @@ inline constexpr MessageRow kMessages[] = {
         "A value cannot be written in the key-file format; the save fails and the file on disk is unchanged.",
         "A description that holds both an apostrophe and a vertical bar.",
         "Change the value of the element so that the format can hold it, and save again.",
+    },
+    {
+        "out-of-memory",
+        ErrorLevel::Fatal,
+        "not enough memory",
+        "There was not enough memory to load or to save the template; the file on disk is unchanged.",
+        "A file of many gigabytes, or a limit that the system sets to each program.",
+        "Close other programs, or raise the limit.",
     },
     {
         "save-failed",
@@ -345,6 +369,14 @@ inline constexpr MessageRow kMessages[] = {
         "The expression nests deeper than the parser's 10000 states allow.",
         "An expression that begins with twenty thousand opening brackets.",
         "Split the expression into several auxiliaries.",
+    },
+    {
+        "expression-too-long",
+        ErrorLevel::Warning,
+        "Line 1 position 1 : longer than %1 characters\n",
+        "An expression of that length is not parsed, and its names are not looked up.",
+        "a sum of 600,000 names",
+        "Divide the expression among auxiliaries.",
     },
     {
         "token-too-long",

@@ -1,6 +1,8 @@
 // Saving a template: its text is written through the key-file library, joined with what its file held
 // beside the template, and put in the target's place in one step.
+#include <array>
 #include <exception>
+#include <new>
 #include <optional>
 
 #include "core/error_registry.h"
@@ -28,29 +30,27 @@ class Image final {
   ~Image() { kvfClose(&handle); }
 
   KvfHandle Handle() const { return handle; }
+  std::string TakeText() { return kvfTakeText(&handle); }
 
  private:
   KvfHandle handle;
 };
 
-void ReportFailure(std::string_view reason) {
-  Errors().ReportInFile(kSaveSymbol, 0, {"save-failed", {reason}});
-}
+constexpr Message kSaveFailed("save-failed");
+constexpr Message kOutOfMemory("out-of-memory");
 
 /// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
 /// follows a text that ends in a line end.
-std::string WithTypeLine(const std::string& text) {
+std::string WithTypeLine(std::string text) {
   std::size_t lineStart = 0;
   for (int line = 1; line < kTypeLineNumber; ++line) {
     const std::size_t lineEnd = text.find('\n', lineStart);
     if (lineEnd == std::string::npos) return text;
     lineStart = lineEnd + 1;
   }
-  std::string result = text.substr(0, lineStart);
-  result += kTypeLine;
-  result.append(text, lineStart);
-  result += "\r\n";
-  return result;
+  text.insert(lineStart, kTypeLine);
+  text += "\r\n";
+  return text;
 }
 
 /// The settings that a save under a new name stamps, so that one that fails can put them back.
@@ -129,22 +129,30 @@ bool Writing::SaveAs(const std::string& path) {
 
 bool Writing::SaveInPlace(const std::string& path) {
   const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
+  // Made before the file is replaced: nothing may fail after that.
+  std::array<std::string, 2> names;
+  std::optional<Message> failed;
   std::string reason;
   try {
+    names = {path, path};
     const std::optional<std::string> text = FileText(reason);
     if (text) reason = ReplaceFile(path, *text);
+    if (!reason.empty()) failed = kSaveFailed;
+  } catch (const std::bad_alloc&) {
+    failed = kOutOfMemory;
   } catch (const std::exception& failure) {
     reason = failure.what();
+    failed = kSaveFailed;
   }
-  if (!reason.empty()) {
+  if (failed) {
     // What is in memory stays unsaved, and its revision uncounted.
     state.misc.documentRevision.SetInt(formerRevision);
     state.flags.modified = true;
-    ReportFailure(reason);
+    Errors().ReportInFile(kSaveSymbol, 0, {*failed, {reason}});
     return false;
   }
-  state.templateFileName = path;
-  state.saveFileName = path;
+  state.templateFileName.swap(names[0]);
+  state.saveFileName.swap(names[1]);
   state.flags.modified = false;
   // From here on the file holds what the template does.
   state.account.Clear();
@@ -152,12 +160,12 @@ bool Writing::SaveInPlace(const std::string& path) {
 }
 
 std::optional<std::string> Writing::FileText(std::string& reason) {
-  const Image image;
+  Image image;
   if (!WriteSections(image.Handle())) {
     reason = "the template holds what the file format can not";
     return std::nullopt;
   }
-  return WithTypeLine(kvfGetText(image.Handle()) + KeptPart(state.keptText));
+  return WithTypeLine(image.TakeText() + KeptPart(state.keptText));
 }
 
 std::optional<std::string> Writing::CopyText(std::string& reason) {
@@ -166,6 +174,8 @@ std::optional<std::string> Writing::CopyText(std::string& reason) {
   std::optional<std::string> text;
   try {
     text = FileText(reason);
+  } catch (const std::bad_alloc&) {
+    reason = kOutOfMemory->text;
   } catch (const std::exception& failure) {
     reason = failure.what();
   }

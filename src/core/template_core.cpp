@@ -4,6 +4,7 @@
 #include "core/search_functions.h"
 #include "elements/property_io.h"
 #include "expr/function_catalogue.h"
+#include "keyfile/reader.h"
 
 namespace tessal {
 
@@ -61,12 +62,21 @@ void TemplateCore::Clear() {
   state.hasMisc = true;
   ForEachCollection([this](const auto& row) { (state.collections.*row.elements).clear(); });
   state.groupCounter = 0;
-  state.keptTree.Clear();
-  state.keptText.clear();
+  state.source = {};
+  state.keptText = {};
+  state.keptTree.reset();
   state.account.Clear();
   state.table.Clear();
   ClearLastKeyError();
   Errors().ClearErrors();
+}
+
+const CKvfSectionItem& TemplateCore::KeptTree() const {
+  if (!state.keptTree) {
+    state.keptTree = std::make_unique<CKvfSectionItem>();
+    ParseKeyFileTree(state.source, *state.keptTree);
+  }
+  return *state.keptTree;
 }
 
 std::size_t TemplateCore::GetExternalFunctionCount() const {

@@ -44,9 +44,10 @@ struct TemplateState {
   ListHeads listHeads;
   Collections collections;
   SymbolTable table;
-  CKvfSectionItem keptTree;  ///< of the file that was loaded
-  std::string keptText;      ///< what that file holds beside the template, as it is in it
-  LoadAccount account;       ///< what the load did not take over
+  std::string source;    ///< the text of the file that was loaded
+  std::string keptText;  ///< what that file holds beside the template, as it is in it
+  mutable std::unique_ptr<CKvfSectionItem> keptTree;  ///< of the source; none before somebody asks
+  LoadAccount account;                                ///< what the load did not take over
   std::uint32_t groupCounter = 0;
   std::string templateFileName;
   std::string saveFileName;

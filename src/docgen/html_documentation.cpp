@@ -1,9 +1,11 @@
 #include "docgen/html_documentation.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <algorithm>
 #include <array>
 #include <filesystem>
-#include <fstream>
 #include <span>
 #include <string_view>
 #include <system_error>
@@ -17,6 +19,7 @@
 #include "docgen/safe_text.h"
 #include "elements/choices.h"
 #include "expr/parser.h"
+#include "platform/descriptor.h"
 #include "platform/file_replacement.h"
 #include "platform/text_encoding.h"
 
@@ -417,11 +420,11 @@ std::optional<std::string> PrepareUsualPagePath(const std::string& templateFile,
 std::string PageRefusal(const std::string& path) {
   std::error_code shownByTheWrite;
   if (!std::filesystem::is_regular_file(std::filesystem::symlink_status(path, shownByTheWrite))) return {};
-  std::ifstream file(path, std::ios::binary);
-  if (!file) return "'" + path + "' exists already and can not be read";
+  const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
   std::string start(kUtf8Mark.size() + kDoctype.size(), '\0');
-  file.read(start.data(), static_cast<std::streamsize>(start.size()));
-  start.resize(static_cast<std::size_t>(file.gcount()));
+  const ssize_t count = read(file.Number(), start.data(), start.size());
+  if (count < 0) return "'" + path + "' exists already and can not be read";
+  start.resize(static_cast<std::size_t>(count));
   if (start.starts_with(kUtf8Mark)) start.erase(0, kUtf8Mark.size());
   return start.empty() || start.starts_with(kDoctype)
              ? std::string()

@@ -148,7 +148,7 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core) {
 }
 
 void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows,
-                       const std::function<void(const std::string& part)>& write) {
+                       const TextSink& write) {
   std::string text = "Template " + core.TemplateFileName() + "\r\n";
   // No line end follows the revision: the header row begins right after it.
   if (core.GetMisc() != nullptr && core.GetDocumentRevision() > 0) {
@@ -172,7 +172,7 @@ void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>&
 
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows) {
   std::string text;
-  WriteOverviewText(core, rows, [&text](const std::string& part) { text += part; });
+  WriteOverviewText(core, rows, [&text](std::string_view part) { text += part; });
   return text;
 }
 
@@ -182,7 +182,8 @@ bool ExportOverview(const TemplateCore& core, const std::string& path, std::stri
     failure = "can not write the overview over its template '" + path + "'";
     return false;
   }
-  failure = WriteOutputFile(path, OverviewText(core, BuildOverview(core)));
+  failure = WriteOutputFile(
+      path, [&core](const TextSink& write) { WriteOverviewText(core, BuildOverview(core), write); });
   return failure.empty();
 }
 

@@ -5,11 +5,11 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
-#include <functional>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "platform/file_replacement.h"
 #include "platform/uid.h"
 
 namespace tessal {
@@ -47,8 +47,7 @@ std::vector<OverviewRow> BuildOverview(const TemplateCore& core);
 std::string OverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows);
 
 /// The same, handed out row by row: each row is as wide as the longest expression.
-void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows,
-                       const std::function<void(const std::string& part)>& write);
+void WriteOverviewText(const TemplateCore& core, const std::vector<OverviewRow>& rows, const TextSink& write);
 
 /// Writes that text. False, with the reason in words, when not every byte reached the file, or when the path
 /// is that of the template itself, which is then left alone.

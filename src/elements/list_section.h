@@ -19,10 +19,9 @@ void ReadList(KvfNode parent, std::string_view name, CEL_Element* head, ReadStat
   const KvfNode list = kvfSectionByNameNum(parent, name, 1);
   if (list == nullptr) return;
   if (head != nullptr) head->Read(list, status);
-  const int count = kvfGetNoSections(list);
-  for (int number = 1; number <= count; ++number) {
+  for (KvfNode section = kvfFirstSection(list); section != nullptr; section = kvfNextSection(section)) {
     CEL_Element& element = add();
-    element.Read(kvfSectionByNum(list, number), status);
+    element.Read(section, status);
     element.SetLoaded(true);
   }
 }
@@ -53,10 +52,9 @@ void WriteList(const Elements& elements, std::string_view name, std::string_view
 /// More sub-sections than state variables raise the subscript failure.
 template <class StateVariables>
 void ReadEquations(KvfNode equations, const StateVariables& stateVariables, ReadStatus& status) {
-  const int count = kvfGetNoSections(equations);
-  for (int number = 1; number <= count; ++number) {
-    auto& variable = At(stateVariables, static_cast<std::size_t>(number - 1));
-    const KvfNode section = kvfSectionByNum(equations, number);
+  std::size_t place = 0;
+  for (KvfNode section = kvfFirstSection(equations); section != nullptr; section = kvfNextSection(section)) {
+    auto& variable = At(stateVariables, place++);
     status.Begin(variable, section);
     ReadProperty(variable.equation, section, variable.symbol.Text(), status);
     if (!HasKeyword(section, variable.symbol.Text())) status.NoteMisnamed(section, variable.equation);

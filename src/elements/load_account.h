@@ -21,6 +21,9 @@ struct PassedOverValue {
   ElementField field;
 };
 
+/// What the account quotes of the file is cut after that many bytes.
+inline constexpr std::size_t kLongestShown = 200;
+
 /// What an entry means for the file when the template is saved.
 enum class AccountKind {
   Absent,   ///< the file lacks something; a save loses nothing

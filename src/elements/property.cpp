@@ -59,7 +59,8 @@ CEL_Property::~CEL_Property() = default;
 bool CEL_Property::SetInt(std::int32_t value) {
   if (type != ValueType::Integer) return false;
   if (value == intValue) return true;
-  prevInt = std::exchange(intValue, value);
+  if (intValue != 0 || former) KeptFormer().intValue = intValue;
+  intValue = value;
   RaiseChange();
   return true;
 }
@@ -67,7 +68,8 @@ bool CEL_Property::SetInt(std::int32_t value) {
 bool CEL_Property::SetReal(double value) {
   if (type != ValueType::Real) return false;
   if (value == realValue) return true;
-  prevReal = std::exchange(realValue, value);
+  if (realValue != 0.0 || former) KeptFormer().realValue = realValue;
+  realValue = value;
   RaiseChange();
   return true;
 }
@@ -75,7 +77,8 @@ bool CEL_Property::SetReal(double value) {
 bool CEL_Property::SetBool(bool value) {
   if (type != ValueType::Boolean) return false;
   if (value == boolValue) return true;
-  prevBool = std::exchange(boolValue, value);
+  if (boolValue || former) KeptFormer().boolValue = boolValue;
+  boolValue = value;
   RaiseChange();
   return true;
 }
@@ -84,10 +87,21 @@ bool CEL_Property::SetText(std::string_view value) {
   if (!IsTextType(type)) return false;
   if (value == text) return true;
   std::string replacement(value);  // the view may lie in the text that is replaced
-  prevText = std::exchange(text, std::move(replacement));
+  if (!text.empty() || former) KeptFormer().text = std::move(text);
+  text = std::move(replacement);
   parsed.reset();
   RaiseChange();
   return true;
+}
+
+const CEL_Property::Value& CEL_Property::Former() const {
+  static const Value none;
+  return former ? *former : none;
+}
+
+CEL_Property::Value& CEL_Property::KeptFormer() {
+  if (!former) former = std::make_unique<Value>();
+  return *former;
 }
 
 std::string CEL_Property::TextOf() const {
@@ -179,17 +193,19 @@ std::string CEL_Property::SelectedFileText() const {
 }
 
 void CEL_Property::AddListener(PropertyListener& listener) {
-  if (std::find(listeners.begin(), listeners.end(), &listener) == listeners.end()) {
-    listeners.push_back(&listener);
+  if (!listeners) listeners = std::make_unique<std::vector<PropertyListener*>>();
+  if (std::find(listeners->begin(), listeners->end(), &listener) == listeners->end()) {
+    listeners->push_back(&listener);
   }
 }
 
 void CEL_Property::RaiseChange() {
   if (modifiedFlag != nullptr) *modifiedFlag = true;
-  if (!NotifyChanges()) return;
+  if (!NotifyChanges() || !listeners) return;
   // By index: a listener may register another one while it is called.
   // NOLINTNEXTLINE(modernize-loop-convert)
-  for (std::size_t index = 0; index < listeners.size(); ++index) listeners[index]->OnPropertyChanged(*this);
+  for (std::size_t index = 0; index < listeners->size(); ++index)
+    (*listeners)[index]->OnPropertyChanged(*this);
 }
 
 }  // namespace tessal

@@ -96,10 +96,10 @@ class CEL_Property final {
   double RealValue() const { return realValue; }
   bool BoolValue() const { return boolValue; }
   const std::string& Text() const { return text; }
-  std::int32_t PrevInt() const { return prevInt; }
-  double PrevReal() const { return prevReal; }
-  bool PrevBool() const { return prevBool; }
-  const std::string& PrevText() const { return prevText; }
+  std::int32_t PrevInt() const { return Former().intValue; }
+  double PrevReal() const { return Former().realValue; }
+  bool PrevBool() const { return Former().boolValue; }
+  const std::string& PrevText() const { return Former().text; }
 
   /// Setters. Each returns false, and does nothing, on a property that does not hold that type of value;
   /// setting the present value is no change.
@@ -158,23 +158,32 @@ class CEL_Property final {
   void RaiseChange();
 
  private:
+  struct Value {
+    std::int32_t intValue = 0;
+    bool boolValue = false;
+    double realValue = 0.0;
+    std::string text;
+  };
+
+  /// The value before the last change.
+  const Value& Former() const;
+  Value& KeptFormer();
+
   ValueType type;
   std::int32_t intValue = 0;
-  std::string text;
   double realValue = 0.0;
+  std::string text;
   bool boolValue = false;
-  std::int32_t prevInt = 0;
-  std::string prevText;
-  double prevReal = 0.0;
-  bool prevBool = false;
-  std::int32_t changeStamp = 0;
-  bool* modifiedFlag = nullptr;
   bool editable = true;
   bool visible = true;
-  std::int32_t selected = -1;
   bool forceReal = false;
+  std::int32_t selected = -1;
+  std::int32_t changeStamp = 0;
+  bool* modifiedFlag = nullptr;
   ChoiceList choices;
-  std::vector<PropertyListener*> listeners;
+  // A template has millions of properties, and few that were changed twice or have a listener.
+  std::unique_ptr<Value> former;
+  std::unique_ptr<std::vector<PropertyListener*>> listeners;
   mutable std::unique_ptr<const ParsedExpression> parsed;
 };
 

@@ -5,7 +5,6 @@
 #include <limits>
 #include <optional>
 #include <utility>
-#include <vector>
 
 #include "core/error_registry.h"
 #include "elements/element.h"
@@ -15,8 +14,6 @@
 namespace tessal {
 
 namespace {
-
-constexpr std::size_t kLongestShown = 200;
 
 std::string_view TypeWord(ValueType type) {
   switch (type) {
@@ -31,9 +28,7 @@ std::string_view TypeWord(ValueType type) {
 
 /// A keyword and its values as in the file, long ones cut.
 std::string Shown(KvfNode keyword) {
-  std::string text = kvfGetSource(keyword);
-  if (text.size() > kLongestShown) text = text.substr(0, kLongestShown) + "...";
-  return text;
+  return kvfGetSource(keyword, kLongestShown);
 }
 
 std::optional<double> NumberIn(std::string_view text) {
@@ -133,9 +128,14 @@ void ReadStatus::NoteUnread(KvfNode section, std::string_view key, const CEL_Pro
 }
 
 void ReadStatus::NoteMisnamed(KvfNode section, const CEL_Property& property) {
-  const std::vector<KvfUnread> unread = kvfGetUnread(section);
-  if (unread.size() != 1 || unread.front().what != KvfUnread::What::Keyword) return;
-  const KvfNode keyword = unread.front().node;
+  std::size_t count = 0;
+  KvfUnread unread{};
+  kvfForEachUnread(section, [&count, &unread](const KvfUnread& each) {
+    unread = each;
+    ++count;
+  });
+  if (count != 1 || unread.what != KvfUnread::What::Keyword) return;
+  const KvfNode keyword = unread.node;
   std::string stored;
   if (kvfGetString(kvfParamByNum(keyword, 1), stored) != kKvfOk) return;
   ElementField field;

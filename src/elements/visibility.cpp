@@ -50,20 +50,17 @@ VisibilityGroup ReadGroup(KvfNode section, int number, ReadStatus& status) {
   ReadText(group.description, section, key::kDescription, status);
   std::int32_t count = 0;
   ReadInteger(count, section, key::kLevels, status);
-  const int sections = kvfGetNoSections(section);
-  group.levels.reserve(static_cast<std::size_t>(sections));
-  for (int level = 1; level <= sections; ++level) {
-    group.levels.push_back(ReadLevel(kvfSectionByNum(section, level), status));
+  for (KvfNode level = kvfFirstSection(section); level != nullptr; level = kvfNextSection(level)) {
+    group.levels.push_back(ReadLevel(level, status));
   }
   return group;
 }
 
 std::vector<VisibilityGroup> ReadGroups(KvfNode definitions, ReadStatus& status) {
   std::vector<VisibilityGroup> groups;
-  const int sections = kvfGetNoSections(definitions);
-  groups.reserve(static_cast<std::size_t>(sections));
-  for (int group = 1; group <= sections; ++group) {
-    groups.push_back(ReadGroup(kvfSectionByNum(definitions, group), group, status));
+  int number = 0;
+  for (KvfNode group = kvfFirstSection(definitions); group != nullptr; group = kvfNextSection(group)) {
+    groups.push_back(ReadGroup(group, ++number, status));
   }
   return groups;
 }

@@ -53,16 +53,19 @@ void ExpressionNode::SetChild(std::int32_t slot, std::unique_ptr<ExpressionNode>
   children[place] = std::move(node);
 }
 
-void ExpressionNode::Release() {
-  std::vector<std::unique_ptr<ExpressionNode>> pending = std::move(children);
-  children.clear();
-  while (!pending.empty()) {
-    const std::unique_ptr<ExpressionNode> node = std::move(pending.back());
-    pending.pop_back();
-    if (!node) continue;
-    for (auto& child : node->children) pending.push_back(std::move(child));
-    node->children.clear();
-    node->kind = NodeKind::Unknown;
+void ExpressionNode::Release() noexcept {
+  // From leaf to leaf, the last first: a list of what is still to be released would need memory, and there
+  // may be none.
+  ExpressionNode* node = this;
+  while (node != this || !children.empty()) {
+    if (node->children.empty()) {
+      node = node->parent;
+      node->children.pop_back();
+    } else if (ExpressionNode* const last = node->children.back().get()) {
+      node = last;
+    } else {
+      node->children.pop_back();
+    }
   }
 }
 

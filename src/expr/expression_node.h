@@ -65,7 +65,7 @@ class ExpressionNode final {
   /// Fills a slot from 1; a slot beyond the count is ignored, and the node released.
   void SetChild(std::int32_t slot, std::unique_ptr<ExpressionNode> node);
   /// Releases all children; the node keeps its kind and text.
-  void Release();
+  void Release() noexcept;
   /// Becomes a copy of another tree, or, of nothing, an unknown node with an empty text.
   void DeepCopy(const ExpressionNode* source);
 

@@ -1,6 +1,10 @@
 %{
 // The grammar of the expression language. Its products are a tree, or a message; nothing is evaluated.
 #include "expr/parse_state.h"
+
+// The parse owns what its stack needs.
+#define YYMALLOC(size) state.Memory().Take(size)
+#define YYFREE(block) state.Memory().Release(block)
 %}
 
 %code requires {

@@ -6,6 +6,7 @@ namespace tessal {
 
 void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& identifiers) {
   identifiers.clear();
+  if (text.size() > kLongestExpression) return;
   bool clean = true;
   ExpressionScan scan(text);
   for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {

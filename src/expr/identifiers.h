@@ -9,7 +9,7 @@
 namespace tessal {
 
 /// The identifiers of a stored expression, its quotes stripped, in text order with repeats. None when the
-/// text holds something that is no token.
+/// text holds something that is no token or is longer than `kLongestExpression`.
 void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers);
 
 /// The same over a text without quotes, as views into it.

@@ -15,6 +15,7 @@
 #include "expr/expression_grammar.h"
 #include "expr/expression_node.h"
 #include "expr/scanner.h"
+#include "platform/parser_memory.h"
 
 namespace tessal {
 
@@ -22,6 +23,8 @@ class ParseState final {
  public:
   /// The text must outlive the parse.
   explicit ParseState(std::string_view expression) : text(expression), scan(expression) {}
+
+  ParserMemory& Memory() { return memory; }
 
   // The token side.
   int Pull(LexemeSpan& lexeme);
@@ -57,6 +60,7 @@ class ParseState final {
 
   std::string_view text;
   ExpressionScan scan;
+  ParserMemory memory;
   std::vector<std::unique_ptr<ExpressionNode>> store;
   std::unique_ptr<ExpressionNode> root;
   std::optional<Finding> failure;

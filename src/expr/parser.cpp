@@ -9,6 +9,11 @@ namespace tessal {
 ParsedExpression ParseExpression(std::string_view text) {
   ParsedExpression parsed;
   parsed.began = ExpressionScannerStart();
+  if (text.size() > kLongestExpression) {
+    parsed.result = ParseFailure{{"expression-too-long", {std::to_string(kLongestExpression)}}, 0, 1};
+    parsed.left = parsed.began;
+    return parsed;
+  }
   ParseState state(text);
   if (tessal_expression_grammar_parse(state) == 0 && state.Root()) {
     parsed.result = std::move(*state.Root());

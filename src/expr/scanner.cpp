@@ -32,9 +32,12 @@ ScanPosition& ScannerCounters() {
 
 ExpressionScan::ExpressionScan(std::string_view text) {
   constexpr auto kLongest = static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() - 2);
+  constexpr std::size_t kEnd = 2;
   text = text.substr(0, std::min(text.find('\0'), kLongest));
   ScannerCounters() = {};
-  BeginFlexScan(text.data(), text.size());
+  scanned.reserve(text.size() + kEnd);
+  scanned = text;
+  BeginFlexScan(scanned);
 }
 
 ExpressionScan::~ExpressionScan() {

@@ -98,6 +98,9 @@ class ScannerRest final {
   ~ScannerRest() { ResetExpressionScanner(); }
 };
 
+/// Bytes of an expression that is still parsed. A tree takes a hundred times the memory of its text.
+inline constexpr std::size_t kLongestExpression = 1'000'000;
+
 /// The scanner as the parser and the lists pull from it. One scan at a time.
 class ExpressionScan final {
  public:
@@ -117,6 +120,9 @@ class ExpressionScan final {
   std::uint32_t Lines() const;
   /// Characters taken when the present line began.
   std::uint32_t LineStart() const;
+
+ private:
+  std::string scanned;
 };
 
 }  // namespace tessal

@@ -3,6 +3,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <string>
 #include <string_view>
 
 #include "expr/scanner.h"
@@ -18,7 +19,8 @@ struct ScanPosition {
 
 ScanPosition& ScannerCounters();
 
-void BeginFlexScan(const char* text, std::size_t length);
+/// Begins a scan of the text in its place; it gets the two zero bytes that end it for the scanner.
+void BeginFlexScan(std::string& text);
 void EndFlexScan();
 TokenCode NextFlexToken();
 std::string_view FlexLexeme();

@@ -1,6 +1,10 @@
 %{
 // The grammar of key-file text, as an item tree is built from it.
 #include "keyfile/read_state.h"
+
+// The parse owns what its stack needs.
+#define YYMALLOC(size) state.Memory().Take(size)
+#define YYFREE(block) state.Memory().Release(block)
 %}
 
 %code requires {
@@ -161,7 +165,7 @@ value_path_string:
 %%
 
 static int tessal_keyfile_grammar_lex(TESSAL_KEYFILE_GRAMMAR_STYPE* value, tessal::ReadState& state) {
-  return state.NextToken(value->place);
+  return state.IsFull() ? OTHER : state.NextToken(value->place);
 }
 
 static void tessal_keyfile_grammar_error(tessal::ReadState& state, const char* message) { state.Fail(message); }

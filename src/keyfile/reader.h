@@ -13,7 +13,11 @@ class CKvfSectionItem;
 int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target);
 
 /// The same from a text in memory.
-int ParseKeyFileTree(const std::string& text, CKvfSectionItem& target);
+int ParseKeyFileTree(std::string text, CKvfSectionItem& target);
+
+/// Whether a tree can be read from a text that `KvfReadableText` has prepared: 1, or 0 with the same failure
+/// texts. The text is as it was afterwards.
+int CheckKeyFileText(std::string& readable);
 
 /// The size of a file in bytes; 0 when it cannot be opened.
 std::uintmax_t KeyFileSize(const std::string& path);

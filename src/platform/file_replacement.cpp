@@ -28,10 +28,40 @@ bool Flush(int descriptor) {
   return fsync(descriptor) == 0 || errno == EINVAL || errno == ENOTSUP;
 }
 
+/// A content that is there as a whole.
+TextSource Whole(std::string_view content) {
+  return [content](const TextSink& write) { write(content); };
+}
+
+/// Writes a content in pieces of some size. False, with the cause in `errno`, when one could not be written;
+/// those after it are dropped.
+bool WriteParts(int descriptor, const TextSource& content) {
+  constexpr std::size_t kPiece = 1U << 16U;
+  std::string piece;
+  int error = 0;
+  const auto write = [descriptor, &error](std::string_view bytes) {
+    if (error == 0 && !WriteAll(descriptor, bytes)) error = errno;
+  };
+  content([&piece, &write](std::string_view part) {
+    if (piece.size() + part.size() > kPiece) {
+      write(piece);
+      piece.clear();
+    }
+    if (part.size() > kPiece) {
+      write(part);
+    } else {
+      piece += part;
+    }
+  });
+  write(piece);
+  errno = error;
+  return error == 0;
+}
+
 /// Writes everything and closes. The empty text, or what failed; `errno` then holds the cause.
 template <class File>
-std::string_view WriteAndClose(File& file, std::string_view content) {
-  if (!WriteAll(file.Number(), content)) return "can not write file";
+std::string_view WriteAndClose(File& file, const TextSource& content) {
+  if (!WriteParts(file.Number(), content)) return "can not write file";
   if (!Flush(file.Number())) return "can not flush file";
   if (!file.Close()) return "can not close file";
   return {};
@@ -137,27 +167,29 @@ std::string ProtectionOfName(const std::string& target) {
 
 /// Writes the content into the new file, lets it take its target's place, and flushes the folder. Returns the
 /// empty text, or the reason.
-std::string FillAndTakePlace(TemporaryFile& file, const std::filesystem::path& target,
-                             const std::string& shown, std::string_view content) {
+std::string FillAndTakePlace(TemporaryFile& file, const std::filesystem::path& folder,
+                             const std::string& shown, const TextSource& content) {
   std::string_view failed = WriteAndClose(file, content);
   if (failed.empty() && !file.TakePlace()) failed = "can not replace file";
-  if (failed.empty() && !FlushFolder(target.parent_path())) failed = "can not flush the folder of file";
+  if (failed.empty() && !FlushFolder(folder)) failed = "can not flush the folder of file";
   return failed.empty() ? std::string() : Reason(failed, shown, errno);
 }
 
 /// Puts the content in the place of whatever has the name `target`; messages call it `shown`.
 std::string PutInPlace(const std::filesystem::path& target, const std::string& shown,
-                       std::string_view content) {
+                       const TextSource& content) {
+  // Made before the file is replaced: nothing may fail after that.
+  const std::filesystem::path folder = target.parent_path();
   RemoveTemporaryRests(target);
   TemporaryFile fresh(target);
   if (!fresh.IsOpen()) return Reason("can not create a file beside", shown, errno);
   if (!TakeAttributes(fresh.Number(), target.native())) {
     return Reason("can not keep the permissions of file", shown, errno);
   }
-  return FillAndTakePlace(fresh, target, shown, content);
+  return FillAndTakePlace(fresh, folder, shown, content);
 }
 
-std::string WriteStream(const std::string& path, std::string_view content) {
+std::string WriteStream(const std::string& path, const TextSource& content) {
   Descriptor stream(open(path.c_str(), O_WRONLY | O_NOCTTY | O_CLOEXEC));
   if (!stream.IsOpen()) return Reason("can not write file", path, errno);
   const std::string_view failed = WriteAndClose(stream, content);
@@ -181,17 +213,26 @@ std::optional<std::string> ReadWholeFile(const std::string& path, std::string& f
     return std::nullopt;
   }
   std::string content;
-  std::array<char, kPiece> piece{};
-  ssize_t count = 0;
-  while ((count = read(file.Number(), piece.data(), piece.size())) != 0) {
+  std::size_t size = FileSize(path);
+  // Room for the whole, and for the read that finds its end.
+  if (size <= kLargestFile) content.resize(std::exchange(size, 0) + kPiece);
+  while (size <= kLargestFile) {
+    if (size == content.size()) content.resize(size + size / 2);
+    const ssize_t count = read(file.Number(), content.data() + size, content.size() - size);
+    if (count == 0) {
+      content.resize(size);
+      return content;
+    }
     if (count > 0) {
-      content.append(piece.data(), static_cast<std::size_t>(count));
+      size += static_cast<std::size_t>(count);
     } else if (errno != EINTR) {
       failure = Reason("can not read file", path, errno);
       return std::nullopt;
     }
   }
-  return content;
+  failure = "can not read file '" + path + "': it is larger than " + std::to_string(kLargestFile) + " bytes";
+  errno = EFBIG;
+  return std::nullopt;
 }
 
 std::uintmax_t FileSize(const std::string& path) {
@@ -201,9 +242,10 @@ std::uintmax_t FileSize(const std::string& path) {
 }
 
 std::string WriteFreshFile(const std::string& path, std::string_view content) {
+  const std::filesystem::path folder = std::filesystem::path(path).parent_path();
   RemoveTemporaryRests(path);
   TemporaryFile fresh(path);
-  return fresh.IsOpen() ? FillAndTakePlace(fresh, path, path, content)
+  return fresh.IsOpen() ? FillAndTakePlace(fresh, folder, path, Whole(content))
                         : Reason("can not create a file beside", path, errno);
 }
 
@@ -212,7 +254,7 @@ std::string ReplaceFile(const std::string& target, std::string_view content) {
   const std::optional<std::filesystem::path> real = RealTarget(target, error);
   if (!real) return Reason("can not write file", target, error);
   std::string reason = ProtectionOfAllNames(real->native());
-  return reason.empty() ? PutInPlace(*real, target, content) : reason;
+  return reason.empty() ? PutInPlace(*real, target, Whole(content)) : reason;
 }
 
 bool IsStream(const std::string& path) {
@@ -222,6 +264,10 @@ bool IsStream(const std::string& path) {
 }
 
 std::string WriteOutputFile(const std::string& path, std::string_view content) {
+  return WriteOutputFile(path, Whole(content));
+}
+
+std::string WriteOutputFile(const std::string& path, const TextSource& content) {
   if (IsStream(path)) return WriteStream(path, content);
   std::string reason = ProtectionOfName(path);
   return reason.empty() ? PutInPlace(path, path, content) : reason;

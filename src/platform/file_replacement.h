@@ -3,13 +3,18 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
 
 namespace tessal {
 
-/// Reads a whole file. Nothing, with the reason in `failure`, when that fails.
+/// No file is read that has more bytes: places in it are counted in 32 bits.
+inline constexpr std::uintmax_t kLargestFile = 1'000'000'000;
+
+/// Reads a whole file. Nothing, with the reason in `failure`, when that fails; for one that is too large
+/// `errno` is EFBIG.
 std::optional<std::string> ReadWholeFile(const std::string& path, std::string& failure);
 
 /// The size in bytes; 0 for a file that cannot be opened.
@@ -32,6 +37,14 @@ std::string ReplaceFile(const std::string& target, std::string_view content);
 /// nor into the other names of a file, which keep the old content. A pipe, a terminal or a device of that
 /// kind, by a link too, has no content that could be lost and is written as it is.
 std::string WriteOutputFile(const std::string& path, std::string_view content);
+
+/// Takes the parts of a text, one after the other.
+using TextSink = std::function<void(std::string_view part)>;
+/// Makes a text part by part, so that it is never there as a whole.
+using TextSource = std::function<void(const TextSink& write)>;
+
+/// The same for a content that is made while it is written.
+std::string WriteOutputFile(const std::string& path, const TextSource& content);
 
 /// Whether the path leads to a pipe, a terminal or a device of that kind.
 bool IsStream(const std::string& path);

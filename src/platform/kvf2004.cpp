@@ -1,25 +1,32 @@
 #include "platform/kvf2004.h"
 
 #include <algorithm>
+#include <array>
+#include <cerrno>
 #include <cmath>
 #include <map>
-#include <memory>
+#include <optional>
 #include <utility>
+#include <variant>
 
 #include "platform/ascii.h"
 #include "platform/file_replacement.h"
-#include "platform/kvf_item.h"
+#include "platform/kvf_image.h"
 #include "platform/kvf_number.h"
 #include "platform/kvf_text.h"
+#include "platform/kvf_writer.h"
 #include "platform/number_text.h"
 
 namespace tessal {
 
 namespace {
 
-/// The library's state: the open images, and what went wrong last.
+/// A file that was read, or one under construction.
+using KvfFile = std::variant<KvfImage, KvfWriter>;
+
+/// The library's state: the open files, and what went wrong last.
 struct Library {
-  std::map<KvfHandle, std::unique_ptr<KvfImage>> images;
+  std::map<KvfHandle, KvfFile> files;
   KvfHandle lastHandle = 0;
   int lastError = kKvfOk;
   KvfSyntaxError syntaxError;
@@ -36,24 +43,49 @@ int Note(int error) {
   return error;
 }
 
-KvfImage* ImageOf(KvfHandle handle) {
-  auto& images = TheLibrary().images;
-  const auto hit = images.find(handle);
-  if (hit != images.end()) return hit->second.get();
-  Note(kKvfBadHandle);
-  return nullptr;
+/// The file of a handle, as an image or a writer; none for another handle.
+template <class File>
+File* FileOf(KvfHandle handle) {
+  auto& files = TheLibrary().files;
+  const auto hit = files.find(handle);
+  File* file = hit == files.end() ? nullptr : std::get_if<File>(&hit->second);
+  if (file == nullptr) Note(kKvfBadHandle);
+  return file;
 }
 
-KvfHandle Keep(std::unique_ptr<KvfImage> image) {
+/// Opens a file made of the arguments, and gives its handle.
+template <class File, class... Arguments>
+KvfHandle Open(Arguments&&... arguments) {
   Library& library = TheLibrary();
   const KvfHandle handle = ++library.lastHandle;
-  library.images.emplace(handle, std::move(image));
+  library.files.try_emplace(handle, std::in_place_type<File>, std::forward<Arguments>(arguments)...);
   return handle;
 }
 
-KvfNode NthOfName(const std::vector<KvfItem*>& items, std::string_view name, int number) {
-  for (const KvfItem* item : items) {
-    if (EqualIgnoringCase(item->text, name) && --number == 0) return item;
+bool Is(KvfNode node, KvfItem::Type type) {
+  if (node != nullptr && node->type == type) return true;
+  Note(kKvfBadNode);
+  return false;
+}
+
+const KvfSection* AsSection(KvfNode node) {
+  return Is(node, KvfItem::Type::Section) ? static_cast<const KvfSection*>(node) : nullptr;
+}
+
+const KvfKeyword* AsKeyword(KvfNode node) {
+  return Is(node, KvfItem::Type::Keyword) ? static_cast<const KvfKeyword*>(node) : nullptr;
+}
+
+/// The section of a node, or none, from that entry on.
+const KvfEntry* SectionFrom(const KvfEntry* entry) {
+  while (entry != nullptr && entry->type != KvfItem::Type::Section) entry = entry->next;
+  return entry;
+}
+
+/// The n-th of a section's keywords or sub-sections that has a name.
+const KvfEntry* NthOfName(const KvfSection& section, KvfItem::Type type, std::string_view name, int number) {
+  for (const KvfEntry* entry = section.first; entry != nullptr; entry = entry->next) {
+    if (entry->type == type && EqualIgnoringCase(entry->Text(), name) && --number == 0) return entry;
   }
   return nullptr;
 }
@@ -64,45 +96,34 @@ KvfNode Asked(KvfNode section) {
   return section;
 }
 
-KvfNode Nth(const std::vector<KvfItem*>& items, int number) {
-  const auto place = static_cast<std::size_t>(number) - 1;
-  return number >= 1 && place < items.size() ? items[place] : nullptr;
-}
-
-bool Is(KvfNode node, KvfItem::Type type) {
-  if (node != nullptr && node->type == type) return true;
-  Note(kKvfBadNode);
-  return false;
-}
-
 bool IsText(const KvfItem& parameter) {
   return parameter.value == KvfItem::Value::Quoted || parameter.value == KvfItem::Value::Path;
 }
 
-/// The keyword that takes the next parameter, or none.
-KvfItem* OpenKeyword(KvfHandle handle) {
-  KvfImage* image = ImageOf(handle);
-  if (image == nullptr) return nullptr;
-  if (image->openKeyword == nullptr) Note(kKvfBadNode);
-  return image->openKeyword;
-}
-
-int AddParameter(KvfHandle handle, KvfItem::Value value, std::string text) {
-  KvfItem* keyword = OpenKeyword(handle);
-  if (keyword == nullptr) return TheLibrary().lastError;
-  TheLibrary().images.at(handle)->AddParameter(*keyword, value, std::move(text));
+/// Adds a value to the open keyword by `add(writer)`.
+template <class Add>
+int AddValue(KvfHandle handle, Add add) {
+  KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
+  if (!writer->HasOpenKeyword()) return Note(kKvfBadNode);
+  add(*writer);
   return kKvfOk;
 }
 
 int OpenSection(KvfHandle handle, std::string_view name, bool asTarget) {
-  KvfImage* image = ImageOf(handle);
-  if (image == nullptr) return kKvfBadHandle;
+  KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
   if (!IsKvfName(name)) return Note(kKvfNotWritable);
-  if (asTarget != image->openSections.empty()) return Note(kKvfBadNode);
-  KvfItem& parent = asTarget ? image->Root() : *image->openSections.back();
-  image->openSections.push_back(&image->AddSection(parent, name, 0));
-  image->openKeyword = nullptr;
+  if (asTarget == writer->HasOpenSection()) return Note(kKvfBadNode);
+  writer->OpenSection(name);
   return kKvfOk;
+}
+
+/// The quote that a text can be written in; 0 when the format cannot hold it.
+char QuoteFor(std::string_view text) {
+  if (text.find('\0') != std::string_view::npos) return '\0';
+  if (text.find('\'') == std::string_view::npos) return '\'';
+  return text.find('|') == std::string_view::npos ? '|' : '\0';
 }
 
 }  // namespace
@@ -112,26 +133,27 @@ KvfHandle kvfLoadFile(const std::string& path, int /*mode*/) {
   library.lastError = kKvfOk;
   library.syntaxError = {};
   std::string failure;
-  const std::optional<std::string> bytes = ReadWholeFile(path, failure);
+  std::optional<std::string> bytes = ReadWholeFile(path, failure);
   if (!bytes) {
-    Note(kKvfCannotOpen);
+    Note(errno == EFBIG ? kKvfTooLarge : kKvfCannotOpen);
     return 0;
   }
-  return kvfLoadText(*bytes);
+  return kvfLoadText(*std::move(bytes));
 }
 
-KvfHandle kvfLoadText(std::string_view bytes) {
+KvfHandle kvfLoadText(std::string bytes) {
   Library& library = TheLibrary();
   library.lastError = kKvfOk;
   library.syntaxError = {};
-  auto image = std::make_unique<KvfImage>();
-  image->source = KvfReadableText(bytes);
-  image->bytesCut = bytes.size() - std::min(bytes.find('\0'), bytes.size());
-  if (!ReadKvfImage(*image, library.syntaxError)) {
+  const std::size_t bytesCut = bytes.size() - std::min(bytes.find('\0'), bytes.size());
+  KvfHandle handle = Open<KvfImage>(KvfReadableText(std::move(bytes)));
+  KvfImage& image = *FileOf<KvfImage>(handle);
+  image.bytesCut = bytesCut;
+  if (!ReadKvfImage(image, library.syntaxError)) {
+    kvfClose(&handle);
     Note(kKvfSyntaxError);
-    return 0;
   }
-  return Keep(std::move(image));
+  return handle;
 }
 
 int kvfGetErrorGlb() {
@@ -140,7 +162,7 @@ int kvfGetErrorGlb() {
 
 int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& text) {
   const Library& library = TheLibrary();
-  if (handle != 0 && ImageOf(handle) == nullptr) return kKvfBadHandle;
+  if (handle != 0 && FileOf<KvfImage>(handle) == nullptr) return kKvfBadHandle;
   line = library.syntaxError.line;
   position = library.syntaxError.position;
   text = library.syntaxError.text;
@@ -148,30 +170,46 @@ int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& tex
 }
 
 KvfHandle kvfCreate() {
-  return Keep(std::make_unique<KvfImage>());
+  return Open<KvfWriter>();
 }
 
 void kvfClose(KvfHandle* handle) {
   if (handle == nullptr || *handle == 0) return;
-  if (TheLibrary().images.erase(*handle) == 0) Note(kKvfBadHandle);
+  if (TheLibrary().files.erase(*handle) == 0) Note(kKvfBadHandle);
   *handle = 0;
 }
 
 KvfNode kvfTargetByNameNum(KvfHandle handle, std::string_view name, int number) {
-  KvfImage* image = ImageOf(handle);
-  return image == nullptr ? nullptr : Asked(NthOfName(image->Root().sections, name, number));
+  const KvfImage* image = FileOf<KvfImage>(handle);
+  return image == nullptr ? nullptr : Asked(NthOfName(image->root, KvfItem::Type::Section, name, number));
 }
 
 KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number) {
-  return Is(node, KvfItem::Type::Section) ? Asked(NthOfName(node->sections, name, number)) : nullptr;
+  const KvfSection* section = AsSection(node);
+  return section == nullptr ? nullptr : Asked(NthOfName(*section, KvfItem::Type::Section, name, number));
 }
 
 int kvfGetNoSections(KvfNode node) {
-  return Is(node, KvfItem::Type::Section) ? static_cast<int>(node->sections.size()) : 0;
+  const KvfSection* section = AsSection(node);
+  return section == nullptr ? 0 : static_cast<int>(section->count);
 }
 
 KvfNode kvfSectionByNum(KvfNode node, int number) {
-  return Is(node, KvfItem::Type::Section) ? Asked(Nth(node->sections, number)) : nullptr;
+  const KvfSection* parent = AsSection(node);
+  if (parent == nullptr || number < 1) return nullptr;
+  const KvfEntry* section = SectionFrom(parent->first);
+  while (section != nullptr && --number > 0) section = SectionFrom(section->next);
+  return Asked(section);
+}
+
+KvfNode kvfFirstSection(KvfNode node) {
+  const KvfSection* section = AsSection(node);
+  return section == nullptr ? nullptr : Asked(SectionFrom(section->first));
+}
+
+KvfNode kvfNextSection(KvfNode node) {
+  const KvfSection* section = AsSection(node);
+  return section == nullptr ? nullptr : Asked(SectionFrom(section->next));
 }
 
 bool kvfIsSection(KvfNode node) {
@@ -179,34 +217,41 @@ bool kvfIsSection(KvfNode node) {
 }
 
 bool kvfHasSection(KvfNode node, std::string_view name) {
-  return Is(node, KvfItem::Type::Section) && NthOfName(node->sections, name, 1) != nullptr;
+  const KvfSection* section = AsSection(node);
+  return section != nullptr && NthOfName(*section, KvfItem::Type::Section, name, 1) != nullptr;
 }
 
 std::string kvfGetNameGlb(KvfNode node) {
   const bool named = node != nullptr && node->type != KvfItem::Type::Parameter;
-  return named ? node->text : std::string();
+  return std::string(named ? node->Text() : std::string_view());
 }
 
 int kvfGetLine(KvfNode node) {
-  return node == nullptr ? 0 : node->line;
+  const bool isEntry = node != nullptr && node->type != KvfItem::Type::Parameter;
+  return isEntry ? static_cast<const KvfEntry*>(node)->line : 0;
 }
 
-KvfNode kvfKeywordByNameNum(KvfNode section, std::string_view name, int number) {
-  return Is(section, KvfItem::Type::Section) ? NthOfName(section->keywords, name, number) : nullptr;
+KvfNode kvfKeywordByNameNum(KvfNode node, std::string_view name, int number) {
+  const KvfSection* section = AsSection(node);
+  return section == nullptr ? nullptr : NthOfName(*section, KvfItem::Type::Keyword, name, number);
 }
 
-int kvfGetNoParams(KvfNode keyword) {
-  return Is(keyword, KvfItem::Type::Keyword) ? static_cast<int>(keyword->keywords.size()) : 0;
+int kvfGetNoParams(KvfNode node) {
+  const KvfKeyword* keyword = AsKeyword(node);
+  return keyword == nullptr ? 0 : static_cast<int>(keyword->count);
 }
 
-KvfNode kvfParamByNum(KvfNode keyword, int number) {
-  return Is(keyword, KvfItem::Type::Keyword) ? Nth(keyword->keywords, number) : nullptr;
+KvfNode kvfParamByNum(KvfNode node, int number) {
+  const KvfKeyword* keyword = AsKeyword(node);
+  const bool isThere =
+      keyword != nullptr && number >= 1 && static_cast<std::uint32_t>(number) <= keyword->count;
+  return isThere ? &keyword->Parameters()[static_cast<std::size_t>(number) - 1] : nullptr;
 }
 
 int kvfGetInt(KvfNode parameter, std::int32_t& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
   if (parameter->value != KvfItem::Value::Integer) return Note(kKvfWrongType);
-  value = KvfInteger(parameter->text);
+  value = KvfInteger(parameter->Text());
   parameter->wasRead = true;
   return kKvfOk;
 }
@@ -214,87 +259,117 @@ int kvfGetInt(KvfNode parameter, std::int32_t& value) {
 int kvfGetDouble(KvfNode parameter, double& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
   if (IsText(*parameter) || parameter->value == KvfItem::Value::Boolean) return Note(kKvfWrongType);
-  value = KvfReal(parameter->text);
+  value = KvfReal(parameter->Text());
   parameter->wasRead = true;
   return kKvfOk;
 }
 
 int kvfGetString(KvfNode parameter, std::string& value) {
   if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
-  value = parameter->text;
+  value = parameter->Text();
   parameter->wasRead = true;
   return kKvfOk;
 }
 
-std::vector<KvfUnread> kvfGetUnread(KvfNode section) {
-  std::vector<KvfUnread> unread;
-  if (!Is(section, KvfItem::Type::Section)) return unread;
+namespace {
+
+/// What of a keyword is unread, if anything is.
+std::optional<KvfUnread::What> UnreadOf(const KvfKeyword& keyword) {
+  const auto parameters = keyword.Parameters();
+  const auto read = static_cast<std::size_t>(
+      std::count_if(parameters.begin(), parameters.end(), [](const KvfItem& each) { return each.wasRead; }));
+  if (read == parameters.size()) return std::nullopt;
+  return read == 0 ? KvfUnread::What::Keyword : KvfUnread::What::FurtherValues;
+}
+
+}  // namespace
+
+void kvfForEachUnread(KvfNode node, const std::function<void(const KvfUnread&)>& visit) {
+  const KvfSection* section = AsSection(node);
+  if (section == nullptr) return;
   struct Step {
-    KvfNode section;
-    std::size_t next;
+    const KvfSection* section;
+    const KvfEntry* next;
   };
   // Sections may nest deeper than calls.
-  std::vector<Step> path{{section, 0}};
+  std::vector<Step> path{{section, section->first}};
   while (!path.empty()) {
-    const KvfNode parent = path.back().section;
-    if (path.back().next >= parent->order.size()) {
+    const KvfSection* parent = path.back().section;
+    const KvfEntry* entry = path.back().next;
+    if (entry == nullptr) {
       path.pop_back();
       continue;
     }
-    const KvfNode item = parent->order[path.back().next++];
-    if (item->type == KvfItem::Type::Section) {
-      if (item->wasRead) {
-        path.push_back({item, 0});
-      } else {
-        unread.push_back({KvfUnread::What::Section, item, parent});
-      }
-      continue;
+    path.back().next = entry->next;
+    if (entry->type == KvfItem::Type::Keyword) {
+      const auto what = UnreadOf(static_cast<const KvfKeyword&>(*entry));
+      if (what) visit({*what, entry, parent});
+    } else if (!entry->wasRead) {
+      visit({KvfUnread::What::Section, entry, parent});
+    } else {
+      const auto& child = static_cast<const KvfSection&>(*entry);
+      path.push_back({&child, child.first});
     }
-    const auto& values = item->keywords;
-    const auto read =
-        std::count_if(values.begin(), values.end(), [](const KvfItem* v) { return v->wasRead; });
-    if (static_cast<std::size_t>(read) == values.size()) continue;
-    unread.push_back({read == 0 ? KvfUnread::What::Keyword : KvfUnread::What::FurtherValues, item, parent});
   }
-  return unread;
 }
 
-void kvfMarkRead(KvfNode keyword) {
-  if (!Is(keyword, KvfItem::Type::Keyword)) return;
-  for (const KvfItem* value : keyword->keywords) value->wasRead = true;
+void kvfMarkRead(KvfNode node) {
+  const KvfKeyword* keyword = AsKeyword(node);
+  if (keyword == nullptr) return;
+  for (const KvfItem& parameter : keyword->Parameters()) parameter.wasRead = true;
 }
 
-std::string kvfGetSource(KvfNode keyword) {
+std::string kvfGetSource(KvfNode node, std::size_t longest) {
   std::string text;
-  if (Is(keyword, KvfItem::Type::Keyword)) AppendKvfKeyword(*keyword, text);
+  const KvfKeyword* keyword = AsKeyword(node);
+  if (keyword == nullptr) return text;
+  text += keyword->Text();
+  text += " = ";
+  std::string_view separator;
+  for (const KvfItem& parameter : keyword->Parameters()) {
+    constexpr std::array<std::string_view, 5> kQuotes = {"", "", "", "'", "|"};
+    const std::string_view quote = kQuotes.at(static_cast<std::size_t>(parameter.value));
+    text += separator;
+    text += quote;
+    text += parameter.Text().substr(0, longest);
+    text += quote;
+    if (text.size() > longest) return text.substr(0, longest) + "...";
+    separator = ", ";
+  }
   return text;
 }
 
 bool kvfFitsInt(KvfNode parameter) {
-  return !Is(parameter, KvfItem::Type::Parameter) || KvfIntegerFits(parameter->text);
+  return !Is(parameter, KvfItem::Type::Parameter) || KvfIntegerFits(parameter->Text());
 }
 
 bool kvfFitsDouble(KvfNode parameter) {
-  return !Is(parameter, KvfItem::Type::Parameter) || KvfRealFits(parameter->text);
+  return !Is(parameter, KvfItem::Type::Parameter) || KvfRealFits(parameter->Text());
 }
 
-std::string kvfTakeText(KvfHandle handle) {
-  KvfImage* image = ImageOf(handle);
-  return image == nullptr ? std::string() : std::exchange(image->source, {});
+std::string kvfTakeText(KvfHandle* handle) {
+  std::string text;
+  auto& files = TheLibrary().files;
+  const auto hit = handle == nullptr ? files.end() : files.find(*handle);
+  if (hit != files.end()) {
+    KvfImage* image = std::get_if<KvfImage>(&hit->second);
+    text = image != nullptr ? std::move(image->source) : std::get<KvfWriter>(hit->second).TakeText();
+  }
+  kvfClose(handle);
+  return text;
 }
 
 std::string kvfTextBeside(KvfHandle handle, KvfNode target) {
-  const KvfImage* image = ImageOf(handle);
+  const KvfImage* image = FileOf<KvfImage>(handle);
   return image == nullptr ? std::string() : KvfTextBeside(*image, target);
 }
 
-std::vector<KvfRemark> kvfGetRemarks(KvfHandle handle, KvfNode target) {
-  const KvfImage* image = ImageOf(handle);
-  return image == nullptr ? std::vector<KvfRemark>() : KvfRemarksOf(*image, target);
+void kvfForEachRemark(KvfHandle handle, KvfNode target, const std::function<void(const KvfRemark&)>& visit) {
+  if (const KvfImage* image = FileOf<KvfImage>(handle)) ForEachKvfRemark(*image, target, visit);
 }
 
 std::size_t kvfGetBytesCut(KvfHandle handle) {
-  const KvfImage* image = ImageOf(handle);
+  const KvfImage* image = FileOf<KvfImage>(handle);
   return image == nullptr ? 0 : image->bytesCut;
 }
 
@@ -307,50 +382,43 @@ int kvfAddSection(KvfHandle handle, std::string_view name) {
 }
 
 int kvfEndSection(KvfHandle handle) {
-  KvfImage* image = ImageOf(handle);
-  if (image == nullptr) return kKvfBadHandle;
-  if (image->openSections.empty()) return Note(kKvfBadNode);
-  image->openSections.pop_back();
-  image->openKeyword = nullptr;
+  KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
+  if (!writer->HasOpenSection()) return Note(kKvfBadNode);
+  writer->CloseSection();
   return kKvfOk;
 }
 
 int kvfAddKeyword(KvfHandle handle, std::string_view name) {
-  KvfImage* image = ImageOf(handle);
-  if (image == nullptr) return kKvfBadHandle;
-  image->openKeyword = nullptr;
-  if (image->openSections.empty()) return Note(kKvfBadNode);
+  KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
+  writer->EndKeyword();
+  if (!writer->HasOpenSection()) return Note(kKvfBadNode);
   if (!IsKvfName(name)) return Note(kKvfNotWritable);
-  image->openKeyword = &image->AddKeyword(*image->openSections.back(), name, 0);
+  writer->AddKeyword(name);
   return kKvfOk;
 }
 
 int kvfAddInt(KvfHandle handle, std::int32_t value) {
-  return AddParameter(handle, KvfItem::Value::Integer, std::to_string(value));
+  return AddValue(handle, [value](KvfWriter& writer) { writer.AddNumber(std::to_string(value)); });
 }
 
 int kvfAddDouble(KvfHandle handle, double value) {
   if (!std::isfinite(value)) return Note(kKvfNotWritable);
-  return AddParameter(handle, KvfItem::Value::Real, ShortestNumberText(value));
+  return AddValue(handle, [value](KvfWriter& writer) { writer.AddNumber(ShortestNumberText(value)); });
 }
 
 int kvfAddString(KvfHandle handle, std::string_view value) {
-  const bool hasQuote = value.find('\'') != std::string_view::npos;
-  const bool hasBar = value.find('|') != std::string_view::npos;
-  if ((hasQuote && hasBar) || value.find('\0') != std::string_view::npos) return Note(kKvfNotWritable);
-  return AddParameter(handle, hasQuote ? KvfItem::Value::Path : KvfItem::Value::Quoted, std::string(value));
+  const char quote = QuoteFor(value);
+  if (quote == '\0') return Note(kKvfNotWritable);
+  return AddValue(handle, [value, quote](KvfWriter& writer) { writer.AddText(value, quote); });
 }
 
 int kvfWrite(KvfHandle handle, const std::string& path) {
-  KvfImage* image = ImageOf(handle);
-  if (image == nullptr) return kKvfBadHandle;
-  TheLibrary().writeFailure = WriteFreshFile(path, WriteKvfImage(*image));
+  const KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
+  TheLibrary().writeFailure = WriteFreshFile(path, writer->Text());
   return TheLibrary().writeFailure.empty() ? kKvfOk : Note(kKvfWriteFailed);
-}
-
-std::string kvfGetText(KvfHandle handle) {
-  KvfImage* image = ImageOf(handle);
-  return image == nullptr ? std::string() : WriteKvfImage(*image);
 }
 
 std::string kvfGetWriteFailure() {

@@ -6,9 +6,9 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace tessal {
 
@@ -28,13 +28,14 @@ enum KvfError : int {
   kKvfWrongType = 1007,    ///< a parameter of another type than asked for
   kKvfNotWritable = 1008,  ///< a text or name that the format cannot hold
   kKvfWriteFailed = 1009,  ///< the file system refused a byte
+  kKvfTooLarge = 1010,     ///< a file above `kLargestFile`
 };
 
 /// Reads and parses a file. Gives 0 on failure; `kvfGetErrorGlb` then says why. The mode is always 1.
 KvfHandle kvfLoadFile(const std::string& path, int mode);
 
 /// The same from bytes in memory.
-KvfHandle kvfLoadText(std::string_view bytes);
+KvfHandle kvfLoadText(std::string bytes);
 
 /// The last error of the library, 0 for none.
 int kvfGetErrorGlb();
@@ -52,7 +53,10 @@ void kvfClose(KvfHandle* handle);
 KvfNode kvfTargetByNameNum(KvfHandle handle, std::string_view name, int number);
 KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number);
 int kvfGetNoSections(KvfNode node);
+/// Counts from the first; who wants them all asks for the first and then for each next one.
 KvfNode kvfSectionByNum(KvfNode node, int number);
+KvfNode kvfFirstSection(KvfNode node);
+KvfNode kvfNextSection(KvfNode section);
 bool kvfIsSection(KvfNode node);
 /// Whether there is a sub-section of that name. Asking is no reading.
 bool kvfHasSection(KvfNode node, std::string_view name);
@@ -85,26 +89,30 @@ struct KvfUnread {
 /// A comment of a file: its line, from 1, and its text.
 struct KvfRemark {
   int line;
-  std::string text;
+  std::string_view text;
 };
 
-/// The unread parts of a section, in the order of the file; of a section that is unread as a whole no parts.
-std::vector<KvfUnread> kvfGetUnread(KvfNode section);
+/// Visits the unread parts of a section, in the order of the file; of a section that is unread as a whole no
+/// parts.
+void kvfForEachUnread(KvfNode section, const std::function<void(const KvfUnread&)>& visit);
 /// Counts a keyword as read, with all its values.
 void kvfMarkRead(KvfNode keyword);
-/// A keyword with its values as the file has them, on one line but for line feeds in its texts.
-std::string kvfGetSource(KvfNode keyword);
+/// A keyword with its values as the file has them, on one line but for line feeds in its texts; what is
+/// longer ends in three points.
+std::string kvfGetSource(KvfNode keyword, std::size_t longest);
 /// Whether a number fits the type that it is read as; otherwise its nearest limit is read.
 bool kvfFitsInt(KvfNode parameter);
 bool kvfFitsDouble(KvfNode parameter);
 
-/// The text of a loaded file, for another reader. The library gives it away.
-std::string kvfTakeText(KvfHandle handle);
+/// The text of a file, which is closed: of one that was loaded what was read, of a new one what `kvfWrite`
+/// writes. Empty for a bad handle.
+std::string kvfTakeText(KvfHandle* handle);
 /// The text beside a target, from the first top-level section on, with CRLF line ends and no blank lines at
 /// its ends. With none for the target, all of it.
 std::string kvfTextBeside(KvfHandle handle, KvfNode target);
-/// The comments in the head of the file and inside the target, without those that the library itself writes.
-std::vector<KvfRemark> kvfGetRemarks(KvfHandle handle, KvfNode target);
+/// Visits the comments in the head of the file and inside the target, without those that the library itself
+/// writes.
+void kvfForEachRemark(KvfHandle handle, KvfNode target, const std::function<void(const KvfRemark&)>& visit);
 /// How many bytes of the file lie after a zero byte, and so were not read.
 std::size_t kvfGetBytesCut(KvfHandle handle);
 
@@ -124,8 +132,6 @@ int kvfAddString(KvfHandle handle, std::string_view value);
 /// every byte reached the file and was flushed to it, else an error number; `kvfGetWriteFailure` then says
 /// why in words.
 int kvfWrite(KvfHandle handle, const std::string& path);
-/// The text that `kvfWrite` writes; empty for a bad handle.
-std::string kvfGetText(KvfHandle handle);
 std::string kvfGetWriteFailure();
 
 }  // namespace tessal

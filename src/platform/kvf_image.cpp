@@ -1,22 +1,17 @@
-// Reading and writing the images of the key-file library. Reading is milder than the grammar of the item
-// tree: no line feed is needed at either end, and comments may be anywhere a line may.
+// Reading key-file text into an image. It is milder than the grammar of the item tree: no line feed is needed
+// at either end, and comments may be anywhere a line may.
+#include "platform/kvf_image.h"
+
 #include <algorithm>
-#include <utility>
+#include <memory>
 
 #include "platform/ascii.h"
-#include "platform/kvf_item.h"
-#include "platform/kvf_text.h"
+#include "platform/kvf_writer.h"
 
 namespace tessal {
 
 namespace {
 
-constexpr std::string_view kHeader =
-    "// Tessal template\n"
-    "// Key-file text: sections, keywords, parameters\n"
-    "// Written by the template editor\n"
-    "\n";
-constexpr std::size_t kBlanksPerLevel = 3;
 constexpr std::size_t kLongestNear = 40;
 
 std::string_view Trimmed(std::string_view text) {
@@ -38,7 +33,7 @@ bool IsOfHeader(std::string_view comment) {
     const std::string_view type = comment.substr(kTypePrefix.size());
     return std::all_of(type.begin(), type.end(), IsAsciiDigit);
   }
-  std::string_view header = kHeader;
+  std::string_view header = kKvfHeader;
   while (header.starts_with(kSlashes)) {
     const std::size_t end = header.find('\n');
     if (header.substr(kSlashes.size(), end - kSlashes.size()) == comment) return true;
@@ -66,10 +61,10 @@ std::string_view WithoutBlankLines(std::string_view text) {
 /// Reads one text, item by item. Sections nest in a list of its own, not in calls.
 class ImageReader final {
  public:
-  explicit ImageReader(KvfImage& fileImage) : text(fileImage.source), image(fileImage) {}
+  explicit ImageReader(KvfImage& fileImage) : text(fileImage.source), image(fileImage), pool(&image.arena) {}
 
   bool Run() {
-    open.push_back(&image.Root());
+    open.push_back({&image.root, nullptr});
     while (SkipToItem()) {
       const bool good = text[place] == '[' ? ReadHead() : ReadLine();
       if (!good) return false;
@@ -105,7 +100,8 @@ class ImageReader final {
     constexpr std::size_t kSlashes = 2;
     const std::size_t start = place + kSlashes;
     place = std::min(text.find('\n', place), text.size());
-    image.comments.push_back({line, start, place - start});
+    image.comments.push_back(
+        {line, static_cast<std::uint32_t>(start), static_cast<std::uint32_t>(place - start)});
   }
 
   bool AtComment() const { return text.substr(place).starts_with("//"); }
@@ -141,6 +137,17 @@ class ImageReader final {
     return text.substr(start, place - start);
   }
 
+  /// Puts an item after those that the open section has.
+  void Append(KvfEntry& entry) {
+    OpenSection& parent = open.back();
+    if (parent.last == nullptr) {
+      parent.section->first = &entry;
+    } else {
+      parent.last->next = &entry;
+    }
+    parent.last = &entry;
+  }
+
   bool ReadHead() {
     const int headLine = line;
     const std::size_t start = lineStart;
@@ -151,8 +158,11 @@ class ImageReader final {
     if (name.empty() || Peek() != ']') return false;
     ++place;
     const bool isTarget = open.size() == 1;
-    open.push_back(&image.AddSection(*open.back(), name, headLine));
-    if (isTarget) image.targets.push_back({open.back(), start, start});
+    KvfSection& section = *pool.new_object<KvfSection>(name, headLine);
+    Append(section);
+    ++open.back().section->count;
+    open.push_back({&section, nullptr});
+    if (isTarget) image.targets.push_back({&section, start, start});
     return EndLine();
   }
 
@@ -165,14 +175,16 @@ class ImageReader final {
     if (word.empty()) return false;
     if (Peek() == '=' && open.size() > 1) {
       ++place;
-      return ReadValues(image.AddKeyword(*open.back(), word, itemLine)) && EndLine();
+      KvfKeyword& keyword = *pool.new_object<KvfKeyword>(word, itemLine);
+      Append(keyword);
+      return ReadValues(keyword) && EndLine();
     }
     if (!EqualIgnoringCase(word, "EndSect") || open.size() == 1) {
       place = start;
       return false;
     }
     const std::size_t comments = image.comments.size();
-    const std::string_view closed = open.back()->text;
+    const std::string_view closed = open.back().section->Text();
     open.pop_back();
     if (!EndLine()) return false;
     // Every writer of such files names the section there.
@@ -184,56 +196,80 @@ class ImageReader final {
     return true;
   }
 
-  bool ReadValues(KvfItem& keyword) {
-    while (true) {
+  /// A value as the text has it, a quoted one without its quotes.
+  struct RawValue {
+    KvfItem::Value type = KvfItem::Value::Integer;
+    std::string_view text;
+  };
+
+  /// The parameters of a keyword lie side by side. Where there are many they are counted first, so that a
+  /// line of any length takes no more than it needs.
+  bool ReadValues(KvfKeyword& keyword) {
+    const Position start = Here();
+    RawValue value;
+    std::uint32_t count = 0;
+    do {
+      if (count > 0) ++place;
       SkipBlanks();
-      if (!ReadValue(keyword)) return false;
+      if (!ReadValue(value)) return false;
+      ++count;
       SkipBlanks();
-      if (Peek() != ',') return true;
-      ++place;
+    } while (Peek() == ',');
+    KvfItem* const parameters = pool.allocate_object<KvfItem>(count);
+    keyword.parameters = parameters;
+    keyword.count = count;
+    if (count == 1) {
+      Put(value, parameters);
+      return true;
     }
+    GoTo(start);
+    for (std::uint32_t number = 0; number < count; ++number) {
+      if (number > 0) ++place;
+      SkipBlanks();
+      ReadValue(value);
+      Put(value, parameters + number);
+      SkipBlanks();
+    }
+    return true;
   }
 
-  bool ReadValue(KvfItem& keyword) {
+  /// Makes a parameter. A text that goes over a line's end is copied, as carriage returns are no part of it.
+  void Put(const RawValue& value, KvfItem* parameter) {
+    std::string_view content = value.text;
+    if (content.find('\r') != std::string_view::npos) {
+      char* const copy = pool.allocate_object<char>(content.size());
+      const char* const end = std::remove_copy(content.begin(), content.end(), copy, '\r');
+      content = {copy, static_cast<std::size_t>(end - copy)};
+    }
+    std::construct_at(parameter, KvfItem::Type::Parameter, content)->value = value.type;
+  }
+
+  bool ReadValue(RawValue& value) {
     const char first = Peek();
-    if (first == '\'' || first == '|') return ReadText(keyword, first);
-    if (IsAsciiDigit(first) || first == '+' || first == '-') return ReadNumber(keyword);
+    if (first == '\'' || first == '|') return ReadText(value, first);
+    if (IsAsciiDigit(first) || first == '+' || first == '-') return ReadNumber(value);
     const std::size_t start = place;
     const std::string_view word = TakeWord();
     if (!EqualIgnoringCase(word, "true") && !EqualIgnoringCase(word, "false")) {
       place = start;
       return false;
     }
-    image.AddParameter(keyword, KvfItem::Value::Boolean, std::string(word));
+    value = {KvfItem::Value::Boolean, word};
     return true;
   }
 
-  bool ReadText(KvfItem& keyword, char quote) {
-    const std::size_t start = place++;
-    const int startLine = line;
-    const std::size_t startOfLine = lineStart;
-    std::string content;
-    while (!AtEnd() && text[place] != quote) {
-      const std::size_t end =
-          std::min(text.find_first_of(quote == '|' ? "|\r\n" : "'\r\n", place), text.size());
-      content += text.substr(place, end - place);
-      place = end;
-      if (AtEnd() || text[place] == quote) break;
-      if (text[place] == '\n') {
-        content += '\n';
-        CountLine();
-      }
-      ++place;
+  bool ReadText(RawValue& value, char quote) {
+    const std::size_t start = place + 1;
+    const std::size_t end = text.find(quote, start);
+    if (end == std::string_view::npos) return false;
+    const std::string_view content = text.substr(start, end - start);
+    for (std::size_t feed = content.find('\n'); feed != std::string_view::npos;
+         feed = content.find('\n', feed + 1)) {
+      place = start + feed;
+      CountLine();
     }
-    if (AtEnd()) {
-      place = start;
-      line = startLine;
-      lineStart = startOfLine;
-      return false;
-    }
-    ++place;
-    image.AddParameter(keyword, quote == '|' ? KvfItem::Value::Path : KvfItem::Value::Quoted,
-                       std::move(content));
+    place = end + 1;
+    value = {quote == '|' ? KvfItem::Value::Path : KvfItem::Value::Quoted, content};
     return true;
   }
 
@@ -242,7 +278,7 @@ class ImageReader final {
     return from;
   }
 
-  bool ReadNumber(KvfItem& keyword) {
+  bool ReadNumber(RawValue& raw) {
     const std::size_t start = place;
     const std::size_t digits = start + (IsAsciiDigit(text[start]) ? 0 : 1);
     std::size_t end = SkipDigits(digits);
@@ -262,67 +298,38 @@ class ImageReader final {
       }
     }
     place = end;
-    image.AddParameter(keyword, value, std::string(text.substr(start, end - start)));
+    raw = {value, text.substr(start, end - start)};
     return true;
+  }
+
+  struct OpenSection {
+    KvfSection* section;
+    KvfEntry* last;  ///< of its items so far
+  };
+
+  struct Position {
+    std::size_t place;
+    std::size_t lineStart;
+    int line;
+  };
+
+  Position Here() const { return {place, lineStart, line}; }
+  void GoTo(const Position& position) {
+    place = position.place;
+    lineStart = position.lineStart;
+    line = position.line;
   }
 
   std::string_view text;
   KvfImage& image;
-  std::vector<KvfItem*> open;
+  std::pmr::polymorphic_allocator<> pool;
+  std::vector<OpenSection> open;
   std::size_t place = 0;
   std::size_t lineStart = 0;
   int line = 1;
 };
 
-std::string ParameterText(const KvfItem& parameter) {
-  switch (parameter.value) {
-    case KvfItem::Value::Quoted:
-      return '\'' + parameter.text + '\'';
-    case KvfItem::Value::Path:
-      return '|' + parameter.text + '|';
-    default:
-      return parameter.text;
-  }
-}
-
 }  // namespace
-
-void AppendKvfKeyword(const KvfItem& keyword, std::string& text) {
-  text += keyword.text;
-  text += " = ";
-  for (std::size_t place = 0; place < keyword.keywords.size(); ++place) {
-    if (place > 0) text += ", ";
-    text += ParameterText(*keyword.keywords[place]);
-  }
-}
-
-KvfItem& KvfImage::AddSection(KvfItem& parent, std::string_view name, int line) {
-  KvfItem& section = items.emplace_back();
-  section.type = KvfItem::Type::Section;
-  section.text = name;
-  section.line = line;
-  parent.sections.push_back(&section);
-  parent.order.push_back(&section);
-  return section;
-}
-
-KvfItem& KvfImage::AddKeyword(KvfItem& section, std::string_view name, int line) {
-  KvfItem& keyword = items.emplace_back();
-  keyword.type = KvfItem::Type::Keyword;
-  keyword.text = name;
-  keyword.line = line;
-  section.keywords.push_back(&keyword);
-  section.order.push_back(&keyword);
-  return keyword;
-}
-
-void KvfImage::AddParameter(KvfItem& keyword, KvfItem::Value value, std::string text) {
-  KvfItem& parameter = items.emplace_back();
-  parameter.type = KvfItem::Type::Parameter;
-  parameter.value = value;
-  parameter.text = std::move(text);
-  keyword.keywords.push_back(&parameter);
-}
 
 bool ReadKvfImage(KvfImage& image, KvfSyntaxError& error) {
   ImageReader reader(image);
@@ -345,48 +352,16 @@ std::string KvfTextBeside(const KvfImage& image, const KvfItem* section) {
   return text;
 }
 
-std::vector<KvfRemark> KvfRemarksOf(const KvfImage& image, const KvfItem* section) {
+void ForEachKvfRemark(const KvfImage& image, const KvfItem* section,
+                      const std::function<void(const KvfRemark&)>& visit) {
   const std::size_t first = image.targets.empty() ? image.source.size() : image.targets.front().start;
   const KvfSpan* span = SpanOf(image, section);
-  std::vector<KvfRemark> remarks;
   for (const KvfComment& comment : image.comments) {
     const bool inHead = comment.start < first;
     const bool inSection = span != nullptr && comment.start >= span->start && comment.start < span->end;
     const std::string_view text = Trimmed(CommentText(image, comment));
-    if (inSection || (inHead && !IsOfHeader(text))) remarks.push_back({comment.line, std::string(text)});
+    if (inSection || (inHead && !IsOfHeader(text))) visit({comment.line, text});
   }
-  return remarks;
-}
-
-std::string WriteKvfImage(KvfImage& image) {
-  std::string text(kHeader);
-  struct Step {
-    const KvfItem* section;
-    std::size_t written;
-  };
-  std::vector<Step> path{{&image.Root(), 0}};
-  while (!path.empty()) {
-    const KvfItem& section = *path.back().section;
-    const std::size_t depth = path.size() - 1;
-    if (path.back().written < section.order.size()) {
-      const KvfItem& item = *section.order[path.back().written++];
-      const std::string indent(kBlanksPerLevel * depth, ' ');
-      if (item.type == KvfItem::Type::Keyword) {
-        text += indent;
-        AppendKvfKeyword(item, text);
-        text += '\n';
-      } else {
-        text += indent + '[' + item.text + "]\n";
-        path.push_back({&item, 0});
-      }
-      continue;
-    }
-    if (depth > 0) {
-      text += std::string(kBlanksPerLevel * (depth - 1), ' ') + "EndSect  // " + section.text + "\n\n";
-    }
-    path.pop_back();
-  }
-  return KvfWritableText(text);
 }
 
 }  // namespace tessal

@@ -10,31 +10,31 @@ namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-}  // namespace
-
-std::string KvfReadableText(std::string_view bytes) {
-  bytes = bytes.substr(0, bytes.find('\0'));
-  if (bytes.starts_with(kByteOrderMark)) bytes.remove_prefix(kByteOrderMark.size());
-  std::string text;
-  text.reserve(bytes.size() + static_cast<std::size_t>(std::count(bytes.begin(), bytes.end(), '\n')));
-  char previous = '\0';
-  for (const char byte : bytes) {
-    if (byte == '\n' && previous != '\r') text += '\r';
-    text += byte;
-    previous = byte;
+std::size_t CountBareLineFeeds(std::string_view text) {
+  std::size_t count = 0;
+  for (std::size_t feed = text.find('\n'); feed != std::string_view::npos; feed = text.find('\n', feed + 1)) {
+    if (feed == 0 || text[feed - 1] != '\r') ++count;
   }
-  return text;
+  return count;
 }
 
-std::string KvfWritableText(std::string_view text) {
-  std::string written;
-  written.reserve(text.size() + static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n')));
-  for (const char character : text) {
-    if (character == '\r') continue;
-    if (character == '\n') written += '\r';
-    written += character;
+}  // namespace
+
+std::string KvfReadableText(std::string bytes) {
+  bytes.resize(std::min(bytes.find('\0'), bytes.size()));
+  if (bytes.starts_with(kByteOrderMark)) bytes.erase(0, kByteOrderMark.size());
+  const std::size_t bare = CountBareLineFeeds(bytes);
+  if (bare == 0) return bytes;
+  std::string text;
+  text.reserve(bytes.size() + bare);
+  std::string_view rest = bytes;
+  for (std::size_t feed = rest.find('\n'); feed != std::string_view::npos; feed = rest.find('\n')) {
+    text += rest.substr(0, feed);
+    if (feed == 0 || rest[feed - 1] != '\r') text += '\r';
+    text += '\n';
+    rest.remove_prefix(feed + 1);
   }
-  return written;
+  return text += rest;
 }
 
 bool IsKvfName(std::string_view text) {

@@ -82,6 +82,18 @@ const std::map<std::string, Operation> kOperations = {
        const std::string text = TextOf("constant k 1");
        open.core.LoadWrapper(open.folder.Write("zeros", text + std::string(3, '\0') + "[X]"));
      }},
+    {"load-sparse",
+     [](OpenTemplate& open, const std::string& rest) {
+       const std::string path = open.folder.Write("sparse", "");
+       std::filesystem::resize_file(path, std::stoull(rest));
+       open.core.LoadWrapper(path);
+     }},
+    {"load-with-keywords",
+     [](OpenTemplate& open, const std::string& rest) {
+       std::string text = "\n[TESSAL_SETUP]\n";
+       for (int count = std::stoi(rest); count > 0; --count) text += "K = 1\n";
+       open.core.LoadWrapper(open.folder.Write("keywords", text + "EndSect\n"));
+     }},
     {"save",
      [](OpenTemplate& open, const std::string& rest) { open.core.SaveWrapper(open.folder.File(rest)); }},
     {"rename-class",
@@ -92,10 +104,11 @@ const std::map<std::string, Operation> kOperations = {
     {"process-rule", [](OpenTemplate& open, const std::string&) { open.core.CheckProcessRule(); }},
 };
 
-/// The entries of the load's account.
-std::string AccountOf(const TemplateCore& core) {
+/// The entries of the load's account, or those of one code.
+std::string AccountOf(const TemplateCore& core, std::string_view code = "") {
   std::string listed;
   for (const AccountEntry& entry : core.Account().Entries()) {
+    if (!code.empty() && entry.code != code) continue;
     CodesSeen().insert(entry.code);
     listed += std::string(entry.code) + " " + entry.symbol + ": " + entry.text + "\n";
   }
@@ -106,6 +119,7 @@ std::string AnswerTo(const CaseCall& call, OpenTemplate& open) {
   if (call.words == "account") return AccountOf(open.core);
   const std::size_t end = std::min(call.words.find(' '), call.words.size());
   const std::string rest = call.words.substr(std::min(end + 1, call.words.size()));
+  if (call.words.starts_with("account ")) return AccountOf(open.core, rest);
   if (call.words != "messages") {
     Errors().Reset();
     kOperations.at(call.words.substr(0, end))(open, rest);
@@ -119,9 +133,9 @@ TEST(Messages, EachCodeIsGivenByAnExampleOrACase) {
       return AnswerTo(call, *open);
     };
   });
-  // The first guards the check itself: the counts balance on every tree of the parser. The others are
-  // reserved.
-  CodesSeen().insert({"call-incomplete", "value-outside-range", "unknown-symbol"});
+  // The first guards the check itself: the counts balance on every tree of the parser. The tests of failing
+  // allocations see the second. The others are reserved.
+  CodesSeen().insert({"call-incomplete", "out-of-memory", "value-outside-range", "unknown-symbol"});
   std::set<std::string_view> codes;
   for (const MessageRow& row : AllMessages()) {
     EXPECT_TRUE(codes.insert(row.code).second) << row.code << " has two rows";

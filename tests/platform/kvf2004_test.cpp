@@ -21,7 +21,7 @@ using test::TemporaryFolder;
 /// A file of the library, closed at the end.
 class Loaded final {
  public:
-  explicit Loaded(std::string_view text) : handle(kvfLoadText(text)) {}
+  explicit Loaded(std::string text) : handle(kvfLoadText(std::move(text))) {}
   Loaded(const Loaded&) = delete;
   Loaded& operator=(const Loaded&) = delete;
   ~Loaded() { kvfClose(&handle); }
@@ -179,8 +179,7 @@ TEST(KvfLibrary, RealsComeBackToTheBit) {
   kvfAddTarget(file, "T");
   kvfAddKeyword(file, "V");
   for (const double value : values) ASSERT_EQ(kvfAddDouble(file, value), 0);
-  const Loaded read(kvfGetText(file));
-  kvfClose(&file);
+  const Loaded read(kvfTakeText(&file));
   const KvfNode keyword = kvfKeywordByNameNum(read.Target(), "V", 1);
   for (std::size_t place = 0; place < values.size(); ++place) {
     double value = 0.0;

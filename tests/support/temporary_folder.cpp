@@ -2,7 +2,6 @@
 
 #include <cstdlib>
 #include <fstream>
-#include <iterator>
 #include <stdexcept>
 #include <system_error>
 
@@ -26,8 +25,10 @@ std::string TemporaryFolder::Write(std::string_view name, std::string_view conte
 }
 
 std::string ReadFile(const std::string& path) {
-  std::ifstream file(path, std::ios::binary);
-  return {std::istreambuf_iterator<char>(file), {}};
+  std::ifstream file(path, std::ios::binary | std::ios::ate);
+  std::string content(file ? static_cast<std::size_t>(file.tellg()) : 0, '\0');
+  file.seekg(0).read(content.data(), static_cast<std::streamsize>(content.size()));
+  return content;
 }
 
 }  // namespace tessal::test

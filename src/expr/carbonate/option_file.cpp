@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <filesystem>
 #include <fstream>
+#include <ios>
 #include <istream>
 #include <limits>
 #include <locale>
@@ -133,9 +134,8 @@ bool ReadValue(std::istream& file, std::string_view keyword, OptionRecord& recor
 }
 
 /// Reads the record up to the end of the file or the first value that can't be read.
-std::optional<ReadingFailure> ReadRecord(std::istream& file, OptionRecord& record) {
+std::optional<ReadingFailure> ReadValues(std::istream& file, std::string& lastKeyword, OptionRecord& record) {
   std::string word;
-  std::string lastKeyword;
   while (ReadWord(file, word)) {
     if (word == kComment) {
       file.ignore(std::numeric_limits<std::streamsize>::max(), '\n');
@@ -150,8 +150,17 @@ std::optional<ReadingFailure> ReadRecord(std::istream& file, OptionRecord& recor
         .reason = ended ? "the value is missing or cut off" : "the value is not a number in range",
         .position = file.tellg()};
   }
-  if (!file.bad()) return std::nullopt;
-  return ReadingFailure{.keyword = lastKeyword, .reason = "the file cannot be read further", .position = -1};
+  return std::nullopt;
+}
+
+std::optional<ReadingFailure> ReadRecord(std::istream& file, OptionRecord& record) {
+  std::string lastKeyword;
+  try {
+    return ReadValues(file, lastKeyword, record);
+  } catch (const std::ios_base::failure&) {
+    return ReadingFailure{
+        .keyword = lastKeyword, .reason = "the file cannot be read further", .position = -1};
+  }
 }
 
 void SettleAfterFailure(OptionRecord& record) {
@@ -236,6 +245,8 @@ void ReadOptionFile(const std::string& path) {
     return;
   }
   file.imbue(std::locale::classic());
+  // A stream that only noted a lack of memory would seem to hold no number.
+  file.exceptions(std::ios::badbit);
   CarbonateLog().BeginReading();
   ReadAndApply(path, file);
   CarbonateLog().EndReading();
