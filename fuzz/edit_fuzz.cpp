@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "choices.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
@@ -16,24 +17,8 @@
 namespace {
 
 using namespace tessal;
+using fuzz::Choices;
 using fuzz::Require;
-
-/// The fuzzer's bytes as choices.
-class Choices final {
- public:
-  Choices(const std::uint8_t* bytes, std::size_t count) : data(bytes), left(count) {}
-
-  bool Done() const { return left == 0; }
-  std::size_t Pick(std::size_t count) {
-    if (left == 0 || count == 0) return 0;
-    --left;
-    return *data++ % count;
-  }
-
- private:
-  const std::uint8_t* data;
-  std::size_t left;
-};
 
 constexpr std::array<const char*, 12> kTexts = {
     "a",     "b + a", "Process_1", "a*(b-2)", "IF a > 1 THEN b ELSE Constant_1",
@@ -88,7 +73,7 @@ void ChangeField(TemplateCore& core, Choices& choices) {
   if (field.name.ends_with(" version")) return;
   // A search function's loading gives up texts that are no choices.
   const auto& allowed = field.choiceTexts;
-  field.text = allowed.empty() ? kTexts[choices.Pick(kTexts.size())] : allowed[choices.Pick(allowed.size())];
+  field.text = allowed.empty() ? choices.AnyOf(kTexts) : choices.AnyOf(allowed);
   field.intValue = static_cast<std::int32_t>(choices.Pick(7)) - 2;
   field.realValue = static_cast<double>(choices.Pick(9)) - 4.5;
   field.boolValue = choices.Pick(2) == 0;
@@ -97,7 +82,7 @@ void ChangeField(TemplateCore& core, Choices& choices) {
 
 /// The texts of the root, of a list head, or of a group.
 void ChangeTexts(TemplateCore& core, Choices& choices) {
-  const char* text = kTexts[choices.Pick(kTexts.size())];
+  const char* text = choices.AnyOf(kTexts);
   auto& groups = core.GetMisc()->Visibilities().groups;
   switch (choices.Pick(5)) {
     case 0:
@@ -177,7 +162,7 @@ void Edit(TemplateCore& core, Choices& choices) {
     case 4: {
       const CEL_Element* renamed = core.GetElement(AnyUid(core, choices));
       if (renamed == nullptr || renamed->Kind() == ElementKind::DerivedOutput) break;
-      core.RenameSymbol(renamed->symbol.Text(), kNames[choices.Pick(kNames.size())], choices.Pick(2) == 0);
+      core.RenameSymbol(renamed->symbol.Text(), choices.AnyOf(kNames), choices.Pick(2) == 0);
       break;
     }
     case 5:
@@ -185,7 +170,7 @@ void Edit(TemplateCore& core, Choices& choices) {
       break;
     case 6:
       if (core.GetMisc()->ExternalFunctions().size() < 3) {
-        core.GetMisc()->AddExternalFunction().publicName.SetText(kNames[choices.Pick(kNames.size())]);
+        core.GetMisc()->AddExternalFunction().publicName.SetText(choices.AnyOf(kNames));
       } else {
         core.GetMisc()->RemoveExternalFunction(choices.Pick(4));
       }
@@ -224,10 +209,9 @@ void LoadFurtherSections(TemplateCore& core) {
   const std::string path = fuzz::ScratchFile("start.tessal");
   static const bool kWritten =
       TemplateCore().SaveWrapper(path) &&
-      ReplaceFile(path,
-                     StartText(path) +
-                         "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // after it\r\n"
-                         "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")
+      ReplaceFile(path, StartText(path) +
+                            "[FIRST] // at its head\r\n// in it\r\nA = 1, -0.25, 'it', |is| // after it\r\n"
+                            "[INNER]\r\nB = TRUE\r\nEndSect // inner\r\nEndSect // FIRST\r\n")
           .empty();
   Require(kWritten && core.LoadWrapper(path), "the start is there");
   SetNotifyChanges(true);

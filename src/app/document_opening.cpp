@@ -111,10 +111,11 @@ DocumentOpening::WorkChoice DocumentOpening::DecideAboutWork(const FoundWork& wo
 
 DocumentOpening::WorkChoice DocumentOpening::AskAboutWork(const FoundWork& work) const {
   const bool hasFile = QFileInfo::exists(work.path);
-  const QString what =
-      work.path.isEmpty()
-          ? Translated("The editor ended before a new document was saved.")
-          : Translated("The editor ended before the changes to the file '%1' were saved.").arg(work.path);
+  QString what = Translated("The editor ended before a new document was saved.");
+  if (!work.title.isEmpty()) what = Translated("The editor ended before '%1' was saved.").arg(work.title);
+  if (!work.path.isEmpty()) {
+    what = Translated("The editor ended before the changes to the file '%1' were saved.").arg(work.path);
+  }
   QMessageBox box(QMessageBox::Question, name, what, QMessageBox::NoButton, &window);
   box.setTextFormat(Qt::PlainText);
   QString times = Translated("The unsaved work was kept on %1.").arg(TimeOf(work.file));

@@ -24,6 +24,7 @@
 #include <QTabWidget>
 #include <QVBoxLayout>
 #include <algorithm>
+#include <utility>
 
 #include "app/comparison_dialog.h"
 #include "app/document_lock.h"
@@ -359,10 +360,19 @@ void HostWindow::Drop(OpenDocument& closed) {
 }
 
 void HostWindow::KeepWork() {
+  QString failure;
   for (const auto& open : documents) {
-    const QString failure = open->KeepWork();
-    if (!failure.isEmpty())
-      statusBar()->showMessage(tr("Unsaved work can not be kept for a recovery: %1").arg(failure));
+    const QString reason = open->KeepWork();
+    if (failure.isEmpty()) failure = reason;
+  }
+  const QString former = std::exchange(
+      notKept,
+      failure.isEmpty() ? QString() : tr("Unsaved work can not be kept for a recovery: %1").arg(failure));
+  if (!notKept.isEmpty()) {
+    statusBar()->showMessage(notKept);
+    workTimer.TryAgain();
+  } else if (statusBar()->currentMessage() == former) {
+    statusBar()->clearMessage();
   }
 }
 

@@ -95,6 +95,7 @@ class HostWindow final : public QMainWindow {
   QList<QAction*> documentActions;  ///< those that need a document in front
   WorkTimer workTimer;
   std::vector<std::unique_ptr<OpenDocument>> documents;
+  QString notKept;  ///< why work could not be kept when it was last due, as the status bar says it
   int newDocuments = 0;
 };
 

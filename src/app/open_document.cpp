@@ -17,6 +17,11 @@ std::string Encoded(const QString& path) {
 
 }  // namespace
 
+void OpenDocument::Show(const CMultiDocTemplate& docTemplate) {
+  view = docTemplate.CreateView(*document);
+  if (firstTitle.isEmpty()) firstTitle = QString::fromStdString(document->Title());
+}
+
 QString OpenDocument::Title() const {
   const QString title = QString::fromStdString(document->Title());
   return isReadOnly ? QCoreApplication::translate("OpenDocument", "%1 (read only)").arg(title) : title;
@@ -46,7 +51,8 @@ bool OpenDocument::Recover(const FoundWork& work) {
   if (!document->OnOpenCopy(Encoded(work.file), Encoded(work.path))) return false;
   if (work.path.isEmpty()) {
     isCopy = true;
-    document->SetTitle(QCoreApplication::translate("OpenDocument", "Recovered").toStdString());
+    firstTitle = QCoreApplication::translate("OpenDocument", "Recovered %1").arg(work.title).trimmed();
+    document->SetTitle(firstTitle.toStdString());
   } else {
     TakeName(work.path);
   }
@@ -87,7 +93,7 @@ QString OpenDocument::KeepWork() {
   if (!text) return QString::fromStdString(reason);
   const std::size_t hash = std::hash<std::string>()(*text);
   if (hash == keptHash) return {};
-  const QString failure = recovery.Write(*text);
+  const QString failure = recovery.Write(*text, firstTitle);
   if (failure.isEmpty()) keptHash = hash;
   return failure;
 }

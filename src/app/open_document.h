@@ -18,7 +18,7 @@ class OpenDocument final {
   explicit OpenDocument(std::unique_ptr<CDocument> made) : document(std::move(made)) {}
 
   /// Makes the view; the host then puts its widget into a tab.
-  void Show(const CMultiDocTemplate& docTemplate) { view = docTemplate.CreateView(*document); }
+  void Show(const CMultiDocTemplate& docTemplate);
 
   CDocument& Document() const { return *document; }
   CView& View() const { return *view; }
@@ -64,6 +64,7 @@ class OpenDocument final {
   std::unique_ptr<CView> view;  // goes before the document that it looks at
   WatchedFile file;
   RecoveryFile recovery;
+  QString firstTitle;        ///< by which its unsaved work is offered while it has no file
   std::size_t keptHash = 0;  ///< of the work that was written last
   std::unique_ptr<QLockFile> lock;
   bool isReadOnly = false;

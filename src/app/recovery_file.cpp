@@ -19,6 +19,7 @@ namespace {
 
 const QString kWorkSuffix = QStringLiteral(".recovery");
 const QString kPathSuffix = QStringLiteral(".path");
+const QString kTitleSuffix = QStringLiteral(".title");
 const QString kUnnamedPrefix = QStringLiteral("unnamed-");
 
 std::string Encoded(const QString& path) {
@@ -42,15 +43,9 @@ bool HoldsWork(const QString& file) {
 
 /// Writes in one step into a file that only its owner may read. The empty text, or the reason.
 QString WritePrivate(const QString& file, std::string_view content) {
-  const std::string path = Encoded(file);
-  if (!IsThere(file)) {
-    // Empty, it is no work yet; the one that takes its place has its permissions.
-    const std::string failure = WriteFreshFile(path, "");
-    if (!failure.empty()) return QString::fromStdString(failure);
-  } else if (!IsOwnFile(file)) {
-    return QStringLiteral("'%1' is no file of this user").arg(file);
-  }
-  return QString::fromStdString(ReplaceFile(path, content));
+  if (IsThere(file) && !IsOwnFile(file))
+    return QStringLiteral("can not replace '%1': it is no file of this user").arg(file);
+  return QString::fromStdString(WriteFreshFile(Encoded(file), content));
 }
 
 /// Notes which document has work left, for the next start. Work that no note names is offered when its
@@ -68,6 +63,11 @@ QString ReadNote(const QString& note) {
   std::string failure;
   const std::optional<std::string> path = ReadWholeFile(Encoded(note), failure);
   return path ? QFile::decodeName(QByteArray::fromStdString(*path)) : QString();
+}
+
+/// One line, whoever wrote it.
+QString ReadTitle(const QString& work) {
+  return IsOwnFile(work + kTitleSuffix) ? ReadNote(work + kTitleSuffix).simplified() : QString();
 }
 
 }  // namespace
@@ -99,7 +99,8 @@ QList<FoundWork> FindAllWork() {
       folder.entryList({kUnnamedPrefix + u'*' + kWorkSuffix}, QDir::Files, QDir::Time);
   for (const QString& name : unnamed) {
     const QString file = folder.filePath(name);
-    if (HoldsWork(file) && Lock(file + kLockSuffix).holder.isEmpty()) works.append({file, QString()});
+    if (HoldsWork(file) && Lock(file + kLockSuffix).holder.isEmpty())
+      works.append({file, QString(), ReadTitle(file)});
   }
   return works;
 }
@@ -108,8 +109,8 @@ RecoveryFile::RecoveryFile(const FoundWork& work) : document(work.path), written
   if (document.isEmpty()) inUse = Lock(written + kLockSuffix).lock;
 }
 
-QString RecoveryFile::Write(std::string_view content) {
-  if (document.isEmpty()) return WriteInState(content);
+QString RecoveryFile::Write(std::string_view content, const QString& title) {
+  if (document.isEmpty()) return WriteUnnamed(content, title);
   if (written.isEmpty()) NoteDocument(document);
   const QString beside = BesideDocument(document, kWorkSuffix);
   if (!WritePrivate(beside, content).isEmpty()) return WriteInState(content);
@@ -121,9 +122,16 @@ QString RecoveryFile::Write(std::string_view content) {
 
 QString RecoveryFile::WriteInState(std::string_view content) {
   if (const QString failure = MakeStateFolder(); !failure.isEmpty()) return failure;
-  const QString file = NameInState();
-  const QString failure = WritePrivate(file, content);
-  if (failure.isEmpty()) written = file;
+  // Also where the writing fails: it may be in place, with its lasting in doubt.
+  written = NameInState();
+  return WritePrivate(written, content);
+}
+
+QString RecoveryFile::WriteUnnamed(std::string_view content, const QString& title) {
+  const QString failure = WriteInState(content);
+  // Work without a title is offered all the same.
+  const QString noted = written + kTitleSuffix;
+  if (failure.isEmpty() && !IsThere(noted)) WriteFreshFile(Encoded(noted), Encoded(title));
   return failure;
 }
 
@@ -138,6 +146,7 @@ QString RecoveryFile::NameInState() {
 
 void RecoveryFile::Remove() {
   if (written.isEmpty()) return;
+  if (document.isEmpty()) RemoveOwn(written + kTitleSuffix);
   RemoveOwn(written);
   written.clear();
   inUse.reset();

@@ -13,8 +13,9 @@ namespace tessal {
 
 /// Unsaved work that nobody is busy with.
 struct FoundWork {
-  QString file;  ///< that holds the work
-  QString path;  ///< of the document; empty for one without a file
+  QString file;     ///< that holds the work
+  QString path;     ///< of the document; empty for one without a file
+  QString title{};  ///< what a document without a file was called; empty when that is not known
 
   bool IsThere() const { return !file.isEmpty(); }
 };
@@ -35,18 +36,20 @@ class RecoveryFile final {
   explicit RecoveryFile(const FoundWork& work);
 
   /// Puts the content into the file, which is beside the document's or, where that cannot be, in the state
-  /// folder. The empty text, or the reason; what was written before is then still there.
-  QString Write(std::string_view content);
+  /// folder. The empty text, or the reason; what was written before is then still there. The title is noted
+  /// with the first content of a document without a file.
+  QString Write(std::string_view content, const QString& title);
   /// Removes what was written or found.
   void Remove();
 
  private:
   QString WriteInState(std::string_view content);
+  QString WriteUnnamed(std::string_view content, const QString& title);
   /// The file in the state folder; one without a document gets a name of its own.
   QString NameInState();
 
   QString document;
-  QString written;                   ///< the file that holds the work; empty before the first write
+  QString written;  ///< the file that was written last, or tried; empty before the first write
   std::unique_ptr<QLockFile> inUse;  ///< of a document without a file, so that no other editor offers it
 };
 

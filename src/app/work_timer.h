@@ -1,5 +1,5 @@
 // When unsaved work is due to be kept: after the user has paused, and in steady work after a while at most.
-// Without any input nothing is ever due.
+// Without any input nothing is ever due, but for what could not be done.
 #pragma once
 
 #include <QObject>
@@ -18,6 +18,9 @@ class WorkTimer final : public QObject {
   void SetIntervals(std::chrono::milliseconds pauseLength, std::chrono::milliseconds longestWait);
   /// As input does: for changes that come from elsewhere.
   void NoteInput();
+
+  /// What was due could not be done: it is due again after the longest wait, also without input.
+  void TryAgain() { wait.start(); }
 
  signals:
   void Due();

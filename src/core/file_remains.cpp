@@ -5,6 +5,7 @@
 #include <unordered_map>
 
 #include "core/template_state.h"
+#include "keyfile/keywords.h"
 
 namespace tessal {
 
@@ -127,6 +128,24 @@ void NoteTransientTexts(const TemplateState& state, LoadAccount& account) {
   });
 }
 
+bool HasTexts(const CEL_Element& head) {
+  return !head.description.Text().empty() || !head.onlineHelp.Text().empty() ||
+         !head.documentation.Text().empty();
+}
+
+/// The lists of the settings are written with what they list alone.
+void NoteTextsOfEmptyLists(CEL_Miscanellous& misc, LoadAccount& account) {
+  const auto note = [&account](const CEL_Element& head, std::string_view section) {
+    if (!HasTexts(head)) return;
+    account.Note(AccountKind::Dropped, section, head.SourceLine(), {"empty-list-dropped", {section}});
+  };
+  if (misc.ExternalFunctions().empty()) note(misc.ExternalFunctionHead(), section::kExternalFunctions);
+  const CEL_Visibility& visibilities = misc.Visibilities();
+  if (visibilities.groups.empty() && visibilities.groupsPassedOver.empty()) {
+    note(visibilities, section::kVisibilityGroups);
+  }
+}
+
 }  // namespace
 
 void NoteWhatNobodyRead(KvfHandle file, KvfNode target, TemplateState& state) {
@@ -135,6 +154,7 @@ void NoteWhatNobodyRead(KvfHandle file, KvfNode target, TemplateState& state) {
     NoteUnread(target, account);
     NoteSharedSymbols(state, account);
     NoteTransientTexts(state, account);
+    if (state.hasMisc) NoteTextsOfEmptyLists(state.misc, account);
   }
   NoteComments(file, target, account);
   if (const std::size_t cut = kvfGetBytesCut(file); cut > 0) {

@@ -236,6 +236,15 @@ inline constexpr MessageRow kMessages[] = {
         "Keep the text in the description of an element or of the template.",
     },
     {
+        "empty-list-dropped",
+        ErrorLevel::Notice,
+        "the texts of %1 will not be kept: a save leaves out an empty list of this kind",
+        "The list of user functions or of visibility groups has texts and nothing else; the format holds "
+        "such a list only with what it lists.",
+        "A DESCRIPTION of VISIBILITY_GROUPS beside GROUPS = 0.",
+        "Keep the text in the description of the template.",
+    },
+    {
         "text-dropped",
         ErrorLevel::Notice,
         "%1 bytes after a zero byte are not read and will not be kept",

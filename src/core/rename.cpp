@@ -148,7 +148,10 @@ std::string ReplaceName(std::string_view expression, std::string_view oldName, s
   const char* copied = expression.data();
   ForEachToken(expression, [&result, &copied, oldName, newName](TokenCode code, std::string_view lexeme) {
     if (code != TokenCode::Identifier || lexeme != oldName) return;
-    result.append(copied, lexeme.data()).append(newName);
+    result.append(copied, lexeme.data());
+    // In "2a", which does not parse, a new name `e5` would become part of a number.
+    if (!result.empty() && IsAsciiDigit(result.back())) result += ' ';
+    result += newName;
     copied = lexeme.data() + lexeme.size();
   });
   return result.append(copied, expression.data() + expression.size());

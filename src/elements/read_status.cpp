@@ -107,9 +107,11 @@ void ReadStatus::NoteUnread(KvfNode section, std::string_view key, const CEL_Pro
     account.Note(AccountKind::Absent, name, kvfGetLine(section), {"key-absent", {key, name}});
     return;
   }
-  kvfMarkRead(keyword);
   // A count holds nothing that its list does not.
-  if (property == nullptr) return;
+  if (property == nullptr) {
+    kvfMarkRead(keyword);
+    return;
+  }
   const ValueType type = property->Type();
   const std::string shown = Shown(keyword);
   const Finding finding = HasValueOfType(keyword, type)
@@ -117,8 +119,10 @@ void ReadStatus::NoteUnread(KvfNode section, std::string_view key, const CEL_Pro
                               : Finding("value-of-wrong-type", {shown, name, TypeWord(type)});
   const std::optional<ElementField> field = FieldOf(keyword, *property, element->LabelOf(*property));
   if (field) {
+    // The values after the first are none that can be taken over: they have an entry of their own.
     account.NotePassedOver(name, kvfGetLine(keyword), finding, {element->GetUid(), *field});
   } else {
+    kvfMarkRead(keyword);
     account.Note(AccountKind::Unread, name, kvfGetLine(keyword), finding);
   }
 }
@@ -134,7 +138,6 @@ void ReadStatus::NoteMisnamed(KvfNode section, const CEL_Property& property) {
   const KvfNode keyword = unread.node;
   std::string stored;
   if (kvfGetString(kvfParamByNum(keyword, 1), stored) != kKvfOk) return;
-  kvfMarkRead(keyword);
   ElementField field;
   field.kind = FieldKind::Expression;
   field.name = element->LabelOf(property);

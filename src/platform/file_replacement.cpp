@@ -165,11 +165,14 @@ std::string ProtectionOfName(const std::string& target) {
                               : Protection(target, old);
 }
 
-/// Writes the content into the new file and lets it take the target's place. The empty text, or what failed.
-std::string_view FillAndTakePlace(TemporaryFile& file, const TextSource& content, const std::string& target) {
-  if (!TakeAttributes(file.Number(), target)) return "can not keep the permissions of file";
-  if (const std::string_view failed = WriteAndClose(file, content); !failed.empty()) return failed;
-  return file.TakePlace() ? "" : "can not replace file";
+/// Writes the content into the new file, lets it take its target's place, and flushes the folder. Returns the
+/// empty text, or the reason.
+std::string FillAndTakePlace(TemporaryFile& file, const std::filesystem::path& folder,
+                             const std::string& shown, const TextSource& content) {
+  std::string_view failed = WriteAndClose(file, content);
+  if (failed.empty() && !file.TakePlace()) failed = "can not replace file";
+  if (failed.empty() && !FlushFolder(folder)) failed = "can not flush the folder of file";
+  return failed.empty() ? std::string() : Reason(failed, shown, errno);
 }
 
 /// Puts the content in the place of whatever has the name `target`; messages call it `shown`.
@@ -180,9 +183,10 @@ std::string PutInPlace(const std::filesystem::path& target, const std::string& s
   RemoveTemporaryRests(target);
   TemporaryFile fresh(target);
   if (!fresh.IsOpen()) return Reason("can not create a file beside", shown, errno);
-  const std::string_view failed = FillAndTakePlace(fresh, content, target.native());
-  if (!failed.empty()) return Reason(failed, shown, errno);
-  return FlushFolder(folder) ? std::string() : Reason("can not flush the folder of file", shown, errno);
+  if (!TakeAttributes(fresh.Number(), target.native())) {
+    return Reason("can not keep the permissions of file", shown, errno);
+  }
+  return FillAndTakePlace(fresh, folder, shown, content);
 }
 
 std::string WriteStream(const std::string& path, const TextSource& content) {
@@ -238,15 +242,11 @@ std::uintmax_t FileSize(const std::string& path) {
 }
 
 std::string WriteFreshFile(const std::string& path, std::string_view content) {
-  constexpr mode_t kReadWriteForOwner = 0600;
-  unlink(path.c_str());
-  Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, kReadWriteForOwner));
-  if (!file.IsOpen()) return Reason("can not open file for writing", path, errno);
-  const std::string_view failed = WriteAndClose(file, Whole(content));
-  if (failed.empty()) return {};
-  std::string reason = Reason(failed, path, errno);
-  unlink(path.c_str());
-  return reason;
+  const std::filesystem::path folder = std::filesystem::path(path).parent_path();
+  RemoveTemporaryRests(path);
+  TemporaryFile fresh(path);
+  return fresh.IsOpen() ? FillAndTakePlace(fresh, folder, path, Whole(content))
+                        : Reason("can not create a file beside", path, errno);
 }
 
 std::string ReplaceFile(const std::string& target, std::string_view content) {

@@ -20,9 +20,9 @@ std::optional<std::string> ReadWholeFile(const std::string& path, std::string& f
 /// The size in bytes; 0 for a file that cannot be opened.
 std::uintmax_t FileSize(const std::string& path);
 
-/// Writes a new file that only its owner may read, for what others shall not see half-done. A file or
-/// a link that was there goes; what the link led to stays. After a failure nothing is left. Returns the empty
-/// text, or the reason in words.
+/// Writes a new file that only its owner may read, for what others shall not see half-done. It takes the
+/// place of a file or a link of that name in one step; what the link led to stays, and so does the file when
+/// the writing fails. Returns the empty text, or the reason in words.
 std::string WriteFreshFile(const std::string& path, std::string_view content);
 
 /// Writes the content of a document into a new file beside the target and, when every byte is on disk, lets

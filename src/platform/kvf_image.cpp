@@ -29,7 +29,10 @@ std::string_view CommentText(const KvfImage& image, const KvfComment& comment) {
 bool IsOfHeader(std::string_view comment) {
   constexpr std::string_view kTypePrefix = "type = ";
   constexpr std::string_view kSlashes = "// ";
-  if (comment.starts_with(kTypePrefix)) return true;
+  if (comment.starts_with(kTypePrefix)) {
+    const std::string_view type = comment.substr(kTypePrefix.size());
+    return std::all_of(type.begin(), type.end(), IsAsciiDigit);
+  }
   std::string_view header = kKvfHeader;
   while (header.starts_with(kSlashes)) {
     const std::size_t end = header.find('\n');

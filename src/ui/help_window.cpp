@@ -36,24 +36,25 @@ QTextBrowser& HelpWindowOf(QWidget& owner) {
   return *window;
 }
 
-/// The path of the page, or of the first place where it was looked for when it lies nowhere.
-QString HelpPagePath() {
-  const QDir programs(QCoreApplication::applicationDirPath());
-  // A folder that is not known would be the current one, which holds whatever somebody put there.
-  if (programs.isRelative()) return kPage;
-  for (const char* folder : kFolders) {
-    const QString path = programs.filePath(QString::fromLatin1(folder) + u'/' + kPage);
-    if (QFileInfo::exists(path)) return QDir::cleanPath(path);
-  }
-  return programs.filePath(kPage);
-}
-
 }  // namespace
 
+QString FindHelpPage(const QString& programFolder) {
+  // A folder that is not known would be the current one, which holds whatever somebody put there.
+  if (QDir::isRelativePath(programFolder)) return {};
+  for (const char* folder : kFolders) {
+    const QString path = QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + kPage);
+    if (QFileInfo::exists(path)) return QDir::cleanPath(path);
+  }
+  return {};
+}
+
 void OpenHelp(QWidget* parent, int topic) {
-  const QString path = HelpPagePath();
-  if (QDir::isRelativePath(path) || !QFileInfo::exists(path)) {
-    QMessageBox::warning(parent, strings::kError, QStringLiteral("The help page %1 is missing.").arg(path));
+  const QString programFolder = QCoreApplication::applicationDirPath();
+  const QString path = FindHelpPage(programFolder);
+  if (path.isEmpty()) {
+    QMessageBox::warning(
+        parent, strings::kError,
+        QStringLiteral("The help page %1 is missing.").arg(QDir(programFolder).filePath(kPage)));
     return;
   }
   QTextBrowser& window = HelpWindowOf(*parent->window());

@@ -15,6 +15,7 @@
 #include <QMessageBox>
 #include <QMimeData>
 #include <QRegularExpression>
+#include <QStatusBar>
 #include <QTabWidget>
 #include <QTest>
 #include <QTimer>
@@ -135,6 +136,7 @@ class HostScript final {
     const QStringList present = Look();
     if (std::exchange(former, present) != present) lines += present;
     QString text = lines.join(u'\n').replace(Path(""), "FOLDER/");
+    text.replace(StateFolder(), "STATE");
     text.replace(QRegularExpression(R"(process \d+ on [^ )]+)"), "PROCESS");
     return text.isEmpty() ? "" : text.toStdString() + "\n";
   }
@@ -366,6 +368,14 @@ const std::map<QString, HostScript::Call> HostScript::kCalls = {
      [](auto& host, auto& /*words*/) { return host.Pass(std::chrono::milliseconds(1), HostScript::kNever); }},
     {"work-on",
      [](auto& host, auto& /*words*/) { return host.Pass(HostScript::kNever, std::chrono::milliseconds(1)); }},
+    {"status",
+     [](auto& host, auto& /*words*/) {
+       return host.boxes.texts.append(host.Window().statusBar()->currentMessage()), true;
+     }},
+    // A file where the editor's folder for the user's state would be.
+    {"block-state", [](auto& host, auto& /*words*/) { return host.state.Write("tessal", ""), true; }},
+    {"unblock-state",
+     [](auto& host, auto& /*words*/) { return std::filesystem::remove(host.state.File("tessal")); }},
     {"kept", [](auto& host, auto& /*words*/) { return host.LookBehind(); }},
     {"notice", [](auto& host, auto& words) { return host.UseNotice(words.join(u' '), 2000); }},
     {"quiet", [](auto& host, auto& /*words*/) { return !host.UseNotice({}, 400); }},
@@ -420,6 +430,22 @@ TEST(Module, ThatIsMissingOrWrongIsNamed) {
     EXPECT_FALSE(module.Load(row.places));
     EXPECT_TRUE(module.Failure().contains(row.named)) << module.Failure().toStdString();
   }
+}
+
+TEST(Module, IsNotTakenFromTheCurrentFolder) {
+  const TemporaryFolder folder;
+  for (const char* place : {"inner", "lib", "lib/tessal"}) {
+    std::filesystem::create_directory(folder.File(place));
+    std::filesystem::create_symlink(TESSAL_MODULE, folder.File(std::string(place) + "/libtessal_editor.so"));
+  }
+  const QString former = QDir::currentPath();
+  QDir::setCurrent(QString::fromStdString(folder.File("inner")));
+  for (const QString unknown : {"", ".", "..", "../inner"}) {
+    EXPECT_FALSE(EditorModule().Load(EditorModule::UsualPlaces(unknown))) << unknown.toStdString();
+  }
+  EXPECT_TRUE(EditorModule().Load(EditorModule::UsualPlaces(QDir::currentPath())))
+      << "a folder that is known";
+  QDir::setCurrent(former);
 }
 
 long ResidentPages() {

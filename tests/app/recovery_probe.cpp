@@ -1,5 +1,6 @@
-// Keeps the work of a document twice and gives it up, as an editor does: what the fault tests interrupt. Says
-// after each step that it is done, or why it failed.
+// Keeps the work of a document twice, as an editor does: what the fault tests interrupt. Then it ends
+// ("leave"), keeps the work once more without a fault ("again"), or gives it up ("remove"). Says after each
+// step that it is done, or why it failed.
 #include <unistd.h>
 
 #include <QString>
@@ -17,13 +18,21 @@ void Say(const QString& text) {
 }  // namespace
 
 int main(int count, char** arguments) {
-  if (count != 2) return 2;
+  if (count != 3) return 2;
   const QString path = QString::fromUtf8(arguments[1]);
+  const std::string end = arguments[2];
   tessal::RecoveryFile recovery = path.isEmpty() ? tessal::RecoveryFile() : tessal::RecoveryFile(path);
-  for (const char digit : {'1', '2'}) {
-    const QString failure = recovery.Write(std::string(100000, digit));
+  const auto keep = [&recovery](char digit) {
+    const QString failure = recovery.Write(std::string(100000, digit), QStringLiteral("Tessal1"));
     Say(failure.isEmpty() ? QString(QLatin1Char(digit)) : failure);
+  };
+  keep('1');
+  keep('2');
+  if (end == "again") {
+    qunsetenv("SAVE_FAULT_AT");
+    keep('3');
   }
+  if (end != "remove") return 0;
   recovery.Remove();
   Say(QStringLiteral("removed"));
 }

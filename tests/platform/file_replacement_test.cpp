@@ -1,6 +1,7 @@
 #include "platform/file_replacement.h"
 
 #include <gtest/gtest.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -158,6 +159,22 @@ TEST(FileReplacement, AFreshFileIsNotWrittenThroughALinkAndNobodyElseReadsIt) {
   EXPECT_EQ(ReadFile(fresh), "new");
   EXPECT_EQ(ModeOf(fresh), 0600U);
   EXPECT_NE(WriteFreshFile(folder.Path().string(), "x"), "");
+}
+
+TEST(FileReplacement, AFreshFileThatCannotBeWrittenLeavesTheOldOne) {
+  const TemporaryFolder folder;
+  const std::string fresh = folder.Write("fresh", "old");
+  const auto formerHandler = std::signal(SIGXFSZ, SIG_IGN);
+  rlimit former = {};
+  getrlimit(RLIMIT_FSIZE, &former);
+  const rlimit small = {4, former.rlim_max};
+  setrlimit(RLIMIT_FSIZE, &small);
+  const std::string failure = WriteFreshFile(fresh, "too long for it");
+  setrlimit(RLIMIT_FSIZE, &former);
+  std::signal(SIGXFSZ, formerHandler);
+  EXPECT_TRUE(failure.starts_with("can not write file")) << failure;
+  EXPECT_EQ(ReadFile(fresh), "old");
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Path()), {}), 1);
 }
 
 TEST(FileReplacement, MakesANewFileWithTheUsualPermissions) {

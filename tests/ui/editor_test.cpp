@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QClipboard>
+#include <QDir>
 #include <QLabel>
 #include <QMimeData>
 #include <QPushButton>
@@ -23,6 +24,7 @@
 #include "ui/editor.h"
 #include "ui/element_form.h"
 #include "ui/expression_colours.h"
+#include "ui/help_window.h"
 #include "ui/icons.h"
 #include "ui/main_view.h"
 #include "ui/node_kinds.h"
@@ -397,6 +399,18 @@ TEST(Documentation, NoProgramIsStartedAndNothingUnusualOpensWithoutAQuestion) {
   }
   text.replace(place, "FOLDER");
   test::ExpectListing("ui/cases/documentation_trust.txt", text.toStdString());
+}
+
+TEST(Help, IsNotTakenFromTheCurrentFolder) {
+  const test::TemporaryFolder folder;
+  const QString page = QString::fromStdString(folder.Write("TessalOnline.html", "<p>not ours</p>"));
+  const QString former = QDir::currentPath();
+  QDir::setCurrent(QString::fromStdString(folder.Path().string()));
+  for (const QString unknown : {"", "."}) {
+    EXPECT_EQ(FindHelpPage(unknown), "");
+  }
+  EXPECT_EQ(FindHelpPage(QDir::currentPath()), page);
+  QDir::setCurrent(former);
 }
 
 }  // namespace
