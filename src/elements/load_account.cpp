@@ -16,8 +16,7 @@ bool CanBeTakenOver(const AccountEntry& entry) {
 }  // namespace
 
 void LoadAccount::Note(AccountKind kind, std::string_view symbol, int line, const Finding& finding) {
-  entries.push_back(
-      {kind, finding.message->code, std::string(symbol), finding.text, line, nullptr, false});
+  entries.push_back({kind, finding.message->code, std::string(symbol), finding.text, line, nullptr, false});
 }
 
 void LoadAccount::NotePassedOver(std::string_view symbol, int line, const Finding& finding,
