@@ -24,18 +24,24 @@ class LeftOut final {
   explicit LeftOut(LoadAccount& loadAccount) : account(loadAccount) {}
 
   void Note(std::string_view symbol, int line, const Finding& finding) {
-    if (++count <= kMostListed) account.Note(AccountKind::Dropped, symbol, line, finding);
+    if (listed == kMostListed) {
+      ++further;
+      return;
+    }
+    ++listed;
+    account.Note(AccountKind::Dropped, symbol, line, finding);
   }
   void Finish() {
-    if (count <= kMostListed) return;
-    account.Note(AccountKind::Dropped, "", 0, {"more-dropped", {std::to_string(count - kMostListed)}});
+    if (further == 0) return;
+    account.Note(AccountKind::Dropped, "", 0, {"more-dropped", {std::to_string(further)}});
   }
 
  private:
   static constexpr std::size_t kMostListed = 100'000;
 
   LoadAccount& account;
-  std::size_t count = 0;
+  std::size_t listed = 0;
+  std::size_t further = 0;
 };
 
 Finding FindingOf(const KvfUnread& unread, const std::string& parent) {

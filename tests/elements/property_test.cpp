@@ -34,6 +34,10 @@ TEST(Property, ChangesKeepTheOldValueAndTellWhoListens) {
   }
   text.SetText(text.Text().substr(1));
   EXPECT_EQ(listener.calls, 2);
+  EXPECT_EQ(text.PrevText(), "silent");
+  text.SetText("");
+  text.SetText("again");
+  EXPECT_EQ(text.PrevText(), "");
   SetNotifyChanges(false);
 }
 

@@ -10,6 +10,7 @@
 #include <sstream>
 
 #include "keyfile/item_tree.h"
+#include "platform/kvf_text.h"
 #include "support/case_file.h"
 #include "support/temporary_folder.h"
 
@@ -24,10 +25,18 @@ std::string Written(const CKvfBaseItem& item) {
   return stream.str();
 }
 
-/// The tree of a text, written again; or the reader's failure text.
+/// The tree of a text, written again; or the reader's failure text. A mere check says the same, and leaves
+/// the text as it is.
 std::string Read(const std::string& text) {
+  const std::string before = KvfReadableText(text);
+  std::string checked = before;
+  const int isGood = CheckKeyFileText(checked);
+  const std::string failure = KeyFileFailureText();
+  EXPECT_EQ(checked, before);
   CKvfSectionItem tree;
-  return ParseKeyFileTree(text, tree) == 0 ? KeyFileFailureText() : Written(tree);
+  EXPECT_EQ(ParseKeyFileTree(text, tree), isGood);
+  EXPECT_EQ(KeyFileFailureText(), failure);
+  return isGood == 0 ? failure : Written(tree);
 }
 
 std::string Exchanged(std::string text, char from, char to) {
