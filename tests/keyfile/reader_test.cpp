@@ -32,7 +32,7 @@ std::string Read(const std::string& text) {
   std::string checked = before;
   const int isGood = CheckKeyFileText(checked);
   const std::string failure = KeyFileFailureText();
-  EXPECT_EQ(checked, before);
+  EXPECT_TRUE(checked == before);
   CKvfSectionItem tree;
   EXPECT_EQ(ParseKeyFileTree(text, tree), isGood);
   EXPECT_EQ(KeyFileFailureText(), failure);
