@@ -57,7 +57,7 @@ QStringList LocalFiles(const QMimeData& mime) {
 /// One file in one spelling, whatever links and dots lead to it.
 QString FullPath(const QString& path) {
   const QFileInfo file(path);
-  const QString canonical = file.canonicalFilePath();
+  QString canonical = file.canonicalFilePath();
   if (!canonical.isEmpty()) return canonical;
   const QString folder = QFileInfo(file.absolutePath()).canonicalFilePath();
   return folder.isEmpty() ? file.absoluteFilePath() : QDir(folder).filePath(file.fileName());

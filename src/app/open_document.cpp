@@ -93,7 +93,7 @@ QString OpenDocument::KeepWork() {
   if (!text) return QString::fromStdString(reason);
   const std::size_t hash = std::hash<std::string>()(*text);
   if (hash == keptHash) return {};
-  const QString failure = recovery.Write(*text, firstTitle);
+  QString failure = recovery.Write(*text, firstTitle);
   if (failure.isEmpty()) keptHash = hash;
   return failure;
 }

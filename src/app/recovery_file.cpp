@@ -121,14 +121,14 @@ QString RecoveryFile::Write(std::string_view content, const QString& title) {
 }
 
 QString RecoveryFile::WriteInState(std::string_view content) {
-  if (const QString failure = MakeStateFolder(); !failure.isEmpty()) return failure;
+  if (QString failure = MakeStateFolder(); !failure.isEmpty()) return failure;
   // Also where the writing fails: it may be in place, with its lasting in doubt.
   written = NameInState();
   return WritePrivate(written, content);
 }
 
 QString RecoveryFile::WriteUnnamed(std::string_view content, const QString& title) {
-  const QString failure = WriteInState(content);
+  QString failure = WriteInState(content);
   // Work without a title is offered all the same.
   const QString noted = written + kTitleSuffix;
   if (failure.isEmpty() && !IsThere(noted)) WriteFreshFile(Encoded(noted), Encoded(title));
@@ -139,7 +139,7 @@ QString RecoveryFile::NameInState() {
   if (!document.isEmpty()) return InStateFolder(document, kWorkSuffix);
   if (!written.isEmpty()) return written;
   const QString name = kUnnamedPrefix + QUuid::createUuid().toString(QUuid::WithoutBraces) + kWorkSuffix;
-  const QString file = QDir(StateFolder()).filePath(name);
+  QString file = QDir(StateFolder()).filePath(name);
   inUse = Lock(file + kLockSuffix).lock;
   return file;
 }
