@@ -5,6 +5,7 @@
 #include <cerrno>
 #include <cmath>
 #include <map>
+#include <memory>
 #include <optional>
 #include <utility>
 #include <variant>
@@ -22,7 +23,7 @@ namespace tessal {
 namespace {
 
 /// A file that was read, or one under construction.
-using KvfFile = std::variant<KvfImage, KvfWriter>;
+using KvfFile = std::variant<std::unique_ptr<KvfImage>, std::unique_ptr<KvfWriter>>;
 
 /// The library's state: the open files, and what went wrong last.
 struct Library {
@@ -48,17 +49,17 @@ template <class File>
 File* FileOf(KvfHandle handle) {
   auto& files = TheLibrary().files;
   const auto hit = files.find(handle);
-  File* file = hit == files.end() ? nullptr : std::get_if<File>(&hit->second);
-  if (file == nullptr) Note(kKvfBadHandle);
-  return file;
+  const auto* file = hit == files.end() ? nullptr : std::get_if<std::unique_ptr<File>>(&hit->second);
+  if (file != nullptr) return file->get();
+  Note(kKvfBadHandle);
+  return nullptr;
 }
 
-/// Opens a file made of the arguments, and gives its handle.
-template <class File, class... Arguments>
-KvfHandle Open(Arguments&&... arguments) {
+/// Keeps a file open, and gives its handle.
+KvfHandle Keep(KvfFile file) {
   Library& library = TheLibrary();
   const KvfHandle handle = ++library.lastHandle;
-  library.files.try_emplace(handle, std::in_place_type<File>, std::forward<Arguments>(arguments)...);
+  library.files.emplace(handle, std::move(file));
   return handle;
 }
 
@@ -146,14 +147,11 @@ KvfHandle kvfLoadText(std::string bytes) {
   library.lastError = kKvfOk;
   library.syntaxError = {};
   const std::size_t bytesCut = bytes.size() - std::min(bytes.find('\0'), bytes.size());
-  KvfHandle handle = Open<KvfImage>(KvfReadableText(std::move(bytes)));
-  KvfImage& image = *FileOf<KvfImage>(handle);
-  image.bytesCut = bytesCut;
-  if (!ReadKvfImage(image, library.syntaxError)) {
-    kvfClose(&handle);
-    Note(kKvfSyntaxError);
-  }
-  return handle;
+  auto image = std::make_unique<KvfImage>(KvfReadableText(std::move(bytes)));
+  image->bytesCut = bytesCut;
+  if (ReadKvfImage(*image, library.syntaxError)) return Keep(std::move(image));
+  Note(kKvfSyntaxError);
+  return 0;
 }
 
 int kvfGetErrorGlb() {
@@ -170,7 +168,7 @@ int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& tex
 }
 
 KvfHandle kvfCreate() {
-  return Open<KvfWriter>();
+  return Keep(std::make_unique<KvfWriter>());
 }
 
 void kvfClose(KvfHandle* handle) {
@@ -352,8 +350,9 @@ std::string kvfTakeText(KvfHandle* handle) {
   auto& files = TheLibrary().files;
   const auto hit = handle == nullptr ? files.end() : files.find(*handle);
   if (hit != files.end()) {
-    KvfImage* image = std::get_if<KvfImage>(&hit->second);
-    text = image != nullptr ? std::move(image->source) : std::get<KvfWriter>(hit->second).TakeText();
+    const auto* image = std::get_if<std::unique_ptr<KvfImage>>(&hit->second);
+    text = image != nullptr ? std::move((*image)->source)
+                            : std::get<std::unique_ptr<KvfWriter>>(hit->second)->TakeText();
   }
   kvfClose(handle);
   return text;
