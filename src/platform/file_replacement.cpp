@@ -205,6 +205,7 @@ std::optional<std::string> ReadWholeFile(const std::string& path, std::string& f
   if (type == std::filesystem::file_type::character || type == std::filesystem::file_type::block) {
     // A device may have no end.
     failure = "can not read file '" + path + "': it is a device";
+    errno = EINVAL;
     return std::nullopt;
   }
   const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
