@@ -98,31 +98,47 @@ class ScannerRest final {
   ~ScannerRest() { ResetExpressionScanner(); }
 };
 
-/// Bytes of an expression that is still parsed. A tree takes a hundred times the memory of its text.
+/// Bytes of an expression that is still parsed. A tree may take a hundred times the memory of its text.
 inline constexpr std::size_t kLongestExpression = 1'000'000;
+
+/// A lexeme by its place in the text that is scanned.
+struct LexemeSpan {
+  std::uint32_t start;
+  std::uint32_t length;
+};
 
 /// The scanner as the parser and the lists pull from it. One scan at a time.
 class ExpressionScan final {
  public:
-  /// Begins a scan of a copy of the text.
-  explicit ExpressionScan(std::string_view text);
+  /// Begins a scan of a text, which must outlive it.
+  explicit ExpressionScan(std::string_view scanned);
   ExpressionScan(const ExpressionScan&) = delete;
   ExpressionScan& operator=(const ExpressionScan&) = delete;
-  ~ExpressionScan();
 
   /// The next token: `End` at the end, the (signed) character for one without a kind.
   TokenCode Next();
-  /// The present token's text; good until the next one is pulled.
-  std::string_view Lexeme() const;
+  /// The present token's text, a view into what is scanned.
+  std::string_view Lexeme() const { return text.substr(lexemeStart, consumed - lexemeStart); }
   /// Characters taken so far, the present token's included.
-  std::uint32_t Consumed() const;
+  std::uint32_t Consumed() const { return consumed; }
   /// Line feeds met outside comments.
-  std::uint32_t Lines() const;
+  std::uint32_t Lines() const { return lines; }
   /// Characters taken when the present line began.
-  std::uint32_t LineStart() const;
+  std::uint32_t LineStart() const { return lineStart; }
 
  private:
-  std::string scanned;
+  void SkipComment();
+  TokenCode Word();
+  TokenCode Number();
+  std::uint32_t AfterDigits(std::uint32_t place) const;
+  TokenCode Colon();
+  char At(std::size_t place) const { return place < text.size() ? text[place] : '\0'; }
+
+  std::string_view text;  ///< to its first zero byte
+  std::uint32_t consumed = 0;
+  std::uint32_t lexemeStart = 0;
+  std::uint32_t lines = 0;
+  std::uint32_t lineStart = 0;
 };
 
 }  // namespace tessal
