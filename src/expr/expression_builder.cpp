@@ -1,6 +1,6 @@
 #include "expr/expression_builder.h"
 
-#include <memory>
+#include <algorithm>
 #include <new>
 #include <type_traits>
 
@@ -11,13 +11,18 @@ static_assert(std::is_trivially_destructible_v<ExpressionNode>, "a block is rele
 
 const ExpressionNode* ExpressionBuilder::CopyTo(void* place) const {
   auto* node = static_cast<ExpressionNode*>(place);
-  for (const ExpressionNode::Fields& fields : nodes) ::new (node++) ExpressionNode(fields);
-  return node - 1;
+  for (NodeHandle handle = 0; handle < count; ++handle) ::new (node + handle) ExpressionNode(nodes[handle]);
+  return node + count - 1;
 }
 
 void ExpressionBuilder::Clear() {
-  nodes.clear();
-  if (nodes.capacity() > kMostKept) nodes.shrink_to_fit();
+  count = 0;
+  if (nodes.size() > kMostKept) nodes = {};
+}
+
+void ExpressionBuilder::Grow() {
+  constexpr std::size_t kFirstRoom = 64;
+  nodes.resize(std::max(kFirstRoom, nodes.size() * 2));
 }
 
 }  // namespace tessal

@@ -22,7 +22,7 @@ class ExpressionBuilder final {
   NodeHandle Add(NodeKind kind, std::string_view text, NodeHandle child);
   NodeHandle Add(NodeKind kind, std::string_view text, NodeHandle first, NodeHandle second);
 
-  std::size_t Count() const { return nodes.size(); }
+  std::size_t Count() const { return count; }
   /// Copies the nodes to a place with room for `Count` of them, and gives the root, the last of them.
   const ExpressionNode* CopyTo(void* place) const;
   /// Begins another tree.
@@ -32,15 +32,16 @@ class ExpressionBuilder final {
   /// More are not kept from one tree to the next.
   static constexpr std::size_t kMostKept = 16'384;
 
-  std::vector<ExpressionNode::Fields> nodes;
+  void Grow();
+
+  std::vector<ExpressionNode::Fields> nodes;  ///< those of the tree, then room for more
+  NodeHandle count = 0;
 };
 
 inline NodeHandle ExpressionBuilder::Add(NodeKind kind, std::string_view text) {
-  ExpressionNode::Fields& node = nodes.emplace_back();
-  node.text = text.data();
-  node.textLength = static_cast<std::uint16_t>(text.size());
-  node.kind = kind;
-  return static_cast<NodeHandle>(nodes.size() - 1);
+  if (count == nodes.size()) Grow();
+  nodes[count] = {.text = text.data(), .textLength = static_cast<std::uint16_t>(text.size()), .kind = kind};
+  return count++;
 }
 
 inline NodeHandle ExpressionBuilder::Add(NodeKind kind, std::string_view text, NodeHandle child) {

@@ -1,36 +1,9 @@
-%{
 // The grammar of the expression language. Its products are a tree, or a message; nothing is evaluated.
-#include "expr/parse_state.h"
-
-// The parse owns what its stack needs.
-#define YYMALLOC(size) state.Memory().Take(size)
-#define YYFREE(block) state.Memory().Release(block)
-%}
+%skeleton "./grammar_tables.m4"
 
 %code requires {
-#include "expr/expression_builder.h"
-#include "expr/scanner.h"
-
-namespace tessal {
-class ParseState;
+#include "expr/parse_state.h"
 }
-}
-
-%code {
-// The scanner's codes are the tokens declared here, in the same order.
-static_assert(static_cast<int>(tessal::TokenCode::Identifier) == IDENTIFIER &&
-              static_cast<int>(tessal::TokenCode::If) == IF &&
-              static_cast<int>(tessal::TokenCode::ExceedanceFrequency) == EXCEEDANCE_FREQUENCY &&
-              static_cast<int>(tessal::TokenCode::UMinus) == U_MINUS);
-
-static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value, tessal::ParseState& state);
-static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message);
-}
-
-%define api.prefix {tessal_expression_grammar_}
-%define api.pure full
-%define parse.error verbose
-%param { tessal::ParseState& state }
 
 // In `IF c THEN a ELSE b + 1` and `a ::= b + 1` the last expression is the longest that follows: shifting is meant.
 %expect 24
@@ -94,7 +67,7 @@ static void tessal_expression_grammar_error(tessal::ParseState& state, const cha
 %%
 
 new_expression:
-    expression                            { $$ = $1; }
+    expression
   ;
 
 constant:
@@ -227,25 +200,3 @@ mod_target:
 abm_property:
     LEFT_SQUARE IDENTIFIER RIGHT_SQUARE   { $$ = state.Leaf(tessal::NodeKind::Property, $2); }
   ;
-
-%%
-
-static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value, tessal::ParseState& state) {
-  const int code = state.Pull(value->lexeme);
-  // The message is set; without an error rule this ends the parse.
-  return state.TokenIsTooLong() ? static_cast<int>(TESSAL_EXPRESSION_GRAMMAR_error) : code;
-}
-
-static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message) {
-  state.FailAsParser(message);
-}
-
-namespace tessal {
-
-// The grammar's own list of its tokens holds their names.
-std::string_view TokenName(TokenCode code) {
-  if (code < TokenCode::Identifier || code > TokenCode::UMinus) return "-";
-  return yysymbol_name(YYTRANSLATE(static_cast<int>(code)));
-}
-
-}  // namespace tessal

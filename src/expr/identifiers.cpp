@@ -21,15 +21,17 @@ void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& ident
 void IdentifiersOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text,
                      std::vector<std::string_view>& identifiers) {
   const ScannerStart began = ExpressionScannerStart();
-  const auto known = ParseOnce(held, text).Identifiers();
-  if (!known) {
+  const ParsedExpression& parsed = ParseOnce(held, text);
+  if (!parsed.KnowsIdentifiers()) {
     // The parse left the rest unscanned, and the start of the next scan as it was there.
     SetExpressionScannerStart(began);
     ScanIdentifiers(text, identifiers);
     return;
   }
   identifiers.clear();
-  for (const LexemeSpan name : *known) identifiers.push_back(text.substr(name.start, name.length));
+  for (const LexemeSpan name : parsed.Identifiers()) {
+    identifiers.push_back(text.substr(name.start, name.length));
+  }
 }
 
 void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers) {

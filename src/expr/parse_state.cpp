@@ -6,13 +6,6 @@ namespace tessal {
 
 namespace {
 
-/// Identifiers and numbers fit a buffer of this size with their terminator, or fail the parse.
-constexpr std::size_t kLexemeBuffer = 1000;
-
-bool HasLexeme(TokenCode code) {
-  return code >= TokenCode::Identifier && code <= TokenCode::ScientificNum;
-}
-
 constexpr std::array<std::string_view, 6> kModlistFields = {"SV1", "SV2", "cpy12", "cpy21", "red1", "red2"};
 
 }  // namespace
@@ -23,40 +16,8 @@ ParseState::ParseState(std::string_view expression, ParseArrays& parseArrays)
   arrays.identifiers.clear();
 }
 
-int ParseState::Pull(LexemeSpan& lexeme) {
-  const TokenCode token = scan.Next();
-  const int code = static_cast<int>(token);
-  if (HasLexeme(token)) {
-    const auto length = static_cast<std::uint32_t>(scan.Lexeme().size());
-    if (length >= kLexemeBuffer) {
-      tooLong = true;
-      Fail("token-too-long");
-      return code;
-    }
-    lexeme = {scan.Consumed() - length, length};
-    if (token == TokenCode::Identifier) arrays.identifiers.push_back(lexeme);
-    return code;
-  }
-  if (token == TokenCode::End) {
-    scannedAll = true;
-  } else if (!IsPlainToken(token)) {
-    clean = false;
-    // A character with the high bit set is negative, and ends the input for the parser.
-    if (token > TokenCode::End && token < TokenCode::Identifier) return UNDEFINED;
-  }
-  return code;
-}
-
 void ParseState::Fail(Message message, std::string_view words) {
   failure = Finding(message, {std::to_string(scan.Lines() + 1), std::to_string(Position()), words});
-}
-
-void ParseState::FailAsParser(std::string_view words) {
-  if (words == "memory exhausted") {
-    Fail("nesting-too-deep");
-  } else {
-    Fail("syntax-error", words);
-  }
 }
 
 NodeHandle ParseState::RidValue(LexemeSpan name) {

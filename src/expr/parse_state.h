@@ -12,10 +12,8 @@
 
 #include "core/messages.h"
 #include "expr/expression_builder.h"
-#include "expr/expression_grammar.h"
 #include "expr/expression_node.h"
 #include "expr/scanner.h"
-#include "platform/parser_memory.h"
 
 namespace tessal {
 
@@ -30,13 +28,13 @@ class ParseState final {
   /// Clears the arrays. The text must outlive the parse and the tree.
   ParseState(std::string_view expression, ParseArrays& parseArrays);
 
-  ParserMemory& Memory() { return memory; }
-
   // The token side.
-  int Pull(LexemeSpan& lexeme);
+  /// The next token, and the place of those that have a text.
+  TokenCode Pull(LexemeSpan& lexeme);
+  /// Whether the token pulled is too long, and the parse has failed.
   bool TokenIsTooLong() const { return tooLong; }
-  /// The failure in the words of the generated parser.
-  void FailAsParser(std::string_view words);
+  /// Notes a message of the parser. Its values are line, position, and the words if it has a place for them.
+  void Fail(Message message, std::string_view words = {});
 
   // The tree side.
   NodeHandle Leaf(NodeKind kind, LexemeSpan lexeme) { return arrays.tree.Add(kind, TextOf(lexeme)); }
@@ -71,20 +69,38 @@ class ParseState final {
   }
 
  private:
+  /// Identifiers and numbers fit a buffer of this size with their terminator, or fail the parse.
+  static constexpr std::uint32_t kLexemeBuffer = 1000;
+
   std::string_view TextOf(LexemeSpan lexeme) const { return {text.data() + lexeme.start, lexeme.length}; }
-  /// Notes a message of the parser. Its values are line, position, and the words if it has a place for them.
-  void Fail(Message message, std::string_view words = {});
   NodeHandle Number(std::string_view digit) { return Node(NodeKind::Number, digit); }
   NodeHandle IsTrue(NodeHandle conditional);
 
   std::string_view text;
   ParseArrays& arrays;
   ExpressionScan scan;
-  ParserMemory memory;
   std::optional<Finding> failure;
   bool tooLong = false;
   bool scannedAll = false;
   bool clean = true;
 };
+
+inline TokenCode ParseState::Pull(LexemeSpan& lexeme) {
+  const TokenCode token = scan.Next();
+  if (token >= TokenCode::Identifier && token <= TokenCode::ScientificNum) {
+    lexeme = scan.Span();
+    if (lexeme.length >= kLexemeBuffer) {
+      tooLong = true;
+      Fail("token-too-long");
+    } else if (token == TokenCode::Identifier) {
+      arrays.identifiers.push_back(lexeme);
+    }
+  } else if (token == TokenCode::End) {
+    scannedAll = true;
+  } else if (!IsPlainToken(token)) {
+    clean = false;
+  }
+  return token;
+}
 
 }  // namespace tessal

@@ -5,6 +5,7 @@
 #include <type_traits>
 #include <utility>
 
+#include "expr/expression_automaton.h"
 #include "expr/expression_builder.h"
 #include "expr/parse_state.h"
 
@@ -35,11 +36,10 @@ std::unique_ptr<ParsedExpression> ParsedExpression::InBlock(const ExpressionBuil
   return parsed;
 }
 
-std::optional<std::span<const LexemeSpan>> ParsedExpression::Identifiers() const {
-  if (!knowsIdentifiers) return std::nullopt;
+std::span<const LexemeSpan> ParsedExpression::Identifiers() const {
   const void* const afterNodes =
       root != nullptr ? static_cast<const void*>(root + 1) : static_cast<const void*>(this + 1);
-  return std::span(static_cast<const LexemeSpan*>(afterNodes), identifierCount);
+  return {static_cast<const LexemeSpan*>(afterNodes), identifierCount};
 }
 
 std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text) {
@@ -52,7 +52,7 @@ std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text) {
     parsed->knowsIdentifiers = true;
   } else {
     ParseState state(text, parseArrays);
-    const bool good = tessal_expression_grammar_parse(state) == 0;
+    const bool good = RunAutomaton(state);
     parsed = ParsedExpression::InBlock(good ? &parseArrays.tree : nullptr, state.Identifiers());
     if (!good)
       parsed->failure =

@@ -5,7 +5,6 @@
 #include <concepts>
 #include <cstdint>
 #include <memory>
-#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -43,9 +42,11 @@ struct ParsedExpression final {
   ScannerStart Began() const { return began; }
   ScannerStart Left() const { return left; }
 
-  /// What `ScanIdentifiers` finds in the text from the same start, with the same effect on the next one, as
-  /// places in the text. Nothing when the parse stopped before the end of the text.
-  std::optional<std::span<const LexemeSpan>> Identifiers() const;
+  /// Whether the parse came to the end of the text, and so knows its identifiers.
+  bool KnowsIdentifiers() const { return knowsIdentifiers; }
+  /// What `ScanIdentifiers` finds in the text from the same start, with the same effect on the next one; only
+  /// of a parse that knows them.
+  std::span<const LexemeSpan> Identifiers() const;
 
   /// What lies after the object goes with it.
   static void operator delete(void* block) noexcept { ::operator delete(block); }

@@ -104,11 +104,14 @@ constexpr std::array<Beginning, 256> kBeginnings = [] {
   return rows;
 }();
 
-/// Whether a character continues a name or keyword.
-constexpr bool ContinuesWord(char character) {
-  const ByteClass byteClass = kBeginnings[PlaceOf(character)].byteClass;
-  return byteClass == ByteClass::Letter || byteClass == ByteClass::Digit;
-}
+/// The bytes that continue a name or keyword.
+constexpr std::array<bool, 256> kContinuesWord = [] {
+  std::array<bool, 256> continues{};
+  for (std::size_t byte = 0; byte < continues.size(); ++byte) {
+    continues[byte] = IsWordCharacter(static_cast<char>(byte));
+  }
+  return continues;
+}();
 
 /// The keyword or name that a word is. NOT, AND, OR and EXCEEDANCE_FREQUENCY are keywords in capitals only.
 TokenCode CodeOfWord(std::string_view word) {
@@ -143,17 +146,18 @@ ExpressionToken MakeToken(const ExpressionScan& scan, TokenCode code) {
 
 }  // namespace
 
-ExpressionScan::ExpressionScan(std::string_view scanned) {
+ExpressionScan::ExpressionScan(std::string_view scanned)
+    : text(scanned.data()), here(text), lexeme(text), line(text) {
   constexpr auto kLongest = static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max() - 2);
-  text = scanned.substr(0, std::min(scanned.find('\0'), kLongest));
+  end = text + std::min({scanned.find('\0'), scanned.size(), kLongest});
 }
 
 TokenCode ExpressionScan::Next() {
+  if (nextStart == ScannerStart::Comment) SkipComment();
   for (;;) {
-    if (nextStart == ScannerStart::Comment) SkipComment();
-    lexemeStart = consumed;
-    if (consumed == text.size()) return TokenCode::End;
-    const Beginning& first = kBeginnings[PlaceOf(text[consumed++])];
+    lexeme = here;
+    if (here == end) return TokenCode::End;
+    const Beginning& first = kBeginnings[PlaceOf(*here++)];
     switch (first.byteClass) {
       case ByteClass::Token:
         return first.token;
@@ -164,19 +168,20 @@ TokenCode ExpressionScan::Next() {
       case ByteClass::Digit:
         return Number();
       case ByteClass::Pair:
-        if (At(consumed) != first.follower) return first.token;
-        ++consumed;
+        if (!IsAt(here, first.follower)) return first.token;
+        ++here;
         return first.pair;
       case ByteClass::Slash:
-        if (At(consumed) != '*') return first.token;
-        ++consumed;
+        if (!IsAt(here, '*')) return first.token;
+        ++here;
         nextStart = ScannerStart::Comment;
+        SkipComment();
         break;
       case ByteClass::Colon:
         return Colon();
       case ByteClass::LineFeed:
         ++lines;
-        lineStart = consumed;
+        line = here;
         break;
     }
   }
@@ -184,43 +189,46 @@ TokenCode ExpressionScan::Next() {
 
 void ExpressionScan::SkipComment() {
   // Its line feeds do not count.
-  const std::size_t end = text.find("*/", consumed);
-  consumed = static_cast<std::uint32_t>(end == std::string_view::npos ? text.size() : end + 2);
-  if (end != std::string_view::npos) nextStart = ScannerStart::Text;
+  constexpr std::string_view kEnd = "*/";
+  here = std::search(here, end, kEnd.begin(), kEnd.end());
+  if (here == end) return;
+  here += kEnd.size();
+  nextStart = ScannerStart::Text;
 }
 
 TokenCode ExpressionScan::Word() {
-  while (ContinuesWord(At(consumed))) ++consumed;
+  const char* place = here;
+  while (place != end && kContinuesWord[PlaceOf(*place)]) ++place;
+  here = place;
   return CodeOfWord(Lexeme());
 }
 
-std::uint32_t ExpressionScan::AfterDigits(std::uint32_t place) const {
-  while (IsAsciiDigit(At(place))) ++place;
-  return place;
+const char* ExpressionScan::AfterDigits(const char* place) const {
+  return std::find_if_not(place, end, IsAsciiDigit);
 }
 
 TokenCode ExpressionScan::Number() {
   TokenCode code = TokenCode::IntNum;
-  consumed = AfterDigits(consumed);
-  if (At(consumed) == '.') {
+  here = AfterDigits(here);
+  if (IsAt(here, '.')) {
     code = TokenCode::FloatNum;
-    consumed = AfterDigits(consumed + 1);
+    here = AfterDigits(here + 1);
   }
-  if (UpperCase(At(consumed)) != 'E') return code;
-  const char sign = At(consumed + 1);
-  const std::uint32_t digits = consumed + (sign == '+' || sign == '-' ? 2 : 1);
-  const std::uint32_t end = AfterDigits(digits);
+  if (!IsAt(here, 'e') && !IsAt(here, 'E')) return code;
+  const bool hasSign = IsAt(here + 1, '+') || IsAt(here + 1, '-');
+  const char* const digits = here + (hasSign ? 2 : 1);
+  const char* const afterDigits = AfterDigits(digits);
   // An E without digits is a name after the number.
-  if (end == digits) return code;
-  consumed = end;
+  if (afterDigits == digits) return code;
+  here = afterDigits;
   return TokenCode::ScientificNum;
 }
 
 TokenCode ExpressionScan::Colon() {
-  if (At(consumed) == ':') {
+  if (IsAt(here, ':')) {
     for (const LoneSign& direct : kDirectSigns) {
-      if (At(consumed + 1) != direct.sign) continue;
-      consumed += 2;
+      if (!IsAt(here + 1, direct.sign)) continue;
+      here += 2;
       return direct.token;
     }
   }

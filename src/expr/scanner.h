@@ -117,28 +117,33 @@ class ExpressionScan final {
 
   /// The next token: `End` at the end, the (signed) character for one without a kind.
   TokenCode Next();
-  /// The present token's text, a view into what is scanned.
-  std::string_view Lexeme() const { return text.substr(lexemeStart, consumed - lexemeStart); }
+  /// The present token's text, a view into what is scanned, and its place there.
+  std::string_view Lexeme() const { return {lexeme, static_cast<std::size_t>(here - lexeme)}; }
+  LexemeSpan Span() const { return {Distance(text, lexeme), Distance(lexeme, here)}; }
   /// Characters taken so far, the present token's included.
-  std::uint32_t Consumed() const { return consumed; }
+  std::uint32_t Consumed() const { return Distance(text, here); }
   /// Line feeds met outside comments.
   std::uint32_t Lines() const { return lines; }
   /// Characters taken when the present line began.
-  std::uint32_t LineStart() const { return lineStart; }
+  std::uint32_t LineStart() const { return Distance(text, line); }
 
  private:
+  static std::uint32_t Distance(const char* from, const char* to) {
+    return static_cast<std::uint32_t>(to - from);
+  }
   void SkipComment();
   TokenCode Word();
   TokenCode Number();
-  std::uint32_t AfterDigits(std::uint32_t place) const;
   TokenCode Colon();
-  char At(std::size_t place) const { return place < text.size() ? text[place] : '\0'; }
+  const char* AfterDigits(const char* place) const;
+  bool IsAt(const char* place, char character) const { return place < end && *place == character; }
 
-  std::string_view text;  ///< to its first zero byte
-  std::uint32_t consumed = 0;
-  std::uint32_t lexemeStart = 0;
+  const char* text;
+  const char* end;     ///< of the text, or its first zero byte
+  const char* here;    ///< after the present token
+  const char* lexeme;  ///< where the present token begins
+  const char* line;    ///< where the present line begins
   std::uint32_t lines = 0;
-  std::uint32_t lineStart = 0;
 };
 
 }  // namespace tessal
