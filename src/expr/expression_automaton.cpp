@@ -55,6 +55,11 @@ constexpr Action Reduction(int rule) {
 
 static_assert(kStateCount + grammar::kRuleCount <= 256, "an action is a byte");
 
+struct RuleShape {
+  std::uint8_t length;  ///< symbols on the right side
+  std::uint8_t left;
+};
+
 /// The automaton with its compressed rows spread out, so that each step is one look.
 struct Automaton {
   std::array<std::array<Action, kTokenCount>, kStateCount> actions;
@@ -62,6 +67,7 @@ struct Automaton {
   std::array<Action, kStateCount> blindActions;
   /// The state after the reduction to a symbol, from the state below it.
   std::array<std::array<std::uint8_t, grammar::kSymbolCount>, kStateCount> nextStates;
+  std::array<RuleShape, grammar::kRuleCount> rules;
 };
 
 /// The entry of a row for a token; an error where the default of the state applies.
@@ -110,12 +116,17 @@ constexpr int SettledState(int state, int symbol) {
 constexpr Automaton kAutomaton = [] {
   Automaton automaton{};
   for (int state = 0; state < kStateCount; ++state) {
-    for (int token = 0; token < kTokenCount; ++token)
+    for (int token = 0; token < kTokenCount; ++token) {
       automaton.actions[state][token] = ActionOf(state, token);
+    }
     if (IsBlind(state)) automaton.blindActions[state] = ActionOf(state, 0);
     for (int symbol = kTokenCount; symbol < grammar::kSymbolCount; ++symbol) {
       automaton.nextStates[state][symbol] = static_cast<std::uint8_t>(SettledState(state, symbol));
     }
+  }
+  for (int rule = 0; rule < grammar::kRuleCount; ++rule) {
+    automaton.rules[rule] = {static_cast<std::uint8_t>(grammar::kTable_r2[rule]),
+                             static_cast<std::uint8_t>(grammar::kTable_r1[rule])};
   }
   return automaton;
 }();
@@ -153,9 +164,10 @@ bool RunAutomaton(ParseState& state) {
   stack.states[0] = 0;
   const auto reduce = [&top, &state](Action reduction) {
     const int rule = reduction - kStateCount;
-    top = top + 1 - static_cast<std::size_t>(grammar::kTable_r2[rule]);
+    const RuleShape shape = kAutomaton.rules[rule];
+    top = top + 1 - shape.length;
+    stack.states[top] = kAutomaton.nextStates[stack.states[top - 1]][shape.left];
     stack.values[top] = grammar::Reduce(rule, &stack.values[top], state);
-    stack.states[top] = kAutomaton.nextStates[stack.states[top - 1]][grammar::kTable_r1[rule]];
   };
   for (;;) {
     while (const Action blind = kAutomaton.blindActions[stack.states[top]]) reduce(blind);

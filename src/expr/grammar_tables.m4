@@ -1,4 +1,3 @@
-                                                                  -*- m4 -*-
 # What Bison writes of grammar.y: its automaton as tables, and the actions of its rules as one function. The
 # loop over them is expression_automaton.cpp.
 
