@@ -3,6 +3,8 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <iterator>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -20,21 +22,26 @@ using grammar::kTokenCount;
 
 constexpr std::size_t kMostStates = 10'000;
 
-constexpr int kErrorToken = 1;
-constexpr int kUndefinedToken = kTokenCount - 1;
+/// The grammar's numbers. Tokens are the first of the symbols.
+using State = std::size_t;
+using Symbol = std::size_t;
+using Rule = std::size_t;
 
-/// The grammar's number of a token that is pulled. What is no token of the grammar is undefined; a character
-/// with the high bit set is negative, and ends the text for the parser.
-constexpr int TokenNumber(TokenCode code) {
-  constexpr int kFirstNumber = 3;
+constexpr Symbol kErrorToken = 1;
+constexpr Symbol kUndefinedToken = kTokenCount - 1;
+
+/// The number of a token that is pulled. What is no token of the grammar is undefined; a character with the
+/// high bit set is negative, and ends the text for the parser.
+constexpr Symbol TokenNumber(TokenCode code) {
+  constexpr std::size_t kFirstNumber = 3;
   if (code <= TokenCode::End) return 0;
   if (code < TokenCode::Identifier) return kUndefinedToken;
-  return static_cast<int>(code) - static_cast<int>(TokenCode::Identifier) + kFirstNumber;
+  return static_cast<std::size_t>(code) - static_cast<std::size_t>(TokenCode::Identifier) + kFirstNumber;
 }
 
 /// The grammar's name of a symbol, without the quotes of those that are no names.
-constexpr std::string_view SymbolName(int number) {
-  const std::string_view name = grammar::kSymbolNames[number];
+constexpr std::string_view SymbolName(Symbol symbol) {
+  const std::string_view name = grammar::kSymbolNames[symbol];
   return name.front() == '"' ? name.substr(1, name.size() - 2) : name;
 }
 
@@ -49,7 +56,7 @@ static_assert(SymbolName(TokenNumber(TokenCode::Identifier)) == "IDENTIFIER" &&
 using Action = std::uint8_t;
 constexpr Action kError = 0;
 
-constexpr Action Reduction(int rule) {
+constexpr Action Reduction(Rule rule) {
   return static_cast<Action>(kStateCount + rule);
 }
 
@@ -70,64 +77,76 @@ struct Automaton {
   std::array<RuleShape, grammar::kRuleCount> rules;
 };
 
-/// The entry of a row for a token; an error where the default of the state applies.
-constexpr int Entry(int state, int token) {
-  const int place = grammar::kTable_pact[state] + token;
-  if (place < 0 || place >= static_cast<int>(std::size(grammar::kTable_table))) return grammar::kErrorEntry;
-  return grammar::kTable_check[place] == token ? grammar::kTable_table[place] : grammar::kErrorEntry;
+/// The place in the compressed rows, of which each row has its own base; none where the row has no entry.
+constexpr std::optional<std::size_t> PlaceOf(std::int16_t base, std::size_t column) {
+  const std::ptrdiff_t place = base + static_cast<std::ptrdiff_t>(column);
+  if (place < 0 || place >= std::ssize(grammar::kTable_table)) return std::nullopt;
+  const auto found = static_cast<std::size_t>(place);
+  return grammar::kTable_check[found] == static_cast<std::ptrdiff_t>(column) ? std::optional(found)
+                                                                             : std::nullopt;
 }
 
-constexpr bool IsBlind(int state) {
+/// The entry of a state for a token; an error where its default applies.
+constexpr int Entry(State state, Symbol token) {
+  const auto place = PlaceOf(grammar::kTable_pact[state], token);
+  return place ? grammar::kTable_table[*place] : grammar::kErrorEntry;
+}
+
+/// Whether a state reduces whatever token comes, without a look at it.
+constexpr bool IsBlind(State state) {
   return grammar::kTable_pact[state] == grammar::kNoRow;
 }
 
-constexpr Action ActionOf(int state, int token) {
+constexpr Rule DefaultRule(State state) {
+  return static_cast<Rule>(grammar::kTable_defact[state]);
+}
+
+constexpr Action ActionOf(State state, Symbol token) {
   const int entry = IsBlind(state) ? grammar::kErrorEntry : Entry(state, token);
   if (entry > 0) return static_cast<Action>(entry);
-  if (entry < 0 && entry != grammar::kErrorEntry) return Reduction(-entry);
-  const int rule = grammar::kTable_defact[state];
-  return rule == 0 ? kError : Reduction(rule);
+  if (entry != grammar::kErrorEntry) return Reduction(static_cast<Rule>(-entry));
+  return DefaultRule(state) == 0 ? kError : Reduction(DefaultRule(state));
 }
 
-constexpr int NextState(int state, int symbol) {
-  const int column = symbol - kTokenCount;
-  const int place = grammar::kTable_pgoto[column] + state;
-  const bool hasEntry = place >= 0 && place < static_cast<int>(std::size(grammar::kTable_table)) &&
-                        grammar::kTable_check[place] == state;
-  return hasEntry ? grammar::kTable_table[place] : grammar::kTable_defgoto[column];
+constexpr State NextState(State state, Symbol symbol) {
+  const std::size_t column = symbol - kTokenCount;
+  const auto place = PlaceOf(grammar::kTable_pgoto[column], state);
+  return static_cast<State>(place ? grammar::kTable_table[*place] : grammar::kTable_defgoto[column]);
 }
 
-constexpr bool PassesOn(int rule) {
-  for (const int own : grammar::kRulesWithAction) {
+constexpr RuleShape ShapeOf(Rule rule) {
+  return {static_cast<std::uint8_t>(grammar::kTable_r2[rule]),
+          static_cast<std::uint8_t>(grammar::kTable_r1[rule])};
+}
+
+constexpr bool PassesOn(Rule rule) {
+  for (const Rule own : grammar::kRulesWithAction) {
     if (own == rule) return false;
   }
-  return grammar::kTable_r2[rule] == 1;
+  return ShapeOf(rule).length == 1;
 }
 
 /// The same after the reductions that follow blindly and change nothing but the symbol.
-constexpr int SettledState(int state, int symbol) {
-  int next = NextState(state, symbol);
-  while (IsBlind(next) && PassesOn(grammar::kTable_defact[next])) {
-    next = NextState(state, grammar::kTable_r1[grammar::kTable_defact[next]]);
+constexpr State SettledState(State state, Symbol symbol) {
+  State next = NextState(state, symbol);
+  while (IsBlind(next) && PassesOn(DefaultRule(next))) {
+    next = NextState(state, ShapeOf(DefaultRule(next)).left);
   }
   return next;
 }
 
 constexpr Automaton kAutomaton = [] {
   Automaton automaton{};
-  for (int state = 0; state < kStateCount; ++state) {
-    for (int token = 0; token < kTokenCount; ++token) {
+  for (State state = 0; state < kStateCount; ++state) {
+    for (Symbol token = 0; token < kTokenCount; ++token) {
       automaton.actions[state][token] = ActionOf(state, token);
     }
     if (IsBlind(state)) automaton.blindActions[state] = ActionOf(state, 0);
-    for (int symbol = kTokenCount; symbol < grammar::kSymbolCount; ++symbol) {
+    for (Symbol symbol = kTokenCount; symbol < grammar::kSymbolCount; ++symbol) {
       automaton.nextStates[state][symbol] = static_cast<std::uint8_t>(SettledState(state, symbol));
     }
   }
-  for (int rule = 0; rule < grammar::kRuleCount; ++rule) {
-    automaton.rules[rule] = {static_cast<std::uint8_t>(grammar::kTable_r2[rule]),
-                             static_cast<std::uint8_t>(grammar::kTable_r1[rule])};
-  }
+  for (Rule rule = 0; rule < grammar::kRuleCount; ++rule) automaton.rules[rule] = ShapeOf(rule);
   return automaton;
 }();
 
@@ -140,16 +159,16 @@ struct Stack {
 Stack stack;
 
 /// The words for a token that a state has no action for: up to four expected tokens are named.
-std::string Unexpected(int state, int token) {
+std::string Unexpected(State state, Symbol token) {
   constexpr std::size_t kMostExpected = 4;
-  std::vector<int> expected;
-  for (int other = 0; other < kTokenCount; ++other) {
+  std::vector<Symbol> expected;
+  for (Symbol other = 0; other < kTokenCount; ++other) {
     if (other != kErrorToken && Entry(state, other) != grammar::kErrorEntry) expected.push_back(other);
   }
   std::string words = "syntax error, unexpected " + std::string(SymbolName(token));
   if (expected.size() > kMostExpected) return words;
   std::string_view before = ", expecting ";
-  for (const int other : expected) {
+  for (const Symbol other : expected) {
     words += before;
     words += SymbolName(other);
     before = " or ";
@@ -163,7 +182,7 @@ bool RunAutomaton(ParseState& state) {
   std::size_t top = 0;
   stack.states[0] = 0;
   const auto reduce = [&top, &state](Action reduction) {
-    const int rule = reduction - kStateCount;
+    const Rule rule = reduction - kStateCount;
     const RuleShape shape = kAutomaton.rules[rule];
     top = top + 1 - shape.length;
     stack.states[top] = kAutomaton.nextStates[stack.states[top - 1]][shape.left];
@@ -172,7 +191,7 @@ bool RunAutomaton(ParseState& state) {
   for (;;) {
     while (const Action blind = kAutomaton.blindActions[stack.states[top]]) reduce(blind);
     grammar::Value value{};
-    const int token = TokenNumber(state.Pull(value.lexeme));
+    const Symbol token = TokenNumber(state.Pull(value.lexeme));
     if (state.TokenIsTooLong()) return false;
     Action action = kAutomaton.actions[stack.states[top]][token];
     for (; action >= kStateCount; action = kAutomaton.actions[stack.states[top]][token]) reduce(action);

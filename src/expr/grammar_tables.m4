@@ -21,6 +21,7 @@ b4_output_begin([b4_parser_file_name])
 [// The automaton of the expression grammar, made from grammar.y.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 
 ]b4_percent_code_get([[requires]])[
@@ -32,11 +33,11 @@ union Value {
 ]b4_user_union_members[
 };
 
-inline constexpr int kStateCount = ]b4_states_number[;
-inline constexpr int kTokenCount = ]b4_tokens_number[;
-inline constexpr int kSymbolCount = ]m4_eval(b4_tokens_number + b4_nterms_number)[;
-inline constexpr int kRuleCount = ]m4_eval(b4_rules_number + 1)[;  ///< that of the end of the text included
-inline constexpr int kFinalState = ]b4_final_state_number[;
+inline constexpr std::size_t kStateCount = ]b4_states_number[;
+inline constexpr std::size_t kTokenCount = ]b4_tokens_number[;
+inline constexpr std::size_t kSymbolCount = ]m4_eval(b4_tokens_number + b4_nterms_number)[;
+inline constexpr std::size_t kRuleCount = ]m4_eval(b4_rules_number + 1)[;  ///< that of the end of the text included
+inline constexpr std::size_t kFinalState = ]b4_final_state_number[;
 inline constexpr int kNoRow = ]b4_pact_ninf[;
 inline constexpr int kErrorEntry = ]b4_table_ninf[;
 
@@ -47,10 +48,10 @@ inline constexpr const char* kSymbolNames[] = {
 };
 
 /// The rules that make a value of their own. All others pass their first one on.
-inline constexpr int kRulesWithAction[] = {]m4_pushdef([b4_case], m4_defn([tessal_rule_number]))b4_actions[]m4_popdef([b4_case])[};
+inline constexpr std::size_t kRulesWithAction[] = {]m4_pushdef([b4_case], m4_defn([tessal_rule_number]))b4_actions[]m4_popdef([b4_case])[};
 
 /// The value of the left side of a rule from those of its right side.
-inline Value Reduce(int rule, const Value* right, ParseState& state) {
+inline Value Reduce(std::size_t rule, const Value* right, ParseState& state) {
   Value value = right[0];
   switch (rule) {
 ]b4_user_actions[

@@ -54,9 +54,10 @@ std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text) {
     ParseState state(text, parseArrays);
     const bool good = RunAutomaton(state);
     parsed = ParsedExpression::InBlock(good ? &parseArrays.tree : nullptr, state.Identifiers());
-    if (!good)
+    if (!good) {
       parsed->failure =
           std::make_unique<const ParseFailure>(ParseFailure{state.Failure(), state.Line(), state.Position()});
+    }
     parsed->knowsIdentifiers = state.ScannedAll();
   }
   parsed->began = began;
