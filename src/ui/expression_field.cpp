@@ -53,8 +53,9 @@ void CAutoRichEditCtrl::ReportText() {
 
 QString CAutoRichEditCtrl::ParserMessage() const {
   const ScannerRest rest;
-  const ParsedExpression parsed = ParseExpression(FromScreen(ContentText(), content, source.Encoding()));
-  const ParseFailure* failure = parsed.Failure();
+  const std::string text = FromScreen(ContentText(), content, source.Encoding());
+  const auto parsed = ParseExpression(text);
+  const ParseFailure* failure = parsed->Failure();
   return failure == nullptr ? QString() : ToScreen(failure->finding.text).trimmed();
 }
 
