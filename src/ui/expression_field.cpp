@@ -82,7 +82,7 @@ Uid CAutoRichEditCtrl::ElementNamed(const std::string& name) const {
 QString CAutoRichEditCtrl::TipOf(Uid uid) const {
   const CEL_Element* element = source.Core().GetElement(uid);
   if (element == nullptr) return {};
-  return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.Text());
+  return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.TextOf());
 }
 
 bool CAutoRichEditCtrl::event(QEvent* happened) {
