@@ -1,6 +1,5 @@
 // Adding, deleting and moving elements. Each ends in a rebuild of the symbol table.
 #include <algorithm>
-#include <type_traits>
 
 #include "core/search_functions.h"
 #include "core/template_core.h"
@@ -45,25 +44,13 @@ bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operat
 
 template <class Element>
 Element& TemplateCore::Add(const Collection<Element>& row) {
-  auto& elements = state.collections.*row.elements;
-  auto element = std::make_unique<Element>(
-      FirstFreeName(row.symbolPrefix, elements.size() + 1,
-                    [this](const std::string& symbol) { return SymbolExists(symbol); }));
-  if constexpr (std::is_same_v<Element, CEL_Lagrange_Specie>) {
-    element->SetIndex(static_cast<std::int32_t>(elements.size() + 1));
-    Adopt(*element, state.root);
-    element->AddMember(ElementKind::HorizontalVector);
-  } else {
-    Adopt(*element, ListHead(row.listKind));
-  }
-  element->documentation.SetText(state.root.documentation.Text());
-  if constexpr (std::is_base_of_v<CEL_Input, Element>) {
-    element->RebuildBuiltInChoices(state.flags.showAllBuiltIns);
-  }
-  elements.push_back(std::move(element));
+  const std::size_t number = (Elements().*row.elements).size() + 1;
+  Element& element =
+      AppendElement(row, FirstFreeName(row.symbolPrefix, number,
+                                       [this](const std::string& symbol) { return SymbolExists(symbol); }));
+  element.documentation.SetText(state.root.documentation.Text());
   RebuildSymbolTable();
-  state.flags.modified = true;
-  return *elements.back();
+  return element;
 }
 
 CEL_Element* TemplateCore::AddElement(ElementKind kind) {

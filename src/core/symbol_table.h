@@ -75,6 +75,8 @@ class SymbolTable final {
   const SymbolRecord* BySymbol(std::string_view symbol) const;
   /// The record that a use names; its number must be one of the table's.
   const SymbolRecord& Used(std::uint32_t sequence) const { return records[sequence - 1]; }
+  /// Whether several elements have the same symbol.
+  bool HasSharedSymbols() const { return hasSharedSymbols; }
   /// The identities behind sequence numbers. The two records of a movement give one.
   std::vector<Uid> UidsOf(std::span<const std::uint32_t> sequences) const;
 
@@ -106,6 +108,7 @@ class SymbolTable final {
   std::vector<std::uint32_t> uses;   ///< of all records, one after the other
   std::vector<std::uint32_t> users;  ///< the same
   NameTable names;
+  bool hasSharedSymbols = false;
   std::vector<std::unique_ptr<UndefinedSymbol>> undefined;
 };
 

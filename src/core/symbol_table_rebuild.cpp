@@ -159,12 +159,19 @@ void SymbolTable::RebuildSteps::NumberParticleElements() {
 /// Of equal names the first record has the meaning.
 void SymbolTable::RebuildSteps::GiveNamesToRecords() {
   std::string composed;
+  table.hasSharedSymbols = false;
   for (const SymbolRecord& record : records) {
     composed.clear();
     record.element->AppendFullSymbol(composed);
     const NameNumber name = table.names.NumberOf(composed);
     if (name >= meanings.size()) meanings.resize(name + 1 + records.size());
-    if (meanings[name] == 0) meanings[name] = record.sequence;
+    if (meanings[name] == 0) {
+      meanings[name] = record.sequence;
+    } else {
+      // The records of a movement share theirs, and lie side by side.
+      const bool isOther = records[meanings[name] - 1].element != record.element;
+      table.hasSharedSymbols = table.hasSharedSymbols || isOther;
+    }
   }
 }
 
