@@ -12,6 +12,7 @@
 #include <vector>
 
 #include "core/name_table.h"
+#include "elements/element_kind.h"
 #include "keyfile/water_body.h"
 #include "platform/uid.h"
 
@@ -28,7 +29,8 @@ struct SymbolRecord {
   Uid uid = Uid::None;         ///< the element's identity
   CEL_Element* element = nullptr;
   const CEL_Property* expression = nullptr;  ///< none for an element without one
-  std::uint32_t index = 0;                   ///< place of the element in its own sequence, from 0
+  ElementKind kind = ElementKind::None;
+  std::uint32_t index = 0;        ///< place of the element in its own sequence, from 0
   std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
   /// Both mean something for the template's own collections only; the records of particle classes carry on
   /// those of the record before them.

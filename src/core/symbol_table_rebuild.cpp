@@ -54,6 +54,7 @@ class SymbolTable::RebuildSteps final {
   SymbolRecord& AppendElement(CEL_Element& element, std::size_t index, std::int32_t specieIndex);
   void NumberTemplateElements();
   void NumberParticleElements();
+  NameNumber NameOf(const SymbolRecord& record);
   void GiveNamesToRecords();
   void ExtractReferences();
   void ExtractRecordReferences(const SymbolRecord& record);
@@ -97,13 +98,14 @@ SymbolRecord& SymbolTable::RebuildSteps::Append(CEL_Element& element, std::size_
   record.uid = element.GetUid();
   record.element = &element;
   record.expression = expression;
+  record.kind = element.Kind();
   record.index = static_cast<std::uint32_t>(index);
   record.specieIndex = specieIndex;
   if (!records.empty()) {
     record.scope = records.back().scope;
     record.spatial = records.back().spatial;
   }
-  element.id.SetInt(static_cast<std::int32_t>(record.sequence));
+  element.Renumber(static_cast<std::int32_t>(record.sequence));
   return records.emplace_back(record);
 }
 
@@ -119,18 +121,38 @@ SymbolRecord& SymbolTable::RebuildSteps::AppendElement(CEL_Element& element, std
   return Append(element, index, specieIndex, &(element.*rows.front().place));
 }
 
+namespace {
+
+/// What is known of an element, its place in the water body among it.
+template <class Element>
+const ElementFacts& WithPlace(Element& element) {
+  ElementFacts& facts = element.Facts();
+  if (facts.knowsPlace) return facts;
+  facts.scope = ScopeFromText(element.scope.Text());
+  if constexpr (requires { element.spatialVariation; }) {
+    facts.spatial = SpatialFromText(element.spatialVariation.Text());
+  } else {
+    facts.spatial = SpatialFromScope(facts.scope);
+  }
+  facts.knowsPlace = true;
+  return facts;
+}
+
+bool IsMovement(ElementKind kind) {
+  return kind == ElementKind::HorizontalVector || kind == ElementKind::VerticalEquation;
+}
+
+}  // namespace
+
 void SymbolTable::RebuildSteps::NumberTemplateElements() {
   ForEachHeadedCollection([this](const auto& row) {
     std::size_t index = 0;
     for (const auto& element : collections.*row.elements) {
       if constexpr (requires { element->scope; }) {
+        const ElementFacts& place = WithPlace(*element);
         SymbolRecord& record = AppendElement(*element, index++, -1);
-        record.scope = ScopeFromText(element->scope.Text());
-        if constexpr (requires { element->spatialVariation; }) {
-          record.spatial = SpatialFromText(element->spatialVariation.Text());
-        } else {
-          record.spatial = SpatialFromScope(record.scope);
-        }
+        record.scope = place.scope;
+        record.spatial = place.spatial;
       }
     }
   });
@@ -156,14 +178,19 @@ void SymbolTable::RebuildSteps::NumberParticleElements() {
   }
 }
 
+NameNumber SymbolTable::RebuildSteps::NameOf(const SymbolRecord& record) {
+  // A class is renamed without its movements, whose names begin with its.
+  if (IsMovement(record.kind)) return table.names.NumberOf(record.element->FullSymbol());
+  ElementFacts& facts = record.element->Facts();
+  if (facts.symbolName == 0) facts.symbolName = table.names.NumberOf(record.element->symbol.Text());
+  return facts.symbolName;
+}
+
 /// Of equal names the first record has the meaning.
 void SymbolTable::RebuildSteps::GiveNamesToRecords() {
-  std::string composed;
   table.hasSharedSymbols = false;
   for (const SymbolRecord& record : records) {
-    composed.clear();
-    record.element->AppendFullSymbol(composed);
-    const NameNumber name = table.names.NumberOf(composed);
+    const NameNumber name = NameOf(record);
     if (name >= meanings.size()) meanings.resize(name + 1 + records.size());
     if (meanings[name] == 0) {
       meanings[name] = record.sequence;
@@ -197,7 +224,7 @@ void SymbolTable::RebuildSteps::ExtractReferences() {
 }
 
 void SymbolTable::RebuildSteps::ExtractRecordReferences(const SymbolRecord& record) {
-  if (record.element->Kind() == ElementKind::SpatialFunction) {
+  if (record.kind == ElementKind::SpatialFunction) {
     const auto& function = static_cast<const CEL_Lagrange_Spatial_Function&>(*record.element);
     if (function.variableId.IntValue() >= 1) Refer(record, table.names.NumberOf(function.VariableName()));
   } else if (record.expression != nullptr) {
