@@ -4,7 +4,7 @@ namespace tessal::bench {
 
 namespace {
 
-constexpr std::size_t kWorkWidth = 66;
+constexpr std::size_t kWorkWidth = 84;
 constexpr const char* kUnitHead = "           unit";
 
 }  // namespace
