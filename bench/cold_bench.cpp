@@ -1,12 +1,12 @@
 // The tool cold: whole processes of it, a fresh one for each sample, over templates of growing size. With
 // another build of the tool, both are run in turns and compared.
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <array>
 #include <cstdint>
 #include <filesystem>
 #include <fstream>
 #include <iostream>
-#include <optional>
 #include <regex>
 #include <stdexcept>
 
@@ -66,7 +66,8 @@ AllocationCounts CountAllocations(const std::vector<std::string>& command, const
   const std::string path = folder.File("allocations");
   AllocationCounts counts;
   std::ofstream(path, std::ios::binary).write(reinterpret_cast<const char*>(&counts), sizeof counts);
-  RunProcess(command, {.environment = {{"LD_PRELOAD", TESSAL_ALLOCATION_COUNT}, {kAllocationFile, path}}});
+  RunProcess(command, {.messages = {},
+                       .environment = {{"LD_PRELOAD", TESSAL_ALLOCATION_COUNT}, {kAllocationFile, path}}});
   std::ifstream(path, std::ios::binary).read(reinterpret_cast<char*>(&counts), sizeof counts);
   if (counts.calls == 0) throw std::runtime_error("the allocations were not counted");
   return counts;
@@ -88,7 +89,9 @@ class ColdRuns final {
  public:
   explicit ColdRuns(Options chosen) : options(std::move(chosen)), filter(options.filter) {}
 
+  /// Of the sizes that are wanted.
   void MakeFiles();
+  bool HasFiles() const { return !files.empty(); }
   /// The figures of the tool, and how they grow from a size to ten times that size.
   void PrintFigures();
   /// The figures of the tool and of the other build, and their ratios.
@@ -117,7 +120,9 @@ void ColdRuns::MakeFiles() {
   if (options.million) sizes.push_back(kLargest);
   for (const std::int64_t size : sizes) {
     const SizedFile file = {size, folder.File(std::to_string(size) + ".tessal")};
-    InOtherProcess([this, &file] { std::filesystem::rename(FileOfSize(folder, file.elements), file.path); });
+    const auto isWanted = [&](const ToolCommand& command) { return IsWanted(command, file); };
+    if (std::none_of(kCommands.begin(), kCommands.end(), isWanted)) continue;
+    InOtherProcess([&] { std::filesystem::rename(FileOfSize(folder, size), file.path); });
     files.push_back(file);
   }
 }
@@ -190,6 +195,7 @@ int main(int count, char** arguments) {
   return RunMain("cold_bench", [&options] {
     ColdRuns runs(options);
     runs.MakeFiles();
+    if (!runs.HasFiles()) return;
     options.other.empty() ? runs.PrintFigures() : runs.PrintComparison();
   });
 }

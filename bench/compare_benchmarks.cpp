@@ -8,6 +8,7 @@
 #include <map>
 #include <nlohmann/json.hpp>
 #include <regex>
+#include <sstream>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -28,10 +29,23 @@ struct Options {
   int rounds = 5;
 };
 
+/// Runs a program whose report of the machine nobody asked for; what it wrote is part of a failure.
+void RunQuietly(const std::vector<std::string>& command, const std::string& output,
+                const ScratchFolder& folder) {
+  const std::string path = folder.File("messages");
+  try {
+    RunProcess(command, {.output = output, .messages = path, .environment = {}});
+  } catch (const std::runtime_error& failure) {
+    std::ostringstream messages;
+    messages << failure.what() << '\n' << std::ifstream(path).rdbuf();
+    throw std::runtime_error(messages.str());
+  }
+}
+
 /// The names of the benchmarks of a program.
 std::vector<std::string> BenchmarksOf(const std::string& program, const ScratchFolder& folder) {
   const std::string path = folder.File("list");
-  RunProcess({program, "--benchmark_list_tests"}, {.output = path, .environment = {}});
+  RunQuietly({program, "--benchmark_list_tests"}, path, folder);
   std::ifstream list(path);
   std::vector<std::string> names;
   for (std::string name; std::getline(list, name);) names.push_back(name);
@@ -59,8 +73,9 @@ std::string Exactly(const std::string& text) {
 double RunOnce(const std::string& program, const std::string& name, const ScratchFolder& folder) {
   constexpr const char* kLeastSeconds = "0.1";
   const std::string path = folder.File("result.json");
-  RunProcess({program, "--benchmark_filter=" + Exactly(name), "--benchmark_out=" + path,
-              "--benchmark_out_format=json", std::string("--benchmark_min_time=") + kLeastSeconds});
+  RunQuietly({program, "--benchmark_filter=" + Exactly(name), "--benchmark_out=" + path,
+              "--benchmark_out_format=json", std::string("--benchmark_min_time=") + kLeastSeconds},
+             "/dev/null", folder);
   const nlohmann::json result = nlohmann::json::parse(std::ifstream(path));
   static const std::map<std::string, double> kNanoseconds = {{"ns", 1}, {"us", 1e3}, {"ms", 1e6}, {"s", 1e9}};
   for (const nlohmann::json& run : result.at("benchmarks")) {

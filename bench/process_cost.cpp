@@ -19,9 +19,16 @@ namespace {
 /// What a shell reports for a program that it can not run.
 constexpr int kNotRun = 127;
 
+/// Lets what is written to a descriptor go to a file.
+void SendTo(const std::string& path, int descriptor) {
+  const int file = open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
+  if (file < 0 || dup2(file, descriptor) < 0) _exit(kNotRun);
+  close(file);
+}
+
 [[noreturn]] void BecomeProgram(const std::vector<std::string>& command, const ProcessPlace& place) {
-  const int output = open(place.output.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
-  if (output < 0 || dup2(output, STDOUT_FILENO) < 0) _exit(kNotRun);
+  SendTo(place.output, STDOUT_FILENO);
+  if (!place.messages.empty()) SendTo(place.messages, STDERR_FILENO);
   for (const auto& [name, value] : place.environment) setenv(name.c_str(), value.c_str(), 1);
   std::vector<char*> arguments;
   for (const std::string& word : command) arguments.push_back(const_cast<char*>(word.c_str()));

@@ -16,7 +16,8 @@ struct ProcessCost {
 };
 
 struct ProcessPlace {
-  std::string output = "/dev/null";                              ///< the file for standard output
+  std::string output = "/dev/null";  ///< the file for standard output
+  std::string messages;              ///< that for standard error; empty for our own
   std::vector<std::pair<std::string, std::string>> environment;  ///< added to this process's own
 };
 
