@@ -144,38 +144,41 @@ Work<ReadCost> Timed(const std::string& text, Read read) {
   };
 }
 
-/// A reader of ours and one of a peer, with the nodes of the documents that they make.
+/// A reader, with the number of nodes in the document that it makes.
+struct Reader {
+  Work<ReadCost> read;
+  std::size_t nodes;
+};
+
+/// A reader of ours and one of a peer.
 struct Pair {
   std::string work;
   std::string peer;
-  Work<ReadCost> ours;
-  Work<ReadCost> theirs;
-  std::size_t ourNodes;
-  std::size_t theirNodes;
+  Reader ours;
+  Reader theirs;
 };
 
+void PrintRows(const RatioTable& table, const Pair& pair, const std::vector<ReadCost>& ours,
+               const std::vector<ReadCost>& theirs) {
+  const auto perNode = [](const Reader& reader) { return 1e9 / static_cast<double>(reader.nodes); };
+  const double ourScale = perNode(pair.ours);
+  const double theirScale = perNode(pair.theirs);
+  const double ourTotal = MedianOf(ours, &ReadCost::withRelease);
+  const double theirTotal = MedianOf(theirs, &ReadCost::withRelease);
+  const std::string released = pair.work + ", with the release";
+  table.PrintRow(pair.work, pair.peer, "ns/node", ourScale * MedianOf(ours, &ReadCost::reading),
+                 theirScale * MedianOf(theirs, &ReadCost::reading));
+  table.PrintRow(released, pair.peer, "ns/node", ourScale * ourTotal, theirScale * theirTotal);
+  table.PrintRow(released, pair.peer, "ms in all", 1e3 * ourTotal, 1e3 * theirTotal);
+}
+
 void PrintPairs(const std::vector<Pair>& pairs) {
-  constexpr double kNanoseconds = 1e9;
-  constexpr double kMilliseconds = 1e3;
   std::vector<Work<ReadCost>> works;
-  for (const Pair& pair : pairs) works.insert(works.end(), {pair.ours, pair.theirs});
+  for (const Pair& pair : pairs) works.insert(works.end(), {pair.ours.read, pair.theirs.read});
   const auto costs = InTurns(works, kRounds);
   const RatioTable table;
   for (std::size_t place = 0; place < pairs.size(); ++place) {
-    const Pair& pair = pairs[place];
-    const auto& ours = costs[2 * place];
-    const auto& theirs = costs[2 * place + 1];
-    const auto print = [&](const std::string& work, const char* unit, double scale, double ourNodes,
-                           double theirNodes, double ReadCost::*part) {
-      table.PrintRow(work, pair.peer, unit, scale * MedianOf(ours, part) / ourNodes,
-                     scale * MedianOf(theirs, part) / theirNodes);
-    };
-    const auto ourNodes = static_cast<double>(pair.ourNodes);
-    const auto theirNodes = static_cast<double>(pair.theirNodes);
-    print(pair.work, "ns/node", kNanoseconds, ourNodes, theirNodes, &ReadCost::reading);
-    print(pair.work + ", with the release", "ns/node", kNanoseconds, ourNodes, theirNodes,
-          &ReadCost::withRelease);
-    print(pair.work + ", with the release", "ms in all", kMilliseconds, 1, 1, &ReadCost::withRelease);
+    PrintRows(table, pairs[place], costs[2 * place], costs[2 * place + 1]);
   }
 }
 
@@ -199,15 +202,18 @@ void Compare() {
             << pugiNodes << " nodes\n";
   const std::string image = "key-file text to an image";
   const std::string inPlace = "key-file text to an image, in place";
+  const Reader imageReader = {Timed(text, ReadImage), ourNodes};
+  const Reader inPlaceReader = {Timed(text, ReadImageInPlace), ourNodes};
   PrintPairs({
-      {image, "RapidJSON", Timed(text, ReadImage), Timed(json, ReadJson), ourNodes, jsonNodes},
-      {inPlace, "RapidJSON, numbers as texts", Timed(text, ReadImageInPlace), Timed(json, ReadJsonInPlace),
-       ourNodes, jsonNodes},
-      {image, "pugixml", Timed(text, ReadImage), Timed(xml, ReadPugi), ourNodes, pugiNodes},
-      {inPlace, "pugixml", Timed(text, ReadImageInPlace), Timed(xml, ReadPugiInPlace), ourNodes, pugiNodes},
-      {image, "libxml2", Timed(text, ReadImage), Timed(xml, ReadXml), ourNodes, xmlNodes},
-      {"key-file text to an item tree", "libxml2", Timed(text, ReadItemTree), Timed(xml, ReadXml), ourNodes,
-       xmlNodes},
+      {image, "RapidJSON", imageReader, {Timed(json, ReadJson), jsonNodes}},
+      {inPlace, "RapidJSON, numbers as texts", inPlaceReader, {Timed(json, ReadJsonInPlace), jsonNodes}},
+      {image, "pugixml", imageReader, {Timed(xml, ReadPugi), pugiNodes}},
+      {inPlace, "pugixml", inPlaceReader, {Timed(xml, ReadPugiInPlace), pugiNodes}},
+      {image, "libxml2", imageReader, {Timed(xml, ReadXml), xmlNodes}},
+      {"key-file text to an item tree",
+       "libxml2",
+       {Timed(text, ReadItemTree), ourNodes},
+       {Timed(xml, ReadXml), xmlNodes}},
   });
 }
 
