@@ -28,8 +28,8 @@ const std::string& Text(const benchmark::State& state) {
 
 void Parse(benchmark::State& state) {
   for ([[maybe_unused]] auto turn : state) {
-    const ParsedExpression parsed = ParseExpression(Text(state));
-    benchmark::DoNotOptimize(&parsed);
+    const auto parsed = ParseExpression(Text(state));
+    benchmark::DoNotOptimize(parsed.get());
   }
   state.SetItemsProcessed(state.iterations());
 }

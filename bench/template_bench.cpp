@@ -56,7 +56,7 @@ void Edit(benchmark::State& state) {
   TemplateCore core;
   Open(core, FileOfSize(folder, state.range(0)));
   CEL_Property& expression = core.GetProcess(core.GetProcessCount() / 2).expression;
-  const std::string former = expression.Text();
+  const std::string former = expression.TextOf();
   bool changed = false;
   const auto edit = [&] {
     changed = !changed;
@@ -91,7 +91,7 @@ void Rename(benchmark::State& state) {
   SetNotifyChanges(false);
   for (std::size_t place = 0; place < kUsers; ++place) {
     CEL_Property& expression = core.GetProcess(place).expression;
-    expression.SetText("used*2 + " + expression.Text());
+    expression.SetText("used*2 + " + expression.TextOf());
   }
   core.GetConstant(0).symbol.SetText("used");
   core.RebuildSymbolTable();

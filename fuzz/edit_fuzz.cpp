@@ -162,7 +162,7 @@ void Edit(TemplateCore& core, Choices& choices) {
     case 4: {
       const CEL_Element* renamed = core.GetElement(AnyUid(core, choices));
       if (renamed == nullptr || renamed->Kind() == ElementKind::DerivedOutput) break;
-      core.RenameSymbol(renamed->symbol.Text(), choices.AnyOf(kNames), choices.Pick(2) == 0);
+      core.RenameSymbol(renamed->symbol.TextOf(), choices.AnyOf(kNames), choices.Pick(2) == 0);
       break;
     }
     case 5:

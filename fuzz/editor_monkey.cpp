@@ -74,7 +74,7 @@ std::string ListOrders(const QTreeWidgetItem& folder, const std::vector<const CE
   std::string text;
   for (int place = 0; place < folder.childCount(); ++place) {
     text += "\n  " + folder.child(place)->text(0).toStdString() + " | " +
-            elements[static_cast<std::size_t>(place)]->symbol.Text();
+            elements[static_cast<std::size_t>(place)]->symbol.TextOf();
   }
   return text + "\n";
 }

@@ -43,29 +43,43 @@ void CheckTokens(const std::string& text) {
 void CheckParse(const std::string& text) {
   ResetExpressionScanner();
   std::unique_ptr<const ParsedExpression> held;
-  const ParsedExpression first = ParseOnce(held, text);
+  const ParsedExpression& first = ParseOnce(held, text);
   const ScannerStart left = ExpressionScannerStart();
   ResetExpressionScanner();
   const ParsedExpression& used = ParseOnce(held, text);
-  Require(ExpressionScannerStart() == left && left == used.left);
-  Require((used.Tree() == nullptr) == (first.Tree() == nullptr));
+  Require(ExpressionScannerStart() == left && left == used.Left() && &used == &first);
   if (const ParseFailure* failure = first.Failure()) {
     ResetExpressionScanner();
-    const ParsedExpression again = ParseExpression(text);
-    Require(again.Failure() != nullptr && again.Failure()->finding.text == failure->finding.text);
+    const auto again = ParseExpression(text);
+    Require(again->Failure() != nullptr && again->Failure()->finding.text == failure->finding.text);
     Require(failure->finding.text.starts_with("Line "));
     return;
   }
   const ExpressionNode& tree = *first.Tree();
-  const ExpressionNode copy(tree);
+  const ExpressionTree copy(&tree);
   int nodes = 0;
   int copied = 0;
   tree.WalkInOrder(
-      nullptr, [&nodes](NodeKind, const std::string&, std::int32_t) { ++nodes; }, nullptr);
-  copy.WalkPostOrder(
-      nullptr, [&copied](NodeKind, const std::string&, std::int32_t) { ++copied; }, nullptr);
+      nullptr, [&nodes](NodeKind, std::string_view, std::int32_t) { ++nodes; }, nullptr);
+  copy.Root().WalkPostOrder(
+      nullptr, [&copied](NodeKind, std::string_view, std::int32_t) { ++copied; }, nullptr);
   Require(nodes == copied);
-  RewriteExpressionText(copy);
+  Require(RewriteExpressionText(tree) == RewriteExpressionText(copy.Root()));
+}
+
+/// A parse knows the names that a scan finds, and leaves the scanner as the scan does.
+void CheckHeldNames(const std::string& text, ScannerStart start) {
+  std::vector<std::string_view> scanned;
+  SetExpressionScannerStart(start);
+  ScanIdentifiers(text, scanned);
+  const ScannerStart left = ExpressionScannerStart();
+  std::unique_ptr<const ParsedExpression> held;
+  std::vector<std::string_view> known;
+  for (int turn = 0; turn < 2; ++turn) {
+    SetExpressionScannerStart(start);
+    IdentifiersOnce(held, text, known);
+    Require(known == scanned && ExpressionScannerStart() == left);
+  }
 }
 
 }  // namespace
@@ -74,6 +88,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const std::string text(reinterpret_cast<const char*>(data), size);
   CheckTokens(text);
   CheckParse(text);
+  CheckHeldNames(text, ScannerStart::Text);
+  CheckHeldNames(text, ScannerStart::Comment);
   tessal::ResetExpressionScanner();
   tessal::CheckFunctionsSpecified("fuzz", Uid{1}, text);
   tessal::IsReservedName(text);

@@ -51,7 +51,7 @@ std::string AnyExpression(Choices& choices, const std::vector<std::string>& defi
 
 std::vector<std::string> SymbolsOf(const TemplateCore& core) {
   std::vector<std::string> symbols;
-  for (const SymbolRecord& record : core.SymbolTable()) symbols.push_back(record.element->symbol.Text());
+  for (const SymbolRecord& record : core.SymbolTable()) symbols.push_back(record.element->symbol.TextOf());
   return symbols;
 }
 
@@ -101,7 +101,7 @@ State StateOf(TemplateCore& core) {
   for (const SymbolRecord& record : core.SymbolTable()) {
     state.references.push_back(record.references);
     record.element->ForEachExpression([&state](const PropertyRow&, const CEL_Property& property) {
-      state.expressions.push_back(property.Text());
+      state.expressions.push_back(property.TextOf());
     });
   }
   for (const auto& name : core.UndefinedSymbols()) state.undefined.insert(name->symbol);

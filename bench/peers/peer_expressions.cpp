@@ -70,8 +70,8 @@ void Require(bool isParsed, const char* parser, const std::string& text) {
 double OurSeconds(const Texts& texts) {
   const ProcessorClock clock;
   for (const std::string& text : texts) {
-    const ParsedExpression parsed = ParseExpression(text);
-    Require(parsed.Tree() != nullptr, "ParseExpression", text);
+    const auto parsed = ParseExpression(text);
+    Require(parsed->Tree() != nullptr, "ParseExpression", text);
   }
   return clock.Seconds();
 }

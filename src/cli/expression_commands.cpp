@@ -61,11 +61,11 @@ ExitCode Ask(const ExpressionCall& call, const Question& question) {
 /// Parses, and lets the operation make the text of a tree. The failure is the parser's message, or nothing.
 Answer WithTree(const std::string& expression, bool withMessage,
                 const std::function<std::string(const ExpressionNode&)>& textOf) {
-  const ParsedExpression parsed = ParseExpression(expression);
-  if (const ParseFailure* failure = parsed.Failure()) {
+  const auto parsed = ParseExpression(expression);
+  if (const ParseFailure* failure = parsed->Failure()) {
     return {withMessage ? failure->finding.text : std::string(), kContentFault};
   }
-  return {textOf(*parsed.Tree()), kFine};
+  return {textOf(*parsed->Tree()), kFine};
 }
 
 /// A token outside the table carries the code of the last one in it; its text shows which of the two it is.

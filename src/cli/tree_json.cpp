@@ -18,7 +18,7 @@ struct OpenNode {
 
 void AppendHead(const ExpressionNode& node, std::string& json) {
   json += "{\"kind\":" + std::to_string(static_cast<std::int32_t>(node.Kind())) +
-          ",\"text\":" + nlohmann::json(JsonText(node.Text())).dump();
+          ",\"text\":" + nlohmann::json(JsonText(std::string(node.Text()))).dump();
   if (node.ChildCount() > 0) json += ",\"children\":[";
 }
 

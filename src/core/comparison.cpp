@@ -44,7 +44,7 @@ std::string Label(const std::string& field) {
 class Listing final {
  public:
   explicit Listing(const TemplateCore& listed) : core(listed) {
-    AddTexts(core.Root(), core.Root().symbol.Text());
+    AddTexts(core.Root(), core.Root().symbol.TextOf());
     AddSettings();
     ForEachHeadedCollection([this](const auto& row) {
       // The texts of another head lie in no file.
@@ -118,7 +118,7 @@ class Listing final {
     if (settings == nullptr) return;
     AddTexts(*settings, "");
     for (const auto& function : settings->ExternalFunctions()) {
-      AppendFields(*function, "", Add(function->KindText(), function->publicName.Text()));
+      AppendFields(*function, "", Add(function->KindText(), function->publicName.TextOf()));
     }
     for (const VisibilityGroup& group : settings->Visibilities().groups) {
       Add(KindText(ElementKind::VisibilityGroup), group.name).fields = {{"Description", group.description}};

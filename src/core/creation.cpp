@@ -55,11 +55,11 @@ std::optional<std::uint32_t> MaskForUser(ElementKind userKind) {
   return row == kOffers.end() ? std::nullopt : std::optional(row->mask);
 }
 
-void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, const std::string& documentation) {
+void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, std::string_view documentation) {
   element.symbol.SetText(symbol);
   element.description.SetText(symbol + " Description");
   element.onlineHelp.SetText(symbol + " Online help");
-  element.documentation.SetText(documentation.empty() ? symbol + " Documentation" : documentation);
+  element.documentation.SetText(documentation.empty() ? symbol + " Documentation" : std::string(documentation));
 }
 
 }  // namespace

@@ -1,5 +1,6 @@
-// Loading a template file. The key-file library gives the values that the elements are built from; the
-// reader of the item tree then checks the same text, and makes its tree when somebody asks for it.
+// Loading a template file. The key-file library gives the values that the elements are built from. It also says
+// whether the text keeps to the stricter grammar of the item tree: only where it may not, that reader checks it.
+// Its tree is made when somebody asks for it.
 #include <exception>
 #include <new>
 
@@ -12,6 +13,7 @@
 #include "keyfile/keywords.h"
 #include "keyfile/reader.h"
 #include "platform/file_replacement.h"
+#include "platform/kvf_text.h"
 
 namespace tessal {
 
@@ -29,8 +31,6 @@ class OpenFile final {
 
   KvfHandle Handle() const { return handle; }
   int Error() const { return error; }
-  /// Closes the file.
-  std::string TakeText() { return kvfTakeText(&handle); }
 
  private:
   KvfHandle handle;
@@ -95,6 +95,8 @@ class Reading final {
 
  private:
   bool ReadFile(const std::string& path);
+  /// Reports why the reader of the item tree refuses the text, where it does.
+  void CheckStrictly(bool isCut);
   /// Whether the numbers of all elements are among those of the records; one that is not gets the last of
   /// them.
   bool CheckIdRange();
@@ -116,14 +118,18 @@ bool Reading::ReadFile(const std::string& path) {
   }
   state.saveFileName = path;
   state.templateFileName = path;
+  // First: texts of elements are views into it.
+  state.source = kvfShareText(file.Handle());
   if (!ReadSections(file.Handle(), 1)) return false;
-  const bool isCut = kvfGetBytesCut(file.Handle()) > 0;
-  state.source = file.TakeText();
-  const bool isEmpty = state.source.empty() && !isCut;
-  if (CheckKeyFileText(state.source) == 0) {
-    Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(isEmpty)}});
-  }
+  if (!kvfIsStrict(file.Handle())) CheckStrictly(kvfGetBytesCut(file.Handle()) > 0);
   return true;
+}
+
+void Reading::CheckStrictly(bool isCut) {
+  std::string text = KvfLineEnds(*state.source);
+  if (CheckKeyFileText(text) != 0) return;
+  const bool isEmpty = text.empty() && !isCut;
+  Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(isEmpty)}});
 }
 
 bool Reading::ReadSections(KvfHandle file, int targetNumber) {

@@ -122,7 +122,7 @@ template <class Visitor>
 void ForEachUsingExpression(const TemplateCore& core, const SymbolRecord& used, Visitor visit) {
   const CEL_Element* previous = nullptr;
   for (const std::uint32_t sequence : used.referencedBy) {
-    const CEL_Element* user = core.FindRecordBySequence(sequence)->element;
+    CEL_Element* user = core.FindRecordBySequence(sequence)->element;
     // The two records of a movement are side by side.
     if (user == previous) continue;
     previous = user;

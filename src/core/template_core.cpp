@@ -74,7 +74,7 @@ void TemplateCore::Clear() {
 const CKvfSectionItem& TemplateCore::KeptTree() const {
   if (!state.keptTree) {
     state.keptTree = std::make_unique<CKvfSectionItem>();
-    ParseKeyFileTree(state.source, *state.keptTree);
+    ParseKeyFileTree(std::string(SourceText()), *state.keptTree);
   }
   return *state.keptTree;
 }

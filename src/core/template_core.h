@@ -76,8 +76,10 @@ class TemplateCore final : public ElementOwner {
     return state.table.Undefined();
   }
   std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() { return state.table.Undefined(); }
-  /// The text of the file that was loaded, up to a zero byte, with CRLF line ends.
-  const std::string& SourceText() const { return state.source; }
+  /// The text of the file that was loaded, up to a zero byte; empty before a load.
+  std::string_view SourceText() const {
+    return state.source ? std::string_view(*state.source) : std::string_view();
+  }
   /// Its item tree, made when it is first asked for; empty for a text that its reader refuses.
   const CKvfSectionItem& KeptTree() const;
   const std::string& TemplateFileName() const { return state.templateFileName; }

@@ -44,7 +44,8 @@ struct TemplateState {
   ListHeads listHeads;
   Collections collections;
   SymbolTable table;
-  std::string source;    ///< the text of the file that was loaded
+  /// The text of the file that was loaded. Texts of elements are views into it: it goes after them.
+  std::shared_ptr<const std::string> source;
   std::string keptText;  ///< what that file holds beside the template, as it is in it
   mutable std::unique_ptr<CKvfSectionItem> keptTree;  ///< of the source; none before somebody asks
   LoadAccount account;                                ///< what the load did not take over

@@ -145,7 +145,7 @@ class PageWriter final {
     Line(kDoctype);
     Line("<html>");
     Line("<head>");
-    const std::string description = Text(core.Root().description.Text());
+    const std::string description = Text(core.Root().description.TextOf());
     if (!description.empty()) Line("<title>Model description for " + description + "</title>");
     if (!options.mathJax.empty()) {
       WriteScripts();
@@ -254,7 +254,7 @@ class PageWriter final {
   }
 
   void WriteSpecie(const CEL_Lagrange_Specie& specie, bool detail, Keys keys) {
-    Line("<li> <h2> Particle Class &quot" + Text(specie.symbol.Text()) + "&quot</h2>");
+    Line("<li> <h2> Particle Class &quot" + Text(specie.symbol.TextOf()) + "&quot</h2>");
     WriteElementEntry(specie, detail, keys, true);
     ForEachMemberList([this, &specie, detail, keys](const auto& list) {
       WriteCollection(list.kind, specie.*list.members, detail, keys);

@@ -67,9 +67,10 @@ constexpr std::string_view kRowValue = "</mtext></mtd><mtd columnalign=\"left\">
 /// The signs of the direct modifications, in the order of their kinds.
 constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
 
-const FunctionMarkUp* FindMarkUp(std::string_view upperName) {
-  const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(),
-                                [upperName](const FunctionMarkUp& row) { return row.name == upperName; });
+const FunctionMarkUp* FindMarkUp(std::string_view name) {
+  const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(), [name](const FunctionMarkUp& row) {
+    return EqualIgnoringCase(row.name, name);
+  });
   return hit == kFunctions.end() ? nullptr : &*hit;
 }
 
@@ -77,7 +78,7 @@ std::string_view DirectSign(NodeKind kind) {
   return kDirectSigns.at(static_cast<std::size_t>(kind) - static_cast<std::size_t>(NodeKind::DirectAssign));
 }
 
-bool IsSum(const std::string& text) {
+bool IsSum(std::string_view text) {
   return text == "+" || text == "-";
 }
 
@@ -86,10 +87,10 @@ class MathMLWriter final {
  public:
   explicit MathMLWriter(std::string& output) : buffer(output) {}
 
-  void OnEnter(NodeKind kind, const std::string& text) {
+  void OnEnter(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Call:
-        EnterCall(UpperCase(text));
+        EnterCall(text);
         break;
       case NodeKind::Arithmetic:
         EnterArithmetic(text);
@@ -121,7 +122,7 @@ class MathMLWriter final {
     }
   }
 
-  void OnBetween(NodeKind kind, const std::string& text) {
+  void OnBetween(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Identifier:
         Element("mi", text);
@@ -140,17 +141,19 @@ class MathMLWriter final {
         WriteRelation(text);
         break;
       case NodeKind::Property:
-        buffer += "<mtext>[" + text + "]</mtext>";
+        buffer += "<mtext>[";
+        buffer += text;
+        buffer += "]</mtext>";
         break;
       default:
         break;
     }
   }
 
-  void OnLeave(NodeKind kind, const std::string& text) {
+  void OnLeave(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Call:
-        LeaveCall(UpperCase(text));
+        LeaveCall(text);
         break;
       case NodeKind::Arithmetic:
         LeaveArithmetic(text);
@@ -182,25 +185,27 @@ class MathMLWriter final {
     buffer += '>';
   }
 
-  void EnterCall(const std::string& name) {
+  void EnterCall(std::string_view name) {
     if (const FunctionMarkUp* markUp = FindMarkUp(name)) {
       buffer += markUp->enter;
     } else {
-      buffer += "<mrow><mtext mathvariant=\"bold-italic\" mathcolor=\"green\">" + name + "</mtext><mfenced>";
+      buffer += "<mrow><mtext mathvariant=\"bold-italic\" mathcolor=\"green\">";
+      for (const char character : name) buffer += UpperCase(character);
+      buffer += "</mtext><mfenced>";
     }
     listStack.push_back(listDepth);
     fenceStack.push_back(fenceDepth);
     listDepth = fenceDepth = 0;
   }
 
-  void LeaveCall(const std::string& name) {
+  void LeaveCall(std::string_view name) {
     const FunctionMarkUp* markUp = FindMarkUp(name);
     buffer += markUp != nullptr ? markUp->leave : "</mfenced></mrow>";
     listDepth = Take(listStack);
     fenceDepth = Take(fenceStack);
   }
 
-  void EnterArithmetic(const std::string& text) {
+  void EnterArithmetic(std::string_view text) {
     if (IsSum(text)) {
       if (++fenceDepth == 1) buffer += kFence;
       return;
@@ -210,7 +215,7 @@ class MathMLWriter final {
     fenceDepth = 0;
   }
 
-  void LeaveArithmetic(const std::string& text) {
+  void LeaveArithmetic(std::string_view text) {
     if (IsSum(text)) {
       if (fenceDepth-- == 1) buffer += kFenceEnd;
       return;
@@ -219,7 +224,7 @@ class MathMLWriter final {
     fenceDepth = Take(fenceStack);
   }
 
-  void EnterConditional(const std::string& text) {
+  void EnterConditional(std::string_view text) {
     if (text == "IF") {
       buffer += "<mtext mathcolor=\"blue\">IF</mtext>";
       return;
@@ -230,9 +235,9 @@ class MathMLWriter final {
     buffer += kRowValue;
   }
 
-  void WriteRelation(const std::string& text) {
+  void WriteRelation(std::string_view text) {
     const auto hit = std::find_if(kRelations.begin(), kRelations.end(),
-                                  [&text](const Relation& relation) { return relation.text == text; });
+                                  [text](const Relation& relation) { return relation.text == text; });
     if (hit != kRelations.end()) {
       buffer += hit->markUp;
     } else {
@@ -263,16 +268,16 @@ std::string TreeToMathML(const ExpressionNode& tree, std::string_view symbol, bo
   buffer += side.after;
   MathMLWriter writer(buffer);
   tree.WalkInOrder(
-      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnEnter(kind, text); },
-      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnBetween(kind, text); },
-      [&writer](NodeKind kind, const std::string& text, std::int32_t) { writer.OnLeave(kind, text); });
+      [&writer](NodeKind kind, std::string_view text, std::int32_t) { writer.OnEnter(kind, text); },
+      [&writer](NodeKind kind, std::string_view text, std::int32_t) { writer.OnBetween(kind, text); },
+      [&writer](NodeKind kind, std::string_view text, std::int32_t) { writer.OnLeave(kind, text); });
   buffer += kEnd;
   return buffer;
 }
 
 std::string ExpressionToMathML(const std::string& expression, const std::string& symbol, bool isDerivative) {
-  const ParsedExpression parsed = ParseExpression(expression);
-  const ExpressionNode* tree = parsed.Tree();
+  const auto parsed = ParseExpression(expression);
+  const ExpressionNode* tree = parsed->Tree();
   return tree == nullptr ? std::string() : TreeToMathML(*tree, symbol, isDerivative);
 }
 

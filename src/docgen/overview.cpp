@@ -14,17 +14,17 @@ namespace tessal {
 namespace {
 
 /// The name that a search function refers to by number.
-std::string NameOfReference(const TemplateCore& core, std::int32_t reference, const std::string& otherwise) {
-  if (reference < 1) return otherwise;
+std::string NameOfReference(const TemplateCore& core, std::int32_t reference, std::string_view otherwise) {
+  if (reference < 1) return std::string(otherwise);
   const CEL_Element* element = core.GetElementBySequence(static_cast<std::uint32_t>(reference));
-  return element == nullptr ? "unkown" : element->symbol.Text();
+  return element == nullptr ? "unkown" : element->symbol.TextOf();
 }
 
 std::string OwnerName(const TemplateCore& core, std::int32_t considered) {
   if (considered == -1) return "own";
   if (considered < 1) return "any";
   const auto place = static_cast<std::size_t>(considered - 1);
-  return place < core.Species().size() ? core.Species()[place]->symbol.Text() : "unkown";
+  return place < core.Species().size() ? core.Species()[place]->symbol.TextOf() : "unkown";
 }
 
 std::string SearchSummary(const TemplateCore& core, const CEL_Lagrange_Spatial_Function& function) {
@@ -37,7 +37,7 @@ std::string SearchSummary(const TemplateCore& core, const CEL_Lagrange_Spatial_F
     sought = OwnerName(core, function.lookFor.IntValue()) + "." +
              NameOfReference(core, reference, function.property.Text());
   }
-  return function.purpose.Text() + "(" + function.math.Text() + "[" + sought + "])";
+  return function.purpose.TextOf() + "(" + function.math.TextOf() + "[" + sought + "])";
 }
 
 /// Collects the rows, counting those that show a number.
@@ -48,7 +48,7 @@ class OverviewBuilder final {
   std::vector<OverviewRow> Build() {
     ForEachHeadedCollection([this](const auto& row) { AddAll(core.Elements().*row.elements, ""); });
     for (const auto& specie : core.Species()) {
-      const std::string ofClass = " (" + specie->symbol.Text() + ")";
+      const std::string ofClass = " (" + specie->symbol.TextOf() + ")";
       ForEachMemberList([this, &specie, &ofClass](const auto& list) {
         // The forcings of a class are kept out on purpose; its movements do not count.
         const bool isListed = list.hasHead && list.kind != ElementKind::SpecieForcing;
@@ -70,9 +70,9 @@ class OverviewBuilder final {
   template <class Element>
   std::string TextOf(const Element& element) const {
     if constexpr (requires { element.equation; }) {
-      return element.equation.Text();
+      return element.equation.TextOf();
     } else if constexpr (requires { element.expression; }) {
-      return element.expression.Text();
+      return element.expression.TextOf();
     } else if constexpr (requires { element.defaultValue; }) {
       return element.defaultValue.TextOf();
     } else if constexpr (requires { element.framework; }) {
@@ -86,8 +86,8 @@ class OverviewBuilder final {
   void AddAll(const Elements& elements, const std::string& ofClass) {
     for (const auto& element : elements) {
       rows.push_back(
-          {{std::to_string(++counted), element->symbol.Text(), std::string(element->KindText()) + ofClass,
-            TextOf(*element), element->description.Text()},
+          {{std::to_string(++counted), element->symbol.TextOf(), std::string(element->KindText()) + ofClass,
+            TextOf(*element), element->description.TextOf()},
            element->GetUid()});
     }
   }
@@ -95,7 +95,7 @@ class OverviewBuilder final {
   void AddMovement(const CEL_Element& movement, std::string type, const CEL_Property& expression,
                    const char* description) {
     rows.push_back(
-        {{"-", movement.symbol.Text(), std::move(type), expression.Text(), description}, movement.GetUid()});
+        {{"-", movement.symbol.TextOf(), std::move(type), expression.TextOf(), description}, movement.GetUid()});
   }
 
   const TemplateCore& core;

@@ -59,17 +59,27 @@ std::span<const std::string_view> LagrangeMath(std::string_view purpose) {
 }
 
 constexpr std::array<PropertyRow, 11> kRows = {{
-    {key::kFunctionId, "Function_ID", ValueType::Integer, nullptr, "", 100.0},
-    {key::kVariableId, "Variable ID", ValueType::Integer, nullptr, "", -1.0},
-    {key::kSpecieId, "Specie ID", ValueType::Integer, nullptr, "", -1.0},
-    {key::kRadius, "Radius", ValueType::Real, nullptr, "", 0.0},
-    {key::kDimension, "Dimension", ValueType::Integer, DimensionChoices, "", 2.0},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_INDIVIDUAL"},
-    {key::kPurpose, "Purpose", ValueType::Text, nullptr, "DIRECTION"},
-    {key::kFramework, "Framework", ValueType::Text, FrameworkChoices, kEuler},
-    {key::kProperty, "Property", ValueType::Text, PropertyChoices, kNone},
-    {key::kMath, "Math", ValueType::Text, nullptr, kNone},
-    {key::kLookFor, "Lookfor", ValueType::Integer, nullptr, "", kOwnSpecie},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::functionId), key::kFunctionId, "Function_ID", ValueType::Integer,
+     nullptr, "", 100.0},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::variableId), key::kVariableId, "Variable ID", ValueType::Integer,
+     nullptr, "", -1.0},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::specieId), key::kSpecieId, "Specie ID", ValueType::Integer,
+     nullptr, "", -1.0},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::radius), key::kRadius, "Radius", ValueType::Real, nullptr, "",
+     0.0},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::dimension), key::kDimension, "Dimension", ValueType::Integer,
+     DimensionChoices, "", 2.0},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::spatialVariation), key::kSpatialVariation, "Spatial Variation",
+     ValueType::Text, nullptr, "PER_INDIVIDUAL"},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::purpose), key::kPurpose, "Purpose", ValueType::Text, nullptr,
+     "DIRECTION"},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::framework), key::kFramework, "Framework", ValueType::Text,
+     FrameworkChoices, kEuler},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::property), key::kProperty, "Property", ValueType::Text,
+     PropertyChoices, kNone},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::math), key::kMath, "Math", ValueType::Text, nullptr, kNone},
+    {PlaceOf(&CEL_Lagrange_Spatial_Function::lookFor), key::kLookFor, "Lookfor", ValueType::Integer, nullptr,
+     "", kOwnSpecie},
 }};
 
 const ChoiceList& OilspillChoices() {
@@ -102,8 +112,7 @@ std::vector<CEL_Choice> FirstLookForChoices() {
 CEL_Lagrange_Spatial_Function::CEL_Lagrange_Spatial_Function(std::string_view caption)
     : CEL_Element(caption) {
   SetKind(ElementKind::SpatialFunction);
-  Bind(kRows, {&functionId, &variableId, &specieId, &radius, &dimension, &spatialVariation, &purpose,
-               &framework, &property, &math, &lookFor});
+  Bind(kRows);
   ListenTo({&variableId, &lookFor, &purpose, &framework});
   static const ChoiceList kWithoutClasses = ShareChoices(FirstLookForChoices());
   lookFor.SetChoices(kWithoutClasses);
@@ -124,9 +133,9 @@ void CEL_Lagrange_Spatial_Function::Read(KvfNode section, ReadStatus& status) {
     std::string_view keyword;
     std::string inFile;
   };
-  const std::array<Choice, 3> choices = {{{&framework, key::kFramework, framework.Text()},
-                                          {&purpose, key::kPurpose, purpose.Text()},
-                                          {&math, key::kMath, math.Text()}}};
+  const std::array<Choice, 3> choices = {{{&framework, key::kFramework, std::string(framework.Text())},
+                                          {&purpose, key::kPurpose, std::string(purpose.Text())},
+                                          {&math, key::kMath, std::string(math.Text())}}};
   RebuildChoices();
   RestoreSelections();
   for (const Choice& choice : choices) {

@@ -27,7 +27,7 @@ const ChoiceList& UserDefinedUnitChoices() {
 /// The base fields in the order of field lists, which is not that of the file.
 struct BaseRow {
   std::string_view label;
-  CEL_Property CEL_Element::*property;
+  PropertyPlace property;
 };
 
 constexpr std::array<BaseRow, 7> kBaseRows = {{
@@ -40,7 +40,25 @@ constexpr std::array<BaseRow, 7> kBaseRows = {{
     {"UNQ Unit", &CEL_Element::unqUnit},
 }};
 
-void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
+/// Gives a fresh property the value of its row.
+void StartWithDefault(CEL_Property& property, const PropertyRow& row) {
+  switch (row.type) {
+    case ValueType::Real:
+      property.StartWith(row.defaultNumber);
+      break;
+    case ValueType::Integer:
+      property.StartWith(static_cast<std::int32_t>(row.defaultNumber));
+      break;
+    case ValueType::Boolean:
+      property.StartWith(row.defaultText == kYes);
+      break;
+    default:
+      property.StartWithText(row.defaultText.empty() ? std::string_view("") : row.defaultText);
+      break;
+  }
+}
+
+void SetDefault(CEL_Property& property, const PropertyRow& row) {
   switch (row.type) {
     case ValueType::Real:
       property.SetReal(row.defaultNumber);
@@ -61,9 +79,10 @@ void ApplyDefault(CEL_Property& property, const PropertyRow& row) {
 
 CEL_Element::CEL_Element(bool withSymbol, bool withId, bool withDescription)
     : hasDescription(withDescription), hasSymbol(withSymbol), hasId(withId), uid(Uid{++UidCounter()}) {
-  unqType.SetInt(kUserDefinedUnit);
+  for (const BaseRow& row : kBaseRows) (this->*row.property).BelongTo(*this);
+  unqType.StartWith(kUserDefinedUnit);
   OfferUnitTypes(kPlainUnitTypes);
-  unqUnit.SetChoices(UserDefinedUnitChoices());
+  unqUnit.OfferStanding(UserDefinedUnitChoices());
   unqUnit.SelectIndex(0);
 }
 
@@ -79,7 +98,7 @@ CEL_ListHead::CEL_ListHead(ElementKind kindNumber, std::string_view caption)
 }
 
 void CEL_Element::OfferUnitTypes(const UnitTypes& types) {
-  unqType.SetChoices(UnitTypeChoices(types));
+  unqType.OfferStanding(UnitTypeChoices(types));
   unqType.SelectIndex(unqType.PresentChoice());
 }
 
@@ -114,61 +133,43 @@ void CEL_Element::SetFileFlags(bool withSymbol, bool withId, bool withDescriptio
   hasDescription = withDescription;
 }
 
-void CEL_Element::Bind(std::span<const PropertyRow> rows, std::initializer_list<CEL_Property*> properties) {
-  assert(rows.size() == properties.size());
-  ownProperties.reserve(ownProperties.size() + rows.size());
-  auto row = rows.begin();
-  for (CEL_Property* property : properties) {
-    assert(property->Type() == row->type);
-    if (row->choices != nullptr) property->SetChoices(row->choices());
-    ownProperties.push_back({&*row, property});
-    if (row->type == ValueType::Expression) {
-      const auto place = static_cast<std::uint8_t>(ownProperties.size() - 1);
-      assert(!HasExpression() || endOfExpressions == place);
-      if (!HasExpression()) firstExpression = place;
-      endOfExpressions = static_cast<std::uint8_t>(place + 1);
-    }
-    ++row;
+void CEL_Element::Bind(std::span<const PropertyRow> classRows) {
+  rows = classRows;
+  for (const PropertyRow& row : rows) {
+    CEL_Property& property = this->*row.place;
+    assert(property.Type() == row.type);
+    property.BelongTo(*this);
+    if (row.choices != nullptr) property.OfferStanding(row.choices());
+    StartWithDefault(property, row);
+    if (row.type != ValueType::Expression) continue;
+    const auto place = static_cast<std::uint8_t>(&row - rows.data());
+    assert(!HasExpression() || firstExpression + expressions == place);
+    if (!HasExpression()) firstExpression = place;
+    ++expressions;
   }
-  ResetOwn();
+  SelectPresentValues();
 }
 
 void CEL_Element::ListenTo(std::initializer_list<CEL_Property*> properties) {
-  for (CEL_Property* property : properties) property->AddListener(*this);
+  for (CEL_Property* property : properties) property->ReportTo(ReportsTo::Holder);
 }
 
 void CEL_Element::ResetOwn() {
-  for (const OwnProperty& own : ownProperties) ApplyDefault(*own.property, *own.row);
+  for (const PropertyRow& row : rows) SetDefault(this->*row.place, row);
   SelectPresentValues();
 }
 
 void CEL_Element::SelectPresentValues() {
   unqType.SelectIndex(unqType.PresentChoice());
   unqUnit.SelectIndex(unqUnit.PresentChoice());
-  for (const OwnProperty& own : ownProperties) {
-    own.property->SelectIndex(own.property->PresentChoice());
+  for (const PropertyRow& row : rows) {
+    CEL_Property& property = this->*row.place;
+    property.SelectIndex(property.PresentChoice());
   }
-}
-
-std::vector<CEL_Property*> CEL_Element::BaseProperties() {
-  std::vector<CEL_Property*> properties;
-  properties.reserve(kBaseRows.size());
-  for (const BaseRow& row : kBaseRows) properties.push_back(&(this->*row.property));
-  return properties;
-}
-
-void CEL_Element::SetModifiedFlag(bool* flag) {
-  modifiedFlag = flag;
-  for (CEL_Property* property : BaseProperties()) property->SetModifiedFlag(flag);
-  for (const OwnProperty& own : ownProperties) own.property->SetModifiedFlag(flag);
 }
 
 void CEL_Element::ClearTexts() {
   for (CEL_Property* text : {&description, &onlineHelp, &documentation}) text->SetText("");
-}
-
-void CEL_Element::MarkModified() {
-  if (modifiedFlag != nullptr) *modifiedFlag = true;
 }
 
 void ResetElementUids() {
@@ -233,23 +234,22 @@ void CEL_Element::WriteBase(KvfHandle file, int& status) {
 
 void CEL_Element::ReadOwn(KvfNode section, ReadStatus& status) {
   for (const bool last : {false, true}) {
-    for (const OwnProperty& own : ownProperties) {
-      const PropertyRow& row = *own.row;
+    for (const PropertyRow& row : rows) {
       if (row.readLast != last || row.keyword.empty()) continue;
       if (!row.onlyWith.empty() && !HasKeyword(section, row.onlyWith)) continue;
       const bool isElsewhere =
           !row.writtenAs.empty() && !HasKeyword(section, row.keyword) && HasKeyword(section, row.writtenAs);
       if (isElsewhere) status.ReportMissing(section, row.keyword);
-      ReadProperty(*own.property, section, isElsewhere ? row.writtenAs : row.keyword, status);
+      ReadProperty(this->*row.place, section, isElsewhere ? row.writtenAs : row.keyword, status);
     }
   }
   SelectPresentValues();
 }
 
 void CEL_Element::WriteOwn(KvfHandle file, int& status) {
-  for (const OwnProperty& own : ownProperties) {
-    const std::string_view keyword = own.row->writtenAs.empty() ? own.row->keyword : own.row->writtenAs;
-    if (!keyword.empty()) WriteProperty(*own.property, file, keyword, *this, status);
+  for (const PropertyRow& row : rows) {
+    const std::string_view keyword = row.writtenAs.empty() ? row.keyword : row.writtenAs;
+    if (!keyword.empty()) WriteProperty(this->*row.place, file, keyword, *this, status);
   }
 }
 
@@ -313,14 +313,14 @@ void CEL_Element::AppendBaseFields(std::vector<ElementField>& fields) const {
 
 void CEL_Element::AppendOwnFields(std::vector<ElementField>& fields) const {
   for (const bool last : {false, true}) {
-    for (const OwnProperty& own : ownProperties) {
-      if (own.row->listedLast == last) fields.push_back(MakeField(own.row->label, *own.property));
+    for (const PropertyRow& row : rows) {
+      if (row.listedLast == last) fields.push_back(MakeField(row.label, this->*row.place));
     }
   }
 }
 
 void CEL_Element::GetFields(std::vector<ElementField>& fields) const {
-  if (!ownProperties.empty()) AppendCaption(fields);
+  if (!rows.empty()) AppendCaption(fields);
   AppendBaseFields(fields);
   AppendOwnFields(fields);
 }
@@ -336,9 +336,9 @@ int CEL_Element::SetBaseFields(const std::vector<ElementField>& fields) {
 
 int CEL_Element::SetOwnFields(const std::vector<ElementField>& fields) {
   int found = 0;
-  for (const OwnProperty& own : ownProperties) {
-    const ElementField* field = FindField(fields, own.row->label);
-    if (field != nullptr && SetFromField(*own.property, *field)) ++found;
+  for (const PropertyRow& row : rows) {
+    const ElementField* field = FindField(fields, row.label);
+    if (field != nullptr && SetFromField(this->*row.place, *field)) ++found;
   }
   return found;
 }
@@ -351,8 +351,8 @@ std::string_view CEL_Element::LabelOf(const CEL_Property& property) const {
   for (const BaseRow& row : kBaseRows) {
     if (&(this->*row.property) == &property) return row.label;
   }
-  for (const OwnProperty& own : ownProperties) {
-    if (own.property == &property) return own.row->label;
+  for (const PropertyRow& row : rows) {
+    if (&(this->*row.place) == &property) return row.label;
   }
   return {};
 }

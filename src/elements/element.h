@@ -19,12 +19,17 @@
 
 namespace tessal {
 
+class CEL_Element;
 class ElementOwner;
 class ReadStatus;
 
-/// One row of the table that an element class is described by: how a property is called in the file and by
-/// people, what it may hold, and what it starts with.
+/// Where an element holds a property.
+using PropertyPlace = CEL_Property CEL_Element::*;
+
+/// One row of the table that an element class is described by: where a property is, how it is called in the
+/// file and by people, what it may hold, and what it starts with.
 struct PropertyRow {
+  PropertyPlace place;
   std::string_view keyword;  ///< empty for a property that the element's own section does not hold
   std::string_view label;
   ValueType type;
@@ -38,6 +43,12 @@ struct PropertyRow {
   std::string_view writtenAs{};
   std::string_view caption{};  ///< the item under which a failed parse is reported; else the symbol
 };
+
+/// The place of a property of an element class.
+template <class Element>
+constexpr PropertyPlace PlaceOf(CEL_Property Element::*property) {
+  return static_cast<PropertyPlace>(property);
+}
 
 // A row with one of its less common columns.
 constexpr PropertyRow ReadLast(PropertyRow row) {
@@ -62,16 +73,14 @@ constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
 }
 
 /// Which unit data an element has in the file.
-enum class UnitMode : std::int32_t { None = 0, Type = 1, Unit = 2, Both = 3 };
+enum class UnitMode : std::uint8_t { None = 0, Type = 1, Unit = 2, Both = 3 };
 
-class CEL_Element : public PropertyListener {
+class CEL_Element : public PropertyHolder {
  public:
   /// A list head or the root: the flags say what it reads and writes.
   CEL_Element(bool withSymbol, bool withId, bool withDescription);
   /// An element with all three, and a caption in its symbol.
   explicit CEL_Element(std::string_view caption);
-  CEL_Element(const CEL_Element&) = delete;
-  CEL_Element& operator=(const CEL_Element&) = delete;
   virtual ~CEL_Element() = default;
 
   /// Fills the properties from a key-file section; a node that is no section leaves the element alone.
@@ -90,6 +99,7 @@ class CEL_Element : public PropertyListener {
   virtual int SetFields(const std::vector<ElementField>& fields);
 
   void OnPropertyChanged(CEL_Property& changed) override;
+  void OnTableChanged() override { RebuildOwner(); }
 
   /// Makes editable what the present values leave to the modeller, and locks what they fix: after a load, a
   /// reset, and a change of what decides it. Values stay as they are.
@@ -98,15 +108,19 @@ class CEL_Element : public PropertyListener {
   /// Calls the visitor with each expression, its row and its property, in the order of the class's table.
   template <class Visitor>
   void ForEachExpression(Visitor visit) const {
-    for (std::size_t place = firstExpression; place < endOfExpressions; ++place) {
-      visit(*ownProperties[place].row, *ownProperties[place].property);
-    }
+    for (const PropertyRow& row : ExpressionRows()) visit(row, this->*row.place);
   }
+  template <class Visitor>
+  void ForEachExpression(Visitor visit) {
+    for (const PropertyRow& row : ExpressionRows()) visit(row, this->*row.place);
+  }
+  /// The rows of the expressions, in the order of the class's table, where they are side by side.
+  std::span<const PropertyRow> ExpressionRows() const { return rows.subspan(firstExpression, expressions); }
 
   /// The label of one of the element's properties; empty for any other.
   std::string_view LabelOf(const CEL_Property& property) const;
 
-  bool HasExpression() const { return firstExpression < endOfExpressions; }
+  bool HasExpression() const { return expressions > 0; }
   /// What the symbol table holds for an element without expressions: the number of an input, the name that a
   /// search looks for.
   virtual std::string RecordText() const { return {}; }
@@ -136,9 +150,8 @@ class CEL_Element : public PropertyListener {
   ElementOwner* Owner() const { return owner; }
   virtual void SetOwner(ElementOwner* template_) { owner = template_; }
 
-  /// Stores the reference in the element and in all its properties.
-  virtual void SetModifiedFlag(bool* flag);
-  void MarkModified();
+  /// The flag that a change of the element or of one of its properties sets.
+  virtual void SetModifiedFlag(bool* flag) { SetFlag(flag); }
 
   /// Has the template, if there is one, bring its symbol table up to date.
   void RebuildOwner();
@@ -169,18 +182,13 @@ class CEL_Element : public PropertyListener {
   CEL_Property unqUnit{ValueType::Integer};
 
  protected:
-  struct OwnProperty {
-    const PropertyRow* row;
-    CEL_Property* property;
-  };
-
   void SetKind(ElementKind kindNumber) { elementKind = kindNumber; }
   /// A list head's kind, unit data and flags are set by who builds it.
   void SetUnitMode(UnitMode mode) { unitMode = mode; }
   void SetFileFlags(bool withSymbol, bool withId, bool withDescription);
 
-  /// Joins the rows of the class's table with the properties, in order, and gives them their defaults.
-  void Bind(std::span<const PropertyRow> rows, std::initializer_list<CEL_Property*> properties);
+  /// Takes the class's table, of which each class has one, and gives the properties in it their defaults.
+  void Bind(std::span<const PropertyRow> classRows);
   void ListenTo(std::initializer_list<CEL_Property*> properties);
 
   void ReadBase(KvfNode section, ReadStatus& status);
@@ -207,39 +215,22 @@ class CEL_Element : public PropertyListener {
   void ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation);
 
  private:
-  std::vector<CEL_Property*> BaseProperties();
-
   bool hasDescription;
   bool hasSymbol;
   bool hasId;
   bool loaded = false;
-  bool* modifiedFlag = nullptr;
+  // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
+  std::uint8_t firstExpression = 0;
+  std::uint8_t expressions = 0;
+  UnitMode unitMode = UnitMode::None;
   Uid uid;
   ElementKind elementKind = ElementKind::None;
-  UnitMode unitMode = UnitMode::None;
   int sourceLine = 0;
   CEL_Element* listHeader = nullptr;
   CEL_Element* parent = nullptr;
   ElementOwner* owner = nullptr;
   std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
-  std::vector<OwnProperty> ownProperties;
-  // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
-  std::uint8_t firstExpression = 0;
-  std::uint8_t endOfExpressions = 0;
-};
-
-/// Follows properties into the symbol table and no further, where a change passed to the element itself would
-/// do more.
-class TableListener final : public PropertyListener {
- public:
-  explicit TableListener(CEL_Element& listening) : element(listening) {}
-  TableListener(const TableListener&) = delete;
-  TableListener& operator=(const TableListener&) = delete;
-  virtual ~TableListener() = default;
-  void OnPropertyChanged(CEL_Property& /*changed*/) override { element.RebuildOwner(); }
-
- private:
-  CEL_Element& element;
+  std::span<const PropertyRow> rows;
 };
 
 /// A list head or the root: an element that carries the descriptive texts of a collection.

@@ -25,33 +25,44 @@ const ChoiceList& FormatChoices() {
 }
 
 constexpr std::array<PropertyRow, 5> kAuxiliaryRows = {{
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
-    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, scope::kNotSpecified},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices,
-     variation::kHorizontalAndVertical},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_Auxilliary_Variable::output), key::kOutput, "Output", ValueType::Boolean, YesNoChoices,
+     kYes},
+    {PlaceOf(&CEL_Auxilliary_Variable::scope), key::kScope, "Scope", ValueType::Text, NoScopeChoices,
+     scope::kNotSpecified},
+    {PlaceOf(&CEL_Auxilliary_Variable::spatialVariation), key::kSpatialVariation, "Spatial Variation",
+     ValueType::Text, SpatialVariationChoices, variation::kHorizontalAndVertical},
+    {PlaceOf(&CEL_Auxilliary_Variable::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {PlaceOf(&CEL_Auxilliary_Variable::expression), key::kExpression, "Expression", ValueType::Expression,
+     nullptr, "0"},
 }};
 
 constexpr std::array<PropertyRow, 8> kProcessRows = {{
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
-    {key::kProcessType, "Process type", ValueType::Text, ProcessTypeChoices, "TRANSFORMATION"},
-    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, scope::kWaterColumn},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices,
-     variation::kHorizontalAndVertical},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_Process::output), key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
+    {PlaceOf(&CEL_Process::processType), key::kProcessType, "Process type", ValueType::Text,
+     ProcessTypeChoices, "TRANSFORMATION"},
+    {PlaceOf(&CEL_Process::scope), key::kScope, "Scope", ValueType::Text, LayerScopeChoices,
+     scope::kWaterColumn},
+    {PlaceOf(&CEL_Process::spatialVariation), key::kSpatialVariation, "Spatial Variation", ValueType::Text,
+     SpatialVariationChoices, variation::kHorizontalAndVertical},
+    {PlaceOf(&CEL_Process::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {PlaceOf(&CEL_Process::expression), key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
     // Files of older versions lack both.
-    OnlyWith(key::kControlId, {key::kControlId, "Control ID", ValueType::Integer, nullptr, "", -1.0}),
-    OnlyWith(key::kControlId, {key::kControlValue, "Control Value", ValueType::Real, nullptr, "", 0.8}),
+    OnlyWith(key::kControlId, {PlaceOf(&CEL_Process::controlId), key::kControlId, "Control ID",
+                               ValueType::Integer, nullptr, "", -1.0}),
+    OnlyWith(key::kControlId, {PlaceOf(&CEL_Process::controlValue), key::kControlValue, "Control Value",
+                               ValueType::Real, nullptr, "", 0.8}),
 }};
 
 constexpr std::array<PropertyRow, 5> kDerivedOutputRows = {{
-    {key::kScope, "Scope", ValueType::Text, NoScopeChoices, scope::kNotSpecified},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, variation::kNone},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kFormat, "Format", ValueType::Text, FormatChoices, "INSTANTANEOUS"},
-    {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_Derived_Output::scope), key::kScope, "Scope", ValueType::Text, NoScopeChoices,
+     scope::kNotSpecified},
+    {PlaceOf(&CEL_Derived_Output::spatialVariation), key::kSpatialVariation, "Spatial Variation",
+     ValueType::Text, SpatialVariationChoices, variation::kNone},
+    {PlaceOf(&CEL_Derived_Output::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {PlaceOf(&CEL_Derived_Output::format), key::kFormat, "Format", ValueType::Text, FormatChoices,
+     "INSTANTANEOUS"},
+    {PlaceOf(&CEL_Derived_Output::expression), key::kExpression, "Expression", ValueType::Expression, nullptr,
+     "0"},
 }};
 
 }  // namespace
@@ -79,14 +90,14 @@ void CEL_ExpressionElement::OnPropertyChanged(CEL_Property& changed) {
 
 CEL_Auxilliary_Variable::CEL_Auxilliary_Variable(std::string_view caption)
     : CEL_ExpressionElement(ElementKind::Auxiliary, caption) {
-  Bind(kAuxiliaryRows, {&output, &scope, &spatialVariation, &unit, &expression});
+  Bind(kAuxiliaryRows);
   ListenTo({&symbol, &spatialVariation, &expression});
-  scope.AddListener(scopeListener);
+  // Its variation does not follow its scope.
+  scope.ReportTo(ReportsTo::Table);
 }
 
 CEL_Process::CEL_Process(std::string_view caption) : CEL_ExpressionElement(ElementKind::Process, caption) {
-  Bind(kProcessRows,
-       {&output, &processType, &scope, &spatialVariation, &unit, &expression, &controlId, &controlValue});
+  Bind(kProcessRows);
   ListenTo({&symbol, &scope, &spatialVariation, &expression});
 }
 
@@ -94,9 +105,10 @@ CEL_Derived_Output::CEL_Derived_Output(std::string_view caption)
     : CEL_ExpressionElement(ElementKind::DerivedOutput, caption) {
   SetFileFlags(false, true, true);
   symbol.SetEditable(false);
-  Bind(kDerivedOutputRows, {&scope, &spatialVariation, &unit, &format, &expression});
+  Bind(kDerivedOutputRows);
   ListenTo({&spatialVariation, &expression});
-  scope.AddListener(scopeListener);
+  // Its variation does not follow its scope.
+  scope.ReportTo(ReportsTo::Table);
 }
 
 }  // namespace tessal

@@ -20,9 +20,6 @@ class CEL_ExpressionElement : public CEL_Element {
 
  protected:
   CEL_ExpressionElement(ElementKind kindNumber, std::string_view caption);
-
-  /// For those whose variation does not follow their scope.
-  TableListener scopeListener{*this};
 };
 
 class CEL_Auxilliary_Variable final : public CEL_ExpressionElement {

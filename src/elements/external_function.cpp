@@ -32,18 +32,21 @@ const ChoiceList& ParameterChoices() {
 }
 
 constexpr std::array<PropertyRow, 5> kRows = {{
-    {key::kPublicName, "Public Name", ValueType::Text, nullptr, "External"},
-    {key::kParameters, "Parameter Count", ValueType::Integer, ParameterChoices, "", 0.0},
-    {key::kUsedAs, "Used as", ValueType::Text, UseChoices, kMathFunction},
-    {key::kDll, "DLL", ValueType::Text},
-    {key::kEntryPoint, "Entry Point", ValueType::Text},
+    {PlaceOf(&CEL_ExternalFunction::publicName), key::kPublicName, "Public Name", ValueType::Text, nullptr,
+     "External"},
+    {PlaceOf(&CEL_ExternalFunction::parameters), key::kParameters, "Parameter Count", ValueType::Integer,
+     ParameterChoices, "", 0.0},
+    {PlaceOf(&CEL_ExternalFunction::usedAs), key::kUsedAs, "Used as", ValueType::Text, UseChoices,
+     kMathFunction},
+    {PlaceOf(&CEL_ExternalFunction::dll), key::kDll, "DLL", ValueType::Text},
+    {PlaceOf(&CEL_ExternalFunction::entryPoint), key::kEntryPoint, "Entry Point", ValueType::Text},
 }};
 
 }  // namespace
 
 CEL_ExternalFunction::CEL_ExternalFunction(std::string_view caption) : CEL_Element(caption) {
   SetKind(ElementKind::ExternalFunction);
-  Bind(kRows, {&publicName, &parameters, &usedAs, &dll, &entryPoint});
+  Bind(kRows);
   ListenTo({&publicName, &parameters, &usedAs});
   claim.Claim(publicName.Text());
 }

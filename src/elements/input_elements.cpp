@@ -22,14 +22,19 @@ constexpr InputKind kForcingKind{ElementKind::Forcing, 2, ForcingBuiltinIds};
 constexpr std::int32_t kNoBuiltin = -1;
 
 constexpr std::array<PropertyRow, 8> kRows = {{
-    {key::kIsUserSpecified, "Is user specified", ValueType::Boolean, YesNoChoices, kYes},
-    {key::kBuiltInId, "Build in ID", ValueType::Integer, nullptr, "", kNoBuiltin},
-    {key::kScope, "Scope", ValueType::Text, InputScopeChoices, scope::kNotSpecified},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, SpatialVariationChoices, variation::kNone},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    ReadLast({key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0}),
-    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
-    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
+    {PlaceOf(&CEL_Input::isUserSpecified), key::kIsUserSpecified, "Is user specified", ValueType::Boolean,
+     YesNoChoices, kYes},
+    {PlaceOf(&CEL_Input::builtInId), key::kBuiltInId, "Build in ID", ValueType::Integer, nullptr, "",
+     kNoBuiltin},
+    {PlaceOf(&CEL_Input::scope), key::kScope, "Scope", ValueType::Text, InputScopeChoices,
+     scope::kNotSpecified},
+    {PlaceOf(&CEL_Input::spatialVariation), key::kSpatialVariation, "Spatial Variation", ValueType::Text,
+     SpatialVariationChoices, variation::kNone},
+    {PlaceOf(&CEL_Input::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    ReadLast({PlaceOf(&CEL_Input::defaultValue), key::kDefaultValue, "Default Value", ValueType::Real,
+              nullptr, "", 0.0}),
+    {PlaceOf(&CEL_Input::minValue), key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
+    {PlaceOf(&CEL_Input::maxValue), key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
 }};
 
 ChoiceList BuiltinChoices(const InputKind& input, bool withDeprecated, std::int32_t inUse) {
@@ -63,10 +68,10 @@ CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
   SetKind(input.kind);
   SetUnitMode(UnitMode::Both);
   OfferUnitTypes(kInputUnitTypes);
-  Bind(kRows,
-       {&isUserSpecified, &builtInId, &scope, &spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
+  Bind(kRows);
   ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
-  scope.AddListener(scopeListener);
+  // The scope of an input that a modeller chooses leaves the variation alone.
+  scope.ReportTo(ReportsTo::Table);
   CEL_Input::Reset();
 }
 
@@ -93,7 +98,11 @@ void CEL_Input::RebuildBuiltInChoices(bool withDeprecated) {
   showDeprecated = withDeprecated;
   const std::int32_t inUse = builtInId.IntValue();
   const bool usual = !withDeprecated && !IsDeprecatedBuiltin(inUse);
-  builtInId.SetChoices(usual ? UsualBuiltinChoices(input) : BuiltinChoices(input, withDeprecated, inUse));
+  if (usual) {
+    builtInId.OfferStanding(UsualBuiltinChoices(input));
+  } else {
+    builtInId.SetChoices(BuiltinChoices(input, withDeprecated, inUse));
+  }
   SelectPresentValues();
 }
 

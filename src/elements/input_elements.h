@@ -43,8 +43,6 @@ class CEL_Input : public CEL_Element {
   void ApplyBuiltin();
 
   const InputKind& input;
-  /// The scope of an input that a modeller chooses leaves the variation alone.
-  TableListener scopeListener{*this};
   bool showDeprecated = false;
 };
 

@@ -19,7 +19,7 @@ void ReadList(KvfNode parent, std::string_view name, CEL_Element* head, ReadStat
   const KvfNode list = kvfSectionByNameNum(parent, name, 1);
   if (list == nullptr) return;
   if (head != nullptr) head->Read(list, status);
-  for (KvfNode section = kvfFirstSection(list); section != nullptr; section = kvfNextSection(section)) {
+  for (KvfNode section = kvfFirstSection(list); section != nullptr; section = kvfNextSection(section, list)) {
     CEL_Element& element = add();
     element.Read(section, status);
     element.SetLoaded(true);
@@ -53,7 +53,8 @@ void WriteList(const Elements& elements, std::string_view name, std::string_view
 template <class StateVariables>
 void ReadEquations(KvfNode equations, const StateVariables& stateVariables, ReadStatus& status) {
   std::size_t place = 0;
-  for (KvfNode section = kvfFirstSection(equations); section != nullptr; section = kvfNextSection(section)) {
+  for (KvfNode section = kvfFirstSection(equations); section != nullptr;
+       section = kvfNextSection(section, equations)) {
     auto& variable = At(stateVariables, place++);
     status.Begin(variable, section);
     ReadProperty(variable.equation, section, variable.symbol.Text(), status);

@@ -38,19 +38,23 @@ const ChoiceList& DebugLevelChoices() {
 
 // Old files lack some keywords, and that is not reported.
 constexpr std::array<PropertyRow, 11> kRows = {{
-    {key::kTessalVersion, "Tessal version", ValueType::Real},
-    {key::kParserVersion, "Parser version", ValueType::Real},
-    ListedLast(OnlyWith(key::kDocumentRevision, {key::kDocumentRevision, "Revision", ValueType::Integer})),
-    {key::kRandSeed, "Randseed", ValueType::Integer},
-    {key::kDebugLevel, "Debug level", ValueType::Integer, DebugLevelChoices},
-    {key::kDebugLog, "Debug log", ValueType::Text},
-    {key::kRandomParticleDir, "Inital random particle dir", ValueType::Boolean, YesNoChoices, kNo},
-    {key::kBuildSpatialTree, "Build spatial tree", ValueType::Boolean, YesNoChoices, kNo},
-    {key::kChecksum, "Checksum", ValueType::Text, nullptr, "0"},
-    OnlyWith(key::kOptimise,
-             {key::kOptimise, "Optimise expressions", ValueType::Boolean, YesNoChoices, kYes}),
-    OnlyWith(key::kTrigonometrics,
-             {key::kTrigonometrics, "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree"}),
+    {PlaceOf(&CEL_Miscanellous::tessalVersion), key::kTessalVersion, "Tessal version", ValueType::Real},
+    {PlaceOf(&CEL_Miscanellous::parserVersion), key::kParserVersion, "Parser version", ValueType::Real},
+    ListedLast(OnlyWith(key::kDocumentRevision, {PlaceOf(&CEL_Miscanellous::documentRevision),
+                                                 key::kDocumentRevision, "Revision", ValueType::Integer})),
+    {PlaceOf(&CEL_Miscanellous::randSeed), key::kRandSeed, "Randseed", ValueType::Integer},
+    {PlaceOf(&CEL_Miscanellous::debugLevel), key::kDebugLevel, "Debug level", ValueType::Integer,
+     DebugLevelChoices},
+    {PlaceOf(&CEL_Miscanellous::debugLog), key::kDebugLog, "Debug log", ValueType::Text},
+    {PlaceOf(&CEL_Miscanellous::randomParticleDir), key::kRandomParticleDir, "Inital random particle dir",
+     ValueType::Boolean, YesNoChoices, kNo},
+    {PlaceOf(&CEL_Miscanellous::buildSpatialTree), key::kBuildSpatialTree, "Build spatial tree",
+     ValueType::Boolean, YesNoChoices, kNo},
+    {PlaceOf(&CEL_Miscanellous::checksum), key::kChecksum, "Checksum", ValueType::Text, nullptr, "0"},
+    OnlyWith(key::kOptimise, {PlaceOf(&CEL_Miscanellous::optimise), key::kOptimise, "Optimise expressions",
+                              ValueType::Boolean, YesNoChoices, kYes}),
+    OnlyWith(key::kTrigonometrics, {PlaceOf(&CEL_Miscanellous::trigonometrics), key::kTrigonometrics,
+                                    "Trigonometric unit", ValueType::Text, AngleUnitChoices, "Degree"}),
 }};
 
 }  // namespace
@@ -58,8 +62,7 @@ constexpr std::array<PropertyRow, 11> kRows = {{
 CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
   SetKind(ElementKind::Miscellaneous);
   symbol.SetEditable(false);
-  Bind(kRows, {&tessalVersion, &parserVersion, &documentRevision, &randSeed, &debugLevel, &debugLog,
-               &randomParticleDir, &buildSpatialTree, &checksum, &optimise, &trigonometrics});
+  Bind(kRows);
   CEL_Miscanellous::Reset();
 }
 

@@ -52,89 +52,180 @@ void SetNotifyChanges(bool on) {
   NotificationSwitch() = on;
 }
 
-CEL_Property::CEL_Property(ValueType valueType) : type(valueType) {}
+struct CEL_Property::Extra {
+  std::string text;  ///< the value of a property whose text was set, not lent
+  std::string formerText;
+  double formerReal = 0.0;
+  std::int32_t formerInt = 0;
+  std::int32_t changeStamp = 0;
+  bool formerBool = false;
+  ChoiceList ownChoices;
+  std::vector<PropertyListener*> listeners;
+};
+
+static_assert(sizeof(void*) != 8 || sizeof(CEL_Property) == 48, "a template has millions of them");
+
+CEL_Property::CEL_Property(ValueType valueType)
+    : selected(0),
+      type(valueType),
+      reportsTo(ReportsTo::Nobody),
+      editable(true),
+      visible(true),
+      forceReal(false) {
+  if (IsTextType(valueType)) {
+    value.text = "";
+  } else if (valueType == ValueType::Real) {
+    value.real = 0.0;
+  } else {
+    value.integer = 0;
+  }
+}
 
 CEL_Property::~CEL_Property() = default;
 
-bool CEL_Property::SetInt(std::int32_t value) {
-  if (type != ValueType::Integer) return false;
-  if (value == intValue) return true;
-  if (intValue != 0 || former) KeptFormer().intValue = intValue;
-  intValue = value;
+CEL_Property::Extra& CEL_Property::More() {
+  if (!extra) extra = std::make_unique<Extra>();
+  return *extra;
+}
+
+template <class Former>
+void CEL_Property::KeepFormer(Former Extra::*former, Former previous) {
+  // Without it the former value is that of a fresh property.
+  if (previous != Former() || extra) More().*former = std::move(previous);
+}
+
+std::int32_t CEL_Property::PrevInt() const {
+  return extra ? extra->formerInt : 0;
+}
+
+double CEL_Property::PrevReal() const {
+  return extra ? extra->formerReal : 0.0;
+}
+
+bool CEL_Property::PrevBool() const {
+  return extra && extra->formerBool;
+}
+
+std::string_view CEL_Property::PrevText() const {
+  return extra ? std::string_view(extra->formerText) : std::string_view();
+}
+
+bool CEL_Property::SetInt(std::int32_t number) {
+  if (Type() != ValueType::Integer) return false;
+  if (number == value.integer) return true;
+  KeepFormer(&Extra::formerInt, value.integer);
+  value.integer = number;
   RaiseChange();
   return true;
 }
 
-bool CEL_Property::SetReal(double value) {
-  if (type != ValueType::Real) return false;
-  if (value == realValue) return true;
-  if (realValue != 0.0 || former) KeptFormer().realValue = realValue;
-  realValue = value;
+bool CEL_Property::SetReal(double number) {
+  if (Type() != ValueType::Real) return false;
+  if (number == value.real) return true;
+  KeepFormer(&Extra::formerReal, value.real);
+  value.real = number;
   RaiseChange();
   return true;
 }
 
-bool CEL_Property::SetBool(bool value) {
-  if (type != ValueType::Boolean) return false;
-  if (value == boolValue) return true;
-  if (boolValue || former) KeptFormer().boolValue = boolValue;
-  boolValue = value;
+bool CEL_Property::SetBool(bool truth) {
+  if (Type() != ValueType::Boolean) return false;
+  if (truth == value.boolean) return true;
+  KeepFormer(&Extra::formerBool, value.boolean);
+  value.boolean = truth;
   RaiseChange();
   return true;
 }
 
-bool CEL_Property::SetText(std::string_view value) {
-  if (!IsTextType(type)) return false;
-  if (value == text) return true;
-  std::string replacement(value);  // the view may lie in the text that is replaced
-  if (!text.empty() || former) KeptFormer().text = std::move(text);
-  text = std::move(replacement);
+bool CEL_Property::SetText(std::string_view text) {
+  if (!IsTextType(Type())) return false;
+  if (text == Text()) return true;
+  std::string replacement(text);  // the view may lie in the text that is replaced
+  Extra& more = More();
+  more.formerText = Text();
+  more.text = std::move(replacement);
+  PointTo(more.text);
+  RaiseChange();
+  return true;
+}
+
+void CEL_Property::StartWith(std::int32_t number) {
+  if (number == value.integer) return;
+  value.integer = number;
+  MarkModified();
+}
+
+void CEL_Property::StartWith(double number) {
+  if (number == value.real) return;
+  value.real = number;
+  MarkModified();
+}
+
+void CEL_Property::StartWith(bool truth) {
+  if (truth == value.boolean) return;
+  value.boolean = truth;
+  MarkModified();
+}
+
+void CEL_Property::StartWithText(std::string_view lasting) {
+  if (lasting == Text()) {
+    // The same text may be about to go from where it was.
+    value.text = lasting.data();
+    return;
+  }
+  PointTo(lasting);
+  if (extra) extra->text.clear();
+  MarkModified();
+}
+
+void CEL_Property::PointTo(std::string_view lasting) {
+  value.text = lasting.data();
+  textSize = static_cast<std::uint32_t>(lasting.size());
   parsed.reset();
-  RaiseChange();
-  return true;
-}
-
-const CEL_Property::Value& CEL_Property::Former() const {
-  static const Value none;
-  return former ? *former : none;
-}
-
-CEL_Property::Value& CEL_Property::KeptFormer() {
-  if (!former) former = std::make_unique<Value>();
-  return *former;
 }
 
 std::string CEL_Property::TextOf() const {
-  switch (type) {
+  switch (Type()) {
     case ValueType::Real:
-      return PlainNumberText(realValue);
+      return PlainNumberText(RealValue());
     case ValueType::Integer:
-      return std::to_string(intValue);
+      return std::to_string(IntValue());
     case ValueType::Boolean:
-      return std::string(boolValue ? kYes : kNo);
+      return std::string(BoolValue() ? kYes : kNo);
     default:
-      return text;
+      return std::string(Text());
   }
 }
 
 const ParsedExpression& CEL_Property::Parsed() const {
-  return ParseOnce(parsed, StripExpressionQuotes(text));
+  return ParseOnce(parsed, StripExpressionQuotes(Text()));
 }
 
 std::int32_t CEL_Property::ChangeStamp() {
-  if (changeStamp == 0) changeStamp = NextValueSerial();
-  return changeStamp;
+  Extra& more = More();
+  if (more.changeStamp == 0) more.changeStamp = NextValueSerial();
+  return more.changeStamp;
 }
 
 const std::vector<CEL_Choice>& CEL_Property::Choices() const {
   static const std::vector<CEL_Choice> kNone;
-  return choices ? *choices : kNone;
+  return choices != nullptr ? *choices : kNone;
+}
+
+void CEL_Property::SetChoices(ChoiceList list) {
+  choices = list.get();
+  if (list || extra) More().ownChoices = std::move(list);
+}
+
+void CEL_Property::OfferStanding(const ChoiceList& list) {
+  if (extra) extra->ownChoices.reset();
+  choices = list.get();
 }
 
 void CEL_Property::AddChoice(CEL_Choice choice) {
   std::vector<CEL_Choice> own = Choices();
   own.push_back(std::move(choice));
-  choices = std::make_shared<const std::vector<CEL_Choice>>(std::move(own));
+  SetChoices(std::make_shared<const std::vector<CEL_Choice>>(std::move(own)));
 }
 
 bool CEL_Property::HasChoice(std::string_view display) const {
@@ -146,15 +237,15 @@ bool CEL_Property::HasChoice(std::string_view display) const {
 std::int32_t CEL_Property::PresentChoice() const {
   const auto& all = Choices();
   const auto hit = std::find_if(all.begin(), all.end(), [this](const CEL_Choice& choice) {
-    switch (type) {
+    switch (Type()) {
       case ValueType::Real:
-        return choice.realValue == realValue;
+        return choice.realValue == value.real;
       case ValueType::Integer:
-        return choice.intValue == intValue;
+        return choice.intValue == value.integer;
       case ValueType::Boolean:
-        return choice.boolValue == boolValue;
+        return choice.boolValue == value.boolean;
       default:
-        return choice.fileText == text;
+        return choice.fileText == Text();
     }
   });
   return hit == all.end() ? -1 : static_cast<std::int32_t>(hit - all.begin());
@@ -164,13 +255,13 @@ void CEL_Property::SelectChoice(std::string_view display) {
   const auto& list = Choices();
   const auto hit = std::find_if(list.begin(), list.end(),
                                 [display](const CEL_Choice& choice) { return choice.display == display; });
-  selected = hit == list.end() ? -1 : static_cast<std::int32_t>(hit - list.begin());
+  SelectIndex(hit == list.end() ? -1 : static_cast<std::int32_t>(hit - list.begin()));
 }
 
 void CEL_Property::ApplySelection() {
-  if (selected < 0) return;
-  const CEL_Choice& choice = Choices().at(static_cast<std::size_t>(selected));
-  switch (type) {
+  if (Selected() < 0) return;
+  const CEL_Choice& choice = Choices().at(static_cast<std::size_t>(Selected()));
+  switch (Type()) {
     case ValueType::Real:
       SetReal(choice.realValue);
       break;
@@ -188,24 +279,30 @@ void CEL_Property::ApplySelection() {
 
 std::string CEL_Property::SelectedFileText() const {
   const auto& list = Choices();
-  const auto index = static_cast<std::size_t>(selected);
-  return selected >= 0 && index < list.size() ? list[index].fileText : std::string();
+  const auto index = static_cast<std::size_t>(Selected());
+  return Selected() >= 0 && index < list.size() ? list[index].fileText : std::string();
 }
 
 void CEL_Property::AddListener(PropertyListener& listener) {
-  if (!listeners) listeners = std::make_unique<std::vector<PropertyListener*>>();
-  if (std::find(listeners->begin(), listeners->end(), &listener) == listeners->end()) {
-    listeners->push_back(&listener);
+  auto& listeners = More().listeners;
+  if (std::find(listeners.begin(), listeners.end(), &listener) == listeners.end()) {
+    listeners.push_back(&listener);
   }
 }
 
 void CEL_Property::RaiseChange() {
-  if (modifiedFlag != nullptr) *modifiedFlag = true;
-  if (!NotifyChanges() || !listeners) return;
+  MarkModified();
+  if (!NotifyChanges()) return;
+  if (holder != nullptr && reportsTo == ReportsTo::Holder) {
+    holder->OnPropertyChanged(*this);
+  } else if (holder != nullptr && reportsTo == ReportsTo::Table) {
+    holder->OnTableChanged();
+  }
+  if (!extra) return;
   // By index: a listener may register another one while it is called.
   // NOLINTNEXTLINE(modernize-loop-convert)
-  for (std::size_t index = 0; index < listeners->size(); ++index)
-    (*listeners)[index]->OnPropertyChanged(*this);
+  for (std::size_t index = 0; index < extra->listeners.size(); ++index)
+    extra->listeners[index]->OnPropertyChanged(*this);
 }
 
 }  // namespace tessal

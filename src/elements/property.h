@@ -11,7 +11,7 @@
 
 namespace tessal {
 
-enum class ValueType : std::int32_t {
+enum class ValueType : std::uint8_t {
   Real = 1,
   Integer = 2,
   Boolean = 3,
@@ -62,6 +62,32 @@ class PropertyListener {
   ~PropertyListener() = default;
 };
 
+/// What properties belong to, and what a change of them marks as modified. It hears of the changes of those
+/// that are told to report to it, before any listener.
+class PropertyHolder : public PropertyListener {
+ public:
+  PropertyHolder(const PropertyHolder&) = delete;
+  PropertyHolder& operator=(const PropertyHolder&) = delete;
+
+  /// A property that reports to the symbol table only has changed.
+  virtual void OnTableChanged() = 0;
+  void MarkModified() {
+    if (modifiedFlag != nullptr) *modifiedFlag = true;
+  }
+
+ protected:
+  PropertyHolder() = default;
+  ~PropertyHolder() = default;
+  void SetFlag(bool* flag) { modifiedFlag = flag; }
+
+ private:
+  bool* modifiedFlag = nullptr;
+};
+
+/// Whom a property reports its changes to beside its listeners: nobody, the symbol table of the template, or
+/// its holder. The holder does more than the table needs.
+enum class ReportsTo : std::uint8_t { Nobody, Table, Holder };
+
 /// The words of a boolean, in files and choices.
 inline constexpr std::string_view kYes = "YES";
 inline constexpr std::string_view kNo = "NO";
@@ -92,21 +118,32 @@ class CEL_Property final {
   CEL_Property& operator=(const CEL_Property&) = delete;
 
   ValueType Type() const { return type; }
-  std::int32_t IntValue() const { return intValue; }
-  double RealValue() const { return realValue; }
-  bool BoolValue() const { return boolValue; }
-  const std::string& Text() const { return text; }
-  std::int32_t PrevInt() const { return Former().intValue; }
-  double PrevReal() const { return Former().realValue; }
-  bool PrevBool() const { return Former().boolValue; }
-  const std::string& PrevText() const { return Former().text; }
+  std::int32_t IntValue() const { return Type() == ValueType::Integer ? value.integer : 0; }
+  double RealValue() const { return Type() == ValueType::Real ? value.real : 0.0; }
+  bool BoolValue() const { return Type() == ValueType::Boolean && value.boolean; }
+  /// Good until the next change.
+  std::string_view Text() const {
+    return IsTextType(Type()) ? std::string_view(value.text, textSize) : std::string_view();
+  }
+  std::int32_t PrevInt() const;
+  double PrevReal() const;
+  bool PrevBool() const;
+  std::string_view PrevText() const;
 
   /// Setters. Each returns false, and does nothing, on a property that does not hold that type of value;
   /// setting the present value is no change.
-  bool SetInt(std::int32_t value);
-  bool SetReal(double value);
-  bool SetBool(bool value);
-  bool SetText(std::string_view value);
+  bool SetInt(std::int32_t number);
+  bool SetReal(double number);
+  bool SetBool(bool truth);
+  bool SetText(std::string_view text);
+
+  // The same for the value that a file or the class's table gives: nobody is called, and what was there
+  // before is no former value. Of a text only the place is kept: it must outlive the property, or its next
+  // change.
+  void StartWith(std::int32_t number);
+  void StartWith(double number);
+  void StartWith(bool truth);
+  void StartWithText(std::string_view lasting);
 
   /// The value as text: numbers in decimal, booleans as "YES" or "NO", texts as they are.
   std::string TextOf() const;
@@ -118,33 +155,36 @@ class CEL_Property final {
   /// A number that identifies the property to its listeners, drawn on first need.
   std::int32_t ChangeStamp();
 
-  void SetModifiedFlag(bool* flag) { modifiedFlag = flag; }
+  void BelongTo(PropertyHolder& itsHolder) { holder = &itsHolder; }
+  void ReportTo(ReportsTo whom) { reportsTo = whom; }
 
   bool Editable() const { return editable; }
-  void SetEditable(bool value) { editable = value; }
+  void SetEditable(bool isEditable) { editable = isEditable; }
   bool Visible() const { return visible; }
-  void SetVisible(bool value) { visible = value; }
+  void SetVisible(bool isVisible) { visible = isVisible; }
 
   /// Writes whole numbers so that they read as reals.
   bool ForceReal() const { return forceReal; }
-  void SetForceReal(bool value) { forceReal = value; }
+  void SetForceReal(bool isForced) { forceReal = isForced; }
 
   const std::vector<CEL_Choice>& Choices() const;
-  bool HasChoices() const { return choices && !choices->empty(); }
+  bool HasChoices() const { return choices != nullptr && !choices->empty(); }
   /// Takes a list that others may hold too. The selection is kept only as an index.
-  void SetChoices(ChoiceList list) { choices = std::move(list); }
+  void SetChoices(ChoiceList list);
+  /// The same for a list that is there for as long as the process.
+  void OfferStanding(const ChoiceList& list);
   void AddChoice(CEL_Choice choice);
-  void ClearChoices() { choices.reset(); }
+  void ClearChoices() { SetChoices({}); }
   bool HasChoice(std::string_view display) const;
 
   /// Index of the first choice of the present value, -1 for none. A NaN is like nothing.
   std::int32_t PresentChoice() const;
 
   /// Index of the selected choice, -1 for none.
-  std::int32_t Selected() const { return selected; }
+  std::int32_t Selected() const { return static_cast<std::int32_t>(selected) - 1; }
   /// Selects the first choice with exactly this display text, or none.
   void SelectChoice(std::string_view display);
-  void SelectIndex(std::int32_t index) { selected = index; }
+  void SelectIndex(std::int32_t index) { selected = static_cast<std::uint32_t>(index + 1) & kMostChoices; }
   /// Copies the selected choice's value into the property; nothing when none is selected.
   /// An index beyond the choices raises the standard out-of-range failure.
   void ApplySelection();
@@ -154,37 +194,44 @@ class CEL_Property final {
   /// Registers a listener once; a second registration of the same one is ignored.
   void AddListener(PropertyListener& listener);
 
-  /// Marks the template as modified and calls the listeners, as a change of value does.
+  /// Marks the template as modified and calls the holder and the listeners, as a change of value does.
   void RaiseChange();
 
  private:
-  struct Value {
-    std::int32_t intValue = 0;
-    bool boolValue = false;
-    double realValue = 0.0;
-    std::string text;
+  /// A file of the largest size has fewer elements to choose from.
+  static constexpr std::uint32_t kMostChoices = (1U << 24U) - 1U;
+
+  union Value {
+    double real;
+    std::int32_t integer;
+    bool boolean;
+    const char* text;
   };
 
-  /// The value before the last change.
-  const Value& Former() const;
-  Value& KeptFormer();
+  /// What few properties have: a template has millions of them, most as the file gave them.
+  struct Extra;
 
-  ValueType type;
-  std::int32_t intValue = 0;
-  double realValue = 0.0;
-  std::string text;
-  bool boolValue = false;
-  bool editable = true;
-  bool visible = true;
-  bool forceReal = false;
-  std::int32_t selected = -1;
-  std::int32_t changeStamp = 0;
-  bool* modifiedFlag = nullptr;
-  ChoiceList choices;
-  // A template has millions of properties, and few that were changed twice or have a listener.
-  std::unique_ptr<Value> former;
-  std::unique_ptr<std::vector<PropertyListener*>> listeners;
+  Extra& More();
+  /// Keeps the former value, where there is one, beside a new one.
+  template <class Former>
+  void KeepFormer(Former Extra::*former, Former previous);
+  void PointTo(std::string_view lasting);
+  void MarkModified() {
+    if (holder != nullptr) holder->MarkModified();
+  }
+
+  Value value;
+  PropertyHolder* holder = nullptr;
+  const std::vector<CEL_Choice>* choices = nullptr;
+  std::unique_ptr<Extra> extra;
   mutable std::unique_ptr<const ParsedExpression> parsed;
+  std::uint32_t textSize = 0;
+  std::uint32_t selected : 24;  ///< from 1; 0 for none
+  ValueType type : 3;
+  ReportsTo reportsTo : 2;
+  bool editable : 1;
+  bool visible : 1;
+  bool forceReal : 1;
 };
 
 }  // namespace tessal

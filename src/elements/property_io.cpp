@@ -24,17 +24,40 @@ KvfNode FirstParameter(KvfNode section, std::string_view key) {
   return keyword == nullptr ? nullptr : kvfParamByNum(keyword, 1);
 }
 
-/// The parameter's text as it is, with the report when there is none.
-bool ReadRawText(std::string& text, KvfNode section, std::string_view key, ReadStatus& status) {
-  const KvfNode parameter = FirstParameter(section, key);
-  if (parameter == nullptr || kvfGetString(parameter, text) != kKvfOk) {
-    status.ReportMissing(section, key);
-    status.NoteUnread(section, key, nullptr);
-    return false;
+/// A parameter's text as it is, or none with the report.
+class RawText final {
+ public:
+  RawText(KvfNode section, std::string_view key, ReadStatus& status) {
+    const KvfNode parameter = FirstParameter(section, key);
+    isThere = parameter != nullptr && kvfGetText(parameter, buffer, value) == kKvfOk;
+    if (isThere) {
+      status.TextWasRead();
+    } else {
+      status.ReportMissing(section, key);
+      status.NoteUnread(section, key, nullptr);
+    }
   }
-  status.TextWasRead();
-  return true;
-}
+  RawText(const RawText&) = delete;
+  RawText& operator=(const RawText&) = delete;
+
+  bool IsThere() const { return isThere; }
+  std::string_view Text() const { return value.text; }
+  /// Gives a property a piece of the text.
+  void GiveTo(CEL_Property& property, std::string_view piece) const {
+    if (piece.empty()) {
+      property.StartWithText("");
+    } else if (value.isLasting) {
+      property.StartWithText(piece);
+    } else {
+      property.SetText(piece);
+    }
+  }
+
+ private:
+  std::string buffer;
+  KvfText value;
+  bool isThere;
+};
 
 /// How the library reads a number of one type.
 struct Reals {
@@ -69,20 +92,22 @@ bool ReadNumber(KvfNode section, std::string_view key, const CEL_Property* prope
 }
 
 void ReadBoolean(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status) {
-  std::string text;
-  const bool isThere = ReadRawText(text, section, key, status);
-  property.SetBool(isThere && text == kYes);
-  if (isThere && text != kYes && text != kNo) status.NoteReplaced(section, key, kNo);
+  const RawText raw(section, key, status);
+  const std::string_view text = raw.Text();
+  property.StartWith(raw.IsThere() && text == kYes);
+  if (raw.IsThere() && text != kYes && text != kNo) status.NoteReplaced(section, key, kNo);
 }
 
 void ReadExpression(CEL_Property& property, KvfNode section, std::string_view key, ReadStatus& status) {
-  std::string stored;
-  ReadRawText(stored, section, key, status);
+  const RawText raw(section, key, status);
+  const std::string_view stored = raw.Text();
   const std::string_view expression = StripExpressionQuotes(stored);
-  property.SetText(CleanText(expression));
+  raw.GiveTo(property, CleanText(expression));
   const auto start = static_cast<std::size_t>(expression.data() - stored.data());
-  const std::string outside = stored.substr(0, start) + stored.substr(start + expression.size());
-  if (outside.find_first_not_of("\" \n\r\t") != std::string::npos) {
+  const auto holdsMore = [](std::string_view outside) {
+    return outside.find_first_not_of("\" \n\r\t") != std::string_view::npos;
+  };
+  if (holdsMore(stored.substr(0, start)) || holdsMore(stored.substr(start + expression.size()))) {
     status.NoteCut(section, key, property.Text());
   }
 }
@@ -108,10 +133,9 @@ std::string_view CleanText(std::string_view text) {
 }
 
 bool ReadText(std::string& text, KvfNode section, std::string_view key, ReadStatus& status) {
-  std::string raw;
-  if (!ReadRawText(raw, section, key, status)) return false;
-  text = CleanText(raw);
-  return true;
+  const RawText raw(section, key, status);
+  if (raw.IsThere()) text = CleanText(raw.Text());
+  return raw.IsThere();
 }
 
 bool ReadInteger(std::int32_t& value, KvfNode section, std::string_view key, ReadStatus& status) {
@@ -127,11 +151,11 @@ void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key,
   switch (property.Type()) {
     case ValueType::Real:
       ReadNumber<Reals>(section, key, &property, status,
-                        [&property](double number) { property.SetReal(number); });
+                        [&property](double number) { property.StartWith(number); });
       break;
     case ValueType::Integer:
       ReadNumber<Integers>(section, key, &property, status,
-                           [&property](std::int32_t number) { property.SetInt(number); });
+                           [&property](std::int32_t number) { property.StartWith(number); });
       break;
     case ValueType::Boolean:
       ReadBoolean(property, section, key, status);
@@ -140,9 +164,8 @@ void ReadProperty(CEL_Property& property, KvfNode section, std::string_view key,
       ReadExpression(property, section, key, status);
       break;
     default: {
-      std::string text;
-      ReadRawText(text, section, key, status);
-      property.SetText(CleanText(text));
+      const RawText raw(section, key, status);
+      raw.GiveTo(property, CleanText(raw.Text()));
       break;
     }
   }

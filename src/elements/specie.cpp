@@ -23,10 +23,14 @@ const ChoiceList& TransportChoices() {
 
 // In file order; people read the transport before the two numbers.
 constexpr std::array<PropertyRow, 4> kRows = {{
-    {key::kScope, "Scope", ValueType::Text, nullptr, scope::kWaterColumn},
-    ListedLast({key::kProjectionTime, "Projection time", ValueType::Real, nullptr, "", 0.0}),
-    ListedLast({key::kFieldOfView, "Field of view", ValueType::Real, nullptr, "", 180.0}),
-    {key::kTransport, "Transport", ValueType::Text, TransportChoices, kTransports[0]},
+    {PlaceOf(&CEL_Lagrange_Specie::scope), key::kScope, "Scope", ValueType::Text, nullptr,
+     scope::kWaterColumn},
+    ListedLast({PlaceOf(&CEL_Lagrange_Specie::projectionTime), key::kProjectionTime, "Projection time",
+                ValueType::Real, nullptr, "", 0.0}),
+    ListedLast({PlaceOf(&CEL_Lagrange_Specie::fieldOfView), key::kFieldOfView, "Field of view",
+                ValueType::Real, nullptr, "", 180.0}),
+    {PlaceOf(&CEL_Lagrange_Specie::transport), key::kTransport, "Transport", ValueType::Text,
+     TransportChoices, kTransports[0]},
 }};
 
 /// The descriptive fields, in the order of field lists.
@@ -52,7 +56,7 @@ CEL_Lagrange_Specie::CEL_Lagrange_Specie(std::string_view caption) : CEL_Element
     heads[place] = std::make_unique<CEL_ListHead>(listKind, tessal::KindText(listKind));
     heads[place]->SetParent(this);
   }
-  Bind(kRows, {&scope, &projectionTime, &fieldOfView, &transport});
+  Bind(kRows);
   ListenTo({&symbol, &id, &description, &documentation, &scope, &projectionTime, &fieldOfView, &transport});
   DropMembers();
   SetLoaded(true);
@@ -106,7 +110,8 @@ std::string CEL_Lagrange_Specie::NewCaption(std::string_view word, std::size_t n
 std::string CEL_Lagrange_Specie::NewName(ElementKind kind, std::string_view word, std::size_t number) {
   // Movements have captions of their own, which the class's name does not begin.
   if (kind == ElementKind::HorizontalVector) return NewCaption(word, number);
-  return FirstFreeName(symbol.Text() + "_" + std::string(word), number, [this](const std::string& name) {
+  const std::string prefix = std::string(symbol.Text()) + '_' + std::string(word);
+  return FirstFreeName(prefix, number, [this](const std::string& name) {
     return Owner() != nullptr && Owner()->SymbolExists(name);
   });
 }
@@ -204,7 +209,7 @@ void CEL_Lagrange_Specie::OnPropertyChanged(CEL_Property& changed) {
     fault = Message("symbol-taken");
   }
   if (fault) {
-    const std::string refused = symbol.Text();
+    const std::string refused(symbol.Text());
     {
       const NotificationsOff silent;  // going back is no new change to judge
       symbol.SetText(symbol.PrevText());

@@ -25,24 +25,32 @@ const ChoiceList& VariationChoices() {
 }
 
 constexpr std::array<PropertyRow, 6> kExpressionRows = {{
-    {key::kExpressionType, "Expression type", ValueType::Text, ExpressionTypeChoices, kAuxiliaryType},
-    {key::kSpecie, "Specie", ValueType::Integer},
-    {key::kOutput, "Output", ValueType::Boolean, YesNoChoices, kYes},
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, VariationChoices, kVariations[0]},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kExpression, "Expression", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::expressionType), key::kExpressionType, "Expression type",
+     ValueType::Text, ExpressionTypeChoices, kAuxiliaryType},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::specie), key::kSpecie, "Specie", ValueType::Integer},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::output), key::kOutput, "Output", ValueType::Boolean,
+     YesNoChoices, kYes},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::spatialVariation), key::kSpatialVariation,
+     "Spatial Variation", ValueType::Text, VariationChoices, kVariations[0]},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::unit), key::kUnit, "Unit", ValueType::Text, nullptr,
+     "undefined"},
+    {PlaceOf(&CEL_Lagrange_Arithmetical_Expression::expression), key::kExpression, "Expression",
+     ValueType::Expression, nullptr, "0"},
 }};
 
 constexpr std::array<PropertyRow, 2> kHorizontalRows = {{
     Captioned("horizontal speed equation",
-              {key::kExpressionHorizontalSpeed, "Speed", ValueType::Expression, nullptr, "0"}),
+              {PlaceOf(&CEL_Lagrange_Horizontal_Vector::speed), key::kExpressionHorizontalSpeed, "Speed",
+               ValueType::Expression, nullptr, "0"}),
     Captioned("horizontal direction equation",
-              {key::kExpressionHorizontalDirection, "Direction", ValueType::Expression, nullptr, "0"}),
+              {PlaceOf(&CEL_Lagrange_Horizontal_Vector::direction), key::kExpressionHorizontalDirection,
+               "Direction", ValueType::Expression, nullptr, "0"}),
 }};
 
 constexpr std::array<PropertyRow, 1> kVerticalRows = {{
     Captioned("vertical speed equation",
-              {key::kExpressionVerticalSpeed, "Speed", ValueType::Expression, nullptr, "0"}),
+              {PlaceOf(&CEL_Lagrange_Vertical_Equation::speed), key::kExpressionVerticalSpeed, "Speed",
+               ValueType::Expression, nullptr, "0"}),
 }};
 
 }  // namespace
@@ -51,7 +59,7 @@ CEL_Lagrange_Arithmetical_Expression::CEL_Lagrange_Arithmetical_Expression(std::
     : CEL_Element(caption) {
   SetKind(ElementKind::ArithmeticExpression);
   SetUnitMode(UnitMode::Both);
-  Bind(kExpressionRows, {&expressionType, &specie, &output, &spatialVariation, &unit, &expression});
+  Bind(kExpressionRows);
   ListenTo({&symbol, &unit, &expression});
 }
 
@@ -82,7 +90,11 @@ bool CEL_Movement::Check() {
 }
 
 void CEL_Movement::AppendFullSymbol(std::string& text) const {
-  if (ListHeader() != nullptr) text += "(" + ListHeader()->Parent()->symbol.Text() + ")";
+  if (ListHeader() != nullptr) {
+    text += '(';
+    text += ListHeader()->Parent()->symbol.Text();
+    text += ')';
+  }
   text += symbol.Text();
 }
 
@@ -93,13 +105,13 @@ void CEL_Movement::GetFields(std::vector<ElementField>& fields) const {
 
 CEL_Lagrange_Horizontal_Vector::CEL_Lagrange_Horizontal_Vector(std::string_view caption)
     : CEL_Movement(ElementKind::HorizontalVector, caption) {
-  Bind(kHorizontalRows, {&speed, &direction});
+  Bind(kHorizontalRows);
   ListenTo({&speed, &direction});
 }
 
 CEL_Lagrange_Vertical_Equation::CEL_Lagrange_Vertical_Equation(std::string_view caption)
     : CEL_Movement(ElementKind::VerticalEquation, caption) {
-  Bind(kVerticalRows, {&speed});
+  Bind(kVerticalRows);
   ListenTo({&speed});
 }
 

@@ -15,29 +15,39 @@ namespace {
 constexpr double kForcingDefault = 1e-35;
 
 constexpr std::array<PropertyRow, 6> kStateVariableRows = {{
-    {key::kSpecie, "Specie", ValueType::Integer},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    ReadLast({key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0}),
-    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
-    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
-    {"", "Equation", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_Lagrange_StateVariable::specie), key::kSpecie, "Specie", ValueType::Integer},
+    {PlaceOf(&CEL_Lagrange_StateVariable::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    ReadLast({PlaceOf(&CEL_Lagrange_StateVariable::defaultValue), key::kDefaultValue, "Default Value",
+              ValueType::Real, nullptr, "", 0.0}),
+    {PlaceOf(&CEL_Lagrange_StateVariable::minValue), key::kMinValue, "Min Value", ValueType::Real, nullptr,
+     "", 0.0},
+    {PlaceOf(&CEL_Lagrange_StateVariable::maxValue), key::kMaxValue, "Max Value", ValueType::Real, nullptr,
+     "", 100.0},
+    {PlaceOf(&CEL_Lagrange_StateVariable::equation), "", "Equation", ValueType::Expression, nullptr, "0"},
 }};
 
 constexpr std::array<PropertyRow, 5> kConstantRows = {{
-    {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_SPECIE"},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    ReadLast({key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0}),
-    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
-    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 10.0},
+    {PlaceOf(&CEL_Lagrange_Constant::spatialVariation), key::kSpatialVariation, "Spatial Variation",
+     ValueType::Text, nullptr, "PER_SPECIE"},
+    {PlaceOf(&CEL_Lagrange_Constant::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    ReadLast({PlaceOf(&CEL_Lagrange_Constant::defaultValue), key::kDefaultValue, "Default Value",
+              ValueType::Real, nullptr, "", 0.0}),
+    {PlaceOf(&CEL_Lagrange_Constant::minValue), key::kMinValue, "Min Value", ValueType::Real, nullptr, "",
+     0.0},
+    {PlaceOf(&CEL_Lagrange_Constant::maxValue), key::kMaxValue, "Max Value", ValueType::Real, nullptr, "",
+     10.0},
 }};
 
 constexpr std::array<PropertyRow, 5> kForcingRows = {{
-    WrittenAs(key::kScope,
-              {key::kSpatialVariation, "Spatial Variation", ValueType::Text, nullptr, "PER_SPECIE"}),
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", kForcingDefault},
-    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", kForcingDefault},
-    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", kForcingDefault},
+    WrittenAs(key::kScope, {PlaceOf(&CEL_Lagrange_Forcing::spatialVariation), key::kSpatialVariation,
+                            "Spatial Variation", ValueType::Text, nullptr, "PER_SPECIE"}),
+    {PlaceOf(&CEL_Lagrange_Forcing::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {PlaceOf(&CEL_Lagrange_Forcing::defaultValue), key::kDefaultValue, "Default Value", ValueType::Real,
+     nullptr, "", kForcingDefault},
+    {PlaceOf(&CEL_Lagrange_Forcing::minValue), key::kMinValue, "Min Value", ValueType::Real, nullptr, "",
+     kForcingDefault},
+    {PlaceOf(&CEL_Lagrange_Forcing::maxValue), key::kMaxValue, "Max Value", ValueType::Real, nullptr, "",
+     kForcingDefault},
 }};
 
 }  // namespace
@@ -74,7 +84,7 @@ void CEL_SpecieValue::OnPropertyChanged(CEL_Property& changed) {
 CEL_Lagrange_StateVariable::CEL_Lagrange_StateVariable(std::string_view caption) : CEL_SpecieValue(caption) {
   SetKind(ElementKind::SpecieStateVariable);
   SetUnitMode(UnitMode::Both);
-  Bind(kStateVariableRows, {&specie, &unit, &defaultValue, &minValue, &maxValue, &equation});
+  Bind(kStateVariableRows);
   OfferParticleUnits("Mass");
   ListenTo({&symbol, &unqType, &unqUnit, &equation});
 }
@@ -96,7 +106,7 @@ bool CEL_Lagrange_StateVariable::Check() {
 CEL_Lagrange_Constant::CEL_Lagrange_Constant(std::string_view caption) : CEL_SpecieValue(caption) {
   SetKind(ElementKind::SpecieConstant);
   SetUnitMode(UnitMode::Both);
-  Bind(kConstantRows, {&spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
+  Bind(kConstantRows);
   OfferParticleUnits(kUserDefined);
   ListenTo({&symbol, &unqType, &unqUnit});
 }
@@ -110,13 +120,13 @@ bool CEL_Lagrange_Constant::Check() {
 
 CEL_Lagrange_Forcing::CEL_Lagrange_Forcing(std::string_view caption) : CEL_SpecieValue(caption) {
   SetKind(ElementKind::SpecieForcing);
-  Bind(kForcingRows, {&spatialVariation, &unit, &defaultValue, &minValue, &maxValue});
+  Bind(kForcingRows);
 }
 
 void CEL_Lagrange_Forcing::Read(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
-  minValue.SetReal(std::numeric_limits<double>::lowest());
-  maxValue.SetReal(std::numeric_limits<double>::max());
+  minValue.StartWith(std::numeric_limits<double>::lowest());
+  maxValue.StartWith(std::numeric_limits<double>::max());
   CEL_Element::Read(section, status);
 }
 

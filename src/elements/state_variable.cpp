@@ -20,13 +20,16 @@ const ChoiceList& TransportChoices() {
 }
 
 constexpr std::array<PropertyRow, 7> kRows = {{
-    {key::kScope, "Scope", ValueType::Text, LayerScopeChoices, scope::kWaterColumn},
-    {key::kTransport, "Transport", ValueType::Text, TransportChoices, "ADVECTION_DISPERSION"},
-    {key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
-    {key::kDefaultValue, "Default Value", ValueType::Real, nullptr, "", 0.0},
-    {key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
-    {key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
-    {"", "Equation", ValueType::Expression, nullptr, "0"},
+    {PlaceOf(&CEL_StateVariable::scope), key::kScope, "Scope", ValueType::Text, LayerScopeChoices,
+     scope::kWaterColumn},
+    {PlaceOf(&CEL_StateVariable::transport), key::kTransport, "Transport", ValueType::Text, TransportChoices,
+     "ADVECTION_DISPERSION"},
+    {PlaceOf(&CEL_StateVariable::unit), key::kUnit, "Unit", ValueType::Text, nullptr, "undefined"},
+    {PlaceOf(&CEL_StateVariable::defaultValue), key::kDefaultValue, "Default Value", ValueType::Real, nullptr,
+     "", 0.0},
+    {PlaceOf(&CEL_StateVariable::minValue), key::kMinValue, "Min Value", ValueType::Real, nullptr, "", 0.0},
+    {PlaceOf(&CEL_StateVariable::maxValue), key::kMaxValue, "Max Value", ValueType::Real, nullptr, "", 100.0},
+    {PlaceOf(&CEL_StateVariable::equation), "", "Equation", ValueType::Expression, nullptr, "0"},
 }};
 
 }  // namespace
@@ -35,7 +38,7 @@ CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(cap
   SetKind(ElementKind::StateVariable);
   SetUnitMode(UnitMode::Both);
   OfferUnitTypes(kStateVariableUnitTypes);
-  Bind(kRows, {&scope, &transport, &unit, &defaultValue, &minValue, &maxValue, &equation});
+  Bind(kRows);
   ListenTo({&symbol, &scope, &unqType, &unqUnit, &equation});
   CEL_StateVariable::Reset();
 }
@@ -58,11 +61,11 @@ void CEL_StateVariable::Read(KvfNode section, ReadStatus& status) {
   ReadProperty(scope, section, key::kScope, status);
   ReadProperty(transport, section, key::kTransport, status);
   ReadProperty(unit, section, key::kUnit, status);
-  minValue.SetReal(std::numeric_limits<double>::lowest());
-  maxValue.SetReal(std::numeric_limits<double>::max());
+  minValue.StartWith(std::numeric_limits<double>::lowest());
+  maxValue.StartWith(std::numeric_limits<double>::max());
   ReadProperty(minValue, section, key::kMinValue, status);
   // A file without a maximum gives one equal to the minimum.
-  maxValue.SetReal(minValue.RealValue());
+  maxValue.StartWith(minValue.RealValue());
   ReadProperty(maxValue, section, key::kMaxValue, status);
   ReadProperty(defaultValue, section, key::kDefaultValue, status);
   SelectPresentValues();

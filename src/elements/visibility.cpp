@@ -50,7 +50,7 @@ VisibilityGroup ReadGroup(KvfNode section, int number, ReadStatus& status) {
   ReadText(group.description, section, key::kDescription, status);
   std::int32_t count = 0;
   ReadInteger(count, section, key::kLevels, status);
-  for (KvfNode level = kvfFirstSection(section); level != nullptr; level = kvfNextSection(level)) {
+  for (KvfNode level = kvfFirstSection(section); level != nullptr; level = kvfNextSection(level, section)) {
     group.levels.push_back(ReadLevel(level, status));
   }
   return group;
@@ -59,7 +59,7 @@ VisibilityGroup ReadGroup(KvfNode section, int number, ReadStatus& status) {
 std::vector<VisibilityGroup> ReadGroups(KvfNode definitions, ReadStatus& status) {
   std::vector<VisibilityGroup> groups;
   int number = 0;
-  for (KvfNode group = kvfFirstSection(definitions); group != nullptr; group = kvfNextSection(group)) {
+  for (KvfNode group = kvfFirstSection(definitions); group != nullptr; group = kvfNextSection(group, definitions)) {
     groups.push_back(ReadGroup(group, ++number, status));
   }
   return groups;

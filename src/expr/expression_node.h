@@ -1,18 +1,16 @@
-// The parse tree of an expression: one type of node, whose kind says what its text and children mean.
+// The parse tree of an expression: one type of node, whose kind says what its text and children mean. The
+// nodes of a tree lie in one block, and refer to each other by their distance in it; their texts are views.
 // Trees of long chains are as deep as they are long, so nothing here recurses.
 #pragma once
 
 #include <cstdint>
-#include <functional>
-#include <memory>
-#include <string>
-#include <utility>
-#include <vector>
+#include <string_view>
+#include <type_traits>
 
 namespace tessal {
 
 /// The numbers are part of what a tree shows as JSON.
-enum class NodeKind : std::int32_t {
+enum class NodeKind : std::uint8_t {
   Unknown = 0,
   Identifier = 2,
   Number = 3,
@@ -36,57 +34,95 @@ enum class NodeKind : std::int32_t {
   Exceedance = 22
 };
 
+/// A node of a tree. It lives in the tree's block, and its text in the text that was parsed.
 class ExpressionNode final {
  public:
-  /// What a walk calls: the node's kind, its text and its depth.
-  using Callback = std::function<void(NodeKind kind, const std::string& text, std::int32_t depth)>;
+  ExpressionNode(const ExpressionNode&) = delete;
+  ExpressionNode& operator=(const ExpressionNode&) = delete;
 
-  ExpressionNode() : text("unknown") {}
-  ExpressionNode(NodeKind nodeKind, std::string nodeText) : kind(nodeKind), text(std::move(nodeText)) {}
-  /// A node with empty slots for children.
-  ExpressionNode(NodeKind nodeKind, std::string nodeText, std::int32_t childCount)
-      : kind(nodeKind), text(std::move(nodeText)), children(static_cast<std::size_t>(childCount)) {}
-  ExpressionNode(const ExpressionNode& other) { DeepCopy(&other); }
-  ExpressionNode(ExpressionNode&& other) noexcept { TakeFrom(other); }
-  ExpressionNode& operator=(const ExpressionNode& other);
-  ExpressionNode& operator=(ExpressionNode&& other) noexcept;
-  ~ExpressionNode() {
-    if (!children.empty()) Release();
+  NodeKind Kind() const { return fields.kind; }
+  std::string_view Text() const { return {fields.text, fields.textLength}; }
+  std::int32_t ChildCount() const { return fields.childCount; }
+  /// The child in a slot from 1; none for a slot beyond the count.
+  const ExpressionNode* Child(std::int32_t slot) const {
+    if (slot < 1 || slot > fields.childCount) return nullptr;
+    return this - (slot == 1 ? fields.toFirst : fields.toSecond);
   }
-
-  NodeKind Kind() const { return kind; }
-  const std::string& Text() const { return text; }
-  std::int32_t ChildCount() const { return static_cast<std::int32_t>(children.size()); }
-  /// The child in a slot from 1; none for an empty slot or one beyond the count.
-  const ExpressionNode* Child(std::int32_t slot) const;
   /// The node above; none at the root.
-  const ExpressionNode* Parent() const { return parent; }
+  const ExpressionNode* Parent() const { return fields.toParent == 0 ? nullptr : this + fields.toParent; }
 
-  /// Fills a slot from 1; a slot beyond the count is ignored, and the node released.
-  void SetChild(std::int32_t slot, std::unique_ptr<ExpressionNode> node);
-  /// Releases all children; the node keeps its kind and text.
-  void Release() noexcept;
-  /// Becomes a copy of another tree, or, of nothing, an unknown node with an empty text.
-  void DeepCopy(const ExpressionNode* source);
-
-  /// Calls `before`, walks the children from the last to the first, calls `visit` and `after`. `before` and
-  /// `after` may be empty.
-  void WalkPostOrder(const Callback& before, const Callback& visit, const Callback& after,
-                     std::int32_t depth = 0) const;
+  /// Calls `before`, walks the children from the last to the first, calls `visit` and `after`. Each is called
+  /// with the node's kind, its text and its depth; `before` and `after` may be `nullptr`.
+  template <class Before, class Visit, class After>
+  void WalkPostOrder(Before&& before, Visit&& visit, After&& after, std::int32_t depth = 0) const;
   /// Calls `before`, walks the first child, calls `visit`, walks the other children in order, calls `after`.
-  void WalkInOrder(const Callback& before, const Callback& visit, const Callback& after,
-                   std::int32_t depth = 0) const;
+  template <class Before, class Visit, class After>
+  void WalkInOrder(Before&& before, Visit&& visit, After&& after, std::int32_t depth = 0) const;
 
  private:
-  static constexpr NodeKind kHighestKind = NodeKind::Exceedance;
+  friend class ExpressionBuilder;
 
-  void TakeFrom(ExpressionNode& other) noexcept;
-  void CopyHead(const ExpressionNode& source);
+  /// Children lie before their parent.
+  struct Fields {
+    const char* text = nullptr;
+    std::uint32_t toFirst = 0;   ///< nodes back to the first child
+    std::uint32_t toSecond = 0;  ///< nodes back to the second child
+    std::uint32_t toParent = 0;  ///< nodes on to the parent; 0 at the root
+    std::uint16_t textLength = 0;
+    NodeKind kind = NodeKind::Unknown;
+    std::uint8_t childCount = 0;
+  };
 
-  NodeKind kind = NodeKind::Unknown;
-  std::string text;
-  std::vector<std::unique_ptr<ExpressionNode>> children;
-  ExpressionNode* parent = nullptr;
+  explicit ExpressionNode(const Fields& nodeFields) : fields(nodeFields) {}
+
+  template <class Callback>
+  void Call(Callback& callback, std::int32_t depth) const {
+    if constexpr (!std::is_null_pointer_v<std::remove_cvref_t<Callback>>) callback(Kind(), Text(), depth);
+  }
+  /// The slot of a node that has a parent.
+  std::int32_t Slot() const { return fields.toParent == Parent()->fields.toFirst ? 1 : 2; }
+
+  Fields fields;
 };
+
+template <class Before, class Visit, class After>
+void ExpressionNode::WalkPostOrder(Before&& before, Visit&& visit, After&& after, std::int32_t depth) const {
+  const ExpressionNode* node = this;
+  node->Call(before, depth);
+  for (std::int32_t toWalk = ChildCount();;) {
+    if (toWalk > 0) {
+      node = node->Child(toWalk);
+      node->Call(before, ++depth);
+      toWalk = node->ChildCount();
+      continue;
+    }
+    node->Call(visit, depth);
+    node->Call(after, depth);
+    if (node == this) return;
+    toWalk = node->Slot() - 1;
+    node = node->Parent();
+    --depth;
+  }
+}
+
+template <class Before, class Visit, class After>
+void ExpressionNode::WalkInOrder(Before&& before, Visit&& visit, After&& after, std::int32_t depth) const {
+  const ExpressionNode* node = this;
+  node->Call(before, depth);
+  for (std::int32_t walked = 0;;) {
+    if (walked == 1 || node->ChildCount() == 0) node->Call(visit, depth);
+    if (walked < node->ChildCount()) {
+      node = node->Child(walked + 1);
+      node->Call(before, ++depth);
+      walked = 0;
+      continue;
+    }
+    node->Call(after, depth);
+    if (node == this) return;
+    walked = node->Slot();
+    node = node->Parent();
+    --depth;
+  }
+}
 
 }  // namespace tessal

@@ -30,6 +30,21 @@ CatalogueFunction MakeFunction(const FunctionRow& row) {
   return function;
 }
 
+/// Names in any case: those that differ in it alone are the same.
+struct HashOfName {
+  std::size_t operator()(std::string_view name) const {
+    std::size_t hash = 0;
+    for (const char character : name) hash = hash * 31 + static_cast<unsigned char>(UpperCase(character));
+    return hash;
+  }
+};
+
+struct IsSameName {
+  bool operator()(std::string_view left, std::string_view right) const {
+    return EqualIgnoringCase(left, right);
+  }
+};
+
 /// The catalogue of the process, and how many templates use it.
 struct Catalogue {
   Catalogue() {
@@ -46,7 +61,8 @@ struct Catalogue {
 
   std::vector<CatalogueFunction> functions;
   std::vector<CatalogueArgument> arguments;
-  std::unordered_map<std::string_view, std::size_t> byName;  ///< the first row of each name
+  std::unordered_map<std::string_view, std::size_t, HashOfName, IsSameName>
+      byName;  ///< the first row of each name
   int users = 0;
 };
 
@@ -56,9 +72,8 @@ Catalogue& TheCatalogue() {
 }
 
 const CatalogueFunction* FindExact(std::string_view upperName) {
-  const Catalogue& catalogue = TheCatalogue();
-  const auto hit = catalogue.byName.find(upperName);
-  return hit == catalogue.byName.end() ? nullptr : &catalogue.functions[hit->second];
+  const CatalogueFunction* function = FindFunction(upperName);
+  return function != nullptr && function->name == upperName ? function : nullptr;
 }
 
 }  // namespace
@@ -89,7 +104,9 @@ const std::array<CatalogueGroup, 2>& Groups() {
 }
 
 const CatalogueFunction* FindFunction(std::string_view name) {
-  return FindExact(UpperCase(name));
+  const Catalogue& catalogue = TheCatalogue();
+  const auto hit = catalogue.byName.find(name);
+  return hit == catalogue.byName.end() ? nullptr : &catalogue.functions[hit->second];
 }
 
 int FindFunctionUpper(std::string_view name, std::string& internalName, std::int32_t& argumentCount,

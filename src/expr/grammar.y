@@ -1,44 +1,9 @@
-%{
 // The grammar of the expression language. Its products are a tree, or a message; nothing is evaluated.
-#include "expr/parse_state.h"
-
-// The parse owns what its stack needs.
-#define YYMALLOC(size) state.Memory().Take(size)
-#define YYFREE(block) state.Memory().Release(block)
-%}
+%skeleton "./grammar_tables.m4"
 
 %code requires {
-#include <cstdint>
-
-namespace tessal {
-class ParseState;
-
-/// A piece of the text that is parsed.
-struct LexemeSpan {
-  const char* start;
-  std::uint32_t length;
-};
-
-/// A node that waits for its parent, by its place in the parse's store.
-using NodeHandle = std::uint32_t;
-}  // namespace tessal
+#include "expr/parse_state.h"
 }
-
-%code {
-// The scanner's codes are the tokens declared here, in the same order.
-static_assert(static_cast<int>(tessal::TokenCode::Identifier) == IDENTIFIER &&
-              static_cast<int>(tessal::TokenCode::If) == IF &&
-              static_cast<int>(tessal::TokenCode::ExceedanceFrequency) == EXCEEDANCE_FREQUENCY &&
-              static_cast<int>(tessal::TokenCode::UMinus) == U_MINUS);
-
-static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value, tessal::ParseState& state);
-static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message);
-}
-
-%define api.prefix {tessal_expression_grammar_}
-%define api.pure full
-%define parse.error verbose
-%param { tessal::ParseState& state }
 
 // In `IF c THEN a ELSE b + 1` and `a ::= b + 1` the last expression is the longest that follows: shifting is meant.
 %expect 24
@@ -102,7 +67,7 @@ static void tessal_expression_grammar_error(tessal::ParseState& state, const cha
 %%
 
 new_expression:
-    expression                            { state.SetRoot($1); $$ = $1; }
+    expression
   ;
 
 constant:
@@ -120,14 +85,14 @@ simple_expression:
   | constant
   | LEFT_BRACKET expression RIGHT_BRACKET { $$ = $2; }
   | abm_property
-  | ADD_OP_MINUS expression %prec U_MINUS { $$ = state.Node(tessal::NodeKind::Negate, "negate", {$2}); }
+  | ADD_OP_MINUS expression %prec U_MINUS { $$ = state.Node(tessal::NodeKind::Negate, "negate", $2); }
   | ADD_OP_PLUS expression %prec U_PLUS   { $$ = $2; }
   | rid_value
   ;
 
 argument_list:
-    expression                            { $$ = state.Node(tessal::NodeKind::Argument, "Argument", {$1}); }
-  | argument_list COMMA expression        { $$ = state.Node(tessal::NodeKind::Argument, "Argument", {$1, $3}); }
+    expression                            { $$ = state.Node(tessal::NodeKind::Argument, "Argument", $1); }
+  | argument_list COMMA expression        { $$ = state.Node(tessal::NodeKind::Argument, "Argument", $1, $3); }
   ;
 
 expression:
@@ -136,22 +101,22 @@ expression:
   | abm_interaction
   | function_call
   | simple_expression
-  | expression ADD_OP_PLUS expression     { $$ = state.Node(tessal::NodeKind::Arithmetic, "+", {$1, $3}); }
-  | expression ADD_OP_MINUS expression    { $$ = state.Node(tessal::NodeKind::Arithmetic, "-", {$1, $3}); }
-  | expression MUL_OP_MULTIPLY expression { $$ = state.Node(tessal::NodeKind::Arithmetic, "*", {$1, $3}); }
-  | expression MUL_OP_DIVIDE expression   { $$ = state.Node(tessal::NodeKind::Arithmetic, "/", {$1, $3}); }
+  | expression ADD_OP_PLUS expression     { $$ = state.Node(tessal::NodeKind::Arithmetic, "+", $1, $3); }
+  | expression ADD_OP_MINUS expression    { $$ = state.Node(tessal::NodeKind::Arithmetic, "-", $1, $3); }
+  | expression MUL_OP_MULTIPLY expression { $$ = state.Node(tessal::NodeKind::Arithmetic, "*", $1, $3); }
+  | expression MUL_OP_DIVIDE expression   { $$ = state.Node(tessal::NodeKind::Arithmetic, "/", $1, $3); }
   | exceedance_frequency_call
   ;
 
 exceedance_frequency_call:
     EXCEEDANCE_FREQUENCY LEFT_BRACKET cond_expression RIGHT_BRACKET
-                                          { $$ = state.Node(tessal::NodeKind::Exceedance, "Exceedance_Frequency", {$3}); }
+                                          { $$ = state.Node(tessal::NodeKind::Exceedance, "Exceedance_Frequency", $3); }
   ;
 
 function_call:
     IDENTIFIER LEFT_BRACKET RIGHT_BRACKET { $$ = state.Leaf(tessal::NodeKind::Call, $1); }
   | IDENTIFIER LEFT_BRACKET argument_list RIGHT_BRACKET
-                                          { $$ = state.Named(tessal::NodeKind::Call, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Call, $1, $3); }
   ;
 
 matched_statement:
@@ -162,13 +127,13 @@ matched_statement:
   ;
 
 cond_expression:
-    expression EQUAL expression           { $$ = state.Node(tessal::NodeKind::Comparison, "==", {$1, $3}); }
-  | expression NOT_EQUAL expression       { $$ = state.Node(tessal::NodeKind::Comparison, "!=", {$1, $3}); }
-  | expression BIGGER expression          { $$ = state.Node(tessal::NodeKind::Comparison, ">", {$1, $3}); }
-  | expression SMALLER expression         { $$ = state.Node(tessal::NodeKind::Comparison, "<", {$1, $3}); }
-  | expression BIGGER_OR_EQUAL expression { $$ = state.Node(tessal::NodeKind::Comparison, ">=", {$1, $3}); }
+    expression EQUAL expression           { $$ = state.Node(tessal::NodeKind::Comparison, "==", $1, $3); }
+  | expression NOT_EQUAL expression       { $$ = state.Node(tessal::NodeKind::Comparison, "!=", $1, $3); }
+  | expression BIGGER expression          { $$ = state.Node(tessal::NodeKind::Comparison, ">", $1, $3); }
+  | expression SMALLER expression         { $$ = state.Node(tessal::NodeKind::Comparison, "<", $1, $3); }
+  | expression BIGGER_OR_EQUAL expression { $$ = state.Node(tessal::NodeKind::Comparison, ">=", $1, $3); }
   | expression SMALLER_OR_EQUAL expression
-                                          { $$ = state.Node(tessal::NodeKind::Comparison, "<=", {$1, $3}); }
+                                          { $$ = state.Node(tessal::NodeKind::Comparison, "<=", $1, $3); }
   | LEFT_BRACKET boolean_OR_expression RIGHT_BRACKET
                                           { $$ = $2; }
   ;
@@ -191,34 +156,34 @@ boolean_AND_expression:
   ;
 
 direct_modification:
-    IDENTIFIER DIRECT_ASSIGN expression   { $$ = state.Named(tessal::NodeKind::DirectAssign, $1, {$3}); }
-  | IDENTIFIER DIRECT_PLUS expression     { $$ = state.Named(tessal::NodeKind::DirectPlus, $1, {$3}); }
-  | IDENTIFIER DIRECT_MINUS expression    { $$ = state.Named(tessal::NodeKind::DirectMinus, $1, {$3}); }
-  | IDENTIFIER DIRECT_MULTIPLY expression { $$ = state.Named(tessal::NodeKind::DirectMultiply, $1, {$3}); }
-  | IDENTIFIER DIRECT_DIVIDE expression   { $$ = state.Named(tessal::NodeKind::DirectDivide, $1, {$3}); }
+    IDENTIFIER DIRECT_ASSIGN expression   { $$ = state.Named(tessal::NodeKind::DirectAssign, $1, $3); }
+  | IDENTIFIER DIRECT_PLUS expression     { $$ = state.Named(tessal::NodeKind::DirectPlus, $1, $3); }
+  | IDENTIFIER DIRECT_MINUS expression    { $$ = state.Named(tessal::NodeKind::DirectMinus, $1, $3); }
+  | IDENTIFIER DIRECT_MULTIPLY expression { $$ = state.Named(tessal::NodeKind::DirectMultiply, $1, $3); }
+  | IDENTIFIER DIRECT_DIVIDE expression   { $$ = state.Named(tessal::NodeKind::DirectDivide, $1, $3); }
   ;
 
 abm_interaction:
     IDENTIFIER LEFT_CURLY interaction_target COMMA interaction_modlists RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3, $5}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, $3, $5); }
   | IDENTIFIER LEFT_CURLY interaction_target RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, $3); }
   | IDENTIFIER LEFT_CURLY interaction_target COMMA RIGHT_CURLY
-                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, {$3}); }
+                                          { $$ = state.Named(tessal::NodeKind::Interaction, $1, $3); }
   ;
 
 interaction_target:
     LEFT_BRACKET IDENTIFIER COMMA expression RIGHT_BRACKET
-        { $$ = state.Node(tessal::NodeKind::Target, "Target", {state.Leaf(tessal::NodeKind::Identifier, $2), $4}); }
+        { $$ = state.Node(tessal::NodeKind::Target, "Target", state.Leaf(tessal::NodeKind::Identifier, $2), $4); }
   | LEFT_BRACKET INT_NUM COMMA expression RIGHT_BRACKET
-        { $$ = state.Node(tessal::NodeKind::Target, "Target ID", {state.Leaf(tessal::NodeKind::Number, $2), $4}); }
+        { $$ = state.Node(tessal::NodeKind::Target, "Target ID", state.Leaf(tessal::NodeKind::Number, $2), $4); }
   ;
 
 interaction_modlists:
     interaction_modlist
   | interaction_modlists COMMA interaction_modlist
-                                          { $$ = state.Node(tessal::NodeKind::Modlists, "Modlist", {$1, $3}); }
-  | LEFT_BRACKET RIGHT_BRACKET            { $$ = state.Node(tessal::NodeKind::Modlists, "empty", {}); }
+                                          { $$ = state.Node(tessal::NodeKind::Modlists, "Modlist", $1, $3); }
+  | LEFT_BRACKET RIGHT_BRACKET            { $$ = state.Node(tessal::NodeKind::Modlists, "empty"); }
   ;
 
 interaction_modlist:
@@ -235,25 +200,3 @@ mod_target:
 abm_property:
     LEFT_SQUARE IDENTIFIER RIGHT_SQUARE   { $$ = state.Leaf(tessal::NodeKind::Property, $2); }
   ;
-
-%%
-
-static int tessal_expression_grammar_lex(TESSAL_EXPRESSION_GRAMMAR_STYPE* value, tessal::ParseState& state) {
-  const int code = state.Pull(value->lexeme);
-  // The message is set; without an error rule this ends the parse.
-  return state.TokenIsTooLong() ? static_cast<int>(TESSAL_EXPRESSION_GRAMMAR_error) : code;
-}
-
-static void tessal_expression_grammar_error(tessal::ParseState& state, const char* message) {
-  state.FailAsParser(message);
-}
-
-namespace tessal {
-
-// The grammar's own list of its tokens holds their names.
-std::string_view TokenName(TokenCode code) {
-  if (code < TokenCode::Identifier || code > TokenCode::UMinus) return "-";
-  return yysymbol_name(YYTRANSLATE(static_cast<int>(code)));
-}
-
-}  // namespace tessal

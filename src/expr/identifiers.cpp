@@ -1,5 +1,6 @@
 #include "expr/identifiers.h"
 
+#include "expr/parser.h"
 #include "expr/scanner.h"
 
 namespace tessal {
@@ -10,14 +11,27 @@ void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& ident
   bool clean = true;
   ExpressionScan scan(text);
   for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {
-    if (code == TokenCode::Identifier) {
-      const std::size_t length = scan.Lexeme().size();
-      identifiers.push_back(text.substr(scan.Consumed() - length, length));
-    }
+    if (code == TokenCode::Identifier) identifiers.push_back(scan.Lexeme());
     // To the end all the same: the start state of the next scan depends on it.
     clean = clean && IsPlainToken(code);
   }
   if (!clean) identifiers.clear();
+}
+
+void IdentifiersOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text,
+                     std::vector<std::string_view>& identifiers) {
+  const ScannerStart began = ExpressionScannerStart();
+  const ParsedExpression& parsed = ParseOnce(held, text);
+  if (!parsed.KnowsIdentifiers()) {
+    // The parse left the rest unscanned, and the start of the next scan as it was there.
+    SetExpressionScannerStart(began);
+    ScanIdentifiers(text, identifiers);
+    return;
+  }
+  identifiers.clear();
+  for (const LexemeSpan name : parsed.Identifiers()) {
+    identifiers.push_back(text.substr(name.start, name.length));
+  }
 }
 
 void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers) {

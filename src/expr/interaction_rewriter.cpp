@@ -16,17 +16,18 @@ namespace {
 /// Names that the engine knows as functions without arguments.
 constexpr std::array<std::string_view, 6> kTimeParts = {"YEAR", "MONTH", "DAY", "HOUR", "MINUTE", "SECOND"};
 
-bool IsAdditive(const std::string& operatorText) {
+bool IsAdditive(std::string_view operatorText) {
   return operatorText == "+" || operatorText == "-";
 }
 
 /// One rewriting. Brackets surround each additive chain at a level; a product or a call opens a new level.
 class Rewriter final {
  public:
-  void Before(NodeKind kind, const std::string& text) {
+  void Before(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Call:
-        output += text + "(";
+        output += text;
+        output += '(';
         savedArguments.push_back(arguments);
         savedBrackets.push_back(brackets);
         arguments = brackets = 0;
@@ -46,7 +47,9 @@ class Rewriter final {
         ++arguments;
         break;
       case NodeKind::Interaction:
-        output += "_ABMInteract_" + text + "(";
+        output += "_ABMInteract_";
+        output += text;
+        output += '(';
         break;
       case NodeKind::Negate:
         output += '-';
@@ -56,7 +59,7 @@ class Rewriter final {
     }
   }
 
-  void Between(NodeKind kind, const std::string& text) {
+  void Between(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Identifier:
         output += text;
@@ -74,14 +77,16 @@ class Rewriter final {
         output += text;
         break;
       case NodeKind::Property:
-        output += "_GetProperty(" + text + ")";
+        output += "_GetProperty(";
+        output += text;
+        output += ')';
         break;
       default:
         break;
     }
   }
 
-  void After(NodeKind kind, const std::string& text) {
+  void After(NodeKind kind, std::string_view text) {
     switch (kind) {
       case NodeKind::Call:
         output += ')';
@@ -130,9 +135,9 @@ class Rewriter final {
 std::string RewriteExpressionText(const ExpressionNode& tree) {
   Rewriter rewriter;
   tree.WalkInOrder(
-      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.Before(kind, text); },
-      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.Between(kind, text); },
-      [&rewriter](NodeKind kind, const std::string& text, std::int32_t) { rewriter.After(kind, text); });
+      [&rewriter](NodeKind kind, std::string_view text, std::int32_t) { rewriter.Before(kind, text); },
+      [&rewriter](NodeKind kind, std::string_view text, std::int32_t) { rewriter.Between(kind, text); },
+      [&rewriter](NodeKind kind, std::string_view text, std::int32_t) { rewriter.After(kind, text); });
   return std::move(rewriter.Output());
 }
 

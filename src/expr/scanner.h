@@ -98,31 +98,52 @@ class ScannerRest final {
   ~ScannerRest() { ResetExpressionScanner(); }
 };
 
-/// Bytes of an expression that is still parsed. A tree takes a hundred times the memory of its text.
+/// Bytes of an expression that is still parsed. A tree may take a hundred times the memory of its text.
 inline constexpr std::size_t kLongestExpression = 1'000'000;
+
+/// A lexeme by its place in the text that is scanned.
+struct LexemeSpan {
+  std::uint32_t start;
+  std::uint32_t length;
+};
 
 /// The scanner as the parser and the lists pull from it. One scan at a time.
 class ExpressionScan final {
  public:
-  /// Begins a scan of a copy of the text.
-  explicit ExpressionScan(std::string_view text);
+  /// Begins a scan of a text, which must outlive it.
+  explicit ExpressionScan(std::string_view scanned);
   ExpressionScan(const ExpressionScan&) = delete;
   ExpressionScan& operator=(const ExpressionScan&) = delete;
-  ~ExpressionScan();
 
   /// The next token: `End` at the end, the (signed) character for one without a kind.
   TokenCode Next();
-  /// The present token's text; good until the next one is pulled.
-  std::string_view Lexeme() const;
+  /// The present token's text, a view into what is scanned, and its place there.
+  std::string_view Lexeme() const { return {lexeme, static_cast<std::size_t>(here - lexeme)}; }
+  LexemeSpan Span() const { return {Distance(text, lexeme), Distance(lexeme, here)}; }
   /// Characters taken so far, the present token's included.
-  std::uint32_t Consumed() const;
+  std::uint32_t Consumed() const { return Distance(text, here); }
   /// Line feeds met outside comments.
-  std::uint32_t Lines() const;
+  std::uint32_t Lines() const { return lines; }
   /// Characters taken when the present line began.
-  std::uint32_t LineStart() const;
+  std::uint32_t LineStart() const { return Distance(text, line); }
 
  private:
-  std::string scanned;
+  static std::uint32_t Distance(const char* from, const char* to) {
+    return static_cast<std::uint32_t>(to - from);
+  }
+  void SkipComment();
+  TokenCode Word();
+  TokenCode Number();
+  TokenCode Colon();
+  const char* AfterDigits(const char* place) const;
+  bool IsAt(const char* place, char character) const { return place < end && *place == character; }
+
+  const char* text;
+  const char* end;     ///< of the text, or its first zero byte
+  const char* here;    ///< after the present token
+  const char* lexeme;  ///< where the present token begins
+  const char* line;    ///< where the present line begins
+  std::uint32_t lines = 0;
 };
 
 }  // namespace tessal

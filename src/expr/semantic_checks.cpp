@@ -55,19 +55,19 @@ class FunctionCheck final {
 
   void Walk(const ExpressionNode& root) {
     root.WalkPostOrder(
-        nullptr, [this](NodeKind kind, const std::string& text, std::int32_t) { Visit(kind, text); },
-        [this](NodeKind kind, const std::string&, std::int32_t) {
+        nullptr, [this](NodeKind kind, std::string_view text, std::int32_t) { Visit(kind, text); },
+        [this](NodeKind kind, std::string_view, std::int32_t) {
           if (kind == NodeKind::Call) --callDepth;
         });
   }
 
   bool IsBalanced() const { return callDepth < 1; }
-  const std::string& LastCall() const { return lastCall; }
+  std::string_view LastCall() const { return lastCall; }
 
   void Report(const Finding& finding) { Errors().ReportCheck(symbol, uid, finding); }
 
  private:
-  void Visit(NodeKind kind, const std::string& text) {
+  void Visit(NodeKind kind, std::string_view text) {
     if (kind == NodeKind::Argument) {
       // The walk comes to a list after all calls in it, so this counts the arguments of one call only.
       ++arguments;
@@ -81,7 +81,7 @@ class FunctionCheck final {
     }
   }
 
-  void CheckCall(const std::string& name) {
+  void CheckCall(std::string_view name) {
     const CatalogueFunction* function = FindFunction(name);
     if (function == nullptr) {
       if (!IsUserFunctionName(name)) Report({"unknown-function", {name}});
@@ -99,7 +99,7 @@ class FunctionCheck final {
   Uid uid;
   std::int32_t arguments = 0;
   std::int32_t callDepth = 0;
-  std::string lastCall;
+  std::string_view lastCall;
 };
 
 }  // namespace
@@ -118,7 +118,7 @@ bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& pa
 }
 
 int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression) {
-  return CheckFunctions(symbol, uid, ParseExpression(expression)) ? 1 : 0;
+  return CheckFunctions(symbol, uid, *ParseExpression(expression)) ? 1 : 0;
 }
 
 bool IsPropertyName(std::string_view text) {

@@ -63,42 +63,82 @@ KvfHandle Keep(KvfFile file) {
   return handle;
 }
 
-bool Is(KvfNode node, KvfItem::Type type) {
-  if (node != nullptr && node->type == type) return true;
+using Type = KvfCell::Type;
+
+bool Is(KvfNode node, Type type) {
+  if (node != nullptr && node.Image()->At(node.Place()).ItemType() == type) return true;
   Note(kKvfBadNode);
   return false;
 }
 
-const KvfSection* AsSection(KvfNode node) {
-  return Is(node, KvfItem::Type::Section) ? static_cast<const KvfSection*>(node) : nullptr;
+bool IsParameter(KvfNode node) {
+  return Is(node, Type::Parameter);
 }
 
-const KvfKeyword* AsKeyword(KvfNode node) {
-  return Is(node, KvfItem::Type::Keyword) ? static_cast<const KvfKeyword*>(node) : nullptr;
+/// Calls the visitor with each entry of a section, by its place, until it gives true.
+template <class Visitor>
+std::uint32_t FindEntry(const KvfImage& image, std::uint32_t section, Visitor visit) {
+  const std::uint32_t end = image.EndOfSection(section);
+  for (std::uint32_t entry = KvfImage::FirstEntry(section); entry < end; entry = image.NextEntry(entry)) {
+    if (visit(entry)) return entry;
+  }
+  return 0;
 }
 
-/// The section of a node, or none, from that entry on.
-const KvfEntry* SectionFrom(const KvfEntry* entry) {
-  while (entry != nullptr && entry->type != KvfItem::Type::Section) entry = entry->next;
-  return entry;
+/// The item at a place, or none at the place of the root, which is no node.
+KvfNode NodeAt(KvfImage& image, std::uint32_t place) {
+  return place == 0 ? KvfNode() : KvfNode(image, place);
 }
 
 /// The n-th of a section's keywords or sub-sections that has a name.
-const KvfEntry* NthOfName(const KvfSection& section, KvfItem::Type type, std::string_view name, int number) {
-  for (const KvfEntry* entry = section.first; entry != nullptr; entry = entry->next) {
-    if (entry->type == type && EqualIgnoringCase(entry->Text(), name) && --number == 0) return entry;
-  }
-  return nullptr;
+KvfNode NthOfName(KvfImage& image, std::uint32_t section, Type type, std::string_view name, int number) {
+  return NodeAt(image, FindEntry(image, section, [&image, type, name, &number](std::uint32_t entry) {
+                  return image.At(entry).ItemType() == type && EqualIgnoringCase(image.TextAt(entry), name) &&
+                         --number == 0;
+                }));
+}
+
+/// The first section from an entry on, before the end.
+KvfNode SectionFrom(KvfImage& image, std::uint32_t entry, std::uint32_t end) {
+  while (entry < end && image.At(entry).ItemType() != Type::Section) entry = image.NextEntry(entry);
+  return entry < end ? KvfNode(image, entry) : KvfNode();
 }
 
 /// A section that somebody asked for.
 KvfNode Asked(KvfNode section) {
-  if (section != nullptr) section->wasRead = true;
+  if (section != nullptr) section.Image()->At(section.Place()).MarkRead();
   return section;
 }
 
-bool IsText(const KvfItem& parameter) {
-  return parameter.value == KvfItem::Value::Quoted || parameter.value == KvfItem::Value::Path;
+std::string_view RawText(KvfNode node) {
+  return node.Image()->TextAt(node.Place());
+}
+
+/// Carriage returns are no part of a text.
+bool HasReturns(std::string_view text) {
+  return text.find('\r') != std::string_view::npos;
+}
+
+/// At most that many bytes of what is left of a text without them.
+std::string WithoutReturns(std::string_view text, std::size_t longest = std::string_view::npos) {
+  std::string changed;
+  for (const char character : text) {
+    if (changed.size() == longest) break;
+    if (character != '\r') changed += character;
+  }
+  return changed;
+}
+
+KvfValueType ValueType(KvfNode parameter) {
+  return static_cast<KvfValueType>(parameter.Image()->At(parameter.Place()).Detail());
+}
+
+bool IsText(KvfValueType type) {
+  return type == KvfValueType::Quoted || type == KvfValueType::Path;
+}
+
+void MarkRead(KvfNode parameter) {
+  parameter.Image()->At(parameter.Place()).MarkRead();
 }
 
 /// Adds a value to the open keyword by `add(writer)`.
@@ -146,9 +186,7 @@ KvfHandle kvfLoadText(std::string bytes) {
   Library& library = TheLibrary();
   library.lastError = kKvfOk;
   library.syntaxError = {};
-  const std::size_t bytesCut = bytes.size() - std::min(bytes.find('\0'), bytes.size());
-  auto image = std::make_unique<KvfImage>(KvfReadableText(std::move(bytes)));
-  image->bytesCut = bytesCut;
+  auto image = std::make_unique<KvfImage>(std::move(bytes));
   if (ReadKvfImage(*image, library.syntaxError)) return Keep(std::move(image));
   Note(kKvfSyntaxError);
   return 0;
@@ -178,158 +216,165 @@ void kvfClose(KvfHandle* handle) {
 }
 
 KvfNode kvfTargetByNameNum(KvfHandle handle, std::string_view name, int number) {
-  const KvfImage* image = FileOf<KvfImage>(handle);
-  return image == nullptr ? nullptr : Asked(NthOfName(image->root, KvfItem::Type::Section, name, number));
+  KvfImage* image = FileOf<KvfImage>(handle);
+  return image == nullptr ? KvfNode() : Asked(NthOfName(*image, 0, Type::Section, name, number));
 }
 
 KvfNode kvfSectionByNameNum(KvfNode node, std::string_view name, int number) {
-  const KvfSection* section = AsSection(node);
-  return section == nullptr ? nullptr : Asked(NthOfName(*section, KvfItem::Type::Section, name, number));
+  if (!Is(node, Type::Section)) return nullptr;
+  return Asked(NthOfName(*node.Image(), node.Place(), Type::Section, name, number));
 }
 
 int kvfGetNoSections(KvfNode node) {
-  const KvfSection* section = AsSection(node);
-  return section == nullptr ? 0 : static_cast<int>(section->count);
+  return Is(node, Type::Section) ? static_cast<int>(node.Image()->SubSectionCount(node.Place())) : 0;
 }
 
 KvfNode kvfSectionByNum(KvfNode node, int number) {
-  const KvfSection* parent = AsSection(node);
-  if (parent == nullptr || number < 1) return nullptr;
-  const KvfEntry* section = SectionFrom(parent->first);
-  while (section != nullptr && --number > 0) section = SectionFrom(section->next);
-  return Asked(section);
+  if (!Is(node, Type::Section) || number < 1) return nullptr;
+  KvfImage& image = *node.Image();
+  return Asked(NodeAt(image, FindEntry(image, node.Place(), [&image, &number](std::uint32_t entry) {
+                        return image.At(entry).ItemType() == Type::Section && --number == 0;
+                      })));
 }
 
 KvfNode kvfFirstSection(KvfNode node) {
-  const KvfSection* section = AsSection(node);
-  return section == nullptr ? nullptr : Asked(SectionFrom(section->first));
+  if (!Is(node, Type::Section)) return nullptr;
+  KvfImage& image = *node.Image();
+  return Asked(SectionFrom(image, KvfImage::FirstEntry(node.Place()), image.EndOfSection(node.Place())));
 }
 
-KvfNode kvfNextSection(KvfNode node) {
-  const KvfSection* section = AsSection(node);
-  return section == nullptr ? nullptr : Asked(SectionFrom(section->next));
+KvfNode kvfNextSection(KvfNode node, KvfNode parent) {
+  if (!Is(node, Type::Section) || !Is(parent, Type::Section)) return nullptr;
+  KvfImage& image = *node.Image();
+  return Asked(SectionFrom(image, image.EndOfSection(node.Place()), image.EndOfSection(parent.Place())));
 }
 
 bool kvfIsSection(KvfNode node) {
-  return node != nullptr && node->type == KvfItem::Type::Section;
+  return node != nullptr && node.Image()->At(node.Place()).ItemType() == Type::Section;
 }
 
 bool kvfHasSection(KvfNode node, std::string_view name) {
-  const KvfSection* section = AsSection(node);
-  return section != nullptr && NthOfName(*section, KvfItem::Type::Section, name, 1) != nullptr;
+  return Is(node, Type::Section) && NthOfName(*node.Image(), node.Place(), Type::Section, name, 1) != nullptr;
 }
 
 std::string kvfGetNameGlb(KvfNode node) {
-  const bool named = node != nullptr && node->type != KvfItem::Type::Parameter;
-  return std::string(named ? node->Text() : std::string_view());
+  const bool named = node != nullptr && node.Image()->At(node.Place()).ItemType() != Type::Parameter;
+  return std::string(named ? RawText(node) : std::string_view());
 }
 
 int kvfGetLine(KvfNode node) {
-  const bool isEntry = node != nullptr && node->type != KvfItem::Type::Parameter;
-  return isEntry ? static_cast<const KvfEntry*>(node)->line : 0;
+  const bool isEntry = node != nullptr && node.Image()->At(node.Place()).ItemType() != Type::Parameter;
+  return isEntry ? node.Image()->LineAt(node.Place()) : 0;
 }
 
 KvfNode kvfKeywordByNameNum(KvfNode node, std::string_view name, int number) {
-  const KvfSection* section = AsSection(node);
-  return section == nullptr ? nullptr : NthOfName(*section, KvfItem::Type::Keyword, name, number);
+  if (!Is(node, Type::Section)) return nullptr;
+  return NthOfName(*node.Image(), node.Place(), Type::Keyword, name, number);
 }
 
 int kvfGetNoParams(KvfNode node) {
-  const KvfKeyword* keyword = AsKeyword(node);
-  return keyword == nullptr ? 0 : static_cast<int>(keyword->count);
+  return Is(node, Type::Keyword) ? static_cast<int>(node.Image()->ParameterCount(node.Place())) : 0;
 }
 
 KvfNode kvfParamByNum(KvfNode node, int number) {
-  const KvfKeyword* keyword = AsKeyword(node);
-  const bool isThere =
-      keyword != nullptr && number >= 1 && static_cast<std::uint32_t>(number) <= keyword->count;
-  return isThere ? &keyword->Parameters()[static_cast<std::size_t>(number) - 1] : nullptr;
+  if (!Is(node, Type::Keyword) || number < 1) return nullptr;
+  KvfImage& image = *node.Image();
+  const auto before = static_cast<std::uint32_t>(number) - 1;
+  if (before >= image.ParameterCount(node.Place())) return nullptr;
+  return {image, image.FirstParameter(node.Place()) + before};
 }
 
 int kvfGetInt(KvfNode parameter, std::int32_t& value) {
-  if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
-  if (parameter->value != KvfItem::Value::Integer) return Note(kKvfWrongType);
-  value = KvfInteger(parameter->Text());
-  parameter->wasRead = true;
+  if (!IsParameter(parameter)) return kKvfBadNode;
+  if (ValueType(parameter) != KvfValueType::Integer) return Note(kKvfWrongType);
+  value = KvfInteger(RawText(parameter));
+  MarkRead(parameter);
   return kKvfOk;
 }
 
 int kvfGetDouble(KvfNode parameter, double& value) {
-  if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
-  if (IsText(*parameter) || parameter->value == KvfItem::Value::Boolean) return Note(kKvfWrongType);
-  value = KvfReal(parameter->Text());
-  parameter->wasRead = true;
+  if (!IsParameter(parameter)) return kKvfBadNode;
+  const KvfValueType type = ValueType(parameter);
+  if (IsText(type) || type == KvfValueType::Boolean) return Note(kKvfWrongType);
+  value = KvfReal(RawText(parameter));
+  MarkRead(parameter);
+  return kKvfOk;
+}
+
+int kvfGetText(KvfNode parameter, std::string& buffer, KvfText& value) {
+  if (!IsParameter(parameter)) return kKvfBadNode;
+  MarkRead(parameter);
+  value = {RawText(parameter), true};
+  if (HasReturns(value.text)) {
+    buffer = WithoutReturns(value.text);
+    value = {buffer, false};
+  }
   return kKvfOk;
 }
 
 int kvfGetString(KvfNode parameter, std::string& value) {
-  if (!Is(parameter, KvfItem::Type::Parameter)) return kKvfBadNode;
-  value = parameter->Text();
-  parameter->wasRead = true;
-  return kKvfOk;
+  std::string buffer;
+  KvfText text;
+  const int result = kvfGetText(parameter, buffer, text);
+  if (result == kKvfOk) value = text.text;
+  return result;
 }
 
 namespace {
 
 /// What of a keyword is unread, if anything is.
-std::optional<KvfUnread::What> UnreadOf(const KvfKeyword& keyword) {
-  const auto parameters = keyword.Parameters();
-  const auto read = static_cast<std::size_t>(
-      std::count_if(parameters.begin(), parameters.end(), [](const KvfItem& each) { return each.wasRead; }));
-  if (read == parameters.size()) return std::nullopt;
+std::optional<KvfUnread::What> UnreadOf(const KvfImage& image, std::uint32_t keyword) {
+  const std::uint32_t count = image.ParameterCount(keyword);
+  const std::uint32_t first = image.FirstParameter(keyword);
+  std::uint32_t read = 0;
+  for (std::uint32_t place = first; place < first + count; ++place) read += image.At(place).WasRead() ? 1 : 0;
+  if (read == count) return std::nullopt;
   return read == 0 ? KvfUnread::What::Keyword : KvfUnread::What::FurtherValues;
 }
 
 }  // namespace
 
 void kvfForEachUnread(KvfNode node, const std::function<void(const KvfUnread&)>& visit) {
-  const KvfSection* section = AsSection(node);
-  if (section == nullptr) return;
-  struct Step {
-    const KvfSection* section;
-    const KvfEntry* next;
-  };
+  if (!Is(node, Type::Section)) return;
+  KvfImage& image = *node.Image();
   // Sections may nest deeper than calls.
-  std::vector<Step> path{{section, section->first}};
-  while (!path.empty()) {
-    const KvfSection* parent = path.back().section;
-    const KvfEntry* entry = path.back().next;
-    if (entry == nullptr) {
-      path.pop_back();
-      continue;
-    }
-    path.back().next = entry->next;
-    if (entry->type == KvfItem::Type::Keyword) {
-      const auto what = UnreadOf(static_cast<const KvfKeyword&>(*entry));
-      if (what) visit({*what, entry, parent});
-    } else if (!entry->wasRead) {
-      visit({KvfUnread::What::Section, entry, parent});
+  std::vector<std::uint32_t> path{node.Place()};
+  std::uint32_t entry = KvfImage::FirstEntry(node.Place());
+  while (true) {
+    while (!path.empty() && entry == image.EndOfSection(path.back())) path.pop_back();
+    if (path.empty()) return;
+    const KvfNode parent(image, path.back());
+    if (image.At(entry).ItemType() == Type::Keyword) {
+      const auto what = UnreadOf(image, entry);
+      if (what) visit({*what, {image, entry}, parent});
+      entry = image.NextEntry(entry);
+    } else if (!image.At(entry).WasRead()) {
+      visit({KvfUnread::What::Section, {image, entry}, parent});
+      entry = image.NextEntry(entry);
     } else {
-      const auto& child = static_cast<const KvfSection&>(*entry);
-      path.push_back({&child, child.first});
+      path.push_back(entry);
+      entry = KvfImage::FirstEntry(entry);
     }
   }
 }
 
-void kvfMarkRead(KvfNode node) {
-  const KvfKeyword* keyword = AsKeyword(node);
-  if (keyword == nullptr) return;
-  for (const KvfItem& parameter : keyword->Parameters()) parameter.wasRead = true;
+void kvfMarkRead(KvfNode keyword) {
+  for (int number = 1; number <= kvfGetNoParams(keyword); ++number) MarkRead(kvfParamByNum(keyword, number));
 }
 
-std::string kvfGetSource(KvfNode node, std::size_t longest) {
+std::string kvfGetSource(KvfNode keyword, std::size_t longest) {
   std::string text;
-  const KvfKeyword* keyword = AsKeyword(node);
-  if (keyword == nullptr) return text;
-  text += keyword->Text();
+  if (!Is(keyword, Type::Keyword)) return text;
+  text += RawText(keyword);
   text += " = ";
   std::string_view separator;
-  for (const KvfItem& parameter : keyword->Parameters()) {
+  for (int number = 1; number <= kvfGetNoParams(keyword); ++number) {
+    const KvfNode parameter = kvfParamByNum(keyword, number);
     constexpr std::array<std::string_view, 5> kQuotes = {"", "", "", "'", "|"};
-    const std::string_view quote = kQuotes.at(static_cast<std::size_t>(parameter.value));
+    const std::string_view quote = kQuotes.at(static_cast<std::size_t>(ValueType(parameter)));
     text += separator;
     text += quote;
-    text += parameter.Text().substr(0, longest);
+    text += WithoutReturns(RawText(parameter), longest);
     text += quote;
     if (text.size() > longest) return text.substr(0, longest) + "...";
     separator = ", ";
@@ -338,33 +383,37 @@ std::string kvfGetSource(KvfNode node, std::size_t longest) {
 }
 
 bool kvfFitsInt(KvfNode parameter) {
-  return !Is(parameter, KvfItem::Type::Parameter) || KvfIntegerFits(parameter->Text());
+  return !IsParameter(parameter) || KvfIntegerFits(RawText(parameter));
 }
 
 bool kvfFitsDouble(KvfNode parameter) {
-  return !Is(parameter, KvfItem::Type::Parameter) || KvfRealFits(parameter->Text());
+  return !IsParameter(parameter) || KvfRealFits(RawText(parameter));
 }
 
 std::string kvfTakeText(KvfHandle* handle) {
-  std::string text;
-  auto& files = TheLibrary().files;
-  const auto hit = handle == nullptr ? files.end() : files.find(*handle);
-  if (hit != files.end()) {
-    const auto* image = std::get_if<std::unique_ptr<KvfImage>>(&hit->second);
-    text = image != nullptr ? std::move((*image)->source)
-                            : std::get<std::unique_ptr<KvfWriter>>(hit->second)->TakeText();
-  }
+  KvfWriter* const writer = handle == nullptr ? nullptr : FileOf<KvfWriter>(*handle);
+  std::string text = writer == nullptr ? std::string() : writer->TakeText();
   kvfClose(handle);
   return text;
 }
 
+std::shared_ptr<const std::string> kvfShareText(KvfHandle handle) {
+  const KvfImage* image = FileOf<KvfImage>(handle);
+  return image == nullptr ? nullptr : image->source;
+}
+
+bool kvfIsStrict(KvfHandle handle) {
+  const KvfImage* image = FileOf<KvfImage>(handle);
+  return image != nullptr && image->isStrict;
+}
+
 std::string kvfTextBeside(KvfHandle handle, KvfNode target) {
   const KvfImage* image = FileOf<KvfImage>(handle);
-  return image == nullptr ? std::string() : KvfTextBeside(*image, target);
+  return image == nullptr ? std::string() : KvfTextBeside(*image, target.Place());
 }
 
 void kvfForEachRemark(KvfHandle handle, KvfNode target, const std::function<void(const KvfRemark&)>& visit) {
-  if (const KvfImage* image = FileOf<KvfImage>(handle)) ForEachKvfRemark(*image, target, visit);
+  if (const KvfImage* image = FileOf<KvfImage>(handle)) ForEachKvfRemark(*image, target.Place(), visit);
 }
 
 std::size_t kvfGetBytesCut(KvfHandle handle) {

@@ -1,20 +1,39 @@
 // The key-file library: reads a key file into targets, sections, keywords and parameters, and writes such
 // files. Elements are filled from it and written through it; it drops comments.
-// Handles and nodes are opaque, zero is "none", numbers count from 1, and names are compared without regard
-// to case. A node lives as long as its handle is open.
+// Handles and nodes are opaque, zero and null are "none", numbers count from 1, and names are compared
+// without regard to case. A node lives as long as its handle is open.
 #pragma once
 
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
 
 namespace tessal {
 
 using KvfHandle = std::uint32_t;
-struct KvfItem;
-using KvfNode = const KvfItem*;
+class KvfImage;
+
+/// A target, section, keyword or parameter of an open file, or none.
+class KvfNode final {
+ public:
+  KvfNode() = default;
+  KvfNode(std::nullptr_t /*none*/) {}  // NOLINT(google-explicit-constructor)
+  /// For the library alone: the item at a place of a file's row.
+  KvfNode(KvfImage& file, std::uint32_t itsPlace) : image(&file), place(itsPlace) {}
+
+  explicit operator bool() const { return image != nullptr; }
+  KvfImage* Image() const { return image; }
+  std::uint32_t Place() const { return place; }
+  friend bool operator==(const KvfNode& one, const KvfNode& other) = default;
+  friend bool operator==(const KvfNode& node, std::nullptr_t /*none*/) { return node.image == nullptr; }
+
+ private:
+  KvfImage* image = nullptr;
+  std::uint32_t place = 0;
+};
 
 /// What went wrong, as `kvfGetErrorGlb` and the calls that return an int report it.
 enum KvfError : int {
@@ -56,7 +75,7 @@ int kvfGetNoSections(KvfNode node);
 /// Counts from the first; who wants them all asks for the first and then for each next one.
 KvfNode kvfSectionByNum(KvfNode node, int number);
 KvfNode kvfFirstSection(KvfNode node);
-KvfNode kvfNextSection(KvfNode section);
+KvfNode kvfNextSection(KvfNode section, KvfNode parent);
 bool kvfIsSection(KvfNode node);
 /// Whether there is a sub-section of that name. Asking is no reading.
 bool kvfHasSection(KvfNode node, std::string_view name);
@@ -74,6 +93,15 @@ int kvfGetInt(KvfNode parameter, std::int32_t& value);
 int kvfGetDouble(KvfNode parameter, double& value);
 /// Quoted and path strings, and numbers and booleans as the text that is in the file.
 int kvfGetString(KvfNode parameter, std::string& value);
+
+/// A text, and whether it lies in the file's own (`kvfShareText`) and is good for as long as that is held.
+/// Otherwise it lies in the buffer that the reader was given.
+struct KvfText {
+  std::string_view text{};
+  bool isLasting = false;
+};
+/// The same as `kvfGetString`, without a copy but for a text that goes over a line's end.
+int kvfGetText(KvfNode parameter, std::string& buffer, KvfText& value);
 
 // What the readers above have not asked for. Asking whether something is there counts for nothing.
 
@@ -104,9 +132,13 @@ std::string kvfGetSource(KvfNode keyword, std::size_t longest);
 bool kvfFitsInt(KvfNode parameter);
 bool kvfFitsDouble(KvfNode parameter);
 
-/// The text of a file, which is closed: of one that was loaded what was read, of a new one what `kvfWrite`
-/// writes. Empty for a bad handle.
+/// The text of a new file, as `kvfWrite` writes it; the file is closed. Empty for any other handle.
 std::string kvfTakeText(KvfHandle* handle);
+/// The text of a file that was loaded, up to a zero byte, without a mark of the byte order. It outlives the
+/// file. Null for any other handle.
+std::shared_ptr<const std::string> kvfShareText(KvfHandle handle);
+/// Whether that text keeps to the grammar of the item tree too. False where it may not.
+bool kvfIsStrict(KvfHandle handle);
 /// The text beside a target, from the first top-level section on, with CRLF line ends and no blank lines at
 /// its ends. With none for the target, all of it.
 std::string kvfTextBeside(KvfHandle handle, KvfNode target);

@@ -1,14 +1,13 @@
 #include "platform/kvf_text.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "platform/ascii.h"
 
 namespace tessal {
 
 namespace {
-
-constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
 std::size_t CountBareLineFeeds(std::string_view text) {
   std::size_t count = 0;
@@ -23,18 +22,22 @@ std::size_t CountBareLineFeeds(std::string_view text) {
 std::string KvfReadableText(std::string bytes) {
   bytes.resize(std::min(bytes.find('\0'), bytes.size()));
   if (bytes.starts_with(kByteOrderMark)) bytes.erase(0, kByteOrderMark.size());
-  const std::size_t bare = CountBareLineFeeds(bytes);
-  if (bare == 0) return bytes;
-  std::string text;
-  text.reserve(bytes.size() + bare);
-  std::string_view rest = bytes;
+  return KvfLineEnds(std::move(bytes));
+}
+
+std::string KvfLineEnds(std::string text) {
+  const std::size_t bare = CountBareLineFeeds(text);
+  if (bare == 0) return text;
+  std::string changed;
+  changed.reserve(text.size() + bare);
+  std::string_view rest = text;
   for (std::size_t feed = rest.find('\n'); feed != std::string_view::npos; feed = rest.find('\n')) {
-    text += rest.substr(0, feed);
-    if (feed == 0 || rest[feed - 1] != '\r') text += '\r';
-    text += '\n';
+    changed += rest.substr(0, feed);
+    if (feed == 0 || rest[feed - 1] != '\r') changed += '\r';
+    changed += '\n';
     rest.remove_prefix(feed + 1);
   }
-  return text += rest;
+  return changed += rest;
 }
 
 bool IsKvfName(std::string_view text) {

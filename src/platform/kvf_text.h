@@ -1,4 +1,4 @@
-// What both readers of key-file text do with the bytes of a file before they read them.
+// What readers of key-file text see of the bytes of a file.
 #pragma once
 
 #include <string>
@@ -6,9 +6,15 @@
 
 namespace tessal {
 
-/// The text up to its first zero byte, without a UTF-8 byte order mark, with each bare line feed as carriage
-/// return and line feed: version control changes line ends, and the layout must survive it.
+/// What a file may begin with to say that it is UTF-8.
+inline constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+
+/// The text up to its first zero byte, without a UTF-8 byte order mark, with the line ends of `KvfLineEnds`.
 std::string KvfReadableText(std::string bytes);
+
+/// A text with each bare line feed as carriage return and line feed: version control changes line ends, and
+/// the layout must survive it.
+std::string KvfLineEnds(std::string text);
 
 /// Whether a text is a name of the format: a letter or underscore, then letters, digits and underscores.
 bool IsKvfName(std::string_view text);

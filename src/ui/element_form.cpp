@@ -274,7 +274,7 @@ void CElementForm::FormToItem() {
     isStale = entered == element->symbol.Text();
     if (isStale) continue;
     // The other fields are not written in this commit.
-    const std::string former = element->symbol.Text();
+    const std::string former = element->symbol.TextOf();
     if (Rename(entered)) RenameInTyped(former, entered);
     ItemToForm();
     return;
@@ -352,7 +352,7 @@ std::vector<TypedValue> CElementForm::TypedValues() const {
     if (!IsTyped(control, property)) continue;
     typed.push_back(
         {[this, &control, &property] { StoreTyped(control, property); },
-         [&property, text = property.Text(), real = property.RealValue(), whole = property.IntValue()] {
+         [&property, text = std::string(property.Text()), real = property.RealValue(), whole = property.IntValue()] {
            property.SetText(text);
            property.SetReal(real);
            property.SetInt(whole);

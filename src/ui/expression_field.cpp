@@ -53,8 +53,9 @@ void CAutoRichEditCtrl::ReportText() {
 
 QString CAutoRichEditCtrl::ParserMessage() const {
   const ScannerRest rest;
-  const ParsedExpression parsed = ParseExpression(FromScreen(ContentText(), content, source.Encoding()));
-  const ParseFailure* failure = parsed.Failure();
+  const std::string text = FromScreen(ContentText(), content, source.Encoding());
+  const auto parsed = ParseExpression(text);
+  const ParseFailure* failure = parsed->Failure();
   return failure == nullptr ? QString() : ToScreen(failure->finding.text).trimmed();
 }
 
@@ -81,7 +82,7 @@ Uid CAutoRichEditCtrl::ElementNamed(const std::string& name) const {
 QString CAutoRichEditCtrl::TipOf(Uid uid) const {
   const CEL_Element* element = source.Core().GetElement(uid);
   if (element == nullptr) return {};
-  return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.Text());
+  return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.TextOf());
 }
 
 bool CAutoRichEditCtrl::event(QEvent* happened) {

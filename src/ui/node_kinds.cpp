@@ -26,11 +26,11 @@ std::unique_ptr<CRightPaneBase> Form(const FormContext& context, QWidget* parent
 }
 
 std::string DescriptionOf(const CEL_Element& element) {
-  return element.description.Text();
+  return element.description.TextOf();
 }
 
 std::string PublicNameOf(const CEL_Element& element) {
-  return "User function '" + static_cast<const CEL_ExternalFunction&>(element).publicName.Text() + "'";
+  return "User function '" + static_cast<const CEL_ExternalFunction&>(element).publicName.TextOf() + "'";
 }
 
 using enum OwnerRule;
@@ -149,7 +149,7 @@ std::string CaptionOfFixedNode(const NodeRow& row) {
 
 std::string ElementCaption(const CEL_Element& element) {
   const NodeRow& row = NodeRowOfElements(element.Kind());
-  return row.captionOf != nullptr ? row.captionOf(element) : element.symbol.Text();
+  return row.captionOf != nullptr ? row.captionOf(element) : element.symbol.TextOf();
 }
 
 std::string MarkedCaption(const CEL_Element& element) {

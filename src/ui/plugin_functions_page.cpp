@@ -13,11 +13,11 @@ namespace {
 std::string CellText(const CEL_ExternalFunction& function, int column) {
   switch (column) {
     case 1:
-      return function.publicName.Text();
+      return function.publicName.TextOf();
     case 2:
-      return function.description.Text();
+      return function.description.TextOf();
     default:
-      return function.dll.Text();
+      return function.dll.TextOf();
   }
 }
 

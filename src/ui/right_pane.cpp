@@ -129,7 +129,7 @@ Answer CRightPaneBase::AskToReplace(const std::string& oldSymbol, const std::str
 
 bool CRightPaneBase::Rename(const std::string& newSymbol) {
   const CEL_Element* element = Element();
-  const std::string oldSymbol = element->symbol.Text();
+  const std::string oldSymbol = element->symbol.TextOf();
   std::string refusal = RenameRefusal(Core(), newSymbol);
   Answer replaces = Answer::Yes;
   if (refusal.empty()) {

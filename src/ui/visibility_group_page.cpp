@@ -238,7 +238,7 @@ void CVisibilityGroupDlg::FillItemTable(CRowTable& table, const std::vector<std:
                if (column == 0) return std::to_string(row.number);
                const SymbolRecord* record = core.FindRecordBySequence(static_cast<std::uint32_t>(row.key));
                if (record == nullptr) return std::string();
-               return column == 1 ? core.RecordSymbol(*record) : record->element->description.Text();
+               return column == 1 ? core.RecordSymbol(*record) : record->element->description.TextOf();
              });
 }
 

@@ -65,7 +65,7 @@ TEST(Editing, ABuiltinTakesItsFieldsAlongAndLocksThem) {
   forcing.builtInId.ApplySelection();
   EXPECT_EQ(forcing.unit.Text(), "()");
   EXPECT_EQ(forcing.defaultValue.RealValue(), -1.0);
-  EXPECT_EQ(forcing.scope.Text() + forcing.spatialVariation.Text(), "WSHORISONTAL");
+  EXPECT_EQ(forcing.scope.TextOf() + forcing.spatialVariation.TextOf(), "WSHORISONTAL");
   EXPECT_FALSE(forcing.isUserSpecified.BoolValue());
   for (const CEL_Property* taken :
        {&forcing.scope, &forcing.spatialVariation, &forcing.unqType, &forcing.unqUnit, &forcing.unit,

@@ -315,7 +315,7 @@ std::string TemplateScript::Offer(const Words& words) {
     notes += "  creates " + request->symbol + ", " +
              std::string(kKinds.at(static_cast<std::size_t>(request->kind))) +
              (specie == nullptr ? ""
-                                : " of " + specie->symbol.Text() + ", " +
+                                : " of " + specie->symbol.TextOf() + ", " +
                                       std::string(core.GetElement(request->ownerId)->KindText())) +
              "\n";
     core.CreateElement(*request);
@@ -399,7 +399,7 @@ std::string TemplateScript::Lookups(const std::string& name) {
   if (core.FindRecordByUid(uid) != core.RecordOfElement(element)) text += ", of two records";
   std::uint32_t sequence = 0;
   if (core.GetSequenceOfUid(uid, sequence)) text += ", number " + std::to_string(sequence);
-  if (element.Parent() != nullptr) text += ", below " + element.Parent()->symbol.Text();
+  if (element.Parent() != nullptr) text += ", below " + element.Parent()->symbol.TextOf();
   if (element.ListHeader() != nullptr) text += ", headed";
   text += ", line " + std::to_string(element.SourceLine()) + (element.Loaded() ? "" : ", not loaded");
   if (core.SymbolExists(name)) text += ", exists";
@@ -410,7 +410,7 @@ std::string TemplateScript::Lookups(const std::string& name) {
   for (const std::string& symbol : symbols) text += " " + symbol;
   std::vector<Uid> uids;
   if (core.GetReferrerUids(uid, uids)) text += " (" + std::to_string(uids.size()) + ")";
-  if (const auto* specie = core.GetParentSpecie(uid)) text += ", list of " + specie->symbol.Text();
+  if (const auto* specie = core.GetParentSpecie(uid)) text += ", list of " + specie->symbol.TextOf();
   std::int32_t id = -1;
   auto found = ElementKind::None;
   text += core.FindElementBySymbol(name, id, found) ? ", by symbol " : ", not by symbol ";
@@ -540,8 +540,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
   using W = const Words&;
   static const std::map<std::string, Operation> kChanges = {
       {"take-over", [](S s, W) { return YesNo(s.core.TakeOverPassedOver()); }},
-      {"add", [](S s, W w) { return AddElement(s.core, KindOf(w.at(0)), s.ClassIn(w, 1)).symbol.Text(); }},
-      {"add-function", [](S s, W) { return s.core.GetMisc()->AddExternalFunction().symbol.Text(); }},
+      {"add", [](S s, W w) { return AddElement(s.core, KindOf(w.at(0)), s.ClassIn(w, 1)).symbol.TextOf(); }},
+      {"add-function", [](S s, W) { return s.core.GetMisc()->AddExternalFunction().symbol.TextOf(); }},
       {"remove-function",
        [](S s, W w) { return YesNo(s.core.GetMisc()->RemoveExternalFunction(Place(w.at(0)))); }},
       {"rebuild", [](S s, W) { return s.core.RebuildSymbolTable(), ""; }},

@@ -83,7 +83,7 @@ TEST(ElementFiles, AnEmptySectionIsReportedAndKeepsTheNumbers) {
   ReadElement(process, path);
   EXPECT_EQ(process.controlValue.RealValue(), 0.8);
   EXPECT_FALSE(process.output.BoolValue()) << "a missing boolean reads as no";
-  EXPECT_EQ(process.scope.Text() + process.expression.Text() + process.symbol.Text(), "");
+  EXPECT_EQ(process.scope.TextOf() + process.expression.TextOf() + process.symbol.TextOf(), "");
   std::string missing;
   for (const ErrorRecord& record : Errors().Records()) {
     EXPECT_EQ(record.level, 3U);

@@ -85,7 +85,7 @@ std::string FieldLine(const ElementField& field) {
 
 template <class Element>
 std::string Listed(Element&& element) {
-  std::string text = std::string(element.KindText()) + " '" + element.symbol.Text() + "'" +
+  std::string text = std::string(element.KindText()) + " '" + element.symbol.TextOf() + "'" +
                      (element.Loaded() ? " loaded" : "") + "\n";
   std::vector<ElementField> fields;
   element.GetFields(fields);

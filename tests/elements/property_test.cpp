@@ -2,8 +2,18 @@
 
 #include <gtest/gtest.h>
 
+#include <string>
+
 namespace tessal {
 namespace {
+
+class CountingHolder final : public PropertyHolder {
+ public:
+  explicit CountingHolder(bool& modified) { SetFlag(&modified); }
+  void OnPropertyChanged(CEL_Property& /*changed*/) override { heard += 'h'; }
+  void OnTableChanged() override { heard += 't'; }
+  std::string heard;
+};
 
 class CountingListener final : public PropertyListener {
  public:
@@ -13,9 +23,10 @@ class CountingListener final : public PropertyListener {
 
 TEST(Property, ChangesKeepTheOldValueAndTellWhoListens) {
   bool modified = false;
+  CountingHolder holder(modified);
   CountingListener listener;
   CEL_Property text(ValueType::Text);
-  text.SetModifiedFlag(&modified);
+  text.BelongTo(holder);
   text.AddListener(listener);
   text.AddListener(listener);
   SetNotifyChanges(true);
@@ -25,6 +36,7 @@ TEST(Property, ChangesKeepTheOldValueAndTellWhoListens) {
   EXPECT_TRUE(modified);
   EXPECT_EQ(listener.calls, 1);
   EXPECT_EQ(text.PrevText(), "");
+  EXPECT_EQ(holder.heard, "") << "nobody has said that it reports to the holder";
   {
     const NotificationsOff silent;
     modified = false;
@@ -36,8 +48,16 @@ TEST(Property, ChangesKeepTheOldValueAndTellWhoListens) {
   EXPECT_EQ(listener.calls, 2);
   EXPECT_EQ(text.PrevText(), "silent");
   text.SetText("");
+  text.ReportTo(ReportsTo::Table);
   text.SetText("again");
   EXPECT_EQ(text.PrevText(), "");
+  text.ReportTo(ReportsTo::Holder);
+  text.StartWithText("of a file");
+  EXPECT_EQ(holder.heard, "t") << "what a file gives is nobody's change";
+  EXPECT_EQ(text.PrevText(), "");
+  text.SetText("last");
+  EXPECT_EQ(holder.heard, "th");
+  EXPECT_EQ(text.PrevText(), "of a file");
   SetNotifyChanges(false);
 }
 

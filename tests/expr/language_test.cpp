@@ -36,7 +36,7 @@ std::string Tokens(const std::string& text) {
 
 /// A tree as nested lists: (kind text child child).
 std::string TreeText(const ExpressionNode& node) {
-  std::string text = "(" + std::to_string(static_cast<int>(node.Kind())) + " " + node.Text();
+  std::string text = "(" + std::to_string(static_cast<int>(node.Kind())) + " " + std::string(node.Text());
   for (std::int32_t slot = 1; slot <= node.ChildCount(); ++slot) {
     EXPECT_EQ(node.Child(slot)->Parent(), &node);
     text += " " + TreeText(*node.Child(slot));
@@ -46,8 +46,8 @@ std::string TreeText(const ExpressionNode& node) {
 
 /// What is made of the tree of a text, or the parser's message.
 std::string OfTree(const std::string& text, const std::function<std::string(const ExpressionNode&)>& make) {
-  const ParsedExpression parsed = ParseExpression(text);
-  return parsed.Failure() != nullptr ? parsed.Failure()->finding.text : make(*parsed.Tree()) + "\n";
+  const auto parsed = ParseExpression(text);
+  return parsed->Failure() != nullptr ? parsed->Failure()->finding.text : make(*parsed->Tree()) + "\n";
 }
 
 std::string Tree(const std::string& text) {
@@ -59,8 +59,8 @@ std::string Walks(const std::string& text) {
   return OfTree(text, [](const ExpressionNode& tree) {
     std::string calls;
     const auto note = [&calls](char sign) {
-      return [&calls, sign](NodeKind, const std::string& nodeText, std::int32_t depth) {
-        calls += sign + nodeText + std::to_string(depth) + ' ';
+      return [&calls, sign](NodeKind, std::string_view nodeText, std::int32_t depth) {
+        calls += sign + std::string(nodeText) + std::to_string(depth) + ' ';
       };
     };
     tree.WalkInOrder(note('<'), note('='), note('>'));
@@ -80,9 +80,18 @@ std::string Findings(const std::string& text) {
   return rows;
 }
 
+/// The identifiers of a text, which are those of its parse, with the same effect on the scanner.
 std::string Identifiers(const std::string& text) {
+  const ScannerStart start = ExpressionScannerStart();
+  std::unique_ptr<const ParsedExpression> held;
+  std::vector<std::string_view> known;
+  IdentifiersOnce(held, StripExpressionQuotes(text), known);
+  const ScannerStart left = ExpressionScannerStart();
+  SetExpressionScannerStart(start);
   std::vector<std::string> identifiers;
   ExtractIdentifiers(text, identifiers);
+  EXPECT_EQ(std::vector<std::string>(known.begin(), known.end()), identifiers) << text;
+  EXPECT_EQ(left, ExpressionScannerStart()) << text;
   std::string rows;
   for (const std::string& each : identifiers) rows += each + "\n";
   return rows;
@@ -238,21 +247,20 @@ TEST_F(Language, DeepNestingIsAMessage) {
 
 TEST_F(Language, LongChainsNeedNoStack) {
   const std::string product = "a" + Repeated("*a", 300'000);
-  const ParsedExpression parsed = ParseExpression(product);
-  const ExpressionNode copy(*parsed.Tree());
-  EXPECT_EQ(RewriteExpressionText(copy), product);
+  const ExpressionTree copy(ParseExpression(product)->Tree());
+  EXPECT_EQ(RewriteExpressionText(copy.Root()), product);
   std::int32_t deepest = 0;
-  copy.WalkPostOrder(
-      {},
-      [&deepest](NodeKind, const std::string&, std::int32_t depth) { deepest = std::max(deepest, depth); },
-      {});
+  copy.Root().WalkPostOrder(
+      nullptr,
+      [&deepest](NodeKind, std::string_view, std::int32_t depth) { deepest = std::max(deepest, depth); },
+      nullptr);
   EXPECT_EQ(deepest, 300'000);
-  EXPECT_FALSE(TreeToMathML(copy, "s", false).empty());
+  EXPECT_FALSE(TreeToMathML(copy.Root(), "s", false).empty());
   EXPECT_EQ(Findings(product), "");
 }
 
 TEST_F(Language, AFailureLeavesTheTreeAlone) {
-  ExpressionNode tree;
+  ExpressionTree tree;
   std::int32_t line = 0;
   std::int32_t position = 0;
   std::string message;
@@ -261,7 +269,7 @@ TEST_F(Language, AFailureLeavesTheTreeAlone) {
   ASSERT_EQ(ParseExpressionText("\n a +", tree, line, position, message), 0);
   EXPECT_EQ(std::tie(line, position, message),
             std::make_tuple(1, 4, "Line 2 position 4 : syntax error, unexpected $end\n"));
-  EXPECT_EQ(TreeText(tree), "(5 + (2 a) (3 1))");
+  EXPECT_EQ(TreeText(tree.Root()), "(5 + (2 a) (3 1))");
 }
 
 TEST_F(Language, AHeldParseIsUsedAgainAsIfItWereParsedAgain) {
@@ -283,33 +291,26 @@ TEST_F(Language, AHeldParseIsUsedAgainAsIfItWereParsedAgain) {
   EXPECT_EQ(ExpressionScannerStart(), ScannerStart::Comment);
 }
 
-TEST_F(Language, ATreeCopiesAndMoves) {
-  ExpressionNode tree = *ParseExpression("f(a, b)").Tree();
-  ExpressionNode copy;
-  copy = tree;
-  const std::string text = TreeText(tree);
-  const ExpressionNode moved = std::move(tree);
-  EXPECT_EQ(TreeText(copy), text);
-  EXPECT_EQ(TreeText(moved), text);
-  EXPECT_EQ(copy.Parent(), nullptr);
+TEST_F(Language, ATreeIsACopyOfItsOwn) {
+  std::string text = "f(a, b - c)";
+  const auto parsed = ParseExpression(text);
+  const std::string nodes = TreeText(*parsed->Tree());
+  ExpressionTree copy(parsed->Tree());
+  text.assign(text.size(), '!');
+  const ExpressionTree moved = std::move(copy);
+  EXPECT_EQ(TreeText(moved.Root()), nodes);
 
-  copy.DeepCopy(nullptr);
-  EXPECT_EQ(TreeText(copy), "(0 )");
-  EXPECT_EQ(TreeText(ExpressionNode()), "(0 unknown)");
-  EXPECT_EQ(RewriteExpressionText(ExpressionNode()), "");
-  const ExpressionNode strange(NodeKind{23}, "strange");
-  EXPECT_EQ(TreeText(ExpressionNode(strange)), "(0 )");
-}
-
-TEST_F(Language, ANodeTakesChildrenInItsSlotsOnly) {
-  ExpressionNode node(NodeKind::Arithmetic, "+", 2);
-  for (const std::int32_t slot : {0, 2, 3}) {
-    node.SetChild(slot, std::make_unique<ExpressionNode>(NodeKind::Number, std::to_string(slot)));
-  }
-  EXPECT_EQ(node.Child(1), nullptr);
-  EXPECT_EQ(node.Child(2)->Text(), "2");
-  node.Release();
-  EXPECT_EQ(node.ChildCount(), 0);
+  ExpressionTree tree(moved.Root().Child(1)->Child(2));
+  EXPECT_EQ(TreeText(tree.Root()), "(5 - (2 b) (2 c))");
+  EXPECT_EQ(tree.Root().Parent(), nullptr);
+  tree.DeepCopy(tree.Root().Child(2));
+  EXPECT_EQ(TreeText(tree.Root()), "(2 c)");
+  tree.DeepCopy(nullptr);
+  EXPECT_EQ(TreeText(tree.Root()), "(0 )");
+  tree.Release();
+  EXPECT_EQ(TreeText(tree.Root()), "(0 unknown)");
+  EXPECT_EQ(RewriteExpressionText(tree.Root()), "");
+  EXPECT_EQ(tree.Root().Child(1), nullptr);
 }
 
 }  // namespace

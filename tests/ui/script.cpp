@@ -418,7 +418,7 @@ void Script::AppendTemplate(std::vector<std::string>& state) {
   for (const SymbolRecord& record : editor->Core().SymbolTable()) elements.push_back(record.element);
   if (editor->Core().GetMisc() != nullptr) elements.push_back(editor->Core().GetMisc());
   for (const CEL_Element* element : elements) {
-    const std::string& name = names.try_emplace(element->GetUid(), element->symbol.Text()).first->second;
+    const std::string& name = names.try_emplace(element->GetUid(), element->symbol.TextOf()).first->second;
     std::vector<ElementField> fields;
     element->GetFields(fields);
     for (const ElementField& field : fields)
