@@ -190,7 +190,7 @@ void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t target) {
 bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
   predecessor = Uid::None;
   const SymbolRecord* record = FindRecordByUid(uid);
-  if (record == nullptr || record->referencedByUids.empty()) return false;
+  if (record == nullptr || record->referencedBy.empty()) return false;
   const ElementKind elementKind = record->element->Kind();
   const bool hasUserOfKind = std::any_of(record->referencedBy.begin(), record->referencedBy.end(),
                                          [this, elementKind](std::uint32_t user) {
@@ -198,7 +198,7 @@ bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
                                          });
   if (!hasUserOfKind) return false;
   // The last user decides the place, whatever its kind; the user of the same kind is only the condition.
-  const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());
+  const SymbolRecord* last = FindRecordByUid(state.table.Used(record->referencedBy.back()).uid);
   if (elementKind == ElementKind::StateVariable || IsOrdered(elementKind)) {
     // A place after the element's own leaves it where it is.
     const std::size_t place = std::min(last->index, record->index);

@@ -1,6 +1,6 @@
-// Loading a template file. The key-file library gives the values that the elements are built from. It also says
-// whether the text keeps to the stricter grammar of the item tree: only where it may not, that reader checks it.
-// Its tree is made when somebody asks for it.
+// Loading a template file. The key-file library gives the values that the elements are built from. It also
+// says whether the text keeps to the stricter grammar of the item tree: only where it may not, that reader
+// checks it. Its tree is made when somebody asks for it.
 #include <exception>
 #include <new>
 
