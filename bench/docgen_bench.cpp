@@ -36,8 +36,7 @@ void Page(benchmark::State& state) {
   TemplateCore core;
   Make(core, state.range(0));
   const std::tm time = {};
-  for ([[maybe_unused]] auto turn : state)
-    benchmark::DoNotOptimize(HtmlDocumentation(core, {}, time).size());
+  for ([[maybe_unused]] auto turn : state) benchmark::DoNotOptimize(HtmlDocumentation(core, {}, time).size());
 }
 
 void Overview(benchmark::State& state) {

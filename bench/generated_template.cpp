@@ -1,9 +1,10 @@
 #include "generated_template.h"
 
-#include <random>
 #include <stdexcept>
+#include <string_view>
 #include <utility>
 
+#include "generated_model.h"
 #include "platform/file_replacement.h"
 
 namespace tessal::bench {
@@ -12,61 +13,46 @@ namespace {
 
 class TemplateWriter final {
  public:
-  explicit TemplateWriter(int elements)
-      : stateVariables(elements * 6 / 100),
-        constants(elements * 30 / 100),
-        forcings(elements * 14 / 100),
-        auxiliaries(elements * 25 / 100),
-        processes(elements * 25 / 100) {}
-
-  /// Nothing but constants.
-  static TemplateWriter OfConstants(int count) {
-    TemplateWriter writer(0);
-    writer.constants = count;
-    return writer;
-  }
+  explicit TemplateWriter(const GeneratedModel& written) : model(written) {}
 
   std::string Text() {
     text = "// Tessal template\r\n\r\n[TESSAL_SETUP]\r\n";
     Head("A generated template");
-    Collection("STATE_VARIABLES", "STATE_VARIABLE_", stateVariables, [this](int place) {
-      Base("S" + std::to_string(place));
+    Collection("STATE_VARIABLES", "STATE_VARIABLE_", model.stateVariables, [this](int place) {
+      Base(kind::kStateVariable, place);
       text += "SCOPE = 'WC'\r\nTRANSPORT = 'ADVECTION_DISPERSION'\r\nUNIT = 'mg/l'\r\n";
       Range();
     });
-    const auto input = [this](const char* prefix) {
-      return [this, prefix](int place) {
-        Base(prefix + std::to_string(place));
+    const auto input = [this](std::string_view kind) {
+      return [this, kind](int place) {
+        Base(kind, place);
         text +=
             "IS_USER_SPECIFIED = 'YES'\r\nBUILT_IN_ID = -1\r\nSCOPE = 'NOT_SPECIFIED'\r\n"
             "SPATIAL_VARIATION = 'NONE'\r\nUNIT = '/d'\r\n";
         Range();
       };
     };
-    Collection("CONSTANTS", "CONSTANT_", constants, input("constant"));
-    Collection("FORCINGS", "FORCING_", forcings, input("forcing"));
-    Collection("AUXILIARY_VARIABLES", "AUXILIARY_VARIABLE_", auxiliaries, [this](int place) {
-      Base("factor" + std::to_string(place));
+    Collection("CONSTANTS", "CONSTANT_", model.constants, input(kind::kConstant));
+    Collection("FORCINGS", "FORCING_", model.forcings, input(kind::kForcing));
+    Collection("AUXILIARY_VARIABLES", "AUXILIARY_VARIABLE_", Count(model.auxiliaries), [this](int place) {
+      Base(kind::kAuxiliary, place);
       text +=
           "OUTPUT = 'YES'\r\nSCOPE = 'NOT_SPECIFIED'\r\nSPATIAL_VARIATION = 'HORISONTAL_AND_VERTICAL'\r\n"
           "UNIT = '-'\r\n";
-      Expression("EXPRESSION", Any("constant", constants) + "*EXP(-" + Any("forcing", forcings) + "/(" +
-                                   Any("constant", constants) + "+1)) + " + Any("factor", place));
+      Expression("EXPRESSION", model.auxiliaries, place);
     });
-    Collection("PROCESSES", "PROCESS_", processes, [this](int place) {
-      Base("rate" + std::to_string(place));
+    Collection("PROCESSES", "PROCESS_", Count(model.processes), [this](int place) {
+      Base(kind::kProcess, place);
       text +=
           "OUTPUT = 'YES'\r\nPROCESS_TYPE = 'TRANSFORMATION'\r\nSCOPE = 'WC'\r\n"
           "SPATIAL_VARIATION = 'HORISONTAL_AND_VERTICAL'\r\nUNIT = 'mg/l/d'\r\n";
-      Expression("EXPRESSION", "IF " + Any("S", stateVariables) + " > 0.5 THEN " +
-                                   Any("factor", auxiliaries) + "*" + Any("constant", constants) + " ELSE " +
-                                   Any("rate", place));
+      Expression("EXPRESSION", model.processes, place);
       text += "CONTROLID = -1\r\nCONTROLVALUE = 0.8\r\n";
     });
     text += "[STATE_VARIABLE_EQUATIONS]\r\n";
-    for (int place = 1; place <= stateVariables; ++place) {
+    for (int place = 1; place <= Count(model.equations); ++place) {
       text += "[STATE_VARIABLE_EQUATION_" + std::to_string(place) + "]\r\n";
-      Expression("S" + std::to_string(place), Any("rate", processes) + " - " + Any("rate", processes));
+      Expression(NameOf(kind::kStateVariable, place), model.equations, place);
       text += "EndSect\r\n\r\n";
     }
     text += "EndSect\r\n\r\nEndSect\r\n\r\n";
@@ -74,11 +60,9 @@ class TemplateWriter final {
   }
 
  private:
-  /// One of the elements declared so far, or a number where there is none.
-  std::string Any(const char* prefix, int count) {
-    if (count < 2) return "1.5";
-    return prefix + std::to_string(1 + random() % static_cast<unsigned>(count - 1));
-  }
+  using Expressions = std::vector<GeneratedExpression>;
+
+  static int Count(const Expressions& expressions) { return static_cast<int>(expressions.size()); }
 
   template <class WriteElement>
   void Collection(const char* name, const char* prefix, int count, WriteElement writeElement) {
@@ -96,58 +80,44 @@ class TemplateWriter final {
     text += "DESCRIPTION = '" + description + "'\r\nONLINE_HELP = ''\r\nDOCUMENTATION = ''\r\n";
   }
 
-  void Base(const std::string& symbol) {
+  void Base(std::string_view kind, int place) {
+    const std::string symbol = NameOf(kind, place);
     text += "SYMBOL = '" + symbol + "'\r\nID = " + std::to_string(++id) + "\r\n";
-    Head("What " + symbol + " means in the model");
+    Head(DescriptionOf(symbol));
     text += "UNQ_TYPE = 999\r\nUNQ_UNIT = 0\r\n";
   }
 
   void Range() { text += "DEFAULT_VALUE = 0.25\r\nMIN_VALUE = 0\r\nMAX_VALUE = 100\r\n"; }
 
-  void Expression(const std::string& keyword, const std::string& expression) {
-    text += keyword + " = '\"" + expression + "\"'\r\n";
+  void Expression(const std::string& keyword, const Expressions& expressions, int place) {
+    const GeneratedExpression& expression = expressions[static_cast<std::size_t>(place - 1)];
+    text += keyword + " = '\"" + Write(expression, kTemplateDialect) + "\"'\r\n";
   }
 
-  int stateVariables;
-  int constants;
-  int forcings;
-  int auxiliaries;
-  int processes;
+  const GeneratedModel& model;
   int id = 0;
   std::string text;
-  std::mt19937 random{1};
 };
 
-}  // namespace
-
-ScratchFolder::ScratchFolder() {
-  std::string pattern = (std::filesystem::temp_directory_path() / "tessal-bench-XXXXXX").string();
-  if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("no scratch folder");
-  path = pattern;
-}
-
-ScratchFolder::~ScratchFolder() {
-  std::error_code ignored;
-  std::filesystem::remove_all(path, ignored);
-}
-
-namespace {
-
-std::string FileOf(const ScratchFolder& folder, const std::string& text) {
+std::string FileOf(const ScratchFolder& folder, const GeneratedModel& model) {
   const std::string path = folder.File("model.tessal");
-  const std::string failure = ReplaceFile(path, text);
+  const std::string failure = ReplaceFile(path, TemplateText(model));
   if (!failure.empty()) throw std::runtime_error(failure);
   return path;
 }
 
 }  // namespace
 
+std::string TemplateText(const GeneratedModel& model) {
+  return TemplateWriter(model).Text();
+}
+
 std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements) {
-  return FileOf(folder, TemplateWriter(static_cast<int>(elements)).Text());
+  return FileOf(folder, GeneratedModel(static_cast<int>(elements)));
 }
 
 std::string FileOfConstants(const ScratchFolder& folder, int count) {
-  return FileOf(folder, TemplateWriter::OfConstants(count).Text());
+  return FileOf(folder, GeneratedModel::OfConstants(count));
 }
 
 }  // namespace tessal::bench

@@ -1,29 +1,19 @@
-// Files of generated templates for the benchmarks.
+// The generated model as a template, and files of it.
 #pragma once
 
 #include <cstdint>
-#include <filesystem>
 #include <string>
+
+#include "scratch_folder.h"
 
 namespace tessal::bench {
 
-/// A folder for the files of a run, removed with the object.
-class ScratchFolder final {
- public:
-  ScratchFolder();
-  ScratchFolder(const ScratchFolder&) = delete;
-  ScratchFolder& operator=(const ScratchFolder&) = delete;
-  ~ScratchFolder();
+struct GeneratedModel;
 
-  std::string File(const std::string& name) const { return (path / name).string(); }
+/// The text of a template file of the model.
+std::string TemplateText(const GeneratedModel& model);
 
- private:
-  std::filesystem::path path;
-};
-
-/// Writes a template file of about that many elements and returns its path: of 100 elements 6 are state
-/// variables, 30 constants, 14 forcings, 25 auxiliaries and 25 processes, whose expressions use four symbols
-/// each.
+/// Writes the template of a model of about that many elements and returns its path.
 std::string FileOfSize(const ScratchFolder& folder, std::int64_t elements);
 
 /// The same of a template that has constants alone.

@@ -51,10 +51,11 @@ function(tessal_test name)
 endfunction()
 
 # tessal_benchmark(NAME SOURCES... LIBRARIES...)
+# A program of benchmarks with the common main; one that has its own is an executable as any other.
 function(tessal_benchmark name)
   cmake_parse_arguments(ARG "" "" "SOURCES;LIBRARIES" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})
-  target_link_libraries(${name} PRIVATE tessal_options ${ARG_LIBRARIES} benchmark::benchmark benchmark::benchmark_main)
+  target_link_libraries(${name} PRIVATE tessal_options ${ARG_LIBRARIES} benchmark::benchmark tessal_bench_main)
 endfunction()
 
 # tessal_fuzzer(NAME SOURCES... LIBRARIES...)

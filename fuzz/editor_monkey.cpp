@@ -59,7 +59,7 @@ std::string TableText(const TemplateCore& core) {
   std::ostringstream text;
   for (const SymbolRecord& record : core.SymbolTable()) {
     text << record.sequence << ' ' << core.RecordSymbol(record) << ' ' << NumberOf(record.uid) << ' '
-         << (record.element->HasExpression() ? record.text : std::string()) << ':';
+         << (record.expression != nullptr ? record.expression->TextOf() : std::string()) << ':';
     for (const std::uint32_t used : record.references) text << ' ' << used;
     text << " by";
     for (const std::uint32_t user : record.referencedBy) text << ' ' << user;

@@ -99,7 +99,7 @@ State StateOf(TemplateCore& core) {
   state.text = core.CopyText(reason).value_or(reason);
   state.symbols = SymbolsOf(core);
   for (const SymbolRecord& record : core.SymbolTable()) {
-    state.references.push_back(record.references);
+    state.references.emplace_back(record.references.begin(), record.references.end());
     record.element->ForEachExpression([&state](const PropertyRow&, const CEL_Property& property) {
       state.expressions.push_back(property.TextOf());
     });

@@ -1,4 +1,6 @@
 #include <nlohmann/json.hpp>
+#include <span>
+#include <vector>
 
 #include "cli/commands.h"
 #include "cli/template_files.h"
@@ -11,6 +13,10 @@ namespace {
 
 using Json = nlohmann::ordered_json;
 
+Json ListOf(std::span<const std::uint32_t> sequences) {
+  return std::vector<std::uint32_t>(sequences.begin(), sequences.end());
+}
+
 Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
   return {{"sequence", record.sequence},
           {"symbol", JsonText(core.RecordSymbol(record))},
@@ -20,9 +26,9 @@ Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
           {"spatial", record.spatial},
           {"index", record.index},
           {"specie", record.specieIndex},
-          {"text", JsonText(record.text)},
-          {"references", record.references},
-          {"referencedBy", record.referencedBy}};
+          {"text", JsonText(RecordText(record))},
+          {"references", ListOf(record.references)},
+          {"referencedBy", ListOf(record.referencedBy)}};
 }
 
 }  // namespace
@@ -39,7 +45,7 @@ ExitCode RunSymbols(const std::string& file, Format format) {
   }
   for (const SymbolRecord& record : core.SymbolTable()) {
     PrintLine(std::to_string(record.sequence) + '\t' + OnOneLine(core.RecordSymbol(record)) + '\t' +
-              std::string(record.element->KindText()) + '\t' + OnOneLine(record.text));
+              std::string(record.element->KindText()) + '\t' + OnOneLine(RecordText(record)));
   }
   return kFine;
 }

@@ -59,7 +59,8 @@ void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, std::stri
   element.symbol.SetText(symbol);
   element.description.SetText(symbol + " Description");
   element.onlineHelp.SetText(symbol + " Online help");
-  element.documentation.SetText(documentation.empty() ? symbol + " Documentation" : std::string(documentation));
+  element.documentation.SetText(documentation.empty() ? symbol + " Documentation"
+                                                      : std::string(documentation));
 }
 
 }  // namespace

@@ -8,14 +8,17 @@ namespace tessal {
 
 bool CheckRecordOrder(const SymbolTable& table, const SymbolRecord& record) {
   const CEL_Element& user = *record.element;
+  const bool isEquation = record.kind == ElementKind::StateVariable;
   bool good = true;
   for (const std::uint32_t sequence : record.references) {
-    const CEL_Element& used = *table.Used(sequence).element;
-    if (user.Kind() == ElementKind::StateVariable) {
-      if (used.Kind() == ElementKind::Process) continue;
+    const SymbolRecord& usedRecord = table.Used(sequence);
+    const bool isFine = isEquation ? usedRecord.kind == ElementKind::Process
+                                   : sequence <= static_cast<std::uint32_t>(user.id.IntValue());
+    if (isFine) continue;
+    const CEL_Element& used = *usedRecord.element;
+    if (isEquation) {
       Errors().Report(RecordSymbol(record), user.GetUid(), {"not-a-process", {used.symbol.Text()}});
     } else {
-      if (sequence <= static_cast<std::uint32_t>(user.id.IntValue())) continue;
       const std::string symbol = RecordSymbol(record);
       Errors().Report(symbol, user.GetUid(), {"order-violated", {used.symbol.Text(), symbol}});
     }
@@ -28,7 +31,7 @@ bool CheckDeclarationOrder(const SymbolTable& table) {
   bool good = true;
   for (const SymbolRecord& record : table.Records()) {
     // The classes check the order of their members themselves.
-    if (record.element->Kind() >= ElementKind::Specie || !record.element->HasExpression()) continue;
+    if (record.kind >= ElementKind::Specie || record.expression == nullptr) continue;
     good = CheckRecordOrder(table, record) && good;
   }
   return good;

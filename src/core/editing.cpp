@@ -1,6 +1,5 @@
 // Adding, deleting and moving elements. Each ends in a rebuild of the symbol table.
 #include <algorithm>
-#include <type_traits>
 
 #include "core/search_functions.h"
 #include "core/template_core.h"
@@ -45,25 +44,13 @@ bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operat
 
 template <class Element>
 Element& TemplateCore::Add(const Collection<Element>& row) {
-  auto& elements = state.collections.*row.elements;
-  auto element = std::make_unique<Element>(
-      FirstFreeName(row.symbolPrefix, elements.size() + 1,
-                    [this](const std::string& symbol) { return SymbolExists(symbol); }));
-  if constexpr (std::is_same_v<Element, CEL_Lagrange_Specie>) {
-    element->SetIndex(static_cast<std::int32_t>(elements.size() + 1));
-    Adopt(*element, state.root);
-    element->AddMember(ElementKind::HorizontalVector);
-  } else {
-    Adopt(*element, ListHead(row.listKind));
-  }
-  element->documentation.SetText(state.root.documentation.Text());
-  if constexpr (std::is_base_of_v<CEL_Input, Element>) {
-    element->RebuildBuiltInChoices(state.flags.showAllBuiltIns);
-  }
-  elements.push_back(std::move(element));
+  const std::size_t number = (Elements().*row.elements).size() + 1;
+  Element& element =
+      AppendElement(row, FirstFreeName(row.symbolPrefix, number,
+                                       [this](const std::string& symbol) { return SymbolExists(symbol); }));
+  element.documentation.SetText(state.root.documentation.Text());
   RebuildSymbolTable();
-  state.flags.modified = true;
-  return *elements.back();
+  return element;
 }
 
 CEL_Element* TemplateCore::AddElement(ElementKind kind) {
@@ -190,7 +177,7 @@ void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t target) {
 bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
   predecessor = Uid::None;
   const SymbolRecord* record = FindRecordByUid(uid);
-  if (record == nullptr || record->referencedByUids.empty()) return false;
+  if (record == nullptr || record->referencedBy.empty()) return false;
   const ElementKind elementKind = record->element->Kind();
   const bool hasUserOfKind = std::any_of(record->referencedBy.begin(), record->referencedBy.end(),
                                          [this, elementKind](std::uint32_t user) {
@@ -198,7 +185,7 @@ bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
                                          });
   if (!hasUserOfKind) return false;
   // The last user decides the place, whatever its kind; the user of the same kind is only the condition.
-  const SymbolRecord* last = FindRecordByUid(record->referencedByUids.back());
+  const SymbolRecord* last = FindRecordByUid(state.table.Used(record->referencedBy.back()).uid);
   if (elementKind == ElementKind::StateVariable || IsOrdered(elementKind)) {
     // A place after the element's own leaves it where it is.
     const std::size_t place = std::min(last->index, record->index);

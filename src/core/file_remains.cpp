@@ -108,6 +108,7 @@ void NoteComments(KvfHandle file, KvfNode target, LoadAccount& account) {
 }
 
 void NoteSharedSymbols(const TemplateState& state, LoadAccount& account) {
+  if (!state.table.HasSharedSymbols()) return;
   std::unordered_map<std::string_view, int> uses;
   state.table.ForEachElement([&uses, &account](const SymbolRecord& record) {
     const CEL_Element& element = *record.element;

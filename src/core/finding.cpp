@@ -57,13 +57,13 @@ bool TemplateCore::IsSymbolTakenByOther(Uid uid, std::string_view symbol) const 
 
 bool TemplateCore::IsReferenced(Uid uid) const {
   const SymbolRecord* record = FindRecordByUid(uid);
-  return record != nullptr && !record->referencedByUids.empty();
+  return record != nullptr && !record->referencedBy.empty();
 }
 
 bool TemplateCore::GetReferrerUids(Uid uid, std::vector<Uid>& uids) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
-  uids = record->referencedByUids;
+  uids = state.table.UidsOf(record->referencedBy);
   return true;
 }
 
@@ -108,7 +108,7 @@ std::vector<const CEL_Element*> TemplateCore::ReferencedElements(const CEL_Eleme
   std::vector<const CEL_Element*> elements;
   const SymbolRecord* record = RecordOfElement(element);
   if (record == nullptr) return elements;
-  std::vector<std::uint32_t> numbers = record->references;
+  std::vector<std::uint32_t> numbers(record->references.begin(), record->references.end());
   const SymbolRecord* next = FindRecordBySequence(record->sequence + 1);
   if (next != nullptr && next->element == &element) {
     std::unordered_set<std::uint32_t> known(numbers.begin(), numbers.end());

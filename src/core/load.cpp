@@ -1,15 +1,17 @@
-// Loading a template file. The key-file library gives the values that the elements are built from. It also says
-// whether the text keeps to the stricter grammar of the item tree: only where it may not, that reader checks it.
-// Its tree is made when somebody asks for it.
+// Loading a template file. The key-file library gives the values that the elements are built from. It also
+// says whether the text keeps to the stricter grammar of the item tree: only where it may not, that reader
+// checks it. Its tree is made when somebody asks for it.
 #include <exception>
 #include <new>
 
 #include "core/error_registry.h"
 #include "core/file_remains.h"
+#include "core/search_functions.h"
 #include "core/template_core.h"
 #include "core/visibility_groups.h"
 #include "elements/list_section.h"
 #include "elements/property_io.h"
+#include "expr/scanner.h"
 #include "keyfile/keywords.h"
 #include "keyfile/reader.h"
 #include "platform/file_replacement.h"
@@ -100,6 +102,8 @@ class Reading final {
   /// Whether the numbers of all elements are among those of the records; one that is not gets the last of
   /// them.
   bool CheckIdRange();
+  /// A rebuild more, where it may find something else than the one after the sections.
+  void RebuildUnlessSettled();
   bool ReadSections(KvfHandle file, int targetNumber);
   void ReadSettings(KvfNode target, ReadStatus& status);
   template <class Element>
@@ -108,6 +112,7 @@ class Reading final {
 
   TemplateCore& core;
   TemplateState& state;
+  bool isSettled = false;
 };
 
 bool Reading::ReadFile(const std::string& path) {
@@ -152,7 +157,10 @@ bool Reading::ReadSections(KvfHandle file, int targetNumber) {
     WithCollection(ElementKind::Specie,
                    [this, target, &status](const auto& row) { ReadCollection(row, target, status); });
   }
+  const ScannerStart start = ExpressionScannerStart();
   core.RebuildSymbolTable();
+  // An open comment reaches the next rebuild's texts, and a search may find by its number what has it now.
+  isSettled = ExpressionScannerStart() == start && !HasSearchFunction(state.collections);
   if (state.hasMisc) VisibilityGroups(state).TakeRecordNumbers();
   state.keptText = kvfTextBeside(file, target);
   NoteWhatNobodyRead(file, target, state);
@@ -172,7 +180,7 @@ void Reading::ReadCollection(const Collection<Element>& row, KvfNode target, Rea
   CEL_Element* head = row.HasHead() ? &state.ListHead(row.listKind) : nullptr;
   if (head != nullptr) status.NoteAbsentSection(target, row.section);
   ReadList(target, row.section, head, status,
-           [this, &row]() -> CEL_Element& { return *core.AddElement(row.kind); });
+           [this, &row]() -> CEL_Element& { return core.AppendElement(row, ""); });
 }
 
 void Reading::ReadTemplateEquations(KvfNode target, ReadStatus& status) {
@@ -202,13 +210,19 @@ bool Reading::CheckIdRange() {
   return good;
 }
 
+void Reading::RebuildUnlessSettled() {
+  const bool isInRange = CheckIdRange();
+  if (isInRange && isSettled) return;
+  if (!isInRange) state.AssignIds();
+  core.RebuildSymbolTable();
+}
+
 bool Reading::Load(const std::string& path) {
   const NotificationsOff silent;
   try {
     core.Clear();
     if (!ReadFile(path)) return false;
-    if (!CheckIdRange()) state.AssignIds();
-    core.RebuildSymbolTable();
+    RebuildUnlessSettled();
     state.SettleSpatialTree();
     state.flags.strictScopeRule ? core.CheckScopeRule() : core.CheckProcessRule();
     core.ParseAllExpressions();

@@ -13,7 +13,7 @@ namespace {
 /// What does not vary in space uses nothing that does; what varies horizontally in the water column uses
 /// nothing of the water column that varies in all three dimensions.
 std::optional<Message> ScopeRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
-  if (user.element->Kind() >= ElementKind::Specie) return std::nullopt;
+  if (user.kind >= ElementKind::Specie) return std::nullopt;
   const bool bothInColumn = user.scope == Scope::WaterColumn && used.scope == Scope::WaterColumn;
   constexpr Message kViolated = "scope-violated";
   const bool violated =
@@ -28,8 +28,8 @@ std::optional<Message> ProcessRuleViolation(const SymbolRecord& user, const Symb
   constexpr std::optional<Message> kAllowed;
   constexpr Message kNoProcess = "no-process-by-rule";
   constexpr Message kInvalidScope = "scope-violated-by-rule";
-  const ElementKind userKind = user.element->Kind();
-  const ElementKind usedKind = used.element->Kind();
+  const ElementKind userKind = user.kind;
+  const ElementKind usedKind = used.kind;
   if (userKind == ElementKind::StateVariable) return usedKind == ElementKind::Process ? kAllowed : kNoProcess;
   if (userKind != ElementKind::Auxiliary && userKind != ElementKind::Process) return kAllowed;
   switch (usedKind) {

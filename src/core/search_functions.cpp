@@ -14,11 +14,6 @@ namespace {
 constexpr std::string_view kLostName = "unkown";
 constexpr std::string_view kUnresolvedName = "unknown";
 
-bool HasSearchFunction(const Sequence<CEL_Lagrange_Specie>& species) {
-  return std::any_of(species.begin(), species.end(),
-                     [](const auto& specie) { return !specie->spatialFunctions.empty(); });
-}
-
 /// Numbered choices that many properties share, and where the choice of a number is among them.
 class NumberChoices final {
  public:
@@ -130,8 +125,13 @@ void ForgetSpecie(const Collections& collections, std::int32_t number) {
   });
 }
 
+bool HasSearchFunction(const Collections& collections) {
+  return std::any_of(collections.species.begin(), collections.species.end(),
+                     [](const auto& specie) { return !specie->spatialFunctions.empty(); });
+}
+
 void ResolveReferencesToNames(const Collections& collections) {
-  if (!HasSearchFunction(collections.species)) return;
+  if (!HasSearchFunction(collections)) return;
   std::unordered_map<std::int32_t, const CEL_Element*> byId;
   ForEachNamedElement(collections,
                       [&byId](const CEL_Element& element) { byId.emplace(element.id.IntValue(), &element); });
@@ -143,7 +143,7 @@ void ResolveReferencesToNames(const Collections& collections) {
 }
 
 void ResolveNamesToReferences(const Collections& collections) {
-  if (!HasSearchFunction(collections.species)) return;
+  if (!HasSearchFunction(collections)) return;
   std::unordered_map<std::string_view, const CEL_Element*> byName;
   ForEachNamedElement(collections, [&byName](const CEL_Element& element) {
     byName.emplace(element.symbol.Text(), &element);

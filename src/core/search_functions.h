@@ -8,6 +8,8 @@ namespace tessal {
 
 struct Collections;
 
+bool HasSearchFunction(const Collections& collections);
+
 /// Notes the name of each search's variable, before a renumbering.
 void ResolveReferencesToNames(const Collections& collections);
 /// Finds the number of each search's variable by its name again.

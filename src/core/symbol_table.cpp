@@ -20,9 +20,26 @@ std::string RecordSymbol(const SymbolRecord& record) {
   return record.element->FullSymbol();
 }
 
+std::string RecordText(const SymbolRecord& record) {
+  return record.expression != nullptr ? record.expression->TextOf() : record.element->RecordText();
+}
+
 void SymbolTable::Clear() {
   records.clear();
+  uses.clear();
+  users.clear();
+  names.Clear();
   undefined.clear();
+}
+
+std::vector<Uid> SymbolTable::UidsOf(std::span<const std::uint32_t> sequences) const {
+  std::vector<Uid> uids;
+  for (const std::uint32_t sequence : sequences) {
+    // The records of a movement lie side by side.
+    const Uid uid = Used(sequence).uid;
+    if (uids.empty() || uids.back() != uid) uids.push_back(uid);
+  }
+  return uids;
 }
 
 const SymbolRecord* SymbolTable::BySequence(std::uint32_t sequence) const {

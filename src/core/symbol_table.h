@@ -1,15 +1,18 @@
 // The flat symbol table of a template: a record for each element in the order of the file, who uses whom, and
 // the names in use that mean nothing. A rebuild makes it again, never patches it, in time proportional
-// to the template.
+// to the template; only the numbers of names stay from one rebuild to the next.
 #pragma once
 
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "core/name_table.h"
+#include "elements/element_kind.h"
 #include "keyfile/water_body.h"
 #include "platform/uid.h"
 
@@ -17,26 +20,26 @@ namespace tessal {
 
 class CEL_Element;
 class CEL_Miscanellous;
+class CEL_Property;
 struct Collections;
 
 /// One slot of the symbol table. A horizontal movement takes two: its direction, then its speed.
 struct SymbolRecord {
   std::uint32_t sequence = 0;  ///< 1-based place in the table, the element's `ID` after a rebuild
+  Uid uid = Uid::None;         ///< the element's identity
+  CEL_Element* element = nullptr;
+  const CEL_Property* expression = nullptr;  ///< none for an element without one
+  ElementKind kind = ElementKind::None;
+  std::uint32_t index = 0;        ///< place of the element in its own sequence, from 0
+  std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
   /// Both mean something for the template's own collections only; the records of particle classes carry on
   /// those of the record before them.
   Scope scope = Scope::Global;
   SpatialVariation spatial = SpatialVariation::None;
-  std::size_t index = 0;          ///< place of the element in its own sequence, from 0
-  std::int32_t specieIndex = -1;  ///< index of the owning particle class from 0; -1 for kinds 1 to 6
-  std::string text;               ///< the expression, or the number of an input as text
-  /// The records that the expression uses and those that use this one: by sequence number and, in parallel,
-  /// by identity. Each entry is there once, in the order of first use.
-  std::vector<std::uint32_t> references;
-  std::vector<std::uint32_t> referencedBy;
-  std::vector<Uid> referenceUids;
-  std::vector<Uid> referencedByUids;
-  CEL_Element* element = nullptr;
-  Uid uid = Uid::None;  ///< the element's identity
+  /// The records that the expression uses and those that use this one, by sequence number, each once. They
+  /// lie in the table: those used in the order of first use, the users in the order of the table.
+  std::span<const std::uint32_t> references;
+  std::span<const std::uint32_t> referencedBy;
 };
 
 /// A name that expressions use and nobody has defined.
@@ -49,6 +52,9 @@ struct UndefinedSymbol {
 
 /// The symbol of a record: the element's, composed with the class's for movements.
 std::string RecordSymbol(const SymbolRecord& record);
+
+/// The expression of a record, the number of an input as text, or the name that a search looks for.
+std::string RecordText(const SymbolRecord& record);
 
 class SymbolTable final {
  public:
@@ -71,6 +77,10 @@ class SymbolTable final {
   const SymbolRecord* BySymbol(std::string_view symbol) const;
   /// The record that a use names; its number must be one of the table's.
   const SymbolRecord& Used(std::uint32_t sequence) const { return records[sequence - 1]; }
+  /// Whether several elements have the same symbol.
+  bool HasSharedSymbols() const { return hasSharedSymbols; }
+  /// The identities behind sequence numbers. The two records of a movement give one.
+  std::vector<Uid> UidsOf(std::span<const std::uint32_t> sequences) const;
 
   /// Calls the visitor with each element that has a record, once: the two records of a movement are side by
   /// side.
@@ -84,7 +94,7 @@ class SymbolTable final {
   }
   /// The same for the records of the given numbers, in their order.
   template <class Visitor>
-  void ForEachElement(const std::vector<std::uint32_t>& sequences, Visitor visit) const {
+  void ForEachElement(std::span<const std::uint32_t> sequences, Visitor visit) const {
     const CEL_Element* previous = nullptr;
     for (const std::uint32_t sequence : sequences) {
       const SymbolRecord& record = Used(sequence);
@@ -97,6 +107,10 @@ class SymbolTable final {
   class RebuildSteps;
 
   std::vector<SymbolRecord> records;
+  std::vector<std::uint32_t> uses;   ///< of all records, one after the other
+  std::vector<std::uint32_t> users;  ///< the same
+  NameTable names;
+  bool hasSharedSymbols = false;
   std::vector<std::unique_ptr<UndefinedSymbol>> undefined;
 };
 

@@ -3,33 +3,38 @@
 #include <algorithm>
 #include <array>
 #include <numeric>
+#include <span>
 #include <unordered_map>
 #include <unordered_set>
 #include <utility>
 
 #include "core/collections.h"
 #include "core/search_functions.h"
-#include "core/symbol_index.h"
 #include "core/symbol_table.h"
 #include "elements/miscellaneous.h"
 #include "expr/identifiers.h"
+#include "expr/parser.h"
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
 
 namespace tessal {
 
-/// One rebuild: what it works on, and what it looks names up in.
+/// One rebuild: what it works on, and what it knows of names.
 class SymbolTable::RebuildSteps final {
  public:
-  RebuildSteps(SymbolTable& table, const Collections& all, const CEL_Miscanellous& misc)
-      : records(table.records), undefined(table.undefined), collections(all), settings(misc) {}
+  RebuildSteps(SymbolTable& rebuilt, const Collections& all, const CEL_Miscanellous& misc)
+      : table(rebuilt),
+        records(rebuilt.records),
+        undefined(rebuilt.undefined),
+        collections(all),
+        settings(misc) {}
 
   void Run() {
     MarkUndefinedStale();
     ResolveReferencesToNames(collections);
+    records.clear();
     NumberTemplateElements();
     NumberParticleElements();
-    records.resize(count);
     ExtractReferences();
     BuildReverseReferences();
     ClassifyArithmeticExpressions();
@@ -38,27 +43,37 @@ class SymbolTable::RebuildSteps final {
   }
 
  private:
+  /// What a name means: 0 before anybody asked, the number of its record, or one of the two kinds after them.
+  using Meaning = std::uint32_t;
+  Meaning DefinedElsewhere() const { return static_cast<Meaning>(records.size() + 1); }
+  Meaning FirstUndefined() const { return static_cast<Meaning>(records.size() + 2); }
+
   void MarkUndefinedStale();
   SymbolRecord& Append(CEL_Element& element, std::size_t index, std::int32_t specieIndex,
-                       std::string_view text);
+                       const CEL_Property* expression);
   SymbolRecord& AppendElement(CEL_Element& element, std::size_t index, std::int32_t specieIndex);
   void NumberTemplateElements();
   void NumberParticleElements();
+  NameNumber NameOf(const SymbolRecord& record);
+  void GiveNamesToRecords();
   void ExtractReferences();
-  void ExtractRecordReferences(SymbolRecord& record, SymbolIndex& symbols);
-  void Refer(SymbolRecord& record, std::string_view name, SymbolIndex& symbols);
-  void NoteUndefined(std::string_view name, Uid uid);
+  void ExtractRecordReferences(const SymbolRecord& record);
+  void ReferToIdentifiers(const SymbolRecord& record);
+  void Refer(const SymbolRecord& record, NameNumber name);
+  Meaning MeaningOf(NameNumber name);
+  Meaning MeaningOfUnknown(std::string_view name);
   bool CountsAsDefined(std::string_view name) const;
   void BuildReverseReferences();
   void ClassifyArithmeticExpressions();
 
+  SymbolTable& table;
   std::vector<SymbolRecord>& records;
   std::vector<std::unique_ptr<UndefinedSymbol>>& undefined;
   const Collections& collections;
   const CEL_Miscanellous& settings;
-  std::size_t count = 0;  ///< records made so far
-  std::vector<const CEL_Property*> expressions;
-  std::unordered_map<std::string_view, UndefinedSymbol*> undefinedByName;
+  std::vector<Meaning> meanings;  ///< by the numbers of names
+  /// The undefined symbols of the rebuilds before this one.
+  std::unordered_map<std::string_view, std::size_t> undefinedByName;
   /// For each record the last one that was noted to use it: an expression's second use of a symbol adds
   /// nothing.
   std::vector<std::uint32_t> lastUser;
@@ -77,52 +92,67 @@ void SymbolTable::RebuildSteps::MarkUndefinedStale() {
 }
 
 SymbolRecord& SymbolTable::RebuildSteps::Append(CEL_Element& element, std::size_t index,
-                                                std::int32_t specieIndex, std::string_view text) {
-  // A record is made in the place of the one before the rebuild, whose buffers it takes over.
-  if (count == records.size()) records.emplace_back();
-  SymbolRecord& record = records[count];
-  const SymbolRecord* before = count == 0 ? nullptr : &records[count - 1];
-  ++count;
-  record.sequence = static_cast<std::uint32_t>(count);
-  record.scope = before == nullptr ? Scope::Global : before->scope;
-  record.spatial = before == nullptr ? SpatialVariation::None : before->spatial;
-  record.index = index;
-  record.specieIndex = specieIndex;
-  record.text = text;
-  for (auto* list : {&record.references, &record.referencedBy}) list->clear();
-  for (auto* list : {&record.referenceUids, &record.referencedByUids}) list->clear();
-  record.element = &element;
+                                                std::int32_t specieIndex, const CEL_Property* expression) {
+  SymbolRecord record;
+  record.sequence = static_cast<std::uint32_t>(records.size() + 1);
   record.uid = element.GetUid();
-  element.id.SetInt(static_cast<std::int32_t>(record.sequence));
-  return record;
+  record.element = &element;
+  record.expression = expression;
+  record.kind = element.Kind();
+  record.index = static_cast<std::uint32_t>(index);
+  record.specieIndex = specieIndex;
+  if (!records.empty()) {
+    record.scope = records.back().scope;
+    record.spatial = records.back().spatial;
+  }
+  element.Renumber(static_cast<std::int32_t>(record.sequence));
+  return records.emplace_back(record);
 }
 
 /// Appends a record for each expression of the element, or one without; the last one appended.
 SymbolRecord& SymbolTable::RebuildSteps::AppendElement(CEL_Element& element, std::size_t index,
                                                        std::int32_t specieIndex) {
-  expressions.clear();
-  element.ForEachExpression(
-      [this](const PropertyRow&, const CEL_Property& expression) { expressions.push_back(&expression); });
-  if (expressions.empty()) return Append(element, index, specieIndex, element.RecordText());
+  const auto rows = element.ExpressionRows();
+  if (rows.empty()) return Append(element, index, specieIndex, nullptr);
   // Against the order of the file: a movement's direction is numbered before its speed.
-  for (std::size_t left = expressions.size(); left > 1; --left) {
-    Append(element, index, specieIndex, expressions[left - 1]->Text());
+  for (std::size_t left = rows.size(); left > 1; --left) {
+    Append(element, index, specieIndex, &(element.*rows[left - 1].place));
   }
-  return Append(element, index, specieIndex, expressions.front()->Text());
+  return Append(element, index, specieIndex, &(element.*rows.front().place));
 }
+
+namespace {
+
+/// What is known of an element, its place in the water body among it.
+template <class Element>
+const ElementFacts& WithPlace(Element& element) {
+  ElementFacts& facts = element.Facts();
+  if (facts.knowsPlace) return facts;
+  facts.scope = ScopeFromText(element.scope.Text());
+  if constexpr (requires { element.spatialVariation; }) {
+    facts.spatial = SpatialFromText(element.spatialVariation.Text());
+  } else {
+    facts.spatial = SpatialFromScope(facts.scope);
+  }
+  facts.knowsPlace = true;
+  return facts;
+}
+
+bool IsMovement(ElementKind kind) {
+  return kind == ElementKind::HorizontalVector || kind == ElementKind::VerticalEquation;
+}
+
+}  // namespace
 
 void SymbolTable::RebuildSteps::NumberTemplateElements() {
   ForEachHeadedCollection([this](const auto& row) {
     std::size_t index = 0;
     for (const auto& element : collections.*row.elements) {
       if constexpr (requires { element->scope; }) {
+        const ElementFacts& place = WithPlace(*element);
         SymbolRecord& record = AppendElement(*element, index++, -1);
-        record.scope = ScopeFromText(element->scope.Text());
-        if constexpr (requires { element->spatialVariation; }) {
-          record.spatial = SpatialFromText(element->spatialVariation.Text());
-        } else {
-          record.spatial = SpatialFromScope(record.scope);
-        }
+        record.scope = place.scope;
+        record.spatial = place.spatial;
       }
     }
   });
@@ -148,37 +178,113 @@ void SymbolTable::RebuildSteps::NumberParticleElements() {
   }
 }
 
-void SymbolTable::RebuildSteps::ExtractReferences() {
-  SymbolIndex symbols(records.size());
-  lastUser.assign(records.size() + 1, 0);
+NameNumber SymbolTable::RebuildSteps::NameOf(const SymbolRecord& record) {
+  // A class is renamed without its movements, whose names begin with its.
+  if (IsMovement(record.kind)) return table.names.NumberOf(record.element->FullSymbol());
+  ElementFacts& facts = record.element->Facts();
+  if (facts.symbolName == 0) facts.symbolName = table.names.NumberOf(record.element->symbol.Text());
+  return facts.symbolName;
+}
+
+/// Of equal names the first record has the meaning.
+void SymbolTable::RebuildSteps::GiveNamesToRecords() {
+  table.hasSharedSymbols = false;
   for (const SymbolRecord& record : records) {
-    record.element->AppendFullSymbol(symbols.NextName());
-    symbols.AddNext(record.uid);
+    const NameNumber name = NameOf(record);
+    if (name >= meanings.size()) meanings.resize(name + 1 + records.size());
+    if (meanings[name] == 0) {
+      meanings[name] = record.sequence;
+    } else {
+      // The records of a movement share theirs, and lie side by side.
+      const bool isOther = records[meanings[name] - 1].element != record.element;
+      table.hasSharedSymbols = table.hasSharedSymbols || isOther;
+    }
   }
-  for (const auto& name : undefined) undefinedByName.emplace(name->symbol, name.get());
-  for (SymbolRecord& record : records) ExtractRecordReferences(record, symbols);
 }
 
-void SymbolTable::RebuildSteps::ExtractRecordReferences(SymbolRecord& record, SymbolIndex& symbols) {
-  if (record.element->Kind() == ElementKind::SpatialFunction) {
+void SymbolTable::RebuildSteps::ExtractReferences() {
+  meanings.assign(table.names.End() + records.size(), 0);
+  GiveNamesToRecords();
+  lastUser.assign(records.size() + 1, 0);
+  for (std::size_t place = 0; place < undefined.size(); ++place) {
+    undefinedByName.emplace(undefined[place]->symbol, place);
+  }
+  // The lists move while they grow: the records get their parts of them at the end.
+  std::vector<std::size_t> ends{0};
+  ends.reserve(records.size() + 1);
+  table.uses.clear();
+  for (const SymbolRecord& record : records) {
+    ExtractRecordReferences(record);
+    ends.push_back(table.uses.size());
+  }
+  const std::span<const std::uint32_t> uses(table.uses);
+  for (std::size_t place = 0; place < records.size(); ++place) {
+    records[place].references = uses.subspan(ends[place], ends[place + 1] - ends[place]);
+  }
+}
+
+void SymbolTable::RebuildSteps::ExtractRecordReferences(const SymbolRecord& record) {
+  if (record.kind == ElementKind::SpatialFunction) {
     const auto& function = static_cast<const CEL_Lagrange_Spatial_Function&>(*record.element);
-    if (function.variableId.IntValue() >= 1) Refer(record, function.VariableName(), symbols);
-    return;
+    if (function.variableId.IntValue() >= 1) Refer(record, table.names.NumberOf(function.VariableName()));
+  } else if (record.expression != nullptr) {
+    ReferToIdentifiers(record);
   }
-  if (!record.element->HasExpression()) return;
-  ScanIdentifiers(StripExpressionQuotes(record.text), identifiers);
-  for (const std::string_view name : identifiers) Refer(record, name, symbols);
 }
 
-void SymbolTable::RebuildSteps::Refer(SymbolRecord& record, std::string_view name, SymbolIndex& symbols) {
-  const std::uint32_t used = symbols.Find(name);
-  if (used == 0) {
-    NoteUndefined(name, record.uid);
+void SymbolTable::RebuildSteps::ReferToIdentifiers(const SymbolRecord& record) {
+  const ScannerStart start = ExpressionScannerStart();
+  const ParsedExpression& parsed = record.expression->Parsed();
+  const std::string_view text = StripExpressionQuotes(record.expression->Text());
+  if (!parsed.KnowsIdentifiers()) {
+    // What the parse left unread counts too, and decides where the next scan starts.
+    SetExpressionScannerStart(start);
+    ScanIdentifiers(text, identifiers);
+    for (const std::string_view name : identifiers) Refer(record, table.names.NumberOf(name));
     return;
   }
-  if (std::exchange(lastUser[used], record.sequence) == record.sequence) return;
-  record.references.push_back(used);
-  record.referenceUids.push_back(symbols.UidOf(used));
+  const auto spans = parsed.Identifiers();
+  const auto numbers = parsed.NameNumbers();
+  for (std::size_t place = 0; place < spans.size(); ++place) {
+    if (numbers[place] == 0) {
+      numbers[place] = table.names.NumberOf(text.substr(spans[place].start, spans[place].length));
+    }
+    Refer(record, numbers[place]);
+  }
+}
+
+void SymbolTable::RebuildSteps::Refer(const SymbolRecord& record, NameNumber name) {
+  const Meaning meaning = MeaningOf(name);
+  if (meaning == DefinedElsewhere()) return;
+  if (meaning >= FirstUndefined()) {
+    UndefinedSymbol& entry = *undefined[meaning - FirstUndefined()];
+    // The uses of one element come one after the other, so a repeat can only be the last entry.
+    if (entry.usedBy.empty() || entry.usedBy.back() != record.uid) entry.usedBy.push_back(record.uid);
+    return;
+  }
+  if (std::exchange(lastUser[meaning], record.sequence) == record.sequence) return;
+  table.uses.push_back(meaning);
+}
+
+SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOf(NameNumber name) {
+  if (name >= meanings.size()) meanings.resize(name + 1 + meanings.size());
+  if (meanings[name] == 0) meanings[name] = MeaningOfUnknown(table.names.NameOf(name));
+  return meanings[name];
+}
+
+/// Of a name that no record has.
+SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOfUnknown(std::string_view name) {
+  // One that was undefined may have become a reserved one since: a user function has taken it.
+  if (CountsAsDefined(name)) return DefinedElsewhere();
+  const auto known = undefinedByName.find(name);
+  if (known != undefinedByName.end()) {
+    undefined[known->second]->stale = false;
+    return FirstUndefined() + static_cast<Meaning>(known->second);
+  }
+  auto added = std::make_unique<UndefinedSymbol>();
+  added->symbol = name;
+  undefined.push_back(std::move(added));
+  return FirstUndefined() + static_cast<Meaning>(undefined.size() - 1);
 }
 
 bool SymbolTable::RebuildSteps::CountsAsDefined(std::string_view name) const {
@@ -188,50 +294,20 @@ bool SymbolTable::RebuildSteps::CountsAsDefined(std::string_view name) const {
                      [name](const auto& function) { return function->publicName.Text() == name; });
 }
 
-void SymbolTable::RebuildSteps::NoteUndefined(std::string_view name, Uid uid) {
-  const auto known = undefinedByName.find(name);
-  if (known == undefinedByName.end()) {
-    if (CountsAsDefined(name)) return;
-    auto added = std::make_unique<UndefinedSymbol>();
-    added->symbol = name;
-    added->usedBy.push_back(uid);
-    undefinedByName.emplace(added->symbol, added.get());
-    undefined.push_back(std::move(added));
-    return;
-  }
-  UndefinedSymbol& entry = *known->second;
-  // A name may have become a reserved one since the last rebuild: a user function has taken it.
-  if (entry.stale && CountsAsDefined(name)) return;
-  entry.stale = false;
-  // The uses of one element come one after the other, so a repeat can only be the last entry.
-  if (entry.usedBy.empty() || entry.usedBy.back() != uid) entry.usedBy.push_back(uid);
-}
-
 void SymbolTable::RebuildSteps::BuildReverseReferences() {
-  // The uses are sorted by the symbol used in lists of plain numbers before they go to the records: in a
-  // large template a step from record to record is expensive.
-  std::vector<Uid> uids(1, Uid::None);
-  std::vector<std::size_t> ends(records.size() + 2, 0);  // of a symbol's uses in the list, by sequence
-  for (const SymbolRecord& user : records) {
-    uids.push_back(user.uid);
-    for (const std::uint32_t sequence : user.references) ++ends[sequence + 1];
-  }
+  // The uses are sorted by the symbol used: counted first, then put in their places.
+  std::vector<std::uint32_t> ends(records.size() + 2, 0);  // of a symbol's uses in the list, by sequence
+  for (const std::uint32_t used : table.uses) ++ends[used + 1];
   std::partial_sum(ends.begin(), ends.end(), ends.begin());
-  std::vector<std::uint32_t> users(ends.back());
+  table.users.resize(table.uses.size());
   for (const SymbolRecord& user : records) {
-    for (const std::uint32_t sequence : user.references) users[ends[sequence]++] = user.sequence;
+    for (const std::uint32_t used : user.references) table.users[ends[used]++] = user.sequence;
   }
-  auto use = users.cbegin();
+  const std::span<const std::uint32_t> users(table.users);
+  std::size_t start = 0;
   for (SymbolRecord& used : records) {
-    const auto end = users.cbegin() + static_cast<std::ptrdiff_t>(ends[used.sequence]);
-    used.referencedBy.assign(use, end);
-    for (; use != end; ++use) {
-      // The two records of a movement share an identity and lie side by side.
-      const Uid uid = uids[*use];
-      if (used.referencedByUids.empty() || used.referencedByUids.back() != uid) {
-        used.referencedByUids.push_back(uid);
-      }
-    }
+    used.referencedBy = users.subspan(start, ends[used.sequence] - start);
+    start = ends[used.sequence];
   }
 }
 

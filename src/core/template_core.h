@@ -9,6 +9,8 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
+#include <utility>
 #include <vector>
 
 #include "core/collections.h"
@@ -135,6 +137,10 @@ class TemplateCore final : public ElementOwner {
   CEL_Lagrange_Specie& AddSpecie();
   /// Makes an element of a collection with a symbol that is not in use; none for a kind without a collection.
   CEL_Element* AddElement(ElementKind kind);
+  /// Makes an element with a symbol at the end of a collection, and leaves the table as it is: for a load,
+  /// which reads the symbol afterwards.
+  template <class Element>
+  Element& AppendElement(const Collection<Element>& collection, std::string_view symbol);
   bool CanDelete(Uid uid) const;
   /// Deletes an element that nobody uses. One that is refused has left its visibility groups all the same.
   bool DeleteElement(Uid uid);
@@ -246,5 +252,25 @@ class TemplateCore final : public ElementOwner {
 
   TemplateState state;
 };
+
+template <class Element>
+Element& TemplateCore::AppendElement(const Collection<Element>& row, std::string_view symbol) {
+  auto& elements = state.collections.*row.elements;
+  auto owned = std::make_unique<Element>(symbol);
+  Element& element = *owned;
+  if constexpr (std::is_same_v<Element, CEL_Lagrange_Specie>) {
+    element.SetIndex(static_cast<std::int32_t>(elements.size() + 1));
+    Adopt(element, state.root);
+    element.AddMember(ElementKind::HorizontalVector);
+  } else {
+    Adopt(element, ListHead(row.listKind));
+  }
+  if constexpr (std::is_base_of_v<CEL_Input, Element>) {
+    if (state.flags.showAllBuiltIns) element.RebuildBuiltInChoices(true);
+  }
+  elements.push_back(std::move(owned));
+  state.flags.modified = true;
+  return element;
+}
 
 }  // namespace tessal

@@ -5,16 +5,39 @@
 #include "core/scope_rule.h"
 #include "core/template_core.h"
 #include "elements/element_checks.h"
+#include "expr/scanner.h"
+#include "expr/user_function_names.h"
 
 namespace tessal {
 
 namespace {
 
+/// Whether what a check finds depends on the element and the names of user functions alone.
+bool IsCheckedAlone(ElementKind kind) {
+  return kind != ElementKind::Specie && kind != ElementKind::SpatialFunction;
+}
+
+/// Checks an element, unless a check of it as it is has found nothing. Checks that start in a comment, or
+/// leave one open for the next, are always made.
+bool CheckElement(CEL_Element& element) {
+  const auto isAtRest = [] { return ExpressionScannerStart() == ScannerStart::Text; };
+  const bool startsAtRest = isAtRest();
+  const std::uint32_t names = UserFunctionNamesVersion();
+  if (startsAtRest && element.Facts().cleanSince == names) return true;
+  const std::size_t messages = Errors().Records().size();
+  const bool good = element.Check();
+  const bool foundNothing = good && Errors().Records().size() == messages;
+  if (foundNothing && startsAtRest && isAtRest() && IsCheckedAlone(element.Kind())) {
+    element.Facts().cleanSince = names;
+  }
+  return good;
+}
+
 /// Runs one check of each element of a sequence; the result of all together.
 template <class Elements>
 bool CheckAll(const Elements& elements) {
   bool good = true;
-  for (const auto& element : elements) good = element->Check() && good;
+  for (const auto& element : elements) good = CheckElement(*element) && good;
   return good;
 }
 
@@ -29,7 +52,7 @@ bool CheckSpecie(CEL_Lagrange_Specie& specie) {
   bool good = specie.Check();
   specie.ForEachMember([&good](CEL_Element& member) {
     // The forcings of a class stay unchecked, unlike those of the template.
-    if (member.Kind() != ElementKind::SpecieForcing) good = member.Check() && good;
+    if (member.Kind() != ElementKind::SpecieForcing) good = CheckElement(member) && good;
   });
   return good;
 }

@@ -375,6 +375,14 @@ std::string CEL_Element::FullSymbol() const {
   return text;
 }
 
+void CEL_Element::Renumber(std::int32_t number) {
+  if (id.IntValue() == number) return;
+  const ElementFacts known = Facts();
+  id.SetInt(number);
+  facts = known;
+  facts.asOf = Changes();
+}
+
 void CEL_Element::RebuildOwner() {
   if (owner != nullptr) owner->RebuildSymbolTable();
 }

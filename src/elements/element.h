@@ -14,6 +14,7 @@
 #include "elements/element_field.h"
 #include "elements/element_kind.h"
 #include "elements/property.h"
+#include "keyfile/water_body.h"
 #include "platform/kvf2004.h"
 #include "platform/uid.h"
 
@@ -75,7 +76,38 @@ constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
 /// Which unit data an element has in the file.
 enum class UnitMode : std::uint8_t { None = 0, Type = 1, Unit = 2, Both = 3 };
 
+/// What passes over a template have found out about an element, and need not find out again before one of its
+/// properties changes.
+struct ElementFacts {
+  std::uint32_t asOf = 0;        ///< the number of changes then
+  std::uint32_t symbolName = 0;  ///< the number of its symbol among the template's names; 0 before it has one
+  std::uint32_t cleanSince =
+      0;  ///< the user function names with which a check found nothing; 0 before one did
+  bool knowsPlace = false;
+  Scope scope = Scope::Global;
+  SpatialVariation spatial = SpatialVariation::None;
+};
+
 class CEL_Element : public PropertyHolder {
+  // First, side by side: every pass over a template looks at it.
+  bool hasDescription;
+  bool hasSymbol;
+  bool hasId;
+  bool loaded = false;
+  // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
+  std::uint8_t firstExpression = 0;
+  std::uint8_t expressions = 0;
+  UnitMode unitMode = UnitMode::None;
+  Uid uid;
+  ElementKind elementKind = ElementKind::None;
+  int sourceLine = 0;
+  CEL_Element* listHeader = nullptr;
+  CEL_Element* parent = nullptr;
+  ElementOwner* owner = nullptr;
+  ElementFacts facts;
+  std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
+  std::span<const PropertyRow> rows;
+
  public:
   /// A list head or the root: the flags say what it reads and writes.
   CEL_Element(bool withSymbol, bool withId, bool withDescription);
@@ -156,6 +188,14 @@ class CEL_Element : public PropertyHolder {
   /// Has the template, if there is one, bring its symbol table up to date.
   void RebuildOwner();
 
+  /// What is known of the element as it is.
+  ElementFacts& Facts() {
+    if (facts.asOf != Changes()) facts = {.asOf = Changes()};
+    return facts;
+  }
+  /// A new number among the elements, which changes nothing that is known.
+  void Renumber(std::int32_t number);
+
   /// Whether the element was read from a file or shown in a form.
   bool Loaded() const { return loaded; }
   void SetLoaded(bool value) { loaded = value; }
@@ -213,24 +253,6 @@ class CEL_Element : public PropertyHolder {
   bool LeavesUnitOpen(const UnitTypes& types) const;
   /// What a new scope does to the spatial variation. The caller brings the symbol table up to date.
   void ApplyScope(const CEL_Property& scope, CEL_Property& spatialVariation);
-
- private:
-  bool hasDescription;
-  bool hasSymbol;
-  bool hasId;
-  bool loaded = false;
-  // The expressions are rows side by side. A rebuild asks every element for them, and searches for none.
-  std::uint8_t firstExpression = 0;
-  std::uint8_t expressions = 0;
-  UnitMode unitMode = UnitMode::None;
-  Uid uid;
-  ElementKind elementKind = ElementKind::None;
-  int sourceLine = 0;
-  CEL_Element* listHeader = nullptr;
-  CEL_Element* parent = nullptr;
-  ElementOwner* owner = nullptr;
-  std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
-  std::span<const PropertyRow> rows;
 };
 
 /// A list head or the root: an element that carries the descriptive texts of a collection.

@@ -72,7 +72,8 @@ CEL_Input::CEL_Input(const InputKind& inputKind, std::string_view caption)
   ListenTo({&symbol, &builtInId, &spatialVariation, &unqType, &unqUnit});
   // The scope of an input that a modeller chooses leaves the variation alone.
   scope.ReportTo(ReportsTo::Table);
-  CEL_Input::Reset();
+  RebuildBuiltInChoices(false);
+  CEL_Input::UpdateLocks();
 }
 
 CEL_Constant::CEL_Constant(std::string_view caption) : CEL_Input(kConstantKind, caption) {}
@@ -103,7 +104,7 @@ void CEL_Input::RebuildBuiltInChoices(bool withDeprecated) {
   } else {
     builtInId.SetChoices(BuiltinChoices(input, withDeprecated, inUse));
   }
-  SelectPresentValues();
+  builtInId.SelectIndex(builtInId.PresentChoice());
 }
 
 std::string CEL_Input::RecordText() const {

@@ -72,8 +72,11 @@ class PropertyHolder : public PropertyListener {
   /// A property that reports to the symbol table only has changed.
   virtual void OnTableChanged() = 0;
   void MarkModified() {
+    ++changes;
     if (modifiedFlag != nullptr) *modifiedFlag = true;
   }
+  /// How often one of the properties has changed.
+  std::uint32_t Changes() const { return changes; }
 
  protected:
   PropertyHolder() = default;
@@ -82,6 +85,7 @@ class PropertyHolder : public PropertyListener {
 
  private:
   bool* modifiedFlag = nullptr;
+  std::uint32_t changes = 0;
 };
 
 /// Whom a property reports its changes to beside its listeners: nobody, the symbol table of the template, or

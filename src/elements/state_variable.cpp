@@ -40,7 +40,7 @@ CEL_StateVariable::CEL_StateVariable(std::string_view caption) : CEL_Element(cap
   OfferUnitTypes(kStateVariableUnitTypes);
   Bind(kRows);
   ListenTo({&symbol, &scope, &unqType, &unqUnit, &equation});
-  CEL_StateVariable::Reset();
+  CEL_StateVariable::UpdateLocks();
 }
 
 void CEL_StateVariable::Reset() {

@@ -12,6 +12,7 @@ namespace {
 struct Names {
   std::list<std::string> list;
   std::unordered_map<std::string_view, std::list<std::string>::iterator> places;
+  std::uint32_t version = 1;
   std::map<std::string, int> claims;  ///< how many declarations claim a name
 };
 
@@ -29,6 +30,7 @@ const std::list<std::string>& UserFunctionNames() {
 bool RegisterUserFunctionName(std::string_view name) {
   if (IsUserFunctionName(name)) return false;
   Names& names = TheNames();
+  ++names.version;
   names.list.emplace_back(name);
   names.places.emplace(names.list.back(), std::prev(names.list.end()));
   return true;
@@ -38,6 +40,7 @@ void UnregisterUserFunctionName(std::string_view name) {
   Names& names = TheNames();
   const auto hit = names.places.find(name);
   if (hit == names.places.end()) return;
+  ++names.version;
   const auto place = hit->second;
   names.places.erase(hit);
   names.list.erase(place);
@@ -47,7 +50,12 @@ bool IsUserFunctionName(std::string_view name) {
   return TheNames().places.contains(name);
 }
 
+std::uint32_t UserFunctionNamesVersion() {
+  return TheNames().version;
+}
+
 void ResetUserFunctionNames() {
+  ++TheNames().version;
   TheNames().places.clear();
   TheNames().list.clear();
   TheNames().claims.clear();

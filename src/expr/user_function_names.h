@@ -2,6 +2,7 @@
 // of the process, in the order of registration, each name once.
 #pragma once
 
+#include <cstdint>
 #include <list>
 #include <string>
 #include <string_view>
@@ -14,6 +15,9 @@ const std::list<std::string>& UserFunctionNames();
 bool RegisterUserFunctionName(std::string_view name);
 void UnregisterUserFunctionName(std::string_view name);
 bool IsUserFunctionName(std::string_view name);
+
+/// A number for the names as they are now, from 1: whenever it is the same, so are the names.
+std::uint32_t UserFunctionNamesVersion();
 
 /// Empties the list, for tests.
 void ResetUserFunctionNames();

@@ -7,7 +7,7 @@
 
 namespace tessal {
 
-enum class Scope : std::int32_t {
+enum class Scope : std::uint8_t {
   Global = 0,
   WaterSurface = 1,
   WaterBottom = 2,
@@ -16,7 +16,7 @@ enum class Scope : std::int32_t {
   None = 5  ///< any other text
 };
 
-enum class SpatialVariation : std::int32_t {
+enum class SpatialVariation : std::uint8_t {
   None = 0,
   Horizontal = 1,
   HorizontalAndVertical = 2,

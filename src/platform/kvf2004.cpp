@@ -29,6 +29,9 @@ using KvfFile = std::variant<std::unique_ptr<KvfImage>, std::unique_ptr<KvfWrite
 struct Library {
   std::map<KvfHandle, KvfFile> files;
   KvfHandle lastHandle = 0;
+  /// The file that was asked for last: a save writes a million items into one.
+  KvfHandle lastAsked = 0;
+  KvfFile* lastFound = nullptr;
   int lastError = kKvfOk;
   KvfSyntaxError syntaxError;
   std::string writeFailure;
@@ -47,9 +50,14 @@ int Note(int error) {
 /// The file of a handle, as an image or a writer; none for another handle.
 template <class File>
 File* FileOf(KvfHandle handle) {
-  auto& files = TheLibrary().files;
-  const auto hit = files.find(handle);
-  const auto* file = hit == files.end() ? nullptr : std::get_if<std::unique_ptr<File>>(&hit->second);
+  Library& library = TheLibrary();
+  if (handle != library.lastAsked || library.lastFound == nullptr) {
+    const auto hit = library.files.find(handle);
+    library.lastAsked = handle;
+    library.lastFound = hit == library.files.end() ? nullptr : &hit->second;
+  }
+  auto* const file =
+      library.lastFound == nullptr ? nullptr : std::get_if<std::unique_ptr<File>>(library.lastFound);
   if (file != nullptr) return file->get();
   Note(kKvfBadHandle);
   return nullptr;
@@ -92,10 +100,7 @@ KvfNode NodeAt(KvfImage& image, std::uint32_t place) {
 
 /// The n-th of a section's keywords or sub-sections that has a name.
 KvfNode NthOfName(KvfImage& image, std::uint32_t section, Type type, std::string_view name, int number) {
-  return NodeAt(image, FindEntry(image, section, [&image, type, name, &number](std::uint32_t entry) {
-                  return image.At(entry).ItemType() == type && EqualIgnoringCase(image.TextAt(entry), name) &&
-                         --number == 0;
-                }));
+  return NodeAt(image, image.FindName(section, type, name, number));
 }
 
 /// The first section from an entry on, before the end.
@@ -211,6 +216,7 @@ KvfHandle kvfCreate() {
 
 void kvfClose(KvfHandle* handle) {
   if (handle == nullptr || *handle == 0) return;
+  TheLibrary().lastFound = nullptr;
   if (TheLibrary().files.erase(*handle) == 0) Note(kKvfBadHandle);
   *handle = 0;
 }

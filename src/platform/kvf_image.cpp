@@ -85,18 +85,17 @@ int KvfImage::LineAt(std::uint32_t place) const {
   return line + static_cast<int>(std::count(between.begin(), between.end(), '\n'));
 }
 
-std::uint32_t KvfImage::ParameterCount(std::uint32_t keyword) const {
-  const std::uint32_t count = row[keyword].Detail();
-  return count < KvfCell::kManyParameters ? count : row[keyword + 1].One();
-}
-
-std::uint32_t KvfImage::FirstParameter(std::uint32_t keyword) const {
-  return row[keyword].Detail() < KvfCell::kManyParameters ? keyword + 1 : keyword + 2;
-}
-
-std::uint32_t KvfImage::NextEntry(std::uint32_t entry) const {
-  if (row[entry].ItemType() == KvfCell::Type::Section) return EndOfSection(entry);
-  return FirstParameter(entry) + ParameterCount(entry);
+std::uint32_t KvfImage::FindName(std::uint32_t section, KvfCell::Type type, std::string_view name,
+                                 int number) const {
+  // An element asks its section once for each of its keywords: most names differ in size.
+  const auto size = static_cast<std::uint32_t>(std::min<std::size_t>(name.size(), KvfCell::kLongSize));
+  const std::uint32_t end = EndOfSection(section);
+  for (std::uint32_t entry = FirstEntry(section); entry < end; entry = NextEntry(entry)) {
+    const KvfCell& cell = row[entry];
+    if (cell.Size() != size || cell.ItemType() != type) continue;
+    if (EqualIgnoringCase(TextAt(entry), name) && --number == 0) return entry;
+  }
+  return 0;
 }
 
 std::string KvfTextBeside(const KvfImage& image, std::uint32_t section) {

@@ -100,14 +100,26 @@ class KvfImage final {
   /// The line of a section or keyword, from 1.
   int LineAt(std::uint32_t place) const;
   /// How many parameters a keyword has, and where the first of them is.
-  std::uint32_t ParameterCount(std::uint32_t keyword) const;
-  std::uint32_t FirstParameter(std::uint32_t keyword) const;
+  std::uint32_t ParameterCount(std::uint32_t keyword) const {
+    const std::uint32_t count = row[keyword].Detail();
+    return count < KvfCell::kManyParameters ? count : row[keyword + 1].One();
+  }
+  std::uint32_t FirstParameter(std::uint32_t keyword) const {
+    return keyword + (row[keyword].Detail() < KvfCell::kManyParameters ? 1 : 2);
+  }
   /// The first section or keyword of a section, and the one after another. At the end both give the section's
   /// end.
   static std::uint32_t FirstEntry(std::uint32_t section) { return section + kSectionCells; }
-  std::uint32_t NextEntry(std::uint32_t entry) const;
+  std::uint32_t NextEntry(std::uint32_t entry) const {
+    return row[entry].ItemType() == KvfCell::Type::Section ? EndOfSection(entry)
+                                                           : FirstParameter(entry) + ParameterCount(entry);
+  }
   std::uint32_t EndOfSection(std::uint32_t section) const { return row[section + 2].One(); }
   std::uint32_t SubSectionCount(std::uint32_t section) const { return row[section + 1].One(); }
+
+  /// The n-th of a section's keywords or sub-sections that has a name, whatever the case of its letters; 0
+  /// for none.
+  std::uint32_t FindName(std::uint32_t section, KvfCell::Type type, std::string_view name, int number) const;
 
   std::shared_ptr<const std::string> source;
   std::size_t bytesCut = 0;  ///< after a zero byte, which ends the text

@@ -72,6 +72,10 @@ void KvfWriter::BeginValue() {
 }
 
 void KvfWriter::AppendText(std::string_view value) {
+  if (value.find('\n') == std::string_view::npos && value.find('\r') == std::string_view::npos) {
+    text += value;
+    return;
+  }
   while (true) {
     const std::size_t next = value.find_first_of(kLineEnd);
     text += value.substr(0, next);

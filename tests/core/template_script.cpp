@@ -188,7 +188,7 @@ std::string TemplateScript::Table() const {
   };
   std::string text;
   for (const SymbolRecord& record : core.SymbolTable()) {
-    const auto symbols = [this](const std::vector<std::uint32_t>& sequences) {
+    const auto symbols = [this](std::span<const std::uint32_t> sequences) {
       std::vector<std::string> names(sequences.size());
       std::transform(sequences.begin(), sequences.end(), names.begin(), [this](std::uint32_t sequence) {
         return core.RecordSymbol(*core.FindRecordBySequence(sequence));
@@ -205,16 +205,15 @@ std::string TemplateScript::Table() const {
             std::string(element.KindText()) + " " + std::to_string(record.index);
     if (record.specieIndex >= 0) text += " of class " + std::to_string(record.specieIndex);
     text += ", scope " + std::to_string(static_cast<int>(record.scope)) + ", spatial " +
-            std::to_string(static_cast<int>(record.spatial)) + ", \"" + record.text + "\"";
+            std::to_string(static_cast<int>(record.spatial)) + ", \"" + RecordText(record) + "\"";
     if (element.id.IntValue() != static_cast<std::int32_t>(record.sequence))
       text += ", id " + element.id.TextOf();
     if (record.uid != element.GetUid()) text += ", of another identity";
     text += listed("uses", symbols(record.references)) + listed("used by", symbols(record.referencedBy));
-    if (symbols(record.references) != bySymbols(record.referenceUids)) {
-      text += listed("uses elements", bySymbols(record.referenceUids));
-    }
-    if (symbols(record.referencedBy) != bySymbols(record.referencedByUids)) {
-      text += listed("used by elements", bySymbols(record.referencedByUids));
+    std::vector<Uid> users;
+    core.GetReferrerUids(record.uid, users);
+    if (symbols(record.referencedBy) != bySymbols(users)) {
+      text += listed("used by elements", bySymbols(users));
     }
     for (const auto& [group, level] : element.Visibility())
       text += "  in " + std::to_string(group) + "/" + std::to_string(level);
