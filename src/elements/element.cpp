@@ -40,38 +40,33 @@ constexpr std::array<BaseRow, 7> kBaseRows = {{
     {"UNQ Unit", &CEL_Element::unqUnit},
 }};
 
-/// Gives a fresh property the value of its row.
-void StartWithDefault(CEL_Property& property, const PropertyRow& row) {
-  switch (row.type) {
-    case ValueType::Real:
-      property.StartWith(row.defaultNumber);
-      break;
-    case ValueType::Integer:
-      property.StartWith(static_cast<std::int32_t>(row.defaultNumber));
-      break;
-    case ValueType::Boolean:
-      property.StartWith(row.defaultText == kYes);
-      break;
-    default:
-      property.StartWithText(row.defaultText.empty() ? std::string_view("") : row.defaultText);
-      break;
-  }
-}
+/// The value that a row gives a fresh property, and the same as a change of the present one.
+struct Starting {
+  CEL_Property& property;
+  void operator()(double value) const { property.StartWith(value); }
+  void operator()(std::int32_t value) const { property.StartWith(value); }
+  void operator()(bool value) const { property.StartWith(value); }
+  void operator()(std::string_view value) const { property.StartWithText(value); }
+};
+struct Setting {
+  CEL_Property& property;
+  void operator()(double value) const { property.SetReal(value); }
+  void operator()(std::int32_t value) const { property.SetInt(value); }
+  void operator()(bool value) const { property.SetBool(value); }
+  void operator()(std::string_view value) const { property.SetText(value); }
+};
 
-void SetDefault(CEL_Property& property, const PropertyRow& row) {
+template <class Give>
+void GiveDefault(const PropertyRow& row, Give give) {
   switch (row.type) {
     case ValueType::Real:
-      property.SetReal(row.defaultNumber);
-      break;
+      return give(row.defaultNumber);
     case ValueType::Integer:
-      property.SetInt(static_cast<std::int32_t>(row.defaultNumber));
-      break;
+      return give(static_cast<std::int32_t>(row.defaultNumber));
     case ValueType::Boolean:
-      property.SetBool(row.defaultText == kYes);
-      break;
+      return give(row.defaultText == kYes);
     default:
-      property.SetText(row.defaultText);
-      break;
+      return give(row.defaultText);
   }
 }
 
@@ -140,7 +135,7 @@ void CEL_Element::Bind(std::span<const PropertyRow> classRows) {
     assert(property.Type() == row.type);
     property.BelongTo(*this);
     if (row.choices != nullptr) property.OfferStanding(row.choices());
-    StartWithDefault(property, row);
+    GiveDefault(row, Starting{property});
     if (row.type != ValueType::Expression) continue;
     const auto place = static_cast<std::uint8_t>(&row - rows.data());
     assert(!HasExpression() || firstExpression + expressions == place);
@@ -155,7 +150,7 @@ void CEL_Element::ListenTo(std::initializer_list<CEL_Property*> properties) {
 }
 
 void CEL_Element::ResetOwn() {
-  for (const PropertyRow& row : rows) SetDefault(this->*row.place, row);
+  for (const PropertyRow& row : rows) GiveDefault(row, Setting{this->*row.place});
   SelectPresentValues();
 }
 

@@ -170,7 +170,7 @@ void CEL_Property::StartWith(bool truth) {
 void CEL_Property::StartWithText(std::string_view lasting) {
   if (lasting == Text()) {
     // The same text may be about to go from where it was.
-    value.text = lasting.data();
+    PointTo(lasting);
     return;
   }
   PointTo(lasting);
@@ -179,7 +179,7 @@ void CEL_Property::StartWithText(std::string_view lasting) {
 }
 
 void CEL_Property::PointTo(std::string_view lasting) {
-  value.text = lasting.data();
+  value.text = lasting.empty() ? "" : lasting.data();
   textSize = static_cast<std::uint32_t>(lasting.size());
   parsed.reset();
 }

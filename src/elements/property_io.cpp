@@ -44,9 +44,7 @@ class RawText final {
   std::string_view Text() const { return value.text; }
   /// Gives a property a piece of the text.
   void GiveTo(CEL_Property& property, std::string_view piece) const {
-    if (piece.empty()) {
-      property.StartWithText("");
-    } else if (value.isLasting) {
+    if (value.isLasting || piece.empty()) {
       property.StartWithText(piece);
     } else {
       property.SetText(piece);
