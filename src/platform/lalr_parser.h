@@ -1,0 +1,198 @@
+// The shift-reduce parser of a grammar: the loop over the tables that Bison makes of it by lalr_tables.m4. It
+// behaves as LALR(1) tables with default reductions do, in what it accepts, in where it fails, and in its
+// words.
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <iterator>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace tessal {
+
+namespace lalr {
+
+constexpr std::size_t kMostStates = 10'000;
+constexpr int kErrorToken = 1;
+
+/// What a state does with a token, or does whatever comes: an error, a shift to the state of that number, or
+/// the reduction of the rule of the rest.
+using Action = std::uint8_t;
+constexpr Action kError = 0;
+
+template <class Grammar>
+constexpr Action Reduction(int rule) {
+  static_assert(Grammar::kStateCount + Grammar::kRuleCount <= 256, "an action is a byte");
+  return static_cast<Action>(Grammar::kStateCount + rule);
+}
+
+/// The automaton with its compressed rows spread out, so that each step is one look.
+template <class Grammar>
+struct Automaton {
+  std::array<std::array<Action, Grammar::kTokenCount>, Grammar::kStateCount> actions;
+  /// The reductions that need no look at the next token; an error where there is none.
+  std::array<Action, Grammar::kStateCount> blindActions;
+  /// The state after the reduction to a symbol, from the state below it.
+  std::array<std::array<std::uint8_t, Grammar::kSymbolCount>, Grammar::kStateCount> nextStates;
+};
+
+/// The entry of a row for a token; an error where the default of the state applies.
+template <class Grammar>
+constexpr int Entry(int state, int token) {
+  const int place = Grammar::kTable_pact[state] + token;
+  if (place < 0 || place >= static_cast<int>(std::size(Grammar::kTable_table))) return Grammar::kErrorEntry;
+  return Grammar::kTable_check[place] == token ? Grammar::kTable_table[place] : Grammar::kErrorEntry;
+}
+
+template <class Grammar>
+constexpr bool IsBlind(int state) {
+  return Grammar::kTable_pact[state] == Grammar::kNoRow;
+}
+
+template <class Grammar>
+constexpr Action ActionOf(int state, int token) {
+  const int entry = IsBlind<Grammar>(state) ? Grammar::kErrorEntry : Entry<Grammar>(state, token);
+  if (entry > 0) return static_cast<Action>(entry);
+  if (entry < 0 && entry != Grammar::kErrorEntry) return Reduction<Grammar>(-entry);
+  const int rule = Grammar::kTable_defact[state];
+  return rule == 0 ? kError : Reduction<Grammar>(rule);
+}
+
+template <class Grammar>
+constexpr int NextState(int state, int symbol) {
+  const int column = symbol - Grammar::kTokenCount;
+  const int place = Grammar::kTable_pgoto[column] + state;
+  const bool hasEntry = place >= 0 && place < static_cast<int>(std::size(Grammar::kTable_table)) &&
+                        Grammar::kTable_check[place] == state;
+  return hasEntry ? Grammar::kTable_table[place] : Grammar::kTable_defgoto[column];
+}
+
+template <class Grammar>
+constexpr bool PassesOn(int rule) {
+  for (const int own : Grammar::kRulesWithAction) {
+    if (own == rule) return false;
+  }
+  return Grammar::kTable_r2[rule] == 1;
+}
+
+/// The same after the reductions that follow blindly and change nothing but the symbol.
+template <class Grammar>
+constexpr int SettledState(int state, int symbol) {
+  int next = NextState<Grammar>(state, symbol);
+  while (IsBlind<Grammar>(next) && PassesOn<Grammar>(Grammar::kTable_defact[next])) {
+    next = NextState<Grammar>(state, Grammar::kTable_r1[Grammar::kTable_defact[next]]);
+  }
+  return next;
+}
+
+template <class Grammar>
+constexpr Automaton<Grammar> SpreadOut() {
+  Automaton<Grammar> automaton{};
+  for (int state = 0; state < Grammar::kStateCount; ++state) {
+    for (int token = 0; token < Grammar::kTokenCount; ++token)
+      automaton.actions[state][token] = ActionOf<Grammar>(state, token);
+    if (IsBlind<Grammar>(state)) automaton.blindActions[state] = ActionOf<Grammar>(state, 0);
+    for (int symbol = Grammar::kTokenCount; symbol < Grammar::kSymbolCount; ++symbol) {
+      automaton.nextStates[state][symbol] = static_cast<std::uint8_t>(SettledState<Grammar>(state, symbol));
+    }
+  }
+  return automaton;
+}
+
+template <class Grammar>
+inline constexpr Automaton<Grammar> kAutomaton = SpreadOut<Grammar>();
+
+/// The stack of the process's one parser of a grammar.
+template <class Grammar>
+struct Stack {
+  std::array<std::uint16_t, kMostStates> states;
+  std::array<typename Grammar::Value, kMostStates> values;
+};
+
+template <class Grammar>
+inline Stack<Grammar> stack;
+
+}  // namespace lalr
+
+/// The grammar's name of a symbol, without the quotes of those that are no names.
+template <class Grammar>
+constexpr std::string_view LalrSymbolName(int number) {
+  const std::string_view name = Grammar::kSymbolNames[number];
+  return name.front() == '"' ? name.substr(1, name.size() - 2) : name;
+}
+
+/// The words for a token that a state has no action for: up to four expected tokens are named.
+template <class Grammar>
+std::string LalrUnexpected(int state, int token) {
+  constexpr std::size_t kMostExpected = 4;
+  std::vector<int> expected;
+  for (int other = 0; other < Grammar::kTokenCount; ++other) {
+    if (other != lalr::kErrorToken && lalr::Entry<Grammar>(state, other) != Grammar::kErrorEntry)
+      expected.push_back(other);
+  }
+  std::string words = "syntax error, unexpected " + std::string(LalrSymbolName<Grammar>(token));
+  if (expected.size() > kMostExpected) return words;
+  std::string_view before = ", expecting ";
+  for (const int other : expected) {
+    words += before;
+    words += LalrSymbolName<Grammar>(other);
+    before = " or ";
+  }
+  return words;
+}
+
+enum class LalrEnd : std::uint8_t {
+  Accepted,
+  Refused,  ///< at a token that no rule takes here
+  TooDeep,  ///< for the stack
+  Stopped   ///< by the parse
+};
+
+struct LalrOutcome {
+  LalrEnd end;
+  std::string words;  ///< of a refusal
+};
+
+/// What is pulled to stop a parse.
+inline constexpr int kLalrStop = -1;
+
+/// Parses what `pull(value)` gives: the grammar's number of the next token, 0 at the end, with its value. The
+/// actions of the rules are calls of `state`.
+template <class Grammar, class State, class Pull>
+LalrOutcome RunLalr(State& state, Pull pull) {
+  using namespace lalr;
+  constexpr const Automaton<Grammar>& kTables = kAutomaton<Grammar>;
+  Stack<Grammar>& symbols = stack<Grammar>;
+  std::size_t top = 0;
+  symbols.states[0] = 0;
+  const auto reduce = [&top, &symbols, &state](Action reduction) {
+    const int rule = reduction - Grammar::kStateCount;
+    top = top + 1 - static_cast<std::size_t>(Grammar::kTable_r2[rule]);
+    symbols.values[top] = Grammar::Reduce(rule, &symbols.values[top], state);
+    symbols.states[top] = kTables.nextStates[symbols.states[top - 1]][Grammar::kTable_r1[rule]];
+    return top + 1 < kMostStates;
+  };
+  for (;;) {
+    while (const Action blind = kTables.blindActions[symbols.states[top]]) {
+      if (!reduce(blind)) return {LalrEnd::TooDeep, {}};
+    }
+    typename Grammar::Value value{};
+    const int token = pull(value);
+    if (token == kLalrStop) return {LalrEnd::Stopped, {}};
+    Action action = kTables.actions[symbols.states[top]][token];
+    for (; action >= Grammar::kStateCount; action = kTables.actions[symbols.states[top]][token]) {
+      if (!reduce(action)) return {LalrEnd::TooDeep, {}};
+    }
+    if (action == kError) return {LalrEnd::Refused, LalrUnexpected<Grammar>(symbols.states[top], token)};
+    ++top;
+    symbols.states[top] = action;
+    symbols.values[top] = value;
+    if (top + 1 == kMostStates) return {LalrEnd::TooDeep, {}};
+    if (action == Grammar::kFinalState) return {LalrEnd::Accepted, {}};
+  }
+}
+
+}  // namespace tessal
