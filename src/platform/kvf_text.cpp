@@ -1,7 +1,6 @@
 #include "platform/kvf_text.h"
 
 #include <algorithm>
-#include <utility>
 
 #include "platform/ascii.h"
 
@@ -18,12 +17,6 @@ std::size_t CountBareLineFeeds(std::string_view text) {
 }
 
 }  // namespace
-
-std::string KvfReadableText(std::string bytes) {
-  bytes.resize(std::min(bytes.find('\0'), bytes.size()));
-  if (bytes.starts_with(kByteOrderMark)) bytes.erase(0, kByteOrderMark.size());
-  return KvfLineEnds(std::move(bytes));
-}
 
 std::string KvfLineEnds(std::string text) {
   const std::size_t bare = CountBareLineFeeds(text);
