@@ -67,18 +67,18 @@ void CheckParse(const std::string& text) {
   Require(RewriteExpressionText(tree) == RewriteExpressionText(copy.Root()));
 }
 
-/// A parse knows the names that a scan finds, and leaves the scanner as the scan does.
-void CheckHeldNames(const std::string& text, ScannerStart start) {
+/// A parse that came to the end knows the names that a scan finds, and leaves the scanner as the scan does.
+void CheckKnownNames(const std::string& text, ScannerStart start) {
+  SetExpressionScannerStart(start);
+  const auto parsed = ParseExpression(text);
+  if (!parsed->KnowsIdentifiers()) return;
   std::vector<std::string_view> scanned;
   SetExpressionScannerStart(start);
   ScanIdentifiers(text, scanned);
-  const ScannerStart left = ExpressionScannerStart();
-  std::unique_ptr<const ParsedExpression> held;
-  std::vector<std::string_view> known;
-  for (int turn = 0; turn < 2; ++turn) {
-    SetExpressionScannerStart(start);
-    IdentifiersOnce(held, text, known);
-    Require(known == scanned && ExpressionScannerStart() == left);
+  Require(parsed->Left() == ExpressionScannerStart() && parsed->Identifiers().size() == scanned.size());
+  for (std::size_t place = 0; place < scanned.size(); ++place) {
+    const LexemeSpan name = parsed->Identifiers()[place];
+    Require(scanned[place].data() == text.data() + name.start && scanned[place].size() == name.length);
   }
 }
 
@@ -88,8 +88,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const std::string text(reinterpret_cast<const char*>(data), size);
   CheckTokens(text);
   CheckParse(text);
-  CheckHeldNames(text, ScannerStart::Text);
-  CheckHeldNames(text, ScannerStart::Comment);
+  CheckKnownNames(text, ScannerStart::Text);
+  CheckKnownNames(text, ScannerStart::Comment);
   tessal::ResetExpressionScanner();
   tessal::CheckFunctionsSpecified("fuzz", Uid{1}, text);
   tessal::IsReservedName(text);

@@ -9,6 +9,7 @@
 #include "core/search_functions.h"
 #include "core/template_core.h"
 #include "core/visibility_groups.h"
+#include "elements/free_name.h"
 #include "elements/list_section.h"
 #include "elements/property_io.h"
 #include "expr/scanner.h"
@@ -107,6 +108,8 @@ class Reading final {
   bool ReadSections(KvfHandle file, int targetNumber);
   void ReadSettings(KvfNode target, ReadStatus& status);
   template <class Element>
+  CEL_Element& AppendUnread(const Collection<Element>& row, ReadStatus& status);
+  template <class Element>
   void ReadCollection(const Collection<Element>& row, KvfNode target, ReadStatus& status);
   void ReadTemplateEquations(KvfNode target, ReadStatus& status);
 
@@ -174,12 +177,24 @@ void Reading::ReadSettings(KvfNode target, ReadStatus& status) {
   if (state.hasMisc) state.misc.Read(settings, status);
 }
 
+/// Appends an element of a collection, to be read next.
+template <class Element>
+CEL_Element& Reading::AppendUnread(const Collection<Element>& row, ReadStatus& status) {
+  const std::size_t number = (state.collections.*row.elements).size() + 1;
+  // The file holds a symbol for most, which would take the place of a default name.
+  if (row.kind == ElementKind::DerivedOutput || row.kind == ElementKind::Specie) {
+    return core.AppendElement(row, NumberedName(row.symbolPrefix, number));
+  }
+  status.BeginUnnamed(row.symbolPrefix, number);
+  return core.AppendElement(row, "");
+}
+
 template <class Element>
 void Reading::ReadCollection(const Collection<Element>& row, KvfNode target, ReadStatus& status) {
   CEL_Element* head = row.HasHead() ? &state.ListHead(row.listKind) : nullptr;
   if (head != nullptr) status.NoteAbsentSection(target, row.section);
   ReadList(target, row.section, head, status,
-           [this, &row]() -> CEL_Element& { return core.AppendElement(row, ""); });
+           [this, &row, &status]() -> CEL_Element& { return AppendUnread(row, status); });
 }
 
 void Reading::ReadTemplateEquations(KvfNode target, ReadStatus& status) {

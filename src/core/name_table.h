@@ -16,7 +16,7 @@ namespace tessal {
 /// The number of a name, from 1; 0 for no name.
 using NameNumber = std::uint32_t;
 
-/// In a large template every step through memory counts: the slots of the hash table lie side by side, probed
+/// In a large template every step through memory counts: the cells of the hash table lie side by side, probed
 /// one after the other, and hold enough of the hash that few names are compared in vain.
 class NameTable final {
  public:
@@ -26,22 +26,22 @@ class NameTable final {
 
   void Clear() {
     names.assign(1, {});
-    slots.assign(kFirstSlots, {});
+    cells.assign(kFirstCells, {});
     texts.release();
   }
 
   /// The number of a name, which gets one if it has none.
   NameNumber NumberOf(std::string_view name) {
     const std::uint32_t hash = ShortHash(name);
-    Slot* slot = &slots[SlotOf(name, hash)];
-    if (slot->number != 0) return slot->number;
-    if (2 * names.size() > slots.size()) {
+    Cell* cell = &cells[CellOf(name, hash)];
+    if (cell->number != 0) return cell->number;
+    if (2 * names.size() > cells.size()) {
       Grow();
-      slot = &slots[SlotOf(name, hash)];
+      cell = &cells[CellOf(name, hash)];
     }
     names.push_back(Kept(name));
-    *slot = {hash, static_cast<NameNumber>(names.size() - 1)};
-    return slot->number;
+    *cell = {hash, static_cast<NameNumber>(names.size() - 1)};
+    return cell->number;
   }
 
   std::string_view NameOf(NameNumber number) const { return names[number]; }
@@ -49,31 +49,31 @@ class NameTable final {
   std::size_t End() const { return names.size(); }
 
  private:
-  static constexpr std::size_t kFirstSlots = 64;
+  static constexpr std::size_t kFirstCells = 64;
 
-  struct Slot {
+  struct Cell {
     std::uint32_t hash = 0;
-    NameNumber number = 0;  ///< 0 for an empty slot
+    NameNumber number = 0;  ///< 0 for an empty cell
   };
 
   static std::uint32_t ShortHash(std::string_view name) {
     return static_cast<std::uint32_t>(std::hash<std::string_view>()(name));
   }
-  /// The slot that holds the name, or the empty one that would take it.
-  std::size_t SlotOf(std::string_view name, std::uint32_t hash) const {
-    std::size_t place = hash & (slots.size() - 1);
-    while (slots[place].number != 0 && (slots[place].hash != hash || names[slots[place].number] != name)) {
-      place = (place + 1) & (slots.size() - 1);
+  /// The cell that holds the name, or the empty one that would take it.
+  std::size_t CellOf(std::string_view name, std::uint32_t hash) const {
+    std::size_t place = hash & (cells.size() - 1);
+    while (cells[place].number != 0 && (cells[place].hash != hash || names[cells[place].number] != name)) {
+      place = (place + 1) & (cells.size() - 1);
     }
     return place;
   }
   void Grow() {
-    const std::vector<Slot> former = std::exchange(slots, std::vector<Slot>(2 * slots.size()));
-    for (const Slot& slot : former) {
-      if (slot.number == 0) continue;
-      std::size_t place = slot.hash & (slots.size() - 1);
-      while (slots[place].number != 0) place = (place + 1) & (slots.size() - 1);
-      slots[place] = slot;
+    const std::vector<Cell> former = std::exchange(cells, std::vector<Cell>(2 * cells.size()));
+    for (const Cell& cell : former) {
+      if (cell.number == 0) continue;
+      std::size_t place = cell.hash & (cells.size() - 1);
+      while (cells[place].number != 0) place = (place + 1) & (cells.size() - 1);
+      cells[place] = cell;
     }
   }
   std::string_view Kept(std::string_view name) {
@@ -84,7 +84,7 @@ class NameTable final {
   }
 
   std::vector<std::string_view> names;
-  std::vector<Slot> slots;
+  std::vector<Cell> cells;
   std::pmr::monotonic_buffer_resource texts;
 };
 

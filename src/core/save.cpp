@@ -4,6 +4,7 @@
 #include <exception>
 #include <new>
 #include <optional>
+#include <utility>
 
 #include "core/error_registry.h"
 #include "core/template_core.h"
@@ -17,20 +18,19 @@ namespace tessal {
 namespace {
 
 constexpr std::string_view kSaveSymbol = "SAVE ";
-constexpr std::string_view kTypeLine = "// type = 2\r\n";
-/// The type line comes before this line, counted from 1.
-constexpr int kTypeLineNumber = 4;
+/// The last line of the head of a template's file.
+constexpr std::string_view kTypeComment = "type = 2";
+constexpr std::string_view kRefused = "the template holds what the file format can not";
 
-/// An image of the library, closed on every way out.
+/// A file of the library that is written into a sink, closed on every way out.
 class Image final {
  public:
-  Image() : handle(kvfCreate()) {}
+  explicit Image(const TextSink& sink) : handle(kvfCreateInto(sink, kTypeComment)) {}
   Image(const Image&) = delete;
   Image& operator=(const Image&) = delete;
   ~Image() { kvfClose(&handle); }
 
   KvfHandle Handle() const { return handle; }
-  std::string TakeText() { return kvfTakeText(&handle); }
 
  private:
   KvfHandle handle;
@@ -38,20 +38,6 @@ class Image final {
 
 constexpr Message kSaveFailed("save-failed");
 constexpr Message kOutOfMemory("out-of-memory");
-
-/// The text with the type line before its fourth line. A text of fewer lines gets none. One more, empty, line
-/// follows a text that ends in a line end.
-std::string WithTypeLine(std::string text) {
-  std::size_t lineStart = 0;
-  for (int line = 1; line < kTypeLineNumber; ++line) {
-    const std::size_t lineEnd = text.find('\n', lineStart);
-    if (lineEnd == std::string::npos) return text;
-    lineStart = lineEnd + 1;
-  }
-  text.insert(lineStart, kTypeLine);
-  text += "\r\n";
-  return text;
-}
 
 /// The settings that a save under a new name stamps, so that one that fails can put them back.
 class Stamps final {
@@ -79,11 +65,6 @@ class Stamps final {
   std::string trigonometrics;
 };
 
-/// What the file held beside the template, to follow it, with a blank line after it.
-std::string KeptPart(const std::string& keptText) {
-  return keptText.empty() ? std::string() : keptText + "\r\n\r\n";
-}
-
 /// The writing of one template.
 class Writing final {
  public:
@@ -92,13 +73,13 @@ class Writing final {
   /// Under a new name: with fresh version stamps and a restarted revision.
   bool SaveAs(const std::string& path);
   bool SaveInPlace(const std::string& path);
-  /// Everything that goes into the file; nothing, with the reason, when the format cannot hold it. Raises
-  /// the revision.
-  std::optional<std::string> FileText(std::string& reason);
-  /// The same, with all but the record numbers left as it was.
+  /// Everything that goes into the file, with all but the record numbers left as it was; nothing, with the
+  /// reason, when the format cannot hold it.
   std::optional<std::string> CopyText(std::string& reason);
 
  private:
+  /// Everything that goes into the file. False when the format cannot hold it. Raises the revision.
+  bool WriteText(const TextSink& sink);
   bool WriteSections(KvfHandle file);
 
   TemplateState& state;
@@ -135,8 +116,12 @@ bool Writing::SaveInPlace(const std::string& path) {
   std::string reason;
   try {
     names = {path, path};
-    const std::optional<std::string> text = FileText(reason);
-    if (text) reason = ReplaceFile(path, *text);
+    bool isRefused = false;
+    reason = ReplaceFile(path, [this, &isRefused](const TextSink& sink) {
+      isRefused = !WriteText(sink);
+      return !isRefused;
+    });
+    if (isRefused) reason = kRefused;
     if (!reason.empty()) failed = kSaveFailed;
   } catch (const std::bad_alloc&) {
     failed = kOutOfMemory;
@@ -159,25 +144,35 @@ bool Writing::SaveInPlace(const std::string& path) {
   return true;
 }
 
-std::optional<std::string> Writing::FileText(std::string& reason) {
-  Image image;
-  if (!WriteSections(image.Handle())) {
-    reason = "the template holds what the file format can not";
-    return std::nullopt;
+bool Writing::WriteText(const TextSink& sink) {
+  Image image(sink);
+  if (!WriteSections(image.Handle())) return false;
+  kvfFinish(image.Handle());
+  // One more line, and what the file held beside the template.
+  sink("\r\n");
+  if (!state.keptText.empty()) {
+    sink(state.keptText);
+    sink("\r\n\r\n");
   }
-  return WithTypeLine(image.TakeText() + KeptPart(state.keptText));
+  return true;
 }
 
 std::optional<std::string> Writing::CopyText(std::string& reason) {
   const bool formerlyModified = state.flags.modified;
   const std::int32_t formerRevision = state.misc.documentRevision.IntValue();
-  std::optional<std::string> text;
+  std::optional<std::string> text(std::in_place);
   try {
-    text = FileText(reason);
+    const bool isWhole = WriteText([&text](std::string_view part) { *text += part; });
+    if (!isWhole) {
+      reason = kRefused;
+      text.reset();
+    }
   } catch (const std::bad_alloc&) {
     reason = kOutOfMemory->text;
+    text.reset();
   } catch (const std::exception& failure) {
     reason = failure.what();
+    text.reset();
   }
   state.misc.documentRevision.SetInt(formerRevision);
   state.flags.modified = formerlyModified;

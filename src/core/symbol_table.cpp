@@ -29,6 +29,8 @@ void SymbolTable::Clear() {
   uses.clear();
   users.clear();
   names.Clear();
+  mentions.clear();
+  mentioned.clear();
   undefined.clear();
 }
 

@@ -106,10 +106,21 @@ class SymbolTable final {
  private:
   class RebuildSteps;
 
+  /// The names that a record's expression mentions, a part of a list. A rebuild takes it over as long as its
+  /// element does not change.
+  struct Mentions {
+    const CEL_Element* element = nullptr;
+    std::uint32_t start = 0;
+    std::uint32_t end = 0;
+    bool isLasting = false;  ///< whether they are the same wherever the scan of the expression starts
+  };
+
   std::vector<SymbolRecord> records;
   std::vector<std::uint32_t> uses;   ///< of all records, one after the other
   std::vector<std::uint32_t> users;  ///< the same
   NameTable names;
+  std::vector<Mentions> mentions;  ///< of the records, in their order
+  std::vector<NameNumber> mentioned;
   bool hasSharedSymbols = false;
   std::vector<std::unique_ptr<UndefinedSymbol>> undefined;
 };

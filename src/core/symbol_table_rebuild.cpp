@@ -58,7 +58,8 @@ class SymbolTable::RebuildSteps final {
   void GiveNamesToRecords();
   void ExtractReferences();
   void ExtractRecordReferences(const SymbolRecord& record);
-  void ReferToIdentifiers(const SymbolRecord& record);
+  bool TakeMentionsOver(std::size_t place, Mentions& taken);
+  void FindMentions(const SymbolRecord& record, Mentions& found);
   void Refer(const SymbolRecord& record, NameNumber name);
   Meaning MeaningOf(NameNumber name);
   Meaning MeaningOfUnknown(std::string_view name);
@@ -78,6 +79,9 @@ class SymbolTable::RebuildSteps final {
   /// nothing.
   std::vector<std::uint32_t> lastUser;
   std::vector<std::string_view> identifiers;
+  std::vector<std::uint32_t> formerSequences;  ///< of the records before the rebuild; 0 for none
+  std::vector<Mentions> formerMentions;
+  std::vector<NameNumber> formerlyMentioned;
 };
 
 void SymbolTable::Rebuild(const Collections& collections, const CEL_Miscanellous& settings) {
@@ -113,6 +117,11 @@ SymbolRecord& SymbolTable::RebuildSteps::Append(CEL_Element& element, std::size_
 SymbolRecord& SymbolTable::RebuildSteps::AppendElement(CEL_Element& element, std::size_t index,
                                                        std::int32_t specieIndex) {
   const auto rows = element.ExpressionRows();
+  const std::uint32_t former = element.Facts().sequence;
+  for (std::size_t left = std::max<std::size_t>(rows.size(), 1); left > 0; --left) {
+    formerSequences.push_back(former < left ? 0 : former + 1 - static_cast<std::uint32_t>(left));
+  }
+  element.Facts().sequence = static_cast<std::uint32_t>(formerSequences.size());
   if (rows.empty()) return Append(element, index, specieIndex, nullptr);
   // Against the order of the file: a movement's direction is numbered before its speed.
   for (std::size_t left = rows.size(); left > 1; --left) {
@@ -209,6 +218,10 @@ void SymbolTable::RebuildSteps::ExtractReferences() {
   for (std::size_t place = 0; place < undefined.size(); ++place) {
     undefinedByName.emplace(undefined[place]->symbol, place);
   }
+  formerMentions = std::exchange(table.mentions, {});
+  formerlyMentioned = std::exchange(table.mentioned, {});
+  table.mentions.reserve(records.size());
+  table.mentioned.reserve(formerlyMentioned.size());
   // The lists move while they grow: the records get their parts of them at the end.
   std::vector<std::size_t> ends{0};
   ends.reserve(records.size() + 1);
@@ -224,15 +237,33 @@ void SymbolTable::RebuildSteps::ExtractReferences() {
 }
 
 void SymbolTable::RebuildSteps::ExtractRecordReferences(const SymbolRecord& record) {
+  Mentions& found = table.mentions.emplace_back();
+  found.element = record.element;
+  found.start = static_cast<std::uint32_t>(table.mentioned.size());
   if (record.kind == ElementKind::SpatialFunction) {
     const auto& function = static_cast<const CEL_Lagrange_Spatial_Function&>(*record.element);
     if (function.variableId.IntValue() >= 1) Refer(record, table.names.NumberOf(function.VariableName()));
-  } else if (record.expression != nullptr) {
-    ReferToIdentifiers(record);
+  } else if (record.expression != nullptr && !TakeMentionsOver(record.sequence - 1, found)) {
+    FindMentions(record, found);
   }
+  found.end = static_cast<std::uint32_t>(table.mentioned.size());
+  for (std::uint32_t place = found.start; place < found.end; ++place) Refer(record, table.mentioned[place]);
 }
 
-void SymbolTable::RebuildSteps::ReferToIdentifiers(const SymbolRecord& record) {
+/// Takes over what the rebuild before has found; false where there is nothing, or it may be different now.
+bool SymbolTable::RebuildSteps::TakeMentionsOver(std::size_t place, Mentions& taken) {
+  const std::uint32_t sequence = formerSequences[place];
+  if (sequence == 0 || sequence > formerMentions.size()) return false;
+  const Mentions& former = formerMentions[sequence - 1];
+  if (former.element != taken.element || !former.isLasting) return false;
+  if (ExpressionScannerStart() != ScannerStart::Text) return false;
+  table.mentioned.insert(table.mentioned.end(), formerlyMentioned.begin() + former.start,
+                         formerlyMentioned.begin() + former.end);
+  taken.isLasting = true;
+  return true;
+}
+
+void SymbolTable::RebuildSteps::FindMentions(const SymbolRecord& record, Mentions& found) {
   const ScannerStart start = ExpressionScannerStart();
   const ParsedExpression& parsed = record.expression->Parsed();
   const std::string_view text = StripExpressionQuotes(record.expression->Text());
@@ -240,17 +271,13 @@ void SymbolTable::RebuildSteps::ReferToIdentifiers(const SymbolRecord& record) {
     // What the parse left unread counts too, and decides where the next scan starts.
     SetExpressionScannerStart(start);
     ScanIdentifiers(text, identifiers);
-    for (const std::string_view name : identifiers) Refer(record, table.names.NumberOf(name));
+    for (const std::string_view name : identifiers) table.mentioned.push_back(table.names.NumberOf(name));
     return;
   }
-  const auto spans = parsed.Identifiers();
-  const auto numbers = parsed.NameNumbers();
-  for (std::size_t place = 0; place < spans.size(); ++place) {
-    if (numbers[place] == 0) {
-      numbers[place] = table.names.NumberOf(text.substr(spans[place].start, spans[place].length));
-    }
-    Refer(record, numbers[place]);
+  for (const LexemeSpan span : parsed.Identifiers()) {
+    table.mentioned.push_back(table.names.NumberOf(text.substr(span.start, span.length)));
   }
+  found.isLasting = start == ScannerStart::Text && parsed.Left() == ScannerStart::Text;
 }
 
 void SymbolTable::RebuildSteps::Refer(const SymbolRecord& record, NameNumber name) {

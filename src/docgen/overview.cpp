@@ -94,8 +94,8 @@ class OverviewBuilder final {
 
   void AddMovement(const CEL_Element& movement, std::string type, const CEL_Property& expression,
                    const char* description) {
-    rows.push_back(
-        {{"-", movement.symbol.TextOf(), std::move(type), expression.TextOf(), description}, movement.GetUid()});
+    rows.push_back({{"-", movement.symbol.TextOf(), std::move(type), expression.TextOf(), description},
+                    movement.GetUid()});
   }
 
   const TemplateCore& core;
@@ -182,8 +182,10 @@ bool ExportOverview(const TemplateCore& core, const std::string& path, std::stri
     failure = "can not write the overview over its template '" + path + "'";
     return false;
   }
-  failure = WriteOutputFile(
-      path, [&core](const TextSink& write) { WriteOverviewText(core, BuildOverview(core), write); });
+  failure = WriteOutputFile(path, [&core](const TextSink& write) {
+    WriteOverviewText(core, BuildOverview(core), write);
+    return true;
+  });
   return failure.empty();
 }
 

@@ -192,6 +192,7 @@ void CEL_Element::ReadBase(KvfNode section, ReadStatus& status) {
   if (!kvfIsSection(section)) return;
   status.Begin(*this, section);
   if (hasSymbol) ReadProperty(symbol, section, key::kSymbol, status);
+  status.SymbolWasRead();
   if (hasId) ReadProperty(id, section, key::kId, status);
   if (hasDescription) {
     ReadProperty(description, section, key::kDescription, status);

@@ -80,6 +80,7 @@ enum class UnitMode : std::uint8_t { None = 0, Type = 1, Unit = 2, Both = 3 };
 /// properties changes.
 struct ElementFacts {
   std::uint32_t asOf = 0;        ///< the number of changes then
+  std::uint32_t sequence = 0;    ///< of its last record in the symbol table; 0 before it has one
   std::uint32_t symbolName = 0;  ///< the number of its symbol among the template's names; 0 before it has one
   std::uint32_t cleanSince =
       0;  ///< the user function names with which a check found nothing; 0 before one did
@@ -90,6 +91,7 @@ struct ElementFacts {
 
 class CEL_Element : public PropertyHolder {
   // First, side by side: every pass over a template looks at it.
+  ElementFacts facts;
   bool hasDescription;
   bool hasSymbol;
   bool hasId;
@@ -104,7 +106,6 @@ class CEL_Element : public PropertyHolder {
   CEL_Element* listHeader = nullptr;
   CEL_Element* parent = nullptr;
   ElementOwner* owner = nullptr;
-  ElementFacts facts;
   std::vector<std::pair<std::int32_t, std::int32_t>> visibility;
   std::span<const PropertyRow> rows;
 

@@ -8,6 +8,7 @@
 
 #include "core/error_registry.h"
 #include "elements/element.h"
+#include "elements/free_name.h"
 #include "elements/property_io.h"
 #include "expr/scanner.h"
 
@@ -81,6 +82,7 @@ void ReadStatus::Begin(const CEL_Element& read, KvfNode itsSection) {
 }
 
 std::string ReadStatus::Name() const {
+  if (unnamed) return NumberedName(unnamed->prefix, unnamed->number);
   const std::string symbol = element == nullptr ? std::string() : element->FullSymbol();
   return symbol.empty() ? kvfGetNameGlb(elementSection) : symbol;
 }

@@ -23,7 +23,10 @@ class ReadStatus final {
 
   /// The element whose section is read from here on, for the words of the account.
   void Begin(const CEL_Element& read, KvfNode itsSection);
-  /// What the account calls that element: its symbol, or without one its section.
+  /// What an element without a symbol is called until its own is read: the default name of a new one.
+  void BeginUnnamed(std::string_view prefix, std::size_t number) { unnamed = Unnamed{prefix, number}; }
+  void SymbolWasRead() { unnamed.reset(); }
+  /// What the account calls the element: its symbol, or without one its section.
   std::string Name() const;
 
   /// Numbers are read while the last text before them, and every number since, was there.
@@ -55,6 +58,11 @@ class ReadStatus final {
     bool isThere;  ///< with a value of another type
   };
 
+  struct Unnamed {
+    std::string_view prefix;
+    std::size_t number;
+  };
+
   ReadStatus(LoadAccount& loadAccount, bool withReports) : account(loadAccount), reports(withReports) {}
   void NoteChanged(Message message, KvfNode section, std::string_view key, std::string_view present);
 
@@ -63,6 +71,7 @@ class ReadStatus final {
   const CEL_Element* element = nullptr;
   KvfNode elementSection = nullptr;
   std::optional<MissingKey> missing;
+  std::optional<Unnamed> unnamed;
 };
 
 }  // namespace tessal

@@ -1,5 +1,6 @@
 #include "expr/expression_automaton.h"
 
+#include <cstddef>
 #include <string_view>
 
 #include "expr/expression_grammar.h"
@@ -11,15 +12,15 @@ namespace tessal {
 
 namespace {
 
-constexpr int kUndefinedToken = ExpressionGrammar::kTokenCount - 1;
+constexpr std::size_t kUndefinedToken = ExpressionGrammar::kTokenCount - 1;
 
 /// The grammar's number of a token that is pulled. What is no token of the grammar is undefined; a character
 /// with the high bit set is negative, and ends the text for the parser.
-constexpr int TokenNumber(TokenCode code) {
-  constexpr int kFirstNumber = 3;
+constexpr std::size_t TokenNumber(TokenCode code) {
+  constexpr std::size_t kFirstNumber = 3;
   if (code <= TokenCode::End) return 0;
   if (code < TokenCode::Identifier) return kUndefinedToken;
-  return static_cast<int>(code) - static_cast<int>(TokenCode::Identifier) + kFirstNumber;
+  return static_cast<std::size_t>(code) - static_cast<std::size_t>(TokenCode::Identifier) + kFirstNumber;
 }
 
 constexpr std::string_view NameOf(TokenCode code) {
@@ -35,7 +36,7 @@ static_assert(NameOf(TokenCode::Identifier) == "IDENTIFIER" && NameOf(TokenCode:
 
 bool RunAutomaton(ParseState& state) {
   const auto pull = [&state](ExpressionGrammar::Value& value) {
-    const int token = TokenNumber(state.Pull(value.lexeme));
+    const std::size_t token = TokenNumber(state.Pull(value.lexeme));
     return state.TokenIsTooLong() ? kLalrStop : token;
   };
   const LalrOutcome outcome = RunLalr<ExpressionGrammar>(state, pull);

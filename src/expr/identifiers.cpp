@@ -1,6 +1,5 @@
 #include "expr/identifiers.h"
 
-#include "expr/parser.h"
 #include "expr/scanner.h"
 
 namespace tessal {
@@ -16,22 +15,6 @@ void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& ident
     clean = clean && IsPlainToken(code);
   }
   if (!clean) identifiers.clear();
-}
-
-void IdentifiersOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text,
-                     std::vector<std::string_view>& identifiers) {
-  const ScannerStart began = ExpressionScannerStart();
-  const ParsedExpression& parsed = ParseOnce(held, text);
-  if (!parsed.KnowsIdentifiers()) {
-    // The parse left the rest unscanned, and the start of the next scan as it was there.
-    SetExpressionScannerStart(began);
-    ScanIdentifiers(text, identifiers);
-    return;
-  }
-  identifiers.clear();
-  for (const LexemeSpan name : parsed.Identifiers()) {
-    identifiers.push_back(text.substr(name.start, name.length));
-  }
 }
 
 void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identifiers) {

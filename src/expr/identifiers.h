@@ -2,14 +2,11 @@
 // that does not parse.
 #pragma once
 
-#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
 
 namespace tessal {
-
-struct ParsedExpression;
 
 /// The identifiers of a stored expression, its quotes stripped, in text order with repeats. None when the
 /// text holds something that is no token or is longer than `kLongestExpression`.
@@ -17,10 +14,5 @@ void ExtractIdentifiers(std::string_view text, std::vector<std::string>& identif
 
 /// The same over a text without quotes, as views into it.
 void ScanIdentifiers(std::string_view text, std::vector<std::string_view>& identifiers);
-
-/// The same of a text of which a parse may be held. The parse gives them where it came to the end of the
-/// text; it is made and held as `ParseOnce` does, which is also how the holder resets it.
-void IdentifiersOnce(std::unique_ptr<const ParsedExpression>& held, std::string_view text,
-                     std::vector<std::string_view>& identifiers);
 
 }  // namespace tessal

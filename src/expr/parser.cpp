@@ -26,16 +26,12 @@ ParseArrays parseArrays;
 std::unique_ptr<ParsedExpression> ParsedExpression::InBlock(const ExpressionBuilder* tree,
                                                             std::span<const LexemeSpan> identifiers) {
   const std::size_t nodeBytes = tree == nullptr ? 0 : tree->Count() * sizeof(ExpressionNode);
-  const std::size_t numberBytes = identifiers.size() * sizeof(std::uint32_t);
-  void* const block =
-      ::operator new(sizeof(ParsedExpression) + nodeBytes + identifiers.size_bytes() + numberBytes);
+  void* const block = ::operator new(sizeof(ParsedExpression) + nodeBytes + identifiers.size_bytes());
   std::unique_ptr<ParsedExpression> parsed(::new (block) ParsedExpression);
   std::byte* const nodes = static_cast<std::byte*>(block) + sizeof(ParsedExpression);
   if (tree != nullptr) parsed->root = tree->CopyTo(nodes);
   std::uninitialized_copy(identifiers.begin(), identifiers.end(),
                           reinterpret_cast<LexemeSpan*>(nodes + nodeBytes));
-  parsed->nameNumbers = reinterpret_cast<std::uint32_t*>(nodes + nodeBytes + identifiers.size_bytes());
-  std::uninitialized_fill_n(parsed->nameNumbers, identifiers.size(), 0U);
   parsed->identifierCount = static_cast<std::uint32_t>(identifiers.size());
   return parsed;
 }
@@ -58,9 +54,10 @@ std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text) {
     ParseState state(text, parseArrays);
     const bool good = RunAutomaton(state);
     parsed = ParsedExpression::InBlock(good ? &parseArrays.tree : nullptr, state.Identifiers());
-    if (!good)
+    if (!good) {
       parsed->failure =
           std::make_unique<const ParseFailure>(ParseFailure{state.Failure(), state.Line(), state.Position()});
+    }
     parsed->knowsIdentifiers = state.ScannedAll();
   }
   parsed->began = began;

@@ -47,9 +47,6 @@ struct ParsedExpression final {
   /// What `ScanIdentifiers` finds in the text from the same start, with the same effect on the next one; only
   /// of a parse that knows them.
   std::span<const LexemeSpan> Identifiers() const;
-  /// Room for a number for each of them, 0 at first: who holds the parse may keep there what it knows of the
-  /// names. They are no part of the value.
-  std::span<std::uint32_t> NameNumbers() const { return {nameNumbers, identifierCount}; }
 
   /// What lies after the object goes with it.
   static void operator delete(void* block) noexcept { ::operator delete(block); }
@@ -58,13 +55,12 @@ struct ParsedExpression final {
   friend std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text);
 
   ParsedExpression() = default;
-  /// A block with the object, the nodes of a tree, if there is one, the identifiers and their numbers.
+  /// A block with the object, the nodes of a tree, if there is one, and the identifiers.
   static std::unique_ptr<ParsedExpression> InBlock(const ExpressionBuilder* tree,
                                                    std::span<const LexemeSpan> identifiers);
 
   std::unique_ptr<const ParseFailure> failure;
   const ExpressionNode* root = nullptr;  ///< the last of the nodes
-  std::uint32_t* nameNumbers = nullptr;
   std::uint32_t identifierCount = 0;
   bool knowsIdentifiers = false;
   ScannerStart began = ScannerStart::Text;

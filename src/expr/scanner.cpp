@@ -158,35 +158,31 @@ TokenCode ExpressionScan::Next() {
     lexeme = here;
     if (here == end) return TokenCode::End;
     const Beginning& first = kBeginnings[PlaceOf(*here++)];
-    switch (first.byteClass) {
-      case ByteClass::Token:
-        return first.token;
-      case ByteClass::Letter:
-        return Word();
-      case ByteClass::Blank:
-        break;
-      case ByteClass::Digit:
-        return Number();
-      case ByteClass::Pair:
-        if (!IsAt(here, first.follower)) return first.token;
-        ++here;
-        return first.pair;
-      case ByteClass::Slash:
-        if (!IsAt(here, '*')) return first.token;
-        ++here;
-        nextStart = ScannerStart::Comment;
-        SkipComment();
-        break;
-      case ByteClass::Colon:
-        return Colon();
-      case ByteClass::LineFeed:
-        ++lines;
-        line = here;
-        break;
+    // The most frequent ones first.
+    if (first.byteClass == ByteClass::Letter) return Word();
+    if (first.byteClass == ByteClass::Token) return first.token;
+    if (first.byteClass == ByteClass::Blank) continue;
+    if (first.byteClass == ByteClass::LineFeed) {
+      ++lines;
+      line = here;
+    } else if (first.byteClass == ByteClass::Slash && IsAt(here, '*')) {
+      ++here;
+      nextStart = ScannerStart::Comment;
+      SkipComment();
+    } else {
+      switch (first.byteClass) {
+        case ByteClass::Digit:
+          return Number();
+        case ByteClass::Colon:
+          return Colon();
+        default:
+          if (first.byteClass != ByteClass::Pair || !IsAt(here, first.follower)) return first.token;
+          ++here;
+          return first.pair;
+      }
     }
   }
 }
-
 void ExpressionScan::SkipComment() {
   // Its line feeds do not count.
   constexpr std::string_view kEnd = "*/";

@@ -22,17 +22,17 @@ std::string& FailureText() {
   return text;
 }
 
-constexpr int kUndefinedToken = KeyFileGrammar::kTokenCount - 1;
+constexpr std::size_t kUndefinedToken = KeyFileGrammar::kTokenCount - 1;
 
 constexpr std::string_view NameOf(KeyFileToken token) {
-  return LalrSymbolName<KeyFileGrammar>(static_cast<int>(token));
+  return LalrSymbolName<KeyFileGrammar>(static_cast<std::size_t>(token));
 }
 
 // The scanner's tokens are the grammar's, in the same order.
 static_assert(NameOf(KeyFileToken::End) == "$end" && NameOf(KeyFileToken::Identifier) == "IDENTIFIER" &&
               NameOf(KeyFileToken::Path) == "PATH_STRING" && NameOf(KeyFileToken::NewLine) == "NEWLINE" &&
               NameOf(KeyFileToken::Other) == "$undefined" &&
-              static_cast<int>(KeyFileToken::Other) == kUndefinedToken);
+              static_cast<std::size_t>(KeyFileToken::Other) == kUndefinedToken);
 
 /// Reads the text of a scan. The actions of the grammar's rules are those of `state`.
 template <class State>
@@ -41,7 +41,7 @@ bool Runs(KeyFileScan& scan, State& state) {
     if (state.IsFull()) return kLalrStop;
     const KeyFileToken token = scan.Next();
     value.piece = scan.Piece();
-    return static_cast<int>(token);
+    return static_cast<std::size_t>(token);
   };
   LalrOutcome outcome = RunLalr<KeyFileGrammar>(state, pull);
   if (outcome.end == LalrEnd::Accepted) return true;

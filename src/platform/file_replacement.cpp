@@ -30,11 +30,14 @@ bool Flush(int descriptor) {
 
 /// A content that is there as a whole.
 TextSource Whole(std::string_view content) {
-  return [content](const TextSink& write) { write(content); };
+  return [content](const TextSink& write) {
+    write(content);
+    return true;
+  };
 }
 
-/// Writes a content in pieces of some size. False, with the cause in `errno`, when one could not be written;
-/// those after it are dropped.
+/// Writes a content in pieces of some size. False, with the cause in `errno`, when one could not be written,
+/// and those after it are dropped; and when the content could not be made.
 bool WriteParts(int descriptor, const TextSource& content) {
   constexpr std::size_t kPiece = 1U << 16U;
   std::string piece;
@@ -42,7 +45,7 @@ bool WriteParts(int descriptor, const TextSource& content) {
   const auto write = [descriptor, &error](std::string_view bytes) {
     if (error == 0 && !WriteAll(descriptor, bytes)) error = errno;
   };
-  content([&piece, &write](std::string_view part) {
+  const bool isWhole = content([&piece, &write](std::string_view part) {
     if (piece.size() + part.size() > kPiece) {
       write(piece);
       piece.clear();
@@ -55,7 +58,7 @@ bool WriteParts(int descriptor, const TextSource& content) {
   });
   write(piece);
   errno = error;
-  return error == 0;
+  return isWhole && error == 0;
 }
 
 /// Writes everything and closes. The empty text, or what failed; `errno` then holds the cause.
@@ -251,11 +254,15 @@ std::string WriteFreshFile(const std::string& path, std::string_view content) {
 }
 
 std::string ReplaceFile(const std::string& target, std::string_view content) {
+  return ReplaceFile(target, Whole(content));
+}
+
+std::string ReplaceFile(const std::string& target, const TextSource& content) {
   int error = 0;
   const std::optional<std::filesystem::path> real = RealTarget(target, error);
   if (!real) return Reason("can not write file", target, error);
   std::string reason = ProtectionOfAllNames(real->native());
-  return reason.empty() ? PutInPlace(*real, target, Whole(content)) : reason;
+  return reason.empty() ? PutInPlace(*real, target, content) : reason;
 }
 
 bool IsStream(const std::string& path) {

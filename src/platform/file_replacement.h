@@ -3,10 +3,11 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
+
+#include "platform/text_source.h"
 
 namespace tessal {
 
@@ -32,16 +33,12 @@ std::string WriteFreshFile(const std::string& path, std::string_view content);
 /// empty text, or the reason in words. The old file is then whole, or, where only the folder could not be
 /// flushed, the new one is.
 std::string ReplaceFile(const std::string& target, std::string_view content);
+std::string ReplaceFile(const std::string& target, const TextSource& content);
 
 /// The same for what is made from a document. It is never written through a symbolic link, which is refused,
 /// nor into the other names of a file, which keep the old content. A pipe, a terminal or a device of that
 /// kind, by a link too, has no content that could be lost and is written as it is.
 std::string WriteOutputFile(const std::string& path, std::string_view content);
-
-/// Takes the parts of a text, one after the other.
-using TextSink = std::function<void(std::string_view part)>;
-/// Makes a text part by part, so that it is never there as a whole.
-using TextSource = std::function<void(const TextSink& write)>;
 
 /// The same for a content that is made while it is written.
 std::string WriteOutputFile(const std::string& path, const TextSource& content);

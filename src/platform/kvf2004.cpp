@@ -214,6 +214,17 @@ KvfHandle kvfCreate() {
   return Keep(std::make_unique<KvfWriter>());
 }
 
+KvfHandle kvfCreateInto(const TextSink& sink, std::string_view lastComment) {
+  return Keep(std::make_unique<KvfWriter>(sink, lastComment));
+}
+
+int kvfFinish(KvfHandle handle) {
+  KvfWriter* writer = FileOf<KvfWriter>(handle);
+  if (writer == nullptr) return kKvfBadHandle;
+  writer->Finish();
+  return kKvfOk;
+}
+
 void kvfClose(KvfHandle* handle) {
   if (handle == nullptr || *handle == 0) return;
   TheLibrary().lastFound = nullptr;

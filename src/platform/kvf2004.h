@@ -11,6 +11,8 @@
 #include <string>
 #include <string_view>
 
+#include "platform/text_source.h"
+
 namespace tessal {
 
 using KvfHandle = std::uint32_t;
@@ -65,6 +67,13 @@ int kvfGetSyntaxErr(KvfHandle handle, int& line, int& position, std::string& tex
 
 /// A handle on a new, empty file image.
 KvfHandle kvfCreate();
+
+/// The same for a file whose text goes to a sink in parts, so that it is never there as a whole. Its head
+/// ends with one comment more.
+KvfHandle kvfCreateInto(const TextSink& sink, std::string_view lastComment);
+
+/// Ends the sections that are still open; all of the text is then with the sink.
+int kvfFinish(KvfHandle handle);
 
 /// Releases a file and sets the handle to 0; a 0 handle is ignored.
 void kvfClose(KvfHandle* handle);

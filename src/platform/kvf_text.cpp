@@ -1,12 +1,21 @@
 #include "platform/kvf_text.h"
 
 #include <algorithm>
+#include <array>
+#include <utility>
 
 #include "platform/ascii.h"
 
 namespace tessal {
 
 namespace {
+
+/// A save asks this of every keyword that it writes.
+constexpr std::array<bool, 256> kWordBytes = [] {
+  std::array<bool, 256> bytes{};
+  for (std::size_t byte = 0; byte < 128; ++byte) bytes[byte] = IsWordCharacter(static_cast<char>(byte));
+  return bytes;
+}();
 
 std::size_t CountBareLineFeeds(std::string_view text) {
   std::size_t count = 0;
@@ -34,8 +43,9 @@ std::string KvfLineEnds(std::string text) {
 }
 
 bool IsKvfName(std::string_view text) {
-  return !text.empty() && !IsAsciiDigit(text.front()) &&
-         std::all_of(text.begin(), text.end(), IsWordCharacter);
+  if (text.empty() || IsAsciiDigit(text.front())) return false;
+  return std::all_of(text.begin(), text.end(),
+                     [](char each) { return kWordBytes[static_cast<unsigned char>(each)]; });
 }
 
 }  // namespace tessal

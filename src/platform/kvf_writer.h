@@ -1,9 +1,12 @@
 // Key-file text as it is written: the layout of the library's own files, made item by item.
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 #include <vector>
+
+#include "platform/text_source.h"
 
 namespace tessal {
 
@@ -18,7 +21,10 @@ inline constexpr std::string_view kKvfHeader =
 /// calls has checked that the format can hold them.
 class KvfWriter final {
  public:
-  KvfWriter() { AppendText(kKvfHeader); }
+  /// Keeps the text until it is taken.
+  KvfWriter() : KvfWriter(TextSink(), "") {}
+  /// Gives the text to a sink, part by part. A further comment comes last in the head, where there is one.
+  KvfWriter(TextSink textSink, std::string_view lastComment);
 
   bool HasOpenSection() const { return !openSections.empty(); }
   /// Whether the next value has a keyword to belong to.
@@ -32,19 +38,27 @@ class KvfWriter final {
   /// The quote is ' or |.
   void AddText(std::string_view value, char quote);
 
-  /// Ends the sections that are still open, and gives the text away.
+  /// Ends the sections that are still open. All of the text is then with the sink.
+  void Finish();
+  /// The same of a text that is kept, which is given away.
   std::string TakeText();
   std::string Text() const { return KvfWriter(*this).TakeText(); }
 
  private:
   enum class Keyword { None, Fresh, HasValues };
 
+  void Put(std::string_view piece);
+  void Put(char character) { Put(std::string_view(&character, 1)); }
+  void Flush();
   void BeginLine();
   void BeginValue();
   /// Line feeds become line ends.
-  void AppendText(std::string_view value);
+  void PutText(std::string_view value);
 
-  std::string text;
+  TextSink sink;
+  std::string kept;  ///< without a sink
+  std::vector<char> part;
+  std::size_t used = 0;  ///< of the part
   std::vector<std::string> openSections;
   Keyword keyword = Keyword::None;
 };

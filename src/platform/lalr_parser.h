@@ -7,6 +7,8 @@
 #include <cstddef>
 #include <cstdint>
 #include <iterator>
+#include <limits>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -16,7 +18,13 @@ namespace tessal {
 namespace lalr {
 
 constexpr std::size_t kMostStates = 10'000;
-constexpr int kErrorToken = 1;
+
+/// The grammar's numbers. Tokens are the first of the symbols.
+using State = std::size_t;
+using Symbol = std::size_t;
+using Rule = std::size_t;
+
+constexpr Symbol kErrorToken = 1;
 
 /// What a state does with a token, or does whatever comes: an error, a shift to the state of that number, or
 /// the reduction of the rule of the rest.
@@ -24,10 +32,15 @@ using Action = std::uint8_t;
 constexpr Action kError = 0;
 
 template <class Grammar>
-constexpr Action Reduction(int rule) {
+constexpr Action Reduction(Rule rule) {
   static_assert(Grammar::kStateCount + Grammar::kRuleCount <= 256, "an action is a byte");
   return static_cast<Action>(Grammar::kStateCount + rule);
 }
+
+struct RuleShape {
+  std::uint8_t length;  ///< symbols on the right side
+  std::uint8_t left;
+};
 
 /// The automaton with its compressed rows spread out, so that each step is one look.
 template <class Grammar>
@@ -37,53 +50,73 @@ struct Automaton {
   std::array<Action, Grammar::kStateCount> blindActions;
   /// The state after the reduction to a symbol, from the state below it.
   std::array<std::array<std::uint8_t, Grammar::kSymbolCount>, Grammar::kStateCount> nextStates;
+  std::array<RuleShape, Grammar::kRuleCount> rules;
 };
 
-/// The entry of a row for a token; an error where the default of the state applies.
+/// The place in the compressed rows, of which each row has its own base; none where the row has no entry.
 template <class Grammar>
-constexpr int Entry(int state, int token) {
-  const int place = Grammar::kTable_pact[state] + token;
-  if (place < 0 || place >= static_cast<int>(std::size(Grammar::kTable_table))) return Grammar::kErrorEntry;
-  return Grammar::kTable_check[place] == token ? Grammar::kTable_table[place] : Grammar::kErrorEntry;
+constexpr std::optional<std::size_t> PlaceOf(std::int16_t base, std::size_t column) {
+  const std::ptrdiff_t place = base + static_cast<std::ptrdiff_t>(column);
+  if (place < 0 || place >= std::ssize(Grammar::kTable_table)) return std::nullopt;
+  const auto found = static_cast<std::size_t>(place);
+  return Grammar::kTable_check[found] == static_cast<std::ptrdiff_t>(column) ? std::optional(found)
+                                                                             : std::nullopt;
 }
 
+/// The entry of a state for a token; an error where its default applies.
 template <class Grammar>
-constexpr bool IsBlind(int state) {
+constexpr int Entry(State state, Symbol token) {
+  const auto place = PlaceOf<Grammar>(Grammar::kTable_pact[state], token);
+  return place ? Grammar::kTable_table[*place] : Grammar::kErrorEntry;
+}
+
+/// Whether a state reduces whatever token comes, without a look at it.
+template <class Grammar>
+constexpr bool IsBlind(State state) {
   return Grammar::kTable_pact[state] == Grammar::kNoRow;
 }
 
 template <class Grammar>
-constexpr Action ActionOf(int state, int token) {
+constexpr Rule DefaultRule(State state) {
+  return static_cast<Rule>(Grammar::kTable_defact[state]);
+}
+
+template <class Grammar>
+constexpr Action ActionOf(State state, Symbol token) {
   const int entry = IsBlind<Grammar>(state) ? Grammar::kErrorEntry : Entry<Grammar>(state, token);
   if (entry > 0) return static_cast<Action>(entry);
-  if (entry < 0 && entry != Grammar::kErrorEntry) return Reduction<Grammar>(-entry);
-  const int rule = Grammar::kTable_defact[state];
+  if (entry != Grammar::kErrorEntry) return Reduction<Grammar>(static_cast<Rule>(-entry));
+  const Rule rule = DefaultRule<Grammar>(state);
   return rule == 0 ? kError : Reduction<Grammar>(rule);
 }
 
 template <class Grammar>
-constexpr int NextState(int state, int symbol) {
-  const int column = symbol - Grammar::kTokenCount;
-  const int place = Grammar::kTable_pgoto[column] + state;
-  const bool hasEntry = place >= 0 && place < static_cast<int>(std::size(Grammar::kTable_table)) &&
-                        Grammar::kTable_check[place] == state;
-  return hasEntry ? Grammar::kTable_table[place] : Grammar::kTable_defgoto[column];
+constexpr State NextState(State state, Symbol symbol) {
+  const std::size_t column = symbol - Grammar::kTokenCount;
+  const auto place = PlaceOf<Grammar>(Grammar::kTable_pgoto[column], state);
+  return static_cast<State>(place ? Grammar::kTable_table[*place] : Grammar::kTable_defgoto[column]);
 }
 
 template <class Grammar>
-constexpr bool PassesOn(int rule) {
-  for (const int own : Grammar::kRulesWithAction) {
+constexpr RuleShape ShapeOf(Rule rule) {
+  return {static_cast<std::uint8_t>(Grammar::kTable_r2[rule]),
+          static_cast<std::uint8_t>(Grammar::kTable_r1[rule])};
+}
+
+template <class Grammar>
+constexpr bool PassesOn(Rule rule) {
+  for (const Rule own : Grammar::kRulesWithAction) {
     if (own == rule) return false;
   }
-  return Grammar::kTable_r2[rule] == 1;
+  return ShapeOf<Grammar>(rule).length == 1;
 }
 
 /// The same after the reductions that follow blindly and change nothing but the symbol.
 template <class Grammar>
-constexpr int SettledState(int state, int symbol) {
-  int next = NextState<Grammar>(state, symbol);
-  while (IsBlind<Grammar>(next) && PassesOn<Grammar>(Grammar::kTable_defact[next])) {
-    next = NextState<Grammar>(state, Grammar::kTable_r1[Grammar::kTable_defact[next]]);
+constexpr State SettledState(State state, Symbol symbol) {
+  State next = NextState<Grammar>(state, symbol);
+  while (IsBlind<Grammar>(next) && PassesOn<Grammar>(DefaultRule<Grammar>(next))) {
+    next = NextState<Grammar>(state, ShapeOf<Grammar>(DefaultRule<Grammar>(next)).left);
   }
   return next;
 }
@@ -91,14 +124,16 @@ constexpr int SettledState(int state, int symbol) {
 template <class Grammar>
 constexpr Automaton<Grammar> SpreadOut() {
   Automaton<Grammar> automaton{};
-  for (int state = 0; state < Grammar::kStateCount; ++state) {
-    for (int token = 0; token < Grammar::kTokenCount; ++token)
+  for (State state = 0; state < Grammar::kStateCount; ++state) {
+    for (Symbol token = 0; token < Grammar::kTokenCount; ++token) {
       automaton.actions[state][token] = ActionOf<Grammar>(state, token);
+    }
     if (IsBlind<Grammar>(state)) automaton.blindActions[state] = ActionOf<Grammar>(state, 0);
-    for (int symbol = Grammar::kTokenCount; symbol < Grammar::kSymbolCount; ++symbol) {
+    for (Symbol symbol = Grammar::kTokenCount; symbol < Grammar::kSymbolCount; ++symbol) {
       automaton.nextStates[state][symbol] = static_cast<std::uint8_t>(SettledState<Grammar>(state, symbol));
     }
   }
+  for (Rule rule = 0; rule < Grammar::kRuleCount; ++rule) automaton.rules[rule] = ShapeOf<Grammar>(rule);
   return automaton;
 }
 
@@ -119,24 +154,24 @@ inline Stack<Grammar> stack;
 
 /// The grammar's name of a symbol, without the quotes of those that are no names.
 template <class Grammar>
-constexpr std::string_view LalrSymbolName(int number) {
-  const std::string_view name = Grammar::kSymbolNames[number];
+constexpr std::string_view LalrSymbolName(std::size_t symbol) {
+  const std::string_view name = Grammar::kSymbolNames[symbol];
   return name.front() == '"' ? name.substr(1, name.size() - 2) : name;
 }
 
 /// The words for a token that a state has no action for: up to four expected tokens are named.
 template <class Grammar>
-std::string LalrUnexpected(int state, int token) {
+std::string LalrUnexpected(lalr::State state, lalr::Symbol token) {
   constexpr std::size_t kMostExpected = 4;
-  std::vector<int> expected;
-  for (int other = 0; other < Grammar::kTokenCount; ++other) {
+  std::vector<lalr::Symbol> expected;
+  for (lalr::Symbol other = 0; other < Grammar::kTokenCount; ++other) {
     if (other != lalr::kErrorToken && lalr::Entry<Grammar>(state, other) != Grammar::kErrorEntry)
       expected.push_back(other);
   }
   std::string words = "syntax error, unexpected " + std::string(LalrSymbolName<Grammar>(token));
   if (expected.size() > kMostExpected) return words;
   std::string_view before = ", expecting ";
-  for (const int other : expected) {
+  for (const lalr::Symbol other : expected) {
     words += before;
     words += LalrSymbolName<Grammar>(other);
     before = " or ";
@@ -157,7 +192,7 @@ struct LalrOutcome {
 };
 
 /// What is pulled to stop a parse.
-inline constexpr int kLalrStop = -1;
+inline constexpr std::size_t kLalrStop = std::numeric_limits<std::size_t>::max();
 
 /// Parses what `pull(value)` gives: the grammar's number of the next token, 0 at the end, with its value. The
 /// actions of the rules are calls of `state`.
@@ -169,10 +204,11 @@ LalrOutcome RunLalr(State& state, Pull pull) {
   std::size_t top = 0;
   symbols.states[0] = 0;
   const auto reduce = [&top, &symbols, &state](Action reduction) {
-    const int rule = reduction - Grammar::kStateCount;
-    top = top + 1 - static_cast<std::size_t>(Grammar::kTable_r2[rule]);
+    const Rule rule = reduction - Grammar::kStateCount;
+    const RuleShape shape = kTables.rules[rule];
+    top = top + 1 - shape.length;
+    symbols.states[top] = kTables.nextStates[symbols.states[top - 1]][shape.left];
     symbols.values[top] = Grammar::Reduce(rule, &symbols.values[top], state);
-    symbols.states[top] = kTables.nextStates[symbols.states[top - 1]][Grammar::kTable_r1[rule]];
     return top + 1 < kMostStates;
   };
   for (;;) {
@@ -180,7 +216,7 @@ LalrOutcome RunLalr(State& state, Pull pull) {
       if (!reduce(blind)) return {LalrEnd::TooDeep, {}};
     }
     typename Grammar::Value value{};
-    const int token = pull(value);
+    const Symbol token = pull(value);
     if (token == kLalrStop) return {LalrEnd::Stopped, {}};
     Action action = kTables.actions[symbols.states[top]][token];
     for (; action >= Grammar::kStateCount; action = kTables.actions[symbols.states[top]][token]) {

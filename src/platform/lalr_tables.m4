@@ -1,4 +1,3 @@
-                                                                  -*- m4 -*-
 # What Bison writes of a grammar: its automaton as tables, and the actions of its rules as one function, in a
 # structure with the name of api.prefix. The loop over them is lalr_parser.h.
 
@@ -22,6 +21,7 @@ b4_output_begin([b4_parser_file_name])
 [// The automaton of a grammar, made from its file.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 
 ]b4_percent_code_get([[requires]])[
@@ -34,11 +34,11 @@ struct ]b4_api_prefix[ {
   ]b4_user_union_members[
   };
 
-  static constexpr int kStateCount = ]b4_states_number[;
-  static constexpr int kTokenCount = ]b4_tokens_number[;
-  static constexpr int kSymbolCount = ]m4_eval(b4_tokens_number + b4_nterms_number)[;
-  static constexpr int kRuleCount = ]m4_eval(b4_rules_number + 1)[;  ///< that of the end of the text included
-  static constexpr int kFinalState = ]b4_final_state_number[;
+  static constexpr std::size_t kStateCount = ]b4_states_number[;
+  static constexpr std::size_t kTokenCount = ]b4_tokens_number[;
+  static constexpr std::size_t kSymbolCount = ]m4_eval(b4_tokens_number + b4_nterms_number)[;
+  static constexpr std::size_t kRuleCount = ]m4_eval(b4_rules_number + 1)[;  ///< that of the end of the text included
+  static constexpr std::size_t kFinalState = ]b4_final_state_number[;
   static constexpr int kNoRow = ]b4_pact_ninf[;
   static constexpr int kErrorEntry = ]b4_table_ninf[;
 
@@ -49,11 +49,11 @@ struct ]b4_api_prefix[ {
   };
 
   /// The rules that make a value of their own. All others pass their first one on.
-  static constexpr int kRulesWithAction[] = {]m4_pushdef([b4_case], m4_defn([tessal_rule_number]))b4_actions[]m4_popdef([b4_case])[};
+  static constexpr std::size_t kRulesWithAction[] = {]m4_pushdef([b4_case], m4_defn([tessal_rule_number]))b4_actions[]m4_popdef([b4_case])[};
 
   /// The value of the left side of a rule from those of its right side.
   template <class Parse>
-  static Value Reduce(int rule, const Value* right, Parse& state) {
+  static Value Reduce(std::size_t rule, const Value* right, Parse& state) {
     Value value = right[0];
     switch (rule) {
 ]b4_user_actions[
