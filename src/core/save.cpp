@@ -148,12 +148,12 @@ bool Writing::WriteText(const TextSink& sink) {
   Image image(sink);
   if (!WriteSections(image.Handle())) return false;
   kvfFinish(image.Handle());
-  // One more line, and what the file held beside the template.
-  sink("\r\n");
   if (!state.keptText.empty()) {
     sink(state.keptText);
     sink("\r\n\r\n");
   }
+  // The file ends in one line more.
+  sink("\r\n");
   return true;
 }
 
