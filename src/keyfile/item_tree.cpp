@@ -79,12 +79,12 @@ void CKvfBaseItem::Clear() {
 }
 
 void CKvfBaseItem::SetDepth(std::size_t newDepth) {
-  depth = static_cast<std::uint32_t>(newDepth) & kDepthMask;
+  PutDepth(newDepth);
   if (kind != kSection) return;
   for (CKvfBaseItem& child : static_cast<CKvfSectionItem&>(*this).Children()) child.SetDepth(newDepth + 1);
 }
 
-CKvfBaseItem& CKvfBaseItem::Copy(ItemMemory& memory) const {
+CKvfBaseItem& CKvfBaseItem::CopyAt(std::size_t copyDepth, ItemMemory& memory) const {
   CKvfBaseItem* copy = nullptr;
   if (kind == kKeyword) {
     copy = &CopyKey(static_cast<const CKvfKeyItem&>(*this).Values(), memory);
@@ -95,9 +95,11 @@ CKvfBaseItem& CKvfBaseItem::Copy(ItemMemory& memory) const {
     copy = &MakeComment(lines, memory);
   } else {
     auto& section = memory.Make<CKvfSectionItem>(memory);
+    section.PutDepth(copyDepth);
     if (kind == kSection) section.CopyContent(static_cast<const CKvfSectionItem&>(*this));
     copy = &section;
   }
+  copy->PutDepth(copyDepth);
   copy->CopyFields(*this, memory);
   copy->parent = parent;
   return *copy;
@@ -128,7 +130,7 @@ void CKvfSectionItem::SetStartComment(std::string_view text) {
 void CKvfSectionItem::Receive(CKvfBaseItem& child) {
   child.parent = this;
   // A part of a tree has the right depths once its uppermost item has.
-  if (child.depth != depth + 1) child.SetDepth(depth + 1);
+  if (child.depth != depth + 1) child.SetDepth(depth + 1U);
 }
 
 void CKvfSectionItem::AppendChild(CKvfBaseItem& child) {
@@ -167,7 +169,7 @@ CKvfCommentItem& CKvfSectionItem::AppendComment(std::span<const std::string_view
 
 void CKvfSectionItem::CopyContent(const CKvfSectionItem& source) {
   SetStartComment(memory->Copy(source.StartComment()));
-  for (const CKvfBaseItem& child : source.Children()) AppendChild(child.Copy(*memory));
+  for (const CKvfBaseItem& child : source.Children()) AppendChild(child.CopyAt(depth + 1, *memory));
 }
 
 void CKvfSectionItem::Assign(const CKvfSectionItem& source) {

@@ -52,7 +52,7 @@ class CKvfBaseItem {
   /// back. The start comment of a section stays.
   void Clear();
   /// A copy in a memory, with the parent of its source and depth 0. Its texts are copies too.
-  CKvfBaseItem& Copy(ItemMemory& memory) const;
+  CKvfBaseItem& Copy(ItemMemory& memory) const { return CopyAt(0, memory); }
 
   Kind ItemKind() const { return kind; }
   /// The names from the top, a point before each; the root gives the empty text.
@@ -86,6 +86,8 @@ class CKvfBaseItem {
   explicit CKvfBaseItem(Kind itemKind) : kind(itemKind) {}
   ~CKvfBaseItem() = default;
 
+  /// A copy with a depth.
+  CKvfBaseItem& CopyAt(std::size_t copyDepth, ItemMemory& memory) const;
   /// Takes kind, name, comment and position of another item, with copies of the texts.
   void CopyFields(const CKvfBaseItem& source, ItemMemory& memory);
 
@@ -94,7 +96,9 @@ class CKvfBaseItem {
   friend class ItemIterator;
 
   static constexpr unsigned kDepthBits = 28;
-  static constexpr std::uint32_t kDepthMask = (1U << kDepthBits) - 1;
+
+  /// Gives the item alone a depth.
+  void PutDepth(std::size_t value) { depth = static_cast<std::uint32_t>(value) & ((1U << kDepthBits) - 1); }
 
   CKvfBaseItem* next = nullptr;  ///< of the same section
   CKvfSectionItem* parent = nullptr;

@@ -72,6 +72,18 @@ ByteClass ClassAt(const char* place) {
   return kByteClasses[static_cast<unsigned char>(*place)];
 }
 
+/// The bytes that continue a name or keyword.
+constexpr std::array<bool, 256> kWordBytes = [] {
+  std::array<bool, 256> continues{};
+  for (std::size_t byte = 0; byte < continues.size(); ++byte)
+    continues[byte] = IsWordCharacter(static_cast<char>(byte));
+  return continues;
+}();
+
+bool ContinuesWord(const char* place) {
+  return kWordBytes[static_cast<unsigned char>(*place)];
+}
+
 bool IsDigit(const char* place) {
   return ClassAt(place) == ByteClass::Digit;
 }
@@ -139,7 +151,7 @@ KeyFileToken KeyFileScan::Next() {
 
 KeyFileToken KeyFileScan::Word() {
   piece = here;
-  while (ClassAt(here) == ByteClass::Letter || ClassAt(here) == ByteClass::Digit) ++here;
+  while (ContinuesWord(here)) ++here;
   pieceEnd = here;
   const std::string_view word = Piece().View();
   const auto isWord = [word](std::string_view reserved) { return EqualIgnoringCase(word, reserved); };

@@ -37,7 +37,9 @@ constexpr Action Reduction(Rule rule) {
   return static_cast<Action>(Grammar::kStateCount + rule);
 }
 
+/// What a reduction needs to know of its rule.
 struct RuleShape {
+  Action action;        ///< the reduction; an error for no rule
   std::uint8_t length;  ///< symbols on the right side
   std::uint8_t left;
 };
@@ -46,8 +48,8 @@ struct RuleShape {
 template <class Grammar>
 struct Automaton {
   std::array<std::array<Action, Grammar::kTokenCount>, Grammar::kStateCount> actions;
-  /// The reductions that need no look at the next token; an error where there is none.
-  std::array<Action, Grammar::kStateCount> blindActions;
+  /// The reductions that need no look at the next token; no rule where there is none.
+  std::array<RuleShape, Grammar::kStateCount> blindRules;
   /// The state after the reduction to a symbol, from the state below it.
   std::array<std::array<std::uint8_t, Grammar::kSymbolCount>, Grammar::kStateCount> nextStates;
   std::array<RuleShape, Grammar::kRuleCount> rules;
@@ -82,15 +84,6 @@ constexpr Rule DefaultRule(State state) {
 }
 
 template <class Grammar>
-constexpr Action ActionOf(State state, Symbol token) {
-  const int entry = IsBlind<Grammar>(state) ? Grammar::kErrorEntry : Entry<Grammar>(state, token);
-  if (entry > 0) return static_cast<Action>(entry);
-  if (entry != Grammar::kErrorEntry) return Reduction<Grammar>(static_cast<Rule>(-entry));
-  const Rule rule = DefaultRule<Grammar>(state);
-  return rule == 0 ? kError : Reduction<Grammar>(rule);
-}
-
-template <class Grammar>
 constexpr State NextState(State state, Symbol symbol) {
   const std::size_t column = symbol - Grammar::kTokenCount;
   const auto place = PlaceOf<Grammar>(Grammar::kTable_pgoto[column], state);
@@ -99,7 +92,7 @@ constexpr State NextState(State state, Symbol symbol) {
 
 template <class Grammar>
 constexpr RuleShape ShapeOf(Rule rule) {
-  return {static_cast<std::uint8_t>(Grammar::kTable_r2[rule]),
+  return {Reduction<Grammar>(rule), static_cast<std::uint8_t>(Grammar::kTable_r2[rule]),
           static_cast<std::uint8_t>(Grammar::kTable_r1[rule])};
 }
 
@@ -111,14 +104,23 @@ constexpr bool PassesOn(Rule rule) {
   return ShapeOf<Grammar>(rule).length == 1;
 }
 
-/// The same after the reductions that follow blindly and change nothing but the symbol.
+/// The state that comes after one that lies on a state, and after the reductions that follow blindly there
+/// and change nothing but the symbol.
 template <class Grammar>
-constexpr State SettledState(State state, Symbol symbol) {
-  State next = NextState<Grammar>(state, symbol);
+constexpr State Settled(State next, State below) {
   while (IsBlind<Grammar>(next) && PassesOn<Grammar>(DefaultRule<Grammar>(next))) {
-    next = NextState<Grammar>(state, ShapeOf<Grammar>(DefaultRule<Grammar>(next)).left);
+    next = NextState<Grammar>(below, ShapeOf<Grammar>(DefaultRule<Grammar>(next)).left);
   }
   return next;
+}
+
+template <class Grammar>
+constexpr Action ActionOf(State state, Symbol token) {
+  const int entry = IsBlind<Grammar>(state) ? Grammar::kErrorEntry : Entry<Grammar>(state, token);
+  if (entry > 0) return static_cast<Action>(Settled<Grammar>(static_cast<State>(entry), state));
+  if (entry != Grammar::kErrorEntry) return Reduction<Grammar>(static_cast<Rule>(-entry));
+  const Rule rule = DefaultRule<Grammar>(state);
+  return rule == 0 ? kError : Reduction<Grammar>(rule);
 }
 
 template <class Grammar>
@@ -128,9 +130,10 @@ constexpr Automaton<Grammar> SpreadOut() {
     for (Symbol token = 0; token < Grammar::kTokenCount; ++token) {
       automaton.actions[state][token] = ActionOf<Grammar>(state, token);
     }
-    if (IsBlind<Grammar>(state)) automaton.blindActions[state] = ActionOf<Grammar>(state, 0);
+    if (IsBlind<Grammar>(state)) automaton.blindRules[state] = ShapeOf<Grammar>(DefaultRule<Grammar>(state));
     for (Symbol symbol = Grammar::kTokenCount; symbol < Grammar::kSymbolCount; ++symbol) {
-      automaton.nextStates[state][symbol] = static_cast<std::uint8_t>(SettledState<Grammar>(state, symbol));
+      automaton.nextStates[state][symbol] =
+          static_cast<std::uint8_t>(Settled<Grammar>(NextState<Grammar>(state, symbol), state));
     }
   }
   for (Rule rule = 0; rule < Grammar::kRuleCount; ++rule) automaton.rules[rule] = ShapeOf<Grammar>(rule);
@@ -195,38 +198,41 @@ struct LalrOutcome {
 inline constexpr std::size_t kLalrStop = std::numeric_limits<std::size_t>::max();
 
 /// Parses what `pull(value)` gives: the grammar's number of the next token, 0 at the end, with its value. The
-/// actions of the rules are calls of `state`.
-template <class Grammar, class State, class Pull>
-LalrOutcome RunLalr(State& state, Pull pull) {
+/// actions of the rules are calls of `parse`.
+template <class Grammar, class Parse, class Pull>
+LalrOutcome RunLalr(Parse& parse, Pull pull) {
   using namespace lalr;
   constexpr const Automaton<Grammar>& kTables = kAutomaton<Grammar>;
   Stack<Grammar>& symbols = stack<Grammar>;
   std::size_t top = 0;
-  symbols.states[0] = 0;
-  const auto reduce = [&top, &symbols, &state](Action reduction) {
-    const Rule rule = reduction - Grammar::kStateCount;
-    const RuleShape shape = kTables.rules[rule];
-    top = top + 1 - shape.length;
-    symbols.states[top] = kTables.nextStates[symbols.states[top - 1]][shape.left];
-    symbols.values[top] = Grammar::Reduce(rule, &symbols.values[top], state);
+  State present = 0;
+  const auto push = [&](State next, const typename Grammar::Value& value) {
+    present = next;
+    symbols.states[top] = static_cast<std::uint16_t>(next);
+    symbols.values[top] = value;
     return top + 1 < kMostStates;
   };
+  const auto reduce = [&](RuleShape rule) {
+    top = top + 1 - rule.length;
+    const State next = kTables.nextStates[symbols.states[top - 1]][rule.left];
+    return push(next, Grammar::Reduce(rule.action - Grammar::kStateCount, &symbols.values[top], parse));
+  };
+  symbols.states[0] = 0;
   for (;;) {
-    while (const Action blind = kTables.blindActions[symbols.states[top]]) {
-      if (!reduce(blind)) return {LalrEnd::TooDeep, {}};
+    for (RuleShape rule = kTables.blindRules[present]; rule.action != kError;
+         rule = kTables.blindRules[present]) {
+      if (!reduce(rule)) return {LalrEnd::TooDeep, {}};
     }
     typename Grammar::Value value{};
     const Symbol token = pull(value);
     if (token == kLalrStop) return {LalrEnd::Stopped, {}};
-    Action action = kTables.actions[symbols.states[top]][token];
-    for (; action >= Grammar::kStateCount; action = kTables.actions[symbols.states[top]][token]) {
-      if (!reduce(action)) return {LalrEnd::TooDeep, {}};
+    Action action = kTables.actions[present][token];
+    for (; action >= Grammar::kStateCount; action = kTables.actions[present][token]) {
+      if (!reduce(kTables.rules[action - Grammar::kStateCount])) return {LalrEnd::TooDeep, {}};
     }
-    if (action == kError) return {LalrEnd::Refused, LalrUnexpected<Grammar>(symbols.states[top], token)};
+    if (action == kError) return {LalrEnd::Refused, LalrUnexpected<Grammar>(present, token)};
     ++top;
-    symbols.states[top] = action;
-    symbols.values[top] = value;
-    if (top + 1 == kMostStates) return {LalrEnd::TooDeep, {}};
+    if (!push(action, value)) return {LalrEnd::TooDeep, {}};
     if (action == Grammar::kFinalState) return {LalrEnd::Accepted, {}};
   }
 }
