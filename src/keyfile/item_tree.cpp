@@ -181,19 +181,20 @@ void CKvfSectionItem::Assign(const CKvfSectionItem& source) {
 }
 
 void CKvfSectionItem::TakeOver(std::unique_ptr<CKvfItemTree> source) {
-  kind = source->kind;
-  mark = source->mark;
+  const CKvfItemTree& root = *source;
+  memory->Hold(std::move(source));
+  kind = root.kind;
+  mark = root.mark;
   depth = 0;
-  SetName(source->Name());
-  SetComment(source->Comment());
-  SetPosition(source->Line(), source->Column());
-  SetStartComment(source->StartComment());
-  for (CKvfBaseItem* child = source->first; child != nullptr;) {
+  SetName(root.Name());
+  SetComment(root.Comment());
+  SetPosition(root.Line(), root.Column());
+  SetStartComment(root.StartComment());
+  for (CKvfBaseItem* child = root.first; child != nullptr;) {
     CKvfBaseItem* const following = child->next;
     AppendChild(*child);
     child = following;
   }
-  memory->Hold(std::move(source));
 }
 
 std::size_t CKvfSectionItem::CountChildren(Kind childKind) const {

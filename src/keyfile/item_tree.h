@@ -201,7 +201,8 @@ class CKvfSectionItem : public CKvfBaseItem {
   CKvfSectionItem& AppendSection(std::string_view childName);
   CKvfKeyItem& AppendKey(std::string_view childName, std::span<const KvfValue> values);
   CKvfCommentItem& AppendComment(std::span<const std::string_view> lines);
-  /// Takes the fields of a tree's root and, after the present children, its children themselves.
+  /// Takes the fields of a tree's root and, after the present children, its children themselves. Their memory
+  /// goes with this section's.
   void TakeOver(std::unique_ptr<CKvfItemTree> source);
   /// Takes the fields of another section and, after the present children, copies of its children.
   void Assign(const CKvfSectionItem& source);

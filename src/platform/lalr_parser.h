@@ -37,8 +37,8 @@ constexpr Action Reduction(Rule rule) {
   return static_cast<Action>(Grammar::kStateCount + rule);
 }
 
-/// What a reduction needs to know of its rule.
-struct RuleShape {
+/// What a reduction needs to know of its rule, in one word.
+struct alignas(4) RuleShape {
   Action action;        ///< the reduction; an error for no rule
   std::uint8_t length;  ///< symbols on the right side
   std::uint8_t left;
@@ -103,6 +103,15 @@ constexpr bool PassesOn(Rule rule) {
   }
   return ShapeOf<Grammar>(rule).length == 1;
 }
+
+/// Whether a reduction may make the stack higher.
+template <class Grammar>
+constexpr bool kHasEmptyRules = [] {
+  for (Rule rule = 1; rule < Grammar::kRuleCount; ++rule) {
+    if (ShapeOf<Grammar>(rule).length == 0) return true;
+  }
+  return false;
+}();
 
 /// The state that comes after one that lies on a state, and after the reductions that follow blindly there
 /// and change nothing but the symbol.
@@ -206,16 +215,12 @@ LalrOutcome RunLalr(Parse& parse, Pull pull) {
   Stack<Grammar>& symbols = stack<Grammar>;
   std::size_t top = 0;
   State present = 0;
-  const auto push = [&](State next, const typename Grammar::Value& value) {
-    present = next;
-    symbols.states[top] = static_cast<std::uint16_t>(next);
-    symbols.values[top] = value;
-    return top + 1 < kMostStates;
-  };
   const auto reduce = [&](RuleShape rule) {
     top = top + 1 - rule.length;
-    const State next = kTables.nextStates[symbols.states[top - 1]][rule.left];
-    return push(next, Grammar::Reduce(rule.action - Grammar::kStateCount, &symbols.values[top], parse));
+    present = kTables.nextStates[symbols.states[top - 1]][rule.left];
+    symbols.states[top] = static_cast<std::uint16_t>(present);
+    symbols.values[top] = Grammar::Reduce(rule.action - Grammar::kStateCount, &symbols.values[top], parse);
+    return !kHasEmptyRules<Grammar> || top + 1 < kMostStates;
   };
   symbols.states[0] = 0;
   for (;;) {
@@ -232,7 +237,10 @@ LalrOutcome RunLalr(Parse& parse, Pull pull) {
     }
     if (action == kError) return {LalrEnd::Refused, LalrUnexpected<Grammar>(present, token)};
     ++top;
-    if (!push(action, value)) return {LalrEnd::TooDeep, {}};
+    present = action;
+    symbols.states[top] = action;
+    symbols.values[top] = value;
+    if (top + 1 == kMostStates) return {LalrEnd::TooDeep, {}};
     if (action == Grammar::kFinalState) return {LalrEnd::Accepted, {}};
   }
 }
