@@ -167,7 +167,7 @@ class Comparison final {
   template <class Item>
   bool CompareAll(Item& child, Partners& partners) {
     bool allSame = true;
-    partners.TakeEach(child, [this, &child, &allSame](Item& candidate) {
+    partners.TakeEach(child, [&](Item& candidate) {
       const bool same = Run(child, candidate);
       allSame = allSame && same;
       const auto mark = same ? CKvfBaseItem::kSame : CKvfBaseItem::kDifferent;

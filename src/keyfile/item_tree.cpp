@@ -23,8 +23,8 @@ KvfValue CopyOf(const KvfValue& value, ItemMemory& memory) {
 
 CKvfCommentItem& MakeComment(std::span<const std::string_view> lines, ItemMemory& memory) {
   CKvfCommentItem& block = memory.Make<CKvfCommentItem>();
-  for (const std::string_view line : std::views::reverse(lines)) {
-    block.Prepend(memory.Make<CommentLine>(memory.Copy(line), nullptr));
+  for (std::size_t place = lines.size(); place-- > 0;) {
+    block.Prepend(memory.Copy(lines[place]), memory);
   }
   return block;
 }
@@ -109,7 +109,8 @@ std::string CKvfBaseItem::Path() const {
   std::vector<const CKvfBaseItem*> way;
   for (const CKvfBaseItem* item = this; item->parent != nullptr; item = item->parent) way.push_back(item);
   std::string path;
-  for (const CKvfBaseItem* item : std::views::reverse(way)) path.append(".").append(item->Name());
+  // NOLINTNEXTLINE(modernize-loop-convert)
+  for (auto item = way.rbegin(); item != way.rend(); ++item) path.append(".").append((*item)->Name());
   return path;
 }
 

@@ -9,7 +9,6 @@
 #include <iosfwd>
 #include <iterator>
 #include <memory>
-#include <ranges>
 #include <set>
 #include <span>
 #include <string>
@@ -113,7 +112,6 @@ class CKvfBaseItem {
   Mark mark : 2 = kUnmatched;
 };
 
-/// Over the children of a section, in file order.
 class ItemIterator final {
  public:
   using value_type = CKvfBaseItem;
@@ -138,10 +136,23 @@ class ItemIterator final {
   CKvfBaseItem* item = nullptr;
 };
 
+/// The children of a section, in file order.
+class ItemRange final {
+ public:
+  explicit ItemRange(CKvfBaseItem* firstChild) : first(firstChild) {}
+  ItemIterator begin() const { return first; }
+  static ItemIterator end() { return {}; }
+  bool empty() const { return first == end(); }
+  CKvfBaseItem& front() const { return *first; }
+
+ private:
+  ItemIterator first;
+};
+
 /// A line of a comment, without the leading "//".
 struct CommentLine {
   std::string_view text;
-  CommentLine* next;
+  const CommentLine* next;
 };
 
 /// A block of adjacent comment lines.
@@ -151,16 +162,15 @@ class CKvfCommentItem final : public CKvfBaseItem {
 
   /// The first of the lines; none for an empty block.
   const CommentLine* FirstLine() const { return first; }
-  /// Puts a line, which lives as long as the item, before the others.
-  void Prepend(CommentLine& commentLine) {
-    commentLine.next = first;
-    first = &commentLine;
+  /// Puts a line before the others. Its text must live as long as the tree.
+  void Prepend(std::string_view text, ItemMemory& memory) {
+    first = &memory.Make<CommentLine>(CommentLine{text, first});
   }
 
  private:
   friend class CKvfBaseItem;
 
-  CommentLine* first = nullptr;
+  const CommentLine* first = nullptr;
 };
 
 class CKvfKeyItem final : public CKvfBaseItem {
@@ -189,7 +199,7 @@ class CKvfSectionItem : public CKvfBaseItem {
   /// An empty section, what is below which lies in a memory.
   explicit CKvfSectionItem(ItemMemory& treeMemory) : CKvfBaseItem(kSection), memory(&treeMemory) {}
 
-  std::ranges::subrange<ItemIterator> Children() const { return {ItemIterator(first), ItemIterator()}; }
+  ItemRange Children() const { return ItemRange(first); }
   std::size_t CountChildren(Kind childKind) const;
   /// The child with that place from 0 among those of its kind, or none.
   CKvfBaseItem* ChildByKind(std::size_t index, Kind childKind) const;

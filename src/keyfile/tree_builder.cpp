@@ -54,7 +54,7 @@ CKvfBaseItem* TreeBuilder::NewComment(KeyFilePiece line) {
 }
 
 CKvfBaseItem* TreeBuilder::PrependComment(KeyFilePiece line, CKvfBaseItem* block) {
-  static_cast<CKvfCommentItem*>(block)->Prepend(memory.Make<CommentLine>(CommentText(line), nullptr));
+  static_cast<CKvfCommentItem*>(block)->Prepend(CommentText(line), memory);
   return block;
 }
 
