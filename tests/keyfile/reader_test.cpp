@@ -92,9 +92,15 @@ TEST_P(KeyFile, IsAsTheCasesSay) {
 INSTANTIATE_TEST_SUITE_P(Cases, KeyFile, testing::Values("reading.txt", "comparing.txt"));
 
 TEST(Reader, DeepNestingIsAMessage) {
-  std::string nested = "\n";
-  for (int depth = 0; depth < 100'000; ++depth) nested += "[S]\n";
-  EXPECT_NE(Read(nested).find("memory exhausted"), std::string::npos);
+  const auto times = [](int count, const std::string& text) {
+    std::string repeated;
+    for (int number = 0; number < count; ++number) repeated += text;
+    return repeated;
+  };
+  EXPECT_EQ(Read("\n" + times(100'000, "[S]\n")), "Error memory exhaustedin line 2500, column 1");
+  // A section without content makes the stack higher, and a line feed counts for two characters.
+  EXPECT_EQ(Read("\n[A]\nEndSect\n" + times(3000, "[S]\n")), "Error memory exhaustedin line 2502, column 0");
+  EXPECT_EQ(Read("\n[S]\n" + times(10'050, "//c\n")), "Error memory exhaustedin line 9993, column 4");
 }
 
 TEST(Reader, LineEndsOfEitherKindReadTheSame) {
@@ -209,6 +215,10 @@ TEST(ItemTree, CopiesKeepEverythingButParentAndDepth) {
   EXPECT_EQ(Items(copy), "2 Comment .S. 4:1 mark 0\n2 Keyword .S.K 5:0 mark 0\n");
   EXPECT_EQ(Written(copy), "[S] //s\n   //c\n   //d\n   \n   K = 1,'t'\nEndSect //e\n\n");
   EXPECT_EQ(other.ChildByKind(2, CKvfBaseItem::kSection), nullptr);
+  CKvfSectionItem& deep = other.AppendSection("A").AppendSection("B");
+  deep.AppendChild(copy.Copy(other.Memory()));
+  EXPECT_EQ(Items(deep),
+            "3 Section .A.B.S 1:0 mark 0\n4 Comment .A.B.S. 4:1 mark 0\n4 Keyword .A.B.S.K 5:0 mark 0\n");
   copy.Clear();
   EXPECT_EQ(copy.StartComment(), "s");
   EXPECT_TRUE(copy.Children().empty());
@@ -234,6 +244,7 @@ TEST(ItemTree, KeywordsSayHowTheyDiffer) {
   CKvfItemTree tree;
   const auto key = [&tree](const std::vector<std::int32_t>& numbers, const char* name = "K") -> CKvfKeyItem& {
     std::vector<KvfValue> values;
+    values.reserve(numbers.size());
     for (const std::int32_t number : numbers) values.push_back(KvfValue::Integer(number));
     return tree.AppendKey(name, values);
   };
