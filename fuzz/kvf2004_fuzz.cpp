@@ -1,11 +1,14 @@
-// Any bytes are loaded or refused with a place; every item of a loaded file answers every question.
+// Any bytes are loaded or refused with a place; every item of a loaded file answers every question, and a
+// text that is called strict is one for the reader of the item tree.
 #include <cstdint>
 #include <cstdlib>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "keyfile/reader.h"
 #include "platform/kvf2004.h"
+#include "platform/kvf_text.h"
 
 namespace {
 
@@ -40,6 +43,10 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   if (file == 0) {
     Require(kvfGetErrorGlb() == kKvfSyntaxError && line >= 1 && position >= 1 && near.size() <= 40);
     return 0;
+  }
+  if (kvfIsStrict(file)) {
+    std::string text = KvfReadableText({reinterpret_cast<const char*>(data), size});
+    Require(CheckKeyFileText(text) == 1);
   }
   std::vector<KvfNode> open;
   for (const char* name : {"T", "TESSAL_SETUP", "A"}) {

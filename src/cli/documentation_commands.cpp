@@ -39,7 +39,7 @@ PageOptions PageOf(const HtmlCall& call) {
 }  // namespace
 
 ExitCode RunOverview(const std::string& file) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!LoadOrComplain(core, file)) return kCallFault;
   WriteOverviewText(core, BuildOverview(core),
                     [](std::string_view part) { Print(ForTerminal(std::string(part))); });
@@ -47,7 +47,7 @@ ExitCode RunOverview(const std::string& file) {
 }
 
 ExitCode RunHtml(const HtmlCall& call) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!LoadOrComplain(core, call.file)) return kCallFault;
   std::string failure;
   const std::optional<std::string> page = PagePath(call, failure);

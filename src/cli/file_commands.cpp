@@ -27,14 +27,14 @@ bool MayLose(const TemplateCore& core, const Call& call) {
 }  // namespace
 
 ExitCode RunSave(const SaveCall& call) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
   if (!MayLose(core, call)) return kContentFault;
   return SaveOrComplain(core, call.output.empty() ? call.file : call.output) ? kFine : kCallFault;
 }
 
 ExitCode RunRepair(const SaveCall& call) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
   for (const AccountEntry& entry : core.Account().Entries()) PrintLine(AccountLine(call.file, entry));
   const bool isWhole = core.TakeOverPassedOver();
@@ -44,7 +44,7 @@ ExitCode RunRepair(const SaveCall& call) {
 
 ExitCode RunNew(const std::string& output, bool overwrite) {
   if (!overwrite && !IsFreeOrComplain(output)) return kCallFault;
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   return SaveOrComplain(core, output) ? kFine : kCallFault;
 }
 
@@ -69,7 +69,7 @@ bool ComplainOfLostNames(const TemplateCore& core, const RenameCall& call, const
 }  // namespace
 
 ExitCode RunRename(const RenameCall& call) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!MayWriteOutput(call) || !LoadOrComplain(core, call.file)) return kCallFault;
   if (!MayLose(core, call)) return kContentFault;
   const std::string newSymbol(CleanText(call.newSymbol));

@@ -34,7 +34,7 @@ Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
 }  // namespace
 
 ExitCode RunSymbols(const std::string& file, Format format) {
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   if (!LoadOrComplain(core, file)) return kCallFault;
   if (format == Format::Json) {
     const EndsWithoutMemory end;

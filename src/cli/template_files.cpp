@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <memory>
 #include <new>
 #include <system_error>
 #include <vector>
@@ -26,6 +27,11 @@ void ComplainWithMessages(std::string_view what, const std::string& file) {
 }
 
 }  // namespace
+
+TemplateCore& TheTemplate() {
+  static TemplateCore& core = *std::make_unique<TemplateCore>().release();
+  return core;
+}
 
 bool RanOutOfMemory() {
   static constexpr Message kOutOfMemory("out-of-memory");

@@ -10,6 +10,9 @@ struct AccountEntry;
 
 namespace tessal::cli {
 
+/// The template that a command works on. Nobody takes it apart: the process ends with it.
+TemplateCore& TheTemplate();
+
 /// Whether the last load or save ended for want of memory, which is no fault of the file.
 bool RanOutOfMemory();
 

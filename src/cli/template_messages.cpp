@@ -5,6 +5,7 @@
 #include <unordered_map>
 
 #include "cli/output.h"
+#include "cli/template_files.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
@@ -18,22 +19,17 @@ namespace {
 /// elements, and a walk through the symbol table for each would take its square.
 class ElementIndex final {
  public:
-  explicit ElementIndex(TemplateCore& core) {
-    for (const SymbolRecord& record : core.SymbolTable()) {
-      entries.try_emplace(record.uid, Entry{record.element, &record});
-    }
-    Add(core.Root());
-    for (const auto& head : core.ListHeads()) Add(*head);
-    if (CEL_Miscanellous* misc = core.GetMisc()) Add(*misc);
-  }
+  explicit ElementIndex(const TemplateCore& indexed) : core(indexed) {}
 
   /// The element with that identity, or none.
-  const CEL_Element* Find(Uid uid) const {
+  const CEL_Element* Find(Uid uid) {
+    MakeOnce();
     const auto hit = entries.find(uid);
     return hit == entries.end() ? nullptr : hit->second.element;
   }
   /// Its first record, or none.
-  const SymbolRecord* RecordOf(Uid uid) const {
+  const SymbolRecord* RecordOf(Uid uid) {
+    MakeOnce();
     const auto hit = entries.find(uid);
     return hit == entries.end() ? nullptr : hit->second.record;
   }
@@ -44,12 +40,24 @@ class ElementIndex final {
     const SymbolRecord* record;
   };
 
+  /// Most templates have no message, and need none of it.
+  void MakeOnce() {
+    if (!entries.empty()) return;
+    for (const SymbolRecord& record : core.SymbolTable()) {
+      entries.try_emplace(record.uid, Entry{record.element, &record});
+    }
+    Add(core.Root());
+    for (const auto& head : core.ListHeads()) Add(*head);
+    if (const CEL_Miscanellous* misc = core.GetMisc()) Add(*misc);
+  }
+
   void Add(const CEL_Element& element) { entries.try_emplace(element.GetUid(), Entry{&element, nullptr}); }
 
+  const TemplateCore& core;
   std::unordered_map<Uid, Entry> entries;
 };
 
-TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements) {
+TemplateMessage Describe(const ErrorRecord& record, ElementIndex& elements) {
   TemplateMessage message;
   message.level = record.level;
   message.code = record.code;
@@ -63,8 +71,7 @@ TemplateMessage Describe(const ErrorRecord& record, const ElementIndex& elements
   return message;
 }
 
-UndefinedName Describe(const UndefinedSymbol& undefined, const ElementIndex& elements,
-                       const TemplateCore& core) {
+UndefinedName Describe(const UndefinedSymbol& undefined, ElementIndex& elements, const TemplateCore& core) {
   UndefinedName name;
   name.symbol = undefined.symbol;
   std::set<std::string> listed;
@@ -85,9 +92,9 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   messages.path = file;
   // A comment that a file leaves open must not swallow the expressions of the next one.
   ResetExpressionScanner();
-  TemplateCore core;
+  TemplateCore& core = TheTemplate();
   messages.loaded = core.LoadWrapper(file);
-  const ElementIndex elements(core);
+  ElementIndex elements(core);
   std::set<std::tuple<std::uint32_t, std::string_view, std::string_view>> listed;
   for (const ErrorRecord& record : Errors().Records()) {
     if (static_cast<int>(record.level) < lowestLevel) continue;

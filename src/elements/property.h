@@ -48,7 +48,7 @@ struct CEL_Choice {
 using ChoiceList = std::shared_ptr<const std::vector<CEL_Choice>>;
 
 class CEL_Property;
-struct ParsedExpression;
+class ParsedExpression;
 
 /// Who wants to know of changes. Called after the change, in order of registration.
 class PropertyListener {

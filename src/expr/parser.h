@@ -28,7 +28,7 @@ struct ParseFailure {
 /// What the parse of a text gives, in one block of memory. The result depends on the text and on where its
 /// scan began, and the scan leaves a start to the next one: both are part of the value, so that its use can
 /// take the place of a parse. Nodes and names are views into the text: the text lives as long as its parse.
-struct ParsedExpression final {
+class ParsedExpression final {
  public:
   ParsedExpression(const ParsedExpression&) = delete;
   ParsedExpression& operator=(const ParsedExpression&) = delete;

@@ -9,7 +9,7 @@
 
 namespace tessal {
 
-struct ParsedExpression;
+class ParsedExpression;
 
 /// Checks a parsed expression. Each finding, the failure of a parse among them, goes to the error registry
 /// under the symbol and identity. False only when it did not parse.

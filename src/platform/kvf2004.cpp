@@ -165,13 +165,6 @@ int OpenSection(KvfHandle handle, std::string_view name, bool asTarget) {
   return kKvfOk;
 }
 
-/// The quote that a text can be written in; 0 when the format cannot hold it.
-char QuoteFor(std::string_view text) {
-  if (text.find('\0') != std::string_view::npos) return '\0';
-  if (text.find('\'') == std::string_view::npos) return '\'';
-  return text.find('|') == std::string_view::npos ? '|' : '\0';
-}
-
 }  // namespace
 
 KvfHandle kvfLoadFile(const std::string& path, int /*mode*/) {
@@ -474,9 +467,12 @@ int kvfAddDouble(KvfHandle handle, double value) {
 }
 
 int kvfAddString(KvfHandle handle, std::string_view value) {
-  const char quote = QuoteFor(value);
-  if (quote == '\0') return Note(kKvfNotWritable);
-  return AddValue(handle, [value, quote](KvfWriter& writer) { writer.AddText(value, quote); });
+  const KvfTextMarks marks = KvfMarksIn(value);
+  if (marks.hasZero || (marks.hasApostrophe && marks.hasBar)) return Note(kKvfNotWritable);
+  return AddValue(handle, [value, marks](KvfWriter& writer) {
+    const char quote = marks.hasApostrophe ? '|' : '\'';
+    marks.hasLineEnd ? writer.AddLines(value, quote) : writer.AddText(value, quote);
+  });
 }
 
 int kvfWrite(KvfHandle handle, const std::string& path) {

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstdint>
 
 #include "platform/ascii.h"
 
@@ -9,7 +10,20 @@ namespace tessal {
 
 namespace {
 
-/// A save asks this of every keyword that it writes.
+// A save asks these of every keyword and text that it writes.
+
+enum Mark : std::uint8_t { kZero = 1, kApostrophe = 2, kBar = 4, kLineEnd = 8 };
+
+constexpr std::array<std::uint8_t, 256> kMarks = [] {
+  std::array<std::uint8_t, 256> marks{};
+  marks['\0'] = kZero;
+  marks['\''] = kApostrophe;
+  marks['|'] = kBar;
+  marks['\n'] = kLineEnd;
+  marks['\r'] = kLineEnd;
+  return marks;
+}();
+
 constexpr std::array<bool, 256> kWordBytes = [] {
   std::array<bool, 256> bytes{};
   for (std::size_t byte = 0; byte < 128; ++byte) bytes[byte] = IsWordCharacter(static_cast<char>(byte));
@@ -39,6 +53,12 @@ std::string KvfLineEnds(std::string text) {
     rest.remove_prefix(feed + 1);
   }
   return changed += rest;
+}
+
+KvfTextMarks KvfMarksIn(std::string_view text) {
+  unsigned marks = 0;
+  for (const char each : text) marks |= kMarks[static_cast<unsigned char>(each)];
+  return {(marks & kZero) != 0, (marks & kApostrophe) != 0, (marks & kBar) != 0, (marks & kLineEnd) != 0};
 }
 
 bool IsKvfName(std::string_view text) {

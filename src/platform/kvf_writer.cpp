@@ -1,6 +1,5 @@
 #include "platform/kvf_writer.h"
 
-#include <cstring>
 #include <utility>
 
 namespace tessal {
@@ -10,21 +9,20 @@ namespace {
 /// A part is large enough to be written to a file by itself.
 constexpr std::size_t kPartSize = 1U << 17U;
 constexpr std::size_t kBlanksPerLevel = 3;
-constexpr std::string_view kBlanks = "                              ";
-constexpr std::string_view kLineEnd = "\r\n";
+constexpr char kLineEnd[] = "\r\n";
 
 }  // namespace
 
 KvfWriter::KvfWriter(TextSink textSink, std::string_view lastComment)
     : sink(std::move(textSink)), part(kPartSize) {
   const std::size_t lastLine = kKvfHeader.rfind('\n', kKvfHeader.size() - 2) + 1;
-  PutText(kKvfHeader.substr(0, lastLine));
+  PutLines(kKvfHeader.substr(0, lastLine));
   if (!lastComment.empty()) {
     Put("// ");
     Put(lastComment);
     Put(kLineEnd);
   }
-  PutText(kKvfHeader.substr(lastLine));
+  PutLines(kKvfHeader.substr(lastLine));
 }
 
 void KvfWriter::OpenSection(std::string_view name) {
@@ -64,7 +62,14 @@ void KvfWriter::AddNumber(std::string_view number) {
 void KvfWriter::AddText(std::string_view value, char quote) {
   BeginValue();
   Put(quote);
-  PutText(value);
+  Put(value);
+  Put(quote);
+}
+
+void KvfWriter::AddLines(std::string_view value, char quote) {
+  BeginValue();
+  Put(quote);
+  PutLines(value);
   Put(quote);
 }
 
@@ -78,16 +83,13 @@ std::string KvfWriter::TakeText() {
   return std::move(kept);
 }
 
-void KvfWriter::Put(std::string_view piece) {
-  if (piece.size() > part.size() - used) Flush();
-  while (piece.size() > part.size()) {
-    std::memcpy(part.data(), piece.data(), part.size());
-    used = part.size();
-    Flush();
-    piece.remove_prefix(part.size());
+void KvfWriter::PutLarge(std::string_view piece) {
+  while (!piece.empty()) {
+    if (used == part.size()) Flush();
+    const std::size_t taken = piece.copy(part.data() + used, part.size() - used);
+    used += taken;
+    piece.remove_prefix(taken);
   }
-  std::memcpy(part.data() + used, piece.data(), piece.size());
-  used += piece.size();
 }
 
 void KvfWriter::Flush() {
@@ -100,11 +102,12 @@ void KvfWriter::Flush() {
 }
 
 void KvfWriter::BeginLine() {
-  for (std::size_t left = kBlanksPerLevel * openSections.size(); left > 0;) {
-    const std::string_view blanks = kBlanks.substr(0, left);
-    Put(blanks);
-    left -= blanks.size();
-  }
+  // Few sections lie deeper.
+  constexpr char kBlanks[] = "                    ";
+  std::size_t left = kBlanksPerLevel * openSections.size();
+  for (; left >= sizeof(kBlanks); left -= sizeof(kBlanks) - 1) Put(kBlanks);
+  std::memcpy(Room(sizeof(kBlanks)), kBlanks, sizeof(kBlanks));
+  used += left;
 }
 
 void KvfWriter::EndKeyword() {
@@ -117,10 +120,7 @@ void KvfWriter::BeginValue() {
   keyword = Keyword::HasValues;
 }
 
-void KvfWriter::PutText(std::string_view value) {
-  const bool isOneLine =
-      value.find('\n') == std::string_view::npos && value.find('\r') == std::string_view::npos;
-  if (isOneLine) return Put(value);
+void KvfWriter::PutLines(std::string_view value) {
   while (true) {
     const std::size_t next = value.find_first_of(kLineEnd);
     Put(value.substr(0, next));

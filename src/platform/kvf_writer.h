@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstddef>
+#include <cstring>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -35,8 +36,10 @@ class KvfWriter final {
   void AddKeyword(std::string_view name);
   void EndKeyword();
   void AddNumber(std::string_view number);
-  /// The quote is ' or |.
+  /// The quote is ' or |. The text is on one line.
   void AddText(std::string_view value, char quote);
+  /// The same for a text of several lines. Line feeds become line ends.
+  void AddLines(std::string_view value, char quote);
 
   /// Ends the sections that are still open. All of the text is then with the sink.
   void Finish();
@@ -47,13 +50,32 @@ class KvfWriter final {
  private:
   enum class Keyword { None, Fresh, HasValues };
 
-  void Put(std::string_view piece);
-  void Put(char character) { Put(std::string_view(&character, 1)); }
+  /// Room at the end of the part for a few bytes.
+  char* Room(std::size_t size) {
+    if (size > part.size() - used) Flush();
+    return part.data() + used;
+  }
+  void Put(std::string_view piece) {
+    // Most pieces are a few bytes, and fit.
+    if (piece.size() > part.size() - used) return PutLarge(piece);
+    piece.copy(part.data() + used, piece.size());
+    used += piece.size();
+  }
+  /// The same for a text of the layout.
+  template <std::size_t kSize>
+  void Put(const char (&literal)[kSize]) {
+    std::memcpy(Room(kSize - 1), literal, kSize - 1);
+    used += kSize - 1;
+  }
+  void Put(char character) {
+    *Room(1) = character;
+    ++used;
+  }
+  void PutLarge(std::string_view piece);
   void Flush();
   void BeginLine();
   void BeginValue();
-  /// Line feeds become line ends.
-  void PutText(std::string_view value);
+  void PutLines(std::string_view value);
 
   TextSink sink;
   std::string kept;  ///< without a sink

@@ -93,5 +93,19 @@ TEST(Editing, ResetLeavesMembersInTheirClass) {
   EXPECT_THROW(loaded->GetSpecie(2), std::out_of_range);
 }
 
+TEST(Editing, ASymbolIsCheckedAgainWhenAUserFunctionTakesItsName) {
+  LoadedTemplate loaded(TemplateText().Misc().Constant("Mix").Text());
+  SetNotifyChanges(true);
+  EXPECT_TRUE(loaded->ValidateTemplate());
+  CEL_ExternalFunction& function = loaded->GetMisc()->AddExternalFunction();
+  function.publicName.SetText("Mix");
+  EXPECT_FALSE(loaded->ValidateTemplate());
+  function.publicName.SetText("Blend");
+  EXPECT_TRUE(loaded->ValidateTemplate());
+  loaded->GetConstant(0).symbol.SetText("1st");
+  EXPECT_FALSE(loaded->ValidateTemplate()) << "a change is checked";
+  SetNotifyChanges(false);
+}
+
 }  // namespace
 }  // namespace tessal
