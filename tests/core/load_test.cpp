@@ -11,7 +11,6 @@
 #include "core/loaded_template.h"
 #include "keyfile/reader.h"
 #include "platform/kvf2004.h"
-#include "platform/kvf_text.h"
 #include "support/template_text.h"
 
 namespace tessal {
