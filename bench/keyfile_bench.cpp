@@ -26,7 +26,7 @@ std::string KeyFileText(std::int64_t sections) {
 void ReadTree(benchmark::State& state) {
   const std::string text = KeyFileText(state.range(0));
   for ([[maybe_unused]] auto turn : state) {
-    CKvfSectionItem tree;
+    CKvfItemTree tree;
     if (ParseKeyFileTree(text, tree) == 0) state.SkipWithError(KeyFileFailureText().c_str());
   }
   state.SetBytesProcessed(state.iterations() * static_cast<std::int64_t>(text.size()));
@@ -43,8 +43,8 @@ void ReadByLibrary(benchmark::State& state) {
 }
 
 void CompareTrees(benchmark::State& state) {
-  CKvfSectionItem left;
-  CKvfSectionItem right;
+  CKvfItemTree left;
+  CKvfItemTree right;
   ParseKeyFileTree(KeyFileText(state.range(0)), left);
   right.Assign(left);
   for ([[maybe_unused]] auto turn : state)

@@ -33,10 +33,17 @@ function(tessal_library name)
   target_link_libraries(${name} PUBLIC tessal_options ${ARG_LIBRARIES})
 endfunction()
 
-# tessal_generated(SOURCES...)
-# Scanners and parsers come from Flex and Bison: their skeletons do not keep our warnings, so they are compiled without them.
-function(tessal_generated)
-  set_source_files_properties(${ARGN} PROPERTIES COMPILE_OPTIONS "-w;-Wno-error" SKIP_LINTING ON)
+# tessal_grammar(HEADER_VARIABLE HEADER)
+# The automaton of the folder's grammar.y as tables: a header, by our own skeleton.
+function(tessal_grammar header_variable header)
+  set(file "${CMAKE_CURRENT_BINARY_DIR}/generated/${header}")
+  cmake_path(GET file PARENT_PATH folder)
+  file(MAKE_DIRECTORY "${folder}")
+  add_custom_command(OUTPUT "${file}"
+    COMMAND ${BISON_EXECUTABLE} -Wno-yacc -o "${file}" grammar.y
+    DEPENDS grammar.y "${CMAKE_SOURCE_DIR}/src/platform/lalr_tables.m4"
+    WORKING_DIRECTORY "${CMAKE_CURRENT_SOURCE_DIR}" VERBATIM)
+  set(${header_variable} "${file}" PARENT_SCOPE)
 endfunction()
 
 # tessal_test(NAME SOURCES... LIBRARIES...)

@@ -22,27 +22,27 @@ std::string Written(const tessal::CKvfSectionItem& tree) {
 }
 
 bool StartsWithComment(const tessal::CKvfSectionItem& tree) {
-  return !tree.Children().empty() && tree.Children().front()->ItemKind() == tessal::CKvfBaseItem::kComment;
+  return !tree.Children().empty() && tree.Children().front().ItemKind() == tessal::CKvfBaseItem::kComment;
 }
 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::string text(reinterpret_cast<const char*>(data), size);
-  tessal::CKvfSectionItem tree;
+  tessal::CKvfItemTree tree;
   if (tessal::ParseKeyFileTree(text, tree) == 0) {
     Require(!tessal::KeyFileFailureText().empty() && tree.Children().empty());
     return 0;
   }
-  tessal::CKvfSectionItem copy;
+  tessal::CKvfItemTree copy;
   copy.Assign(tree);
   Require(tree.Compare(tree, nullptr, nullptr, false) || !tree.Children().empty());
   const std::string once = Written(copy);
   if (StartsWithComment(tree)) return 0;
-  tessal::CKvfSectionItem again;
+  tessal::CKvfItemTree again;
   Require(tessal::ParseKeyFileTree(once, again) == 1);
   const std::string twice = Written(again);
-  tessal::CKvfSectionItem last;
+  tessal::CKvfItemTree last;
   Require(tessal::ParseKeyFileTree(twice, last) == 1);
   Require(Written(last) == twice);
   return 0;

@@ -24,7 +24,7 @@ const CKvfKeyItem& AsKeyword(const CKvfBaseItem& item) {
   return static_cast<const CKvfKeyItem&>(item);
 }
 
-void WriteJsonText(JsonWriter& writer, const std::string& text) {
+void WriteJsonText(JsonWriter& writer, std::string_view text) {
   writer.String(text.data(), static_cast<rapidjson::SizeType>(text.size()));
 }
 
@@ -46,7 +46,7 @@ void WriteJsonValue(JsonWriter& writer, const KvfValue& value) {
   }
 }
 
-void WriteJsonValues(JsonWriter& writer, const std::vector<KvfValue>& values) {
+void WriteJsonValues(JsonWriter& writer, std::span<const KvfValue> values) {
   if (values.size() == 1) {
     WriteJsonValue(writer, values.front());
     return;
@@ -58,42 +58,42 @@ void WriteJsonValues(JsonWriter& writer, const std::vector<KvfValue>& values) {
 
 void WriteJsonSection(JsonWriter& writer, const CKvfSectionItem& section) {
   writer.StartObject();
-  for (const auto& child : section.Children()) {
-    if (child->ItemKind() == CKvfBaseItem::kComment) continue;
-    WriteJsonText(writer, child->name);
-    if (child->ItemKind() == CKvfBaseItem::kSection) {
-      WriteJsonSection(writer, AsSection(*child));
+  for (const CKvfBaseItem& child : section.Children()) {
+    if (child.ItemKind() == CKvfBaseItem::kComment) continue;
+    WriteJsonText(writer, child.Name());
+    if (child.ItemKind() == CKvfBaseItem::kSection) {
+      WriteJsonSection(writer, AsSection(child));
     } else {
-      WriteJsonValues(writer, AsKeyword(*child).values);
+      WriteJsonValues(writer, AsKeyword(child).Values());
     }
   }
   writer.EndObject();
 }
 
 std::string PlainText(const KvfValue& value) {
-  if (value.Type() == KvfValue::kQuoted || value.Type() == KvfValue::kPath) return value.AsString();
-  std::ostringstream text;
-  value.Write(text);
-  return text.str();
+  if (value.IsText()) return std::string(value.AsString());
+  std::string text;
+  value.AppendTo(text);
+  return text;
 }
 
 void AppendXmlKeyword(pugi::xml_node parent, const CKvfKeyItem& keyword) {
-  pugi::xml_node element = parent.append_child(keyword.name.c_str());
-  if (keyword.values.size() == 1) {
-    element.text().set(PlainText(keyword.values.front()).c_str());
+  pugi::xml_node element = parent.append_child(std::string(keyword.Name()).c_str());
+  if (keyword.Values().size() == 1) {
+    element.text().set(PlainText(keyword.Values().front()).c_str());
     return;
   }
-  for (const KvfValue& value : keyword.values) {
+  for (const KvfValue& value : keyword.Values()) {
     element.append_child("VALUE").text().set(PlainText(value).c_str());
   }
 }
 
 void AppendXmlChildren(pugi::xml_node parent, const CKvfSectionItem& section) {
-  for (const auto& child : section.Children()) {
-    if (child->ItemKind() == CKvfBaseItem::kSection) {
-      AppendXmlChildren(parent.append_child(child->name.c_str()), AsSection(*child));
-    } else if (child->ItemKind() == CKvfBaseItem::kKeyword) {
-      AppendXmlKeyword(parent, AsKeyword(*child));
+  for (const CKvfBaseItem& child : section.Children()) {
+    if (child.ItemKind() == CKvfBaseItem::kSection) {
+      AppendXmlChildren(parent.append_child(std::string(child.Name()).c_str()), AsSection(child));
+    } else if (child.ItemKind() == CKvfBaseItem::kKeyword) {
+      AppendXmlKeyword(parent, AsKeyword(child));
     }
   }
 }
@@ -121,9 +121,9 @@ std::string ContentAsXml(const CKvfSectionItem& tree) {
 
 std::size_t CountNodes(const CKvfSectionItem& tree) {
   std::size_t count = 0;
-  for (const auto& child : tree.Children()) {
-    if (child->ItemKind() == CKvfBaseItem::kSection) count += 1 + CountNodes(AsSection(*child));
-    if (child->ItemKind() == CKvfBaseItem::kKeyword) count += 1 + AsKeyword(*child).values.size();
+  for (const CKvfBaseItem& child : tree.Children()) {
+    if (child.ItemKind() == CKvfBaseItem::kSection) count += 1 + CountNodes(AsSection(child));
+    if (child.ItemKind() == CKvfBaseItem::kKeyword) count += 1 + AsKeyword(child).Values().size();
   }
   return count;
 }

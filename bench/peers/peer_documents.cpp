@@ -62,8 +62,8 @@ std::unique_ptr<Image> ReadImageInPlace(std::string& text) {
   return std::make_unique<Image>(std::move(text));
 }
 
-std::unique_ptr<CKvfSectionItem> ReadItemTree(const std::string& text) {
-  auto tree = std::make_unique<CKvfSectionItem>();
+std::unique_ptr<CKvfItemTree> ReadItemTree(const std::string& text) {
+  auto tree = std::make_unique<CKvfItemTree>();
   ReadTree(text, *tree);
   return tree;
 }
@@ -188,7 +188,7 @@ void Compare() {
   std::string xml;
   std::size_t ourNodes = 0;
   {
-    CKvfSectionItem tree;
+    CKvfItemTree tree;
     ReadTree(text, tree);
     json = ContentAsJson(tree);
     xml = ContentAsXml(tree);

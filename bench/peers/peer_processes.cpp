@@ -68,7 +68,7 @@ void WriteAsXml(const std::string& keyFile, const std::string& path) {
   std::string failure;
   const std::optional<std::string> text = ReadWholeFile(keyFile, failure);
   if (!text) throw std::runtime_error(failure);
-  CKvfSectionItem tree;
+  CKvfItemTree tree;
   ReadTree(*text, tree);
   std::string xml = ContentAsXml(tree);
   if (xml.size() < text->size()) xml.resize(text->size(), ' ');

@@ -147,14 +147,14 @@ class Listing final {
   void AddFurtherSections() {
     if (core.KeptText().empty()) return;
     bool targetSeen = false;
-    for (const auto& child : core.KeptTree().Children()) {
-      if (child->ItemKind() != CKvfBaseItem::kSection) continue;
-      const bool isTarget = !targetSeen && EqualIgnoringCase(child->name, section::kTarget);
+    for (const CKvfBaseItem& child : core.KeptTree().Children()) {
+      if (child.ItemKind() != CKvfBaseItem::kSection) continue;
+      const bool isTarget = !targetSeen && EqualIgnoringCase(child.Name(), section::kTarget);
       targetSeen = targetSeen || isTarget;
       if (isTarget) continue;
-      TextStream text;
-      child->Write(text);
-      Add("Further section", child->name).fields = {{"Text", text.str()}};
+      std::string text;
+      child.AppendTo(text);
+      Add("Further section", std::string(child.Name())).fields = {{"Text", std::move(text)}};
     }
   }
 

@@ -134,9 +134,8 @@ bool Reading::ReadFile(const std::string& path) {
 }
 
 void Reading::CheckStrictly(bool isCut) {
-  std::string text = KvfLineEnds(*state.source);
-  if (CheckKeyFileText(text) != 0) return;
-  const bool isEmpty = text.empty() && !isCut;
+  if (CheckKeyFileText(*state.source) != 0) return;
+  const bool isEmpty = state.source->empty() && !isCut;
   Errors().ReportInFile(kNotKeptSymbol, 0, {"sections-not-kept", {TreeFailureText(isEmpty)}});
 }
 

@@ -73,8 +73,8 @@ void TemplateCore::Clear() {
 
 const CKvfSectionItem& TemplateCore::KeptTree() const {
   if (!state.keptTree) {
-    state.keptTree = std::make_unique<CKvfSectionItem>();
-    ParseKeyFileTree(std::string(SourceText()), *state.keptTree);
+    state.keptTree = std::make_unique<CKvfItemTree>();
+    if (state.source) ParseKeyFileTree(state.source, *state.keptTree);
   }
   return *state.keptTree;
 }

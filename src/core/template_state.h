@@ -47,8 +47,8 @@ struct TemplateState {
   /// The text of the file that was loaded. Texts of elements are views into it: it goes after them.
   std::shared_ptr<const std::string> source;
   std::string keptText;  ///< what that file holds beside the template, as it is in it
-  mutable std::unique_ptr<CKvfSectionItem> keptTree;  ///< of the source; none before somebody asks
-  LoadAccount account;                                ///< what the load did not take over
+  mutable std::unique_ptr<CKvfItemTree> keptTree;  ///< of the source; none before somebody asks
+  LoadAccount account;                             ///< what the load did not take over
   std::uint32_t groupCounter = 0;
   std::string templateFileName;
   std::string saveFileName;

@@ -1,5 +1,4 @@
-// The shift-reduce parser: the automaton of the grammar over the tokens of one text. It behaves as LALR(1)
-// tables with default reductions do, in what it accepts, in where it fails, and in its words.
+// The shift-reduce parser: the automaton of the grammar over the tokens of one text.
 #pragma once
 
 namespace tessal {

@@ -1,5 +1,6 @@
 // The grammar of the expression language. Its products are a tree, or a message; nothing is evaluated.
-%skeleton "./grammar_tables.m4"
+%skeleton "../platform/lalr_tables.m4"
+%define api.prefix {ExpressionGrammar}
 
 %code requires {
 #include "expr/parse_state.h"

@@ -1,11 +1,14 @@
 // Comparing two item trees, with a report of what differs. Comments never count, and an item without a
 // partner makes no difference by itself: it is reported only together with a real one.
+#include <algorithm>
 #include <array>
+#include <bit>
+#include <functional>
 #include <ostream>
 #include <regex>
 #include <string_view>
-#include <unordered_map>
 #include <utility>
+#include <vector>
 
 #include "keyfile/item_tree.h"
 
@@ -38,10 +41,10 @@ std::vector<std::regex> Compile(const IgnoredNames* names) {
   return expressions;
 }
 
-bool IsIgnored(const std::string& name, const std::vector<std::regex>& expressions) {
+bool IsIgnored(std::string_view name, const std::vector<std::regex>& expressions) {
   if (name.size() > kLongestMatched) return false;
   for (const std::regex& expression : expressions) {
-    if (std::regex_search(name, expression)) return true;
+    if (std::regex_search(name.begin(), name.end(), expression)) return true;
   }
   return false;
 }
@@ -50,128 +53,165 @@ void Report(std::ostream* report, std::string_view first, std::string_view secon
   if (report != nullptr) *report << first << second << '\n';
 }
 
-}  // namespace
-
-bool CKvfKeyItem::Compare(CKvfBaseItem& other, std::ostream* report, const IgnoredNames* ignoreNames,
-                          bool /*onlyKeywords*/) {
-  if (other.ItemKind() != kKeyword) return false;
-  if (ignoreNames != nullptr && IsIgnored(name, Compile(ignoreNames))) {
-    Report(report, "ignored key name ", name);
-    return true;
-  }
-  const auto& otherKey = static_cast<const CKvfKeyItem&>(other);
-  if (name != otherKey.name) {
-    Report(report, "Different key names " + name + "<>", otherKey.name);
+bool CompareKeys(const CKvfKeyItem& key, const CKvfKeyItem& other, std::ostream* report) {
+  if (key.Name() != other.Name()) {
+    if (report != nullptr) {
+      *report << "Different key names " << key.Name() << "<>" << other.Name() << '\n';
+    }
     return false;
   }
-  if (values.size() != otherKey.values.size()) {
-    Report(report, name, " different value count");
+  const std::span<const KvfValue> values = key.Values();
+  const std::span<const KvfValue> otherValues = other.Values();
+  if (values.size() != otherValues.size()) {
+    Report(report, key.Name(), " different value count");
     return false;
   }
   if (values.empty()) return false;
-  for (std::size_t place = 0; place < values.size(); ++place) {
-    if (values[place] == otherKey.values[place]) continue;
-    Report(report, name + " Value #" + std::to_string(place + 1), " is different");
+  const auto difference = std::ranges::mismatch(values, otherValues).in1;
+  if (difference != values.end()) {
+    if (report != nullptr) {
+      *report << key.Name() << " Value #" << difference - values.begin() + 1 << " is different\n";
+    }
     return false;
   }
-  Report(report, name, " matches");
+  Report(report, key.Name(), " matches");
   return true;
 }
 
+/// The sections and keywords of a section by kind and name.
+class Partners final {
+ public:
+  static constexpr std::uint32_t kNone = 0xFFFFFFFFU;
+
+  explicit Partners(const CKvfSectionItem& section) {
+    for (CKvfBaseItem& child : section.Children()) {
+      if (child.ItemKind() != CKvfBaseItem::kComment) items.push_back({&child, kNone});
+    }
+    names.resize(std::bit_ceil(2 * items.size() + 1));
+    // From the end, so that the items of a name are in file order.
+    for (auto place = static_cast<std::uint32_t>(items.size()); place-- > 0;) {
+      Name& name = Find(*items[place].item);
+      items[place].next = std::exchange(name.first, place);
+      name.any = place;
+    }
+  }
+
+  /// Calls back for each item with the kind and name of another one, and leaves none for a later call.
+  template <class Item, class Call>
+  void TakeEach(const Item& like, Call call) {
+    Name& name = Find(like);
+    for (std::uint32_t place = std::exchange(name.first, kNone); place != kNone; place = items[place].next) {
+      call(static_cast<Item&>(*items[place].item));
+    }
+  }
+
+ private:
+  struct Entry {
+    CKvfBaseItem* item;
+    std::uint32_t next;  ///< of the same kind and name
+  };
+  struct Name {
+    std::uint32_t any = kNone;    ///< an item with the name; none for a free place
+    std::uint32_t first = kNone;  ///< of those that are left
+  };
+
+  Name& Find(const CKvfBaseItem& item) {
+    const std::size_t mask = names.size() - 1;
+    std::size_t place = std::hash<std::string_view>()(item.Name()) & mask;
+    while (names[place].any != kNone) {
+      const CKvfBaseItem& other = *items[names[place].any].item;
+      if (other.ItemKind() == item.ItemKind() && other.Name() == item.Name()) break;
+      place = (place + 1) & mask;
+    }
+    return names[place];
+  }
+
+  std::vector<Entry> items;
+  std::vector<Name> names;  ///< hashed, with at least as many free places as names
+};
+
 /// The recursive step of a comparison. Partners are found by name; the marks of both trees are the result.
-class CKvfSectionItem::Comparison final {
+class Comparison final {
  public:
   explicit Comparison(const IgnoredNames* ignoreNames) : ignored(Compile(ignoreNames)) {}
 
   bool Run(CKvfSectionItem& left, CKvfSectionItem& right) {
-    if (left.name != right.name) return false;
-    if (IsIgnored(left.name, ignored)) {
-      left.SetMarks(kIgnored);
-      right.SetMarks(kIgnored);
+    if (left.Name() != right.Name()) return false;
+    if (IsIgnored(left.Name(), ignored)) {
+      left.SetMarks(CKvfBaseItem::kIgnored);
+      right.SetMarks(CKvfBaseItem::kIgnored);
       return true;
     }
     Partners partners(right);
     bool ignoredMarked = false;
-    std::size_t differences = 0;
-    for (const auto& child : left.children) {
-      switch (child->ItemKind()) {
-        case kSection:
-          differences +=
-              CompareSections(static_cast<CKvfSectionItem&>(*child), partners.sections[child->name]);
-          break;
-        case kKeyword:
-          if (IsIgnored(child->name, ignored)) {
-            child->mark = kIgnored;
-            break;
-          }
-          if (!ignoredMarked) MarkIgnoredKeywords(right);
-          ignoredMarked = true;
-          differences += CompareKeywords(static_cast<CKvfKeyItem&>(*child), partners.keywords[child->name]);
-          break;
-        default:
-          child->mark = kIgnored;
-          break;
+    bool same = true;
+    for (CKvfBaseItem& child : left.Children()) {
+      if (child.ItemKind() == CKvfBaseItem::kSection) {
+        same = CompareAll(static_cast<CKvfSectionItem&>(child), partners) && same;
+      } else if (child.ItemKind() == CKvfBaseItem::kKeyword && !IsIgnored(child.Name(), ignored)) {
+        if (!std::exchange(ignoredMarked, true)) MarkIgnoredKeywords(right);
+        same = CompareAll(static_cast<CKvfKeyItem&>(child), partners) && same;
+      } else {
+        child.SetMark(CKvfBaseItem::kIgnored);
       }
     }
-    left.mark = differences == 0 ? kSame : kDifferent;
-    return differences == 0;
+    left.SetMark(same ? CKvfBaseItem::kSame : CKvfBaseItem::kDifferent);
+    return same;
   }
 
  private:
-  /// The children of a section by name, each list in file order.
-  struct Partners {
-    explicit Partners(const CKvfSectionItem& section) {
-      for (const auto& child : section.children) {
-        if (child->ItemKind() == kSection) {
-          sections[child->name].push_back(static_cast<CKvfSectionItem*>(child.get()));
-        } else if (child->ItemKind() == kKeyword) {
-          keywords[child->name].push_back(static_cast<CKvfKeyItem*>(child.get()));
-        }
-      }
-    }
-    std::unordered_map<std::string_view, std::vector<CKvfSectionItem*>> sections;
-    std::unordered_map<std::string_view, std::vector<CKvfKeyItem*>> keywords;
-  };
+  static bool Run(CKvfKeyItem& left, CKvfKeyItem& right) { return CompareKeys(left, right, nullptr); }
 
   /// Does not stop at the first partner: every unmatched one of the name is compared, and none is left for
   /// the next child of the name.
-  std::size_t CompareSections(CKvfSectionItem& child, std::vector<CKvfSectionItem*>& candidates) {
-    std::size_t differences = 0;
-    for (CKvfSectionItem* candidate : std::exchange(candidates, {})) {
-      const bool same = Run(child, *candidate);
-      if (!same) ++differences;
-      child.mark = candidate->mark = same ? kSame : kDifferent;
-    }
-    return differences;
-  }
-
-  static std::size_t CompareKeywords(CKvfKeyItem& child, std::vector<CKvfKeyItem*>& candidates) {
-    std::size_t differences = 0;
-    for (CKvfKeyItem* candidate : std::exchange(candidates, {})) {
-      const bool same = child.Compare(*candidate, nullptr, nullptr, false);
-      if (!same) ++differences;
-      child.mark = candidate->mark = same ? kSame : kDifferent;
-    }
-    return differences;
+  template <class Item>
+  bool CompareAll(Item& child, Partners& partners) {
+    bool allSame = true;
+    partners.TakeEach(child, [&](Item& candidate) {
+      const bool same = Run(child, candidate);
+      allSame = allSame && same;
+      const auto mark = same ? CKvfBaseItem::kSame : CKvfBaseItem::kDifferent;
+      child.SetMark(mark);
+      candidate.SetMark(mark);
+    });
+    return allSame;
   }
 
   void MarkIgnoredKeywords(const CKvfSectionItem& section) const {
-    for (const auto& child : section.children) {
-      const bool open = child->ItemKind() == kKeyword && child->mark == kUnmatched;
-      if (open && IsIgnored(child->name, ignored)) child->mark = kIgnored;
+    if (ignored.empty()) return;
+    for (CKvfBaseItem& child : section.Children()) {
+      const bool isOpen =
+          child.ItemKind() == CKvfBaseItem::kKeyword && child.ComparisonMark() == CKvfBaseItem::kUnmatched;
+      if (isOpen && IsIgnored(child.Name(), ignored)) child.SetMark(CKvfBaseItem::kIgnored);
     }
   }
 
   std::vector<std::regex> ignored;
 };
 
-bool CKvfSectionItem::Compare(CKvfBaseItem& other, std::ostream* report, const IgnoredNames* ignoreNames,
-                              bool onlyKeywords) {
-  if (other.ItemKind() != kSection) return false;
-  auto& otherSection = static_cast<CKvfSectionItem&>(other);
-  SetMarks(kUnmatched);
-  otherSection.SetMarks(kUnmatched);
-  const bool same = Comparison(ignoreNames).Run(*this, otherSection);
+void ReportDifferences(const CKvfSectionItem& section, std::ostream& report, int side, bool onlyKeywords) {
+  constexpr std::array<std::string_view, 2> kUnmatchedTexts = {" is missing", " is extra"};
+  for (const CKvfBaseItem& child : section.Children()) {
+    const CKvfBaseItem::Kind kind = child.ItemKind();
+    const CKvfBaseItem::Mark mark = child.ComparisonMark();
+    const bool isReported =
+        kind == CKvfBaseItem::kKeyword || (kind != CKvfBaseItem::kComment && !onlyKeywords);
+    if (isReported && mark == CKvfBaseItem::kUnmatched) {
+      report << child.Describe() << kUnmatchedTexts.at(static_cast<std::size_t>(side)) << '\n';
+    } else if (isReported && mark == CKvfBaseItem::kDifferent && side == 0) {
+      report << child.Describe() << " is different (line " << child.Line() << ")\n";
+    }
+    if (kind == CKvfBaseItem::kSection) {
+      ReportDifferences(static_cast<const CKvfSectionItem&>(child), report, side, onlyKeywords);
+    }
+  }
+}
+
+bool CompareSections(CKvfSectionItem& section, CKvfSectionItem& other, std::ostream* report,
+                     const IgnoredNames* ignoreNames, bool onlyKeywords) {
+  section.SetMarks(CKvfBaseItem::kUnmatched);
+  other.SetMarks(CKvfBaseItem::kUnmatched);
+  const bool same = Comparison(ignoreNames).Run(section, other);
   if (report == nullptr) return same;
   if (ignoreNames != nullptr) {
     *report << "Ignored names : ";
@@ -189,25 +229,26 @@ bool CKvfSectionItem::Compare(CKvfBaseItem& other, std::ostream* report, const I
   }
   constexpr int kThisSide = 0;
   constexpr int kOtherSide = 1;
-  ReportDifferences(*report, kThisSide, onlyKeywords);
-  otherSection.ReportDifferences(*report, kOtherSide, onlyKeywords);
+  ReportDifferences(section, *report, kThisSide, onlyKeywords);
+  ReportDifferences(other, *report, kOtherSide, onlyKeywords);
   return false;
 }
 
-void CKvfSectionItem::ReportDifferences(std::ostream& report, int side, bool onlyKeywords) const {
-  constexpr std::array<std::string_view, 2> kUnmatchedTexts = {" is missing", " is extra"};
-  for (const auto& child : children) {
-    const Kind childKind = child->ItemKind();
-    const bool isReported = childKind != kComment && (childKind == kKeyword || !onlyKeywords);
-    if (isReported && child->mark == kUnmatched) {
-      report << child->Describe() << kUnmatchedTexts.at(static_cast<std::size_t>(side)) << '\n';
-    } else if (isReported && child->mark == kDifferent && side == 0) {
-      report << child->Describe() << " is different (line " << child->line << ")\n";
-    }
-    if (childKind == kSection) {
-      static_cast<const CKvfSectionItem&>(*child).ReportDifferences(report, side, onlyKeywords);
-    }
+}  // namespace
+
+bool CKvfBaseItem::Compare(CKvfBaseItem& other, std::ostream* report, const IgnoredNames* ignoreNames,
+                           bool onlyKeywords) {
+  if (kind == kNone || other.kind != kind) return false;
+  if (kind == kSection) {
+    return CompareSections(static_cast<CKvfSectionItem&>(*this), static_cast<CKvfSectionItem&>(other), report,
+                           ignoreNames, onlyKeywords);
   }
+  if (kind == kComment) return true;
+  if (ignoreNames != nullptr && IsIgnored(Name(), Compile(ignoreNames))) {
+    Report(report, "ignored key name ", Name());
+    return true;
+  }
+  return CompareKeys(static_cast<CKvfKeyItem&>(*this), static_cast<CKvfKeyItem&>(other), report);
 }
 
 }  // namespace tessal

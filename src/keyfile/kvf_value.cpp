@@ -1,7 +1,7 @@
 #include "keyfile/kvf_value.h"
 
-#include <ios>
-#include <ostream>
+#include <array>
+#include <charconv>
 #include <stdexcept>
 
 namespace tessal {
@@ -10,54 +10,73 @@ namespace {
 
 constexpr int kSignificantDigits = 16;
 
-template <class Type, class Content>
-const Type& Get(const Content& content) {
-  const Type* value = std::get_if<Type>(&content);
-  if (value == nullptr) throw std::runtime_error("Incompatible type!");
-  return *value;
+void Require(bool isType) {
+  if (!isType) throw std::runtime_error("Incompatible type!");
+}
+
+template <class... Format>
+void AppendNumber(std::string& written, Format... number) {
+  std::array<char, 32> digits;
+  const auto made = std::to_chars(digits.data(), digits.data() + digits.size(), number...);
+  written.append(digits.data(), made.ptr);
 }
 
 }  // namespace
 
 bool KvfValue::AsBoolean() const {
-  return Get<bool>(content);
+  Require(tag == kBoolean);
+  return boolean;
 }
 
 std::int32_t KvfValue::AsInteger() const {
-  return Get<std::int32_t>(content);
+  Require(tag == kInteger);
+  return integer;
 }
 
 double KvfValue::AsReal() const {
-  return Get<double>(content);
+  Require(tag == kReal);
+  return real;
 }
 
-const std::string& KvfValue::AsString() const {
-  return Get<std::string>(content);
+std::string_view KvfValue::AsString() const {
+  Require(IsText());
+  return {text, size};
 }
 
-void KvfValue::Write(std::ostream& stream) const {
+void KvfValue::AppendTo(std::string& written) const {
   switch (tag) {
     case kBoolean:
-      stream << (AsBoolean() ? "true" : "false");
+      written += boolean ? "true" : "false";
       break;
     case kInteger:
-      stream << AsInteger();
+      AppendNumber(written, integer);
       break;
-    case kReal: {
-      const std::streamsize former = stream.precision(kSignificantDigits);
-      stream << AsReal();
-      stream.precision(former);
+    case kReal:
+      AppendNumber(written, real, std::chars_format::general, kSignificantDigits);
       break;
-    }
     case kQuoted:
-      stream << '\'' << AsString() << '\'';
+      written.append("'").append(AsString()).append("'");
       break;
     case kPath:
-      stream << '|' << AsString() << '|';
+      written.append("|").append(AsString()).append("|");
       break;
     default:
-      stream << "illegal type";
+      written += "illegal type";
       break;
+  }
+}
+
+bool operator==(const KvfValue& left, const KvfValue& right) {
+  if (left.tag != right.tag) return false;
+  switch (left.tag) {
+    case KvfValue::kBoolean:
+      return left.boolean == right.boolean;
+    case KvfValue::kInteger:
+      return left.integer == right.integer;
+    case KvfValue::kReal:
+      return left.real == right.real;
+    default:
+      return left.AsString() == right.AsString();
   }
 }
 

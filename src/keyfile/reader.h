@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <string>
 
 namespace tessal {
@@ -12,12 +13,13 @@ class CKvfSectionItem;
 /// says why.
 int LoadKeyFileTree(const std::string& path, CKvfSectionItem& target);
 
-/// The same from a text in memory.
+/// The same from a text in memory, up to its first zero byte and without a UTF-8 byte order mark. The tree
+/// keeps the text.
+int ParseKeyFileTree(std::shared_ptr<const std::string> text, CKvfSectionItem& target);
 int ParseKeyFileTree(std::string text, CKvfSectionItem& target);
 
-/// Whether a tree can be read from a text that `KvfReadableText` has prepared: 1, or 0 with the same failure
-/// texts. The text is as it was afterwards.
-int CheckKeyFileText(std::string& readable);
+/// Whether a tree can be read from a text without a byte order mark: 1, or 0 with the same failure texts.
+int CheckKeyFileText(const std::string& text);
 
 /// The size of a file in bytes; 0 when it cannot be opened.
 std::uintmax_t KeyFileSize(const std::string& path);

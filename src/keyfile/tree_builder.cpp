@@ -1,127 +1,127 @@
 #include "keyfile/tree_builder.h"
 
-#include <iterator>
-#include <utility>
+#include <algorithm>
+#include <string>
 
 #include "platform/kvf_number.h"
 
 namespace tessal {
 
-std::uint32_t TreeBuilder::KeepLiteral() {
-  return texts.Put(std::exchange(literal, {}));
-}
-
-std::uint32_t TreeBuilder::NewComment(std::uint32_t line) {
-  auto block = std::make_unique<CKvfCommentItem>();
-  block->line = Line();
-  block->column = Column();
-  block->lines.push_back(TextAt(line));
-  return PutNew(std::move(block));
-}
-
-std::uint32_t TreeBuilder::PrependComment(std::uint32_t line, std::uint32_t block) {
-  // Blocks are built from their last line on; `AppendItem` and `Finish` turn them round.
-  static_cast<CKvfCommentItem&>(*items.At(block)).lines.push_back(TextAt(line));
-  return block;
-}
-
-std::uint32_t TreeBuilder::NewTargets(std::uint32_t section) {
-  targetsBackwards.clear();
-  targetsBackwards.push_back(items.Take(section));
-  return kNothing;
-}
-
-std::uint32_t TreeBuilder::PrependTarget(std::uint32_t section, std::uint32_t targets) {
-  targetsBackwards.push_back(items.Take(section));
-  return targets;
-}
-
-std::uint32_t TreeBuilder::NewSection() {
-  return PutNew(std::make_unique<CKvfSectionItem>());
-}
-
 namespace {
 
-/// A comment block was built from its last line on.
-void TurnRound(CKvfBaseItem& item) {
-  if (item.ItemKind() != CKvfBaseItem::kComment) return;
-  auto& lines = static_cast<CKvfCommentItem&>(item).lines;
-  lines = {std::make_move_iterator(lines.rbegin()), std::make_move_iterator(lines.rend())};
+/// A template's tree takes about twice the bytes of its text. What is not used is not touched.
+constexpr std::size_t kUsualTimes = 2;
+
+constexpr bool IsDroppedInComments(char character) {
+  return character == '\b' || character == '\r' || character == '\t';
+}
+
+/// A text without some of its characters, in a memory.
+template <class IsDropped>
+std::string_view Without(std::string_view text, IsDropped isDropped, ItemMemory& memory) {
+  std::string kept;
+  std::ranges::remove_copy_if(text, std::back_inserter(kept), isDropped);
+  return memory.Copy(kept);
 }
 
 }  // namespace
 
-std::uint32_t TreeBuilder::AppendItem(std::uint32_t section, std::uint32_t item) {
-  if (item == kNothing) return section;
-  TurnRound(*items.At(item));
-  SectionAt(section).AdoptChild(items.Take(item));
+TreeBuilder::TreeBuilder(const KeyFileScan& textScan, std::size_t textSize)
+    : scan(textScan),
+      mostBytes(kFreeBytes + kMostTimes * textSize),
+      tree(std::make_unique<CKvfItemTree>(kUsualTimes * textSize + 1024)),
+      memory(tree->Memory()) {}
+
+std::string_view TreeBuilder::CommentText(KeyFilePiece piece) {
+  std::string_view text = piece.View();
+  // As nearly every line ends.
+  if (text.ends_with('\r')) text.remove_suffix(1);
+  if (std::ranges::none_of(text, IsDroppedInComments)) return text;
+  return Without(text, IsDroppedInComments, memory);
+}
+
+std::string_view TreeBuilder::QuotedText(KeyFilePiece piece) {
+  const std::string_view text = piece.View();
+  if (text.find('\r') == std::string_view::npos) return text;
+  return Without(
+      text, [](char character) { return character == '\r'; }, memory);
+}
+
+CKvfBaseItem* TreeBuilder::NewComment(KeyFilePiece line) {
+  auto& block = memory.Make<CKvfCommentItem>();
+  block.SetPosition(scan.Line(), scan.Column());
+  return PrependComment(line, &block);
+}
+
+CKvfBaseItem* TreeBuilder::PrependComment(KeyFilePiece line, CKvfBaseItem* block) {
+  static_cast<CKvfCommentItem*>(block)->Prepend(CommentText(line), memory);
+  return block;
+}
+
+CKvfBaseItem* TreeBuilder::NewTargets(CKvfBaseItem* section) {
+  return PrependTarget(section, tree.get());
+}
+
+CKvfBaseItem* TreeBuilder::PrependTarget(CKvfBaseItem* section, CKvfBaseItem* targets) {
+  tree->PrependChild(*section);
+  return targets;
+}
+
+CKvfBaseItem* TreeBuilder::NewSection() {
+  auto& section = memory.Make<CKvfSectionItem>(memory);
+  section.SetDepth(++openSections);
+  return &section;
+}
+
+CKvfBaseItem* TreeBuilder::AppendItem(CKvfBaseItem* section, CKvfBaseItem* item) {
+  if (item != nullptr) static_cast<CKvfSectionItem*>(section)->AppendChild(*item);
   return section;
 }
 
-std::uint32_t TreeBuilder::EndSection(std::uint32_t section, std::uint32_t name, std::uint32_t startComment,
-                                      std::uint32_t endComment) {
-  CKvfSectionItem& ended = SectionAt(section);
-  ended.name = TextAt(name);
-  ended.startComment = TextAt(startComment);
-  ended.comment = TextAt(endComment);
+CKvfBaseItem* TreeBuilder::EndSection(CKvfBaseItem* section, KeyFilePiece name, KeyFilePiece startComment,
+                                      KeyFilePiece endComment) {
+  auto& ended = static_cast<CKvfSectionItem&>(*section);
+  --openSections;
+  ended.SetName(name.View());
+  ended.SetStartComment(CommentText(startComment));
+  ended.SetComment(CommentText(endComment));
   // The line of the last head inside the section: nested heads have overwritten it.
-  ended.line = SectionLine();
-  ended.column = 0;
+  ended.SetPosition(sectionLine, 0);
   return section;
 }
 
-std::uint32_t TreeBuilder::RealValue(std::uint32_t digits) {
-  return PutValue(KvfValue::Real(KvfReal(TextAt(digits))));
+void TreeBuilder::AddReal(KeyFilePiece digits) {
+  values.push_back(KvfValue::Real(KvfReal(digits.View())));
 }
 
-std::uint32_t TreeBuilder::IntegerValue(std::uint32_t digits) {
-  return PutValue(KvfValue::Integer(KvfInteger(TextAt(digits))));
+void TreeBuilder::AddInteger(KeyFilePiece digits) {
+  values.push_back(KvfValue::Integer(KvfInteger(digits.View())));
 }
 
-std::uint32_t TreeBuilder::BooleanValue(std::uint32_t word) {
-  const std::string letters = TextAt(word);
-  return PutValue(KvfValue::Boolean(letters.front() == 't' || letters.front() == 'T'));
+void TreeBuilder::AddBoolean(KeyFilePiece word) {
+  values.push_back(KvfValue::Boolean(*word.begin == 't' || *word.begin == 'T'));
 }
 
-std::uint32_t TreeBuilder::QuotedValue(std::uint32_t content) {
-  return PutValue(KvfValue::Quoted(TextAt(content)));
+void TreeBuilder::AddQuoted(KeyFilePiece content) {
+  values.push_back(KvfValue::Quoted(QuotedText(content)));
 }
 
-std::uint32_t TreeBuilder::PathValue(std::uint32_t content) {
-  return PutValue(KvfValue::Path(TextAt(content)));
+void TreeBuilder::AddPath(KeyFilePiece content) {
+  values.push_back(KvfValue::Path(QuotedText(content)));
 }
 
-std::uint32_t TreeBuilder::NewKey(std::uint32_t value) {
-  const std::uint32_t key = PutNew(std::make_unique<CKvfKeyItem>());
-  return AppendValue(key, value);
+CKvfBaseItem* TreeBuilder::EndKey(KeyFilePiece name, KeyFilePiece comment) {
+  CKvfKeyItem& key = CKvfKeyItem::Make(memory, values);
+  values.clear();
+  key.SetName(name.View());
+  key.SetComment(CommentText(comment));
+  key.SetPosition(scan.Line(), scan.Column());
+  return &key;
 }
 
-std::uint32_t TreeBuilder::AppendValue(std::uint32_t key, std::uint32_t value) {
-  KeyAt(key).values.push_back(values.Take(value));
-  return key;
-}
-
-std::uint32_t TreeBuilder::EndKey(std::uint32_t key, std::uint32_t name, std::uint32_t comment) {
-  CKvfKeyItem& ended = KeyAt(key);
-  ended.name = TextAt(name);
-  ended.comment = TextAt(comment);
-  ended.line = Line();
-  ended.column = Column();
-  return key;
-}
-
-void TreeBuilder::Finish(std::uint32_t header, std::uint32_t /*targets*/) {
-  root = std::make_unique<CKvfSectionItem>();
-  root->name.assign(1, '.');  // GCC 12 warns, wrongly, of an overlap when a literal is assigned here
-  if (header != kNothing) {
-    TurnRound(*items.At(header));
-    root->AdoptChild(items.Take(header));
-  }
-  // NOLINTNEXTLINE(modernize-loop-convert)
-  for (auto target = targetsBackwards.rbegin(); target != targetsBackwards.rend(); ++target) {
-    root->AdoptChild(std::move(*target));
-  }
-  root->SetDepth(0);
+void TreeBuilder::Finish(CKvfBaseItem* header, CKvfBaseItem* /*targets*/) {
+  tree->SetName(".");
+  if (header != nullptr) tree->PrependChild(*header);
 }
 
 }  // namespace tessal

@@ -1,103 +1,87 @@
-// A read of a key file that builds its item tree. The texts and items under construction lie in stores here,
-// whose places are the values of the grammar, so that a failed read releases everything.
+// What a read of a key file does for each rule of its grammar: nothing, or building the item tree.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <string>
 #include <string_view>
 #include <vector>
 
 #include "keyfile/item_tree.h"
-#include "keyfile/read_state.h"
+#include "keyfile/scanner.h"
 
 namespace tessal {
 
-/// Things that are put in, and taken out again soon after. A place is used again when it is free.
-template <class Thing>
-class PlaceStore final {
+/// A read that only says whether a text is a key file.
+class TreelessRead final {
  public:
-  std::uint32_t Put(Thing thing) {
-    if (free.empty()) {
-      things.push_back(std::move(thing));
-      return static_cast<std::uint32_t>(things.size() - 1);
-    }
-    const std::uint32_t place = free.back();
-    free.pop_back();
-    things[place] = std::move(thing);
-    return place;
+  static CKvfBaseItem* NewComment(KeyFilePiece /*line*/) { return nullptr; }
+  static CKvfBaseItem* PrependComment(KeyFilePiece /*line*/, CKvfBaseItem* /*block*/) { return nullptr; }
+  static CKvfBaseItem* NewTargets(CKvfBaseItem* /*section*/) { return nullptr; }
+  static CKvfBaseItem* PrependTarget(CKvfBaseItem* /*section*/, CKvfBaseItem* /*targets*/) { return nullptr; }
+  static CKvfBaseItem* NewSection() { return nullptr; }
+  static CKvfBaseItem* AppendItem(CKvfBaseItem* /*section*/, CKvfBaseItem* /*item*/) { return nullptr; }
+  static void NoteSectionLine() {}
+  static CKvfBaseItem* EndSection(CKvfBaseItem* /*section*/, KeyFilePiece /*name*/,
+                                  KeyFilePiece /*startComment*/, KeyFilePiece /*endComment*/) {
+    return nullptr;
   }
-  Thing& At(std::uint32_t place) { return things[place]; }
-  Thing Take(std::uint32_t place) {
-    free.push_back(place);
-    return std::move(things[place]);
-  }
+  static void AddReal(KeyFilePiece /*digits*/) {}
+  static void AddInteger(KeyFilePiece /*digits*/) {}
+  static void AddBoolean(KeyFilePiece /*word*/) {}
+  static void AddQuoted(KeyFilePiece /*content*/) {}
+  static void AddPath(KeyFilePiece /*content*/) {}
+  static CKvfBaseItem* EndKey(KeyFilePiece /*name*/, KeyFilePiece /*comment*/) { return nullptr; }
+  static void Finish(CKvfBaseItem* /*header*/, CKvfBaseItem* /*targets*/) {}
 
- private:
-  std::vector<Thing> things;
-  std::vector<std::uint32_t> free;
+  static bool IsFull() { return false; }
 };
 
-class TreeBuilder final : public ReadState {
+/// A read that builds a tree. Its texts are views into the text that is scanned, but for those with
+/// characters that do not count.
+class TreeBuilder final {
  public:
   /// A tree may take so many times the bytes of its text, and something for a small text of short lines.
   static constexpr std::size_t kMostTimes = 12;
   static constexpr std::size_t kFreeBytes = 256'000'000;
 
-  explicit TreeBuilder(std::string& scanned) : ReadState(scanned) {}
+  TreeBuilder(const KeyFileScan& textScan, std::size_t textSize);
 
-  std::uint32_t NewComment(std::uint32_t line) override;
-  std::uint32_t PrependComment(std::uint32_t line, std::uint32_t block) override;
-  std::uint32_t NewTargets(std::uint32_t section) override;
-  std::uint32_t PrependTarget(std::uint32_t section, std::uint32_t targets) override;
-  std::uint32_t NewSection() override;
-  std::uint32_t AppendItem(std::uint32_t section, std::uint32_t item) override;
-  std::uint32_t EndSection(std::uint32_t section, std::uint32_t name, std::uint32_t startComment,
-                           std::uint32_t endComment) override;
-  std::uint32_t RealValue(std::uint32_t digits) override;
-  std::uint32_t IntegerValue(std::uint32_t digits) override;
-  std::uint32_t BooleanValue(std::uint32_t word) override;
-  std::uint32_t QuotedValue(std::uint32_t content) override;
-  std::uint32_t PathValue(std::uint32_t content) override;
-  std::uint32_t NewKey(std::uint32_t value) override;
-  std::uint32_t AppendValue(std::uint32_t key, std::uint32_t value) override;
-  std::uint32_t EndKey(std::uint32_t key, std::uint32_t name, std::uint32_t comment) override;
-  void Finish(std::uint32_t header, std::uint32_t targets) override;
-  bool IsFull() const override { return spent > kFreeBytes + kMostTimes * TextSize(); }
+  CKvfBaseItem* NewComment(KeyFilePiece line);
+  CKvfBaseItem* PrependComment(KeyFilePiece line, CKvfBaseItem* block);
+  CKvfBaseItem* NewTargets(CKvfBaseItem* section);
+  CKvfBaseItem* PrependTarget(CKvfBaseItem* section, CKvfBaseItem* targets);
+  CKvfBaseItem* NewSection();
+  static CKvfBaseItem* AppendItem(CKvfBaseItem* section, CKvfBaseItem* item);
+  void NoteSectionLine() { sectionLine = scan.Line(); }
+  CKvfBaseItem* EndSection(CKvfBaseItem* section, KeyFilePiece name, KeyFilePiece startComment,
+                           KeyFilePiece endComment);
+  // The values of a keyword come together before it ends.
+  void AddReal(KeyFilePiece digits);
+  void AddInteger(KeyFilePiece digits);
+  void AddBoolean(KeyFilePiece word);
+  void AddQuoted(KeyFilePiece content);
+  void AddPath(KeyFilePiece content);
+  CKvfBaseItem* EndKey(KeyFilePiece name, KeyFilePiece comment);
+  void Finish(CKvfBaseItem* header, CKvfBaseItem* targets);
 
-  /// The finished tree; none after a failure.
-  std::unique_ptr<CKvfSectionItem>& Root() { return root; }
+  /// Whether more was built than may be. The read ends then.
+  bool IsFull() const { return memory.Taken() + values.size() * sizeof(KvfValue) > mostBytes; }
+
+  /// The finished tree.
+  std::unique_ptr<CKvfItemTree> Take() { return std::move(tree); }
 
  private:
-  std::uint32_t Keep(std::string_view token) override { return texts.Put(std::string(token)); }
-  void BeginLiteral() override { literal.clear(); }
-  void AppendLiteral(std::string_view piece) override { literal += piece; }
-  std::uint32_t KeepLiteral() override;
+  std::string_view CommentText(KeyFilePiece piece);
+  std::string_view QuotedText(KeyFilePiece piece);
 
-  std::string TextAt(std::uint32_t place) { return place == kNothing ? std::string() : texts.Take(place); }
-  template <class Item>
-  std::uint32_t PutNew(std::unique_ptr<Item> item) {
-    spent += sizeof(Item) + kBlock;
-    return items.Put(std::move(item));
-  }
-  std::uint32_t PutValue(KvfValue value) {
-    spent += sizeof(KvfValue) + kBlock;
-    return values.Put(std::move(value));
-  }
-
-  CKvfSectionItem& SectionAt(std::uint32_t place) { return static_cast<CKvfSectionItem&>(*items.At(place)); }
-  CKvfKeyItem& KeyAt(std::uint32_t place) { return static_cast<CKvfKeyItem&>(*items.At(place)); }
-
-  /// What a block of memory and the pointer to it take beside its content.
-  static constexpr std::size_t kBlock = 24;
-
-  std::size_t spent = 0;  ///< bytes, but for those of long texts, which the text has too
-  std::string literal;
-  PlaceStore<std::string> texts;
-  PlaceStore<KvfValue> values;
-  PlaceStore<std::unique_ptr<CKvfBaseItem>> items;
-  std::vector<std::unique_ptr<CKvfBaseItem>> targetsBackwards;
-  std::unique_ptr<CKvfSectionItem> root;
+  const KeyFileScan& scan;
+  std::size_t mostBytes;
+  std::unique_ptr<CKvfItemTree> tree;
+  ItemMemory& memory;
+  std::vector<KvfValue> values;  ///< of the keyword that is read
+  std::size_t openSections = 0;
+  std::int32_t sectionLine = 0;
 };
 
 }  // namespace tessal

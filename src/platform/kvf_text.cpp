@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 #include <cstdint>
-#include <utility>
 
 #include "platform/ascii.h"
 
@@ -40,12 +39,6 @@ std::size_t CountBareLineFeeds(std::string_view text) {
 }
 
 }  // namespace
-
-std::string KvfReadableText(std::string bytes) {
-  bytes.resize(std::min(bytes.find('\0'), bytes.size()));
-  if (bytes.starts_with(kByteOrderMark)) bytes.erase(0, kByteOrderMark.size());
-  return KvfLineEnds(std::move(bytes));
-}
 
 std::string KvfLineEnds(std::string text) {
   const std::size_t bare = CountBareLineFeeds(text);

@@ -9,9 +9,6 @@ namespace tessal {
 /// What a file may begin with to say that it is UTF-8.
 inline constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-/// The text up to its first zero byte, without a UTF-8 byte order mark, with the line ends of `KvfLineEnds`.
-std::string KvfReadableText(std::string bytes);
-
 /// A text with each bare line feed as carriage return and line feed: version control changes line ends, and
 /// the layout must survive it.
 std::string KvfLineEnds(std::string text);

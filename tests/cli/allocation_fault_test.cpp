@@ -255,7 +255,7 @@ class AllocationFaults : public ::testing::TestWithParam<std::tuple<Row, std::st
 };
 
 TEST_P(AllocationFaults, EndWithOneLineOrNotAtAll) {
-  constexpr long kFewest = 500;
+  constexpr long kFewest = 20;
   const auto [last, all] = FailInChildren();
   for (long number = last + 1; number <= all; number += row.step) {
     Judge(number, Wait(Start({"ALLOCATION_FAULT_AT=" + std::to_string(number)})));

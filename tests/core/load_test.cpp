@@ -11,7 +11,6 @@
 #include "core/loaded_template.h"
 #include "keyfile/reader.h"
 #include "platform/kvf2004.h"
-#include "platform/kvf_text.h"
 #include "support/template_text.h"
 
 namespace tessal {
@@ -80,8 +79,7 @@ TEST(Load, ATextThatIsCalledStrictIsReadAsATree) {
     if (file == 0) continue;
     const bool isStrict = kvfIsStrict(file);
     kvfClose(&file);
-    std::string readable = KvfReadableText(damaged);
-    const int isRead = CheckKeyFileText(readable);
+    const int isRead = CheckKeyFileText(damaged);
     EXPECT_TRUE(!isStrict || isRead == 1) << damaged << KeyFileFailureText();
     ++counts[{isStrict, isRead}];
   }

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <iterator>
 #include <sstream>
 #include <stdexcept>
 
@@ -424,7 +425,7 @@ std::string TemplateScript::State() const {
        << core.GetSpecieCount() << " classes " << core.GetExternalFunctionCount() << " functions, named "
        << core.CountNamedElements() << ", revision " << core.GetDocumentRevision() << "\nfile '"
        << core.TemplateFileName() << "' saved to '" << core.SaveFileName() << "' kept "
-       << core.KeptTree().Children().size() << (core.Modified() ? " modified" : "")
+       << std::ranges::distance(core.KeptTree().Children()) << (core.Modified() ? " modified" : "")
        << (core.GetMisc() == nullptr ? " without settings" : "");
   return text.str();
 }
