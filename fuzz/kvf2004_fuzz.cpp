@@ -8,7 +8,6 @@
 
 #include "keyfile/reader.h"
 #include "platform/kvf2004.h"
-#include "platform/kvf_text.h"
 
 namespace {
 
@@ -45,8 +44,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     return 0;
   }
   if (kvfIsStrict(file)) {
-    std::string text = KvfReadableText({reinterpret_cast<const char*>(data), size});
-    Require(CheckKeyFileText(text) == 1);
+    Require(CheckKeyFileText(*kvfShareText(file)) == 1);
   }
   std::vector<KvfNode> open;
   for (const char* name : {"T", "TESSAL_SETUP", "A"}) {
