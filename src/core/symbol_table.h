@@ -79,7 +79,7 @@ class SymbolTable final {
   const SymbolRecord& Used(std::uint32_t sequence) const { return records[sequence - 1]; }
   /// Whether several elements have the same symbol.
   bool HasSharedSymbols() const { return hasSharedSymbols; }
-  /// The identities behind sequence numbers. The two records of a movement give one.
+  /// The identities of the elements with these sequence numbers. The two records of a movement give one.
   std::vector<Uid> UidsOf(std::span<const std::uint32_t> sequences) const;
 
   /// Calls the visitor with each element that has a record, once: the two records of a movement are side by

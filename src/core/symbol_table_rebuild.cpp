@@ -230,9 +230,9 @@ void SymbolTable::RebuildSteps::ExtractReferences() {
     ExtractRecordReferences(record);
     ends.push_back(table.uses.size());
   }
-  const std::span<const std::uint32_t> uses(table.uses);
+  const std::span<const std::uint32_t> all(table.uses);
   for (std::size_t place = 0; place < records.size(); ++place) {
-    records[place].references = uses.subspan(ends[place], ends[place + 1] - ends[place]);
+    records[place].references = all.subspan(ends[place], ends[place + 1] - ends[place]);
   }
 }
 
@@ -330,10 +330,10 @@ void SymbolTable::RebuildSteps::BuildReverseReferences() {
   for (const SymbolRecord& user : records) {
     for (const std::uint32_t used : user.references) table.users[ends[used]++] = user.sequence;
   }
-  const std::span<const std::uint32_t> users(table.users);
+  const std::span<const std::uint32_t> all(table.users);
   std::size_t start = 0;
   for (SymbolRecord& used : records) {
-    used.referencedBy = users.subspan(start, ends[used.sequence] - start);
+    used.referencedBy = all.subspan(start, ends[used.sequence] - start);
     start = ends[used.sequence];
   }
 }

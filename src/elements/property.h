@@ -63,7 +63,7 @@ class PropertyListener {
 };
 
 /// What properties belong to, and what a change of them marks as modified. It hears of the changes of those
-/// that are told to report to it, before any listener.
+/// that are to report to it, before any listener.
 class PropertyHolder : public PropertyListener {
  public:
   PropertyHolder(const PropertyHolder&) = delete;

@@ -59,7 +59,8 @@ VisibilityGroup ReadGroup(KvfNode section, int number, ReadStatus& status) {
 std::vector<VisibilityGroup> ReadGroups(KvfNode definitions, ReadStatus& status) {
   std::vector<VisibilityGroup> groups;
   int number = 0;
-  for (KvfNode group = kvfFirstSection(definitions); group != nullptr; group = kvfNextSection(group, definitions)) {
+  for (KvfNode group = kvfFirstSection(definitions); group != nullptr;
+       group = kvfNextSection(group, definitions)) {
     groups.push_back(ReadGroup(group, ++number, status));
   }
   return groups;

@@ -350,13 +350,13 @@ std::vector<TypedValue> CElementForm::TypedValues() const {
     if (!IsStored(control.field->editor) || qobject_cast<QComboBox*>(control.editor) != nullptr) continue;
     CEL_Property& property = control.field->property(*element);
     if (!IsTyped(control, property)) continue;
-    typed.push_back(
-        {[this, &control, &property] { StoreTyped(control, property); },
-         [&property, text = std::string(property.Text()), real = property.RealValue(), whole = property.IntValue()] {
-           property.SetText(text);
-           property.SetReal(real);
-           property.SetInt(whole);
-         }});
+    typed.push_back({[this, &control, &property] { StoreTyped(control, property); },
+                     [&property, text = std::string(property.Text()), real = property.RealValue(),
+                      whole = property.IntValue()] {
+                       property.SetText(text);
+                       property.SetReal(real);
+                       property.SetInt(whole);
+                     }});
   }
   return typed;
 }

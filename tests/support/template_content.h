@@ -27,7 +27,8 @@ inline bool IsInNoFile(const CEL_Element& element, const std::string& field) {
 }
 
 inline std::string TextsOf(const CEL_Element& head) {
-  return head.description.TextOf() + "|" + head.onlineHelp.TextOf() + "|" + head.documentation.TextOf() + "\n";
+  return head.description.TextOf() + "|" + head.onlineHelp.TextOf() + "|" + head.documentation.TextOf() +
+         "\n";
 }
 
 inline std::string FieldsOf(const CEL_Element& element) {
