@@ -44,7 +44,7 @@ struct TemplateState {
   ListHeads listHeads;
   Collections collections;
   SymbolTable table;
-  /// The text of the file that was loaded. Texts of elements are views into it: it goes after them.
+  /// The text of the file that was loaded. Texts of elements are views into it.
   std::shared_ptr<const std::string> source;
   std::string keptText;  ///< what that file holds beside the template, as it is in it
   mutable std::unique_ptr<CKvfItemTree> keptTree;  ///< of the source; none before somebody asks

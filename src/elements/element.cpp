@@ -154,6 +154,11 @@ void CEL_Element::ResetOwn() {
   SelectPresentValues();
 }
 
+void CEL_Element::RestartOwn() {
+  for (const PropertyRow& row : rows) GiveDefault(row, Starting{this->*row.place});
+  SelectPresentValues();
+}
+
 void CEL_Element::SelectPresentValues() {
   unqType.SelectIndex(unqType.PresentChoice());
   unqUnit.SelectIndex(unqUnit.PresentChoice());

@@ -238,6 +238,8 @@ class CEL_Element : public PropertyHolder {
   void ReadOwn(KvfNode section, ReadStatus& status);
   void WriteOwn(KvfHandle file, int& status);
   void ResetOwn();
+  /// The same as for a fresh element: no text stays a view into the file that it was read from.
+  void RestartOwn();
 
   void AppendCaption(std::vector<ElementField>& fields) const;
   void AppendBaseFields(std::vector<ElementField>& fields) const;

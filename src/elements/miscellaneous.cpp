@@ -67,7 +67,8 @@ CEL_Miscanellous::CEL_Miscanellous() : CEL_Element(false, false, true) {
 }
 
 void CEL_Miscanellous::Reset() {
-  ResetOwn();
+  // The settings outlive the file: the next load drops its text.
+  RestartOwn();
   tessalVersion.SetReal(SoftwareVersion());
   parserVersion.SetReal(ParserVersion());
   ClearTexts();

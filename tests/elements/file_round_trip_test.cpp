@@ -1,6 +1,9 @@
 // What the file makes of texts, expressions and numbers of an element.
 #include <gtest/gtest.h>
 
+#include <memory>
+#include <vector>
+
 #include "core/error_registry.h"
 #include "elements/expression_elements.h"
 #include "elements/read_status.h"
@@ -25,11 +28,14 @@ void WriteElement(CEL_Element& element, const std::string& path) {
 }
 
 void ReadElement(CEL_Element& element, const std::string& path) {
+  // The element's texts are views into those of the files.
+  static std::vector<std::shared_ptr<const std::string>> texts;
   LoadAccount account;
   ReadStatus status(account);
   KvfHandle file = kvfLoadFile(path, 1);
   ASSERT_NE(file, 0U);
   element.Read(kvfTargetByNameNum(file, "T", 1), status);
+  texts.push_back(kvfShareText(file));
   kvfClose(&file);
 }
 
