@@ -72,6 +72,10 @@ class CTessalDoc final : public CDocument {
   std::optional<std::string> Copy(std::string& reason) override;
   bool OnOpenCopy(const std::string& source, const std::string& path) override;
   DocumentComparison CompareWithFile(const std::string& path) const override;
+  /// Takes the last step of the template back, or does the next one again, with the mark of the document; none
+  /// when there is no step.
+  std::optional<StepEffect> Undo();
+  std::optional<StepEffect> Redo();
   /// Marks the title too. The mark is taken off by the title that a save gives.
   void SetModifiedFlag(bool flag) override;
 
@@ -90,6 +94,8 @@ class CTessalDoc final : public CDocument {
   bool Open(const std::string& source, const std::string& path);
   /// The file of that path holds what a copy of the work in it does not: a save that replaces it must ask.
   void NoteLossesOf(const std::string& path);
+  /// Takes the mark off, or puts it on, after a step.
+  void FollowMark();
   /// Whether the file may lose what the load did not take over.
   bool MayLose(const std::string& path);
 

@@ -198,6 +198,7 @@ bool TemplateCore::Rename(std::string_view oldSymbol, std::string_view newSymbol
   // The caller's may be a view into what is about to change.
   const std::string oldName(oldSymbol);
   const std::string newName(newSymbol);
+  const EditStep step(history);
   const bool wasModified = state.flags.modified;
   {
     // The rewrites must not change the table under the walk.

@@ -66,6 +66,8 @@ class SymbolTable final {
   /// Numbers the elements, makes the records and finds who uses whom. Reports nothing. The public names of
   /// the settings' user functions count as defined.
   void Rebuild(const Collections& collections, const CEL_Miscanellous& settings);
+  /// The same where the links of searches, which are numbers, are those of the numbers to come.
+  void RebuildUnderLinks(const Collections& collections, const CEL_Miscanellous& settings);
 
   // Finding; none when there is no such record. The sizes are those of hand-written templates: the searches
   // are linear, and no index is kept between rebuilds.

@@ -30,11 +30,26 @@ class SymbolTable::RebuildSteps final {
         settings(misc) {}
 
   void Run() {
-    MarkUndefinedStale();
     ResolveReferencesToNames(collections);
+    Number();
+    Finish();
+  }
+
+  void RunUnderLinks() {
+    Number();
+    ResolveReferencesToNames(collections);
+    Finish();
+  }
+
+ private:
+  void Number() {
     records.clear();
     NumberTemplateElements();
     NumberParticleElements();
+  }
+
+  void Finish() {
+    MarkUndefinedStale();
     ExtractReferences();
     BuildReverseReferences();
     ClassifyArithmeticExpressions();
@@ -42,7 +57,6 @@ class SymbolTable::RebuildSteps final {
     std::erase_if(undefined, [](const auto& name) { return name->stale; });
   }
 
- private:
   /// What a name means: 0 before anybody asked, the number of its record, or one of the two kinds after them.
   using Meaning = std::uint32_t;
   Meaning DefinedElsewhere() const { return static_cast<Meaning>(records.size() + 1); }
@@ -86,6 +100,10 @@ class SymbolTable::RebuildSteps final {
 
 void SymbolTable::Rebuild(const Collections& collections, const CEL_Miscanellous& settings) {
   RebuildSteps(*this, collections, settings).Run();
+}
+
+void SymbolTable::RebuildUnderLinks(const Collections& collections, const CEL_Miscanellous& settings) {
+  RebuildSteps(*this, collections, settings).RunUnderLinks();
 }
 
 void SymbolTable::RebuildSteps::MarkUndefinedStale() {

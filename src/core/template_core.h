@@ -15,6 +15,7 @@
 
 #include "core/collections.h"
 #include "core/creation.h"
+#include "core/edit_history.h"
 #include "core/symbol_table.h"
 #include "core/template_state.h"
 #include "elements/element_owner.h"
@@ -170,6 +171,13 @@ class TemplateCore final : public ElementOwner {
   /// The same with any of the ways to rewrite the uses.
   bool Rename(std::string_view oldSymbol, std::string_view newSymbol, Rewriting rewriting);
 
+  // Taking back. Off until the history is started.
+  EditHistory& History() { return history; }
+  /// Takes the last step back, or does the next one again, and brings up to date what follows; none when there
+  /// is no step. The template counts as modified unless the file holds it as it is then.
+  std::optional<StepEffect> Undo();
+  std::optional<StepEffect> Redo();
+
   // The structural pass and the check pass.
   /// Numbers the elements, makes the symbol table and finds who uses whom. Reports nothing.
   void RebuildSymbolTable() override;
@@ -214,6 +222,11 @@ class TemplateCore final : public ElementOwner {
   std::string LevelText(std::int32_t group, std::int32_t level) const;
   std::string LevelListText(std::int32_t group, std::int32_t level) const;
 
+  // What elements report to their template.
+  void OnChanging(CEL_Element& element, CEL_Property& property) override;
+  void OnAppended(CEL_Element& element) override;
+  void OnRemoved(std::unique_ptr<CEL_Element> element, std::size_t place) override;
+
   // What elements ask of their template.
   std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const override;
   std::size_t SpecieCount() const override { return Species().size(); }
@@ -247,10 +260,14 @@ class TemplateCore final : public ElementOwner {
   Element& Add(const Collection<Element>& collection);
   void Adopt(CEL_Element& element, CEL_Element& parent);
   bool EraseElement(const SymbolRecord& record);
-  void MoveWithin(const SymbolRecord& record, std::size_t target);
+  void MoveWithin(const SymbolRecord& record, std::size_t place);
   CreationOffer OfferFor(const UndefinedSymbol& undefined) const;
 
+  StepEffect Take(StepEffect (EditHistory::*step)());
+  void FollowStep(const StepEffect& effect);
+
   TemplateState state;
+  EditHistory history{state};
 };
 
 template <class Element>

@@ -370,6 +370,16 @@ void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) {
   RebuildOwner();
 }
 
+void CEL_Element::OnChanging(CEL_Property& property) {
+  // Numbers follow from places.
+  if (owner != nullptr && &property != &id) owner->OnChanging(*this, property);
+}
+
+void CEL_Element::FollowValues() {
+  SelectPresentValues();
+  UpdateLocks();
+}
+
 std::string CEL_Element::FullSymbol() const {
   std::string text;
   AppendFullSymbol(text);
