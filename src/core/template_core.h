@@ -236,6 +236,8 @@ class TemplateCore final : public ElementOwner {
   /// Loads a file in the place of the present template. False when it could not be read; the registry then
   /// holds the reason.
   bool LoadWrapper(const std::string& path);
+  /// Loads the text of a file that has no name.
+  bool LoadText(std::string text);
   /// Loads the content of one file as that of another, which a plain save then replaces; of none where `path`
   /// is empty. Fails as a load does.
   bool LoadCopy(const std::string& source, const std::string& path);

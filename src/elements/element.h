@@ -167,6 +167,10 @@ class CEL_Element : public PropertyHolder {
   /// Points each property's selection at the choice of its value.
   void SelectPresentValues();
 
+  /// Takes the values of another element of the same class, but for its symbol and its number. Nobody hears of
+  /// it; choices and locks follow.
+  void TakeValuesOf(const CEL_Element& other);
+
   /// Empties the descriptive texts.
   void ClearTexts();
 
