@@ -11,6 +11,7 @@
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QFontMetrics>
+#include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
@@ -75,7 +76,8 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
       pages(std::make_unique<QStackedWidget>(this).release()),
       tabs(std::make_unique<QTabWidget>(this).release()),
       startPage(std::make_unique<StartPage>(this).release()),
-      notice(std::make_unique<NoticeBar>(this).release()) {
+      notice(std::make_unique<NoticeBar>(this).release()),
+      status(std::make_unique<QLabel>(this).release()) {
   tabs->setDocumentMode(true);
   tabs->setTabsClosable(true);
   tabs->setMovable(true);
@@ -83,7 +85,7 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
   LayOut();
   setAcceptDrops(true);
   // Made now, it shows what the widgets of the window have to say.
-  statusBar();
+  statusBar()->addPermanentWidget(status);
   FitToScreen();
   MakeMenus();
   connect(startPage, &StartPage::NewRequested, this, &HostWindow::NewDocument);
@@ -145,8 +147,9 @@ void HostWindow::MakeMenus() {
   documentActions.append(close);
   file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
   QMenu* help = menuBar()->addMenu(tr("&Help"));
-  help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
-  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), *close).release();
+  QAction* about = help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
+  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), QList<QAction*>{close, about})
+                     .release();
 }
 
 void HostWindow::FillRecentMenu() {
@@ -234,6 +237,7 @@ OpenDocument* HostWindow::FindUntouched() const {
 void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
   opened->Show(*docTemplate);
   opened->View().SetFrameTitleUpdate([this] { UpdateTitles(); });
+  opened->View().SetStatusUpdate([this](const std::string& message) { ShowStatus(message); });
   connect(&opened->File(), &WatchedFile::StateChanged, this, &HostWindow::ShowNotice);
   documents.push_back(std::move(opened));
   OpenDocument& shown = *documents.back();
@@ -472,6 +476,14 @@ void HostWindow::UpdateTitles() {
                      : Shortened(front->Title(), kMostTitleCharacters) + QStringLiteral(" \u2013 ") + name);
   for (QAction* action : documentActions) action->setEnabled(front != nullptr);
   ShowNotice();
+  ShowStatus({});
+}
+
+void HostWindow::ShowStatus(const std::string& message) {
+  constexpr int kShownFor = 10000;  // milliseconds
+  const OpenDocument* front = Current();
+  status->setText(front == nullptr ? QString() : QString::fromStdString(front->View().StatusText()));
+  if (!message.empty()) statusBar()->showMessage(QString::fromStdString(message), kShownFor);
 }
 
 void HostWindow::closeEvent(QCloseEvent* close) {

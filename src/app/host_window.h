@@ -9,6 +9,7 @@
 
 #include "app/work_timer.h"
 
+class QLabel;
 class QMenu;
 class QStackedWidget;
 class QTabWidget;
@@ -73,6 +74,8 @@ class HostWindow final : public QMainWindow {
   void Drop(OpenDocument& closed);
   void KeepWork();
   void UpdateTitles();
+  /// What the view in front has to say, with a message for a while.
+  void ShowStatus(const std::string& message);
   // What can be done about a file that others have changed.
   void ShowNotice();
   void ReloadCurrent();
@@ -90,6 +93,7 @@ class HostWindow final : public QMainWindow {
   QTabWidget* tabs;
   StartPage* startPage;
   NoticeBar* notice;
+  QLabel* status;
   ViewCommands* viewCommands = nullptr;
   QMenu* recentMenu = nullptr;
   QList<QAction*> documentActions;  ///< those that need a document in front

@@ -27,6 +27,8 @@ inline constexpr int kAddGroup = 11;
 inline constexpr int kDeleteGroup = 12;
 inline constexpr int kSelectGroup = 13;
 inline constexpr int kRenameGroup = 14;
+/// Several elements have come, gone or moved at once.
+inline constexpr int kStructure = 15;
 }  // namespace hint
 
 /// A hint whose argument is a number: an element's identity, a group's place, or a switch.

@@ -12,7 +12,7 @@ namespace {
 constexpr const char* kNameless = "Edit";
 
 /// The group that an edit is about, in the state after it; 0 for none.
-std::int32_t GroupOf(const Edit& edit) {
+std::int32_t GroupOf(const TemplateEdit& edit) {
   return std::visit(
       [](const auto& each) -> std::int32_t {
         if constexpr (requires { each.group; }) {
@@ -87,7 +87,7 @@ StepEffect EditHistory::Undo() {
 StepEffect EditHistory::Redo() {
   const RecordingOff quiet(*this);
   Step& step = steps[done];
-  for (Edit& edit : step.edits) Exchange(state, edit);
+  for (TemplateEdit& edit : step.edits) Exchange(state, edit);
   ++done;
   Measure(step);
   return Settle(step);
@@ -98,7 +98,7 @@ StepEffect EditHistory::Settle(const Step& step) {
   effect.name = step.name;
   effect.subject = SubjectOfStep(step.edits);
   const CEL_Element* previous = nullptr;
-  for (const Edit& edit : step.edits) {
+  for (const TemplateEdit& edit : step.edits) {
     if (const auto* value = std::get_if<ValueEdit>(&edit)) {
       if (value->element == std::exchange(previous, value->element)) continue;
       value->element->FollowValues();
@@ -112,7 +112,7 @@ StepEffect EditHistory::Settle(const Step& step) {
       if (effect.group == 0) effect.group = GroupOf(edit);
     }
   }
-  for (const Edit& edit : step.edits) {
+  for (const TemplateEdit& edit : step.edits) {
     const auto* presence = std::get_if<PresenceEdit>(&edit);
     if (presence == nullptr) continue;
     effect.structure = true;
@@ -140,7 +140,7 @@ void EditHistory::Close(std::string_view name) noexcept {
 
 /// A value that is as it was before the act, because it was refused or went back, was not changed by it.
 void EditHistory::DropUnchanged() {
-  std::erase_if(open, [](const Edit& edit) {
+  std::erase_if(open, [](const TemplateEdit& edit) {
     const auto* value = std::get_if<ValueEdit>(&edit);
     try {
       return value != nullptr && ValueOf(*value->property) == value->other;
@@ -173,7 +173,7 @@ void EditHistory::Append(std::string_view name) {
 void EditHistory::Measure(Step& step) {
   bytes -= step.bytes;
   step.bytes = sizeof(Step) + step.name.size();
-  for (const Edit& edit : step.edits) step.bytes += SizeOf(edit);
+  for (const TemplateEdit& edit : step.edits) step.bytes += SizeOf(edit);
   bytes += step.bytes;
 }
 
@@ -210,7 +210,7 @@ void EditHistory::NoteMoved(const ListPlace& list, std::size_t from, std::size_t
   if (from != to) Note(PlaceEdit{list, from, to, &element});
 }
 
-void EditHistory::Note(Edit edit) {
+void EditHistory::Note(TemplateEdit edit) {
   if (!IsRecording()) return;
   if (depth == 0) MakeRoom();
   open.push_back(std::move(edit));

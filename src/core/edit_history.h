@@ -74,14 +74,14 @@ class EditHistory final {
   void NoteRemoved(const ListPlace& list, std::size_t place, std::unique_ptr<CEL_Element> element);
   void NoteMoved(const ListPlace& list, std::size_t from, std::size_t to, CEL_Element& element);
   /// An edit of the groups or of the template's switches.
-  void Note(Edit edit);
+  void Note(TemplateEdit edit);
 
  private:
   static constexpr std::size_t kNever = static_cast<std::size_t>(-1);
 
   struct Step {
     std::string name;
-    std::vector<Edit> edits;
+    std::vector<TemplateEdit> edits;
     std::size_t bytes = 0;
   };
 
@@ -107,7 +107,7 @@ class EditHistory final {
   bool started = false;
   int pauses = 0;
   int depth = 0;
-  std::vector<Edit> open;                         ///< of the act that is going on
+  std::vector<TemplateEdit> open;                         ///< of the act that is going on
   std::unordered_set<const CEL_Property*> noted;  ///< values that it has changed already
   std::unordered_set<const CEL_Element*> fresh;   ///< elements that it has made
 };

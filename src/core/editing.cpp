@@ -112,6 +112,19 @@ bool TemplateCore::DeleteElement(Uid uid) {
   return true;
 }
 
+std::vector<Uid> TemplateCore::DeleteElements(std::vector<Uid> uids) {
+  const EditStep step(history);
+  // A use comes after its definition: the last go first, and one round is the rule.
+  for (std::size_t before = uids.size() + 1; uids.size() < before;) {
+    before = uids.size();
+    for (auto uid = uids.rbegin(); uid != uids.rend(); ++uid) {
+      if (CanDelete(*uid) && DeleteElement(*uid)) *uid = Uid::None;
+    }
+    std::erase(uids, Uid::None);
+  }
+  return uids;
+}
+
 bool TemplateCore::EraseElement(const SymbolRecord& record) {
   const std::size_t index = record.index;
   const ElementKind elementKind = record.element->Kind();

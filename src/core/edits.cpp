@@ -149,15 +149,15 @@ struct Summary {
   const ValueEdit* firstValue = nullptr;
   bool isOneValue = true;
   bool isOneElement = true;
-  const Edit* firstOfGroups = nullptr;
+  const TemplateEdit* firstOfGroups = nullptr;
   std::size_t memberships = 0;
   bool takesOver = false;
   const BuiltInsEdit* builtIns = nullptr;
 };
 
-Summary SummaryOf(const std::vector<Edit>& edits) {
+Summary SummaryOf(const std::vector<TemplateEdit>& edits) {
   Summary summary;
-  for (const Edit& edit : edits) {
+  for (const TemplateEdit& edit : edits) {
     std::visit(Overloaded{[&summary](const ValueEdit& value) {
                             const bool isSymbol = value.property == &value.element->symbol;
                             if (isSymbol && summary.renamed == nullptr) summary.renamed = &value;
@@ -271,11 +271,11 @@ PropertyValue ValueOf(const CEL_Property& property) {
   }
 }
 
-void Exchange(TemplateState& state, Edit& edit) {
+void Exchange(TemplateState& state, TemplateEdit& edit) {
   std::visit(Exchanging(state), edit);
 }
 
-std::size_t SizeOf(const Edit& edit) {
+std::size_t SizeOf(const TemplateEdit& edit) {
   const auto own = [](const auto& each) -> std::size_t {
     using Kind = std::decay_t<decltype(each)>;
     if constexpr (std::is_same_v<Kind, ValueEdit>) {
@@ -297,10 +297,10 @@ std::size_t SizeOf(const Edit& edit) {
       return 0;
     }
   };
-  return sizeof(Edit) + std::visit(own, edit);
+  return sizeof(TemplateEdit) + std::visit(own, edit);
 }
 
-std::string NameOfStep(const TemplateState& state, const std::vector<Edit>& edits) {
+std::string NameOfStep(const TemplateState& state, const std::vector<TemplateEdit>& edits) {
   const Summary summary = SummaryOf(edits);
   if (summary.takesOver) return "Take over what was not read";
   if (!summary.created.empty()) return OneOrCount("Create", summary.created);
@@ -315,9 +315,9 @@ std::string NameOfStep(const TemplateState& state, const std::vector<Edit>& edit
   return summary.firstValue == nullptr ? std::string() : NameOfValues(summary);
 }
 
-Uid SubjectOfStep(const std::vector<Edit>& edits) {
+Uid SubjectOfStep(const std::vector<TemplateEdit>& edits) {
   Uid subject = Uid::None;
-  for (const Edit& edit : edits) {
+  for (const TemplateEdit& edit : edits) {
     if (const auto* presence = std::get_if<PresenceEdit>(&edit)) return presence->element->GetUid();
     if (const auto* place = std::get_if<PlaceEdit>(&edit)) return place->element->GetUid();
     const auto* value = std::get_if<ValueEdit>(&edit);

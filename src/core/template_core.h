@@ -145,6 +145,9 @@ class TemplateCore final : public ElementOwner {
   bool CanDelete(Uid uid) const;
   /// Deletes an element that nobody uses. One that is refused has left its visibility groups all the same.
   bool DeleteElement(Uid uid);
+  /// Deletes several, as one step, each as soon as nobody uses it any more; those that stay are as they were. The
+  /// ones that were not deleted.
+  std::vector<Uid> DeleteElements(std::vector<Uid> uids);
   /// Whether a move keeps every use after its definition. Only auxiliaries, processes and arithmetic
   /// expressions can be refused.
   bool CanMove(Uid uid, Uid targetUid) const;

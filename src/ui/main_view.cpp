@@ -1,8 +1,10 @@
 #include "ui/main_view.h"
 
 #include <QAction>
+#include <QApplication>
 #include <QFontInfo>
 #include <QKeyEvent>
+#include <QLineEdit>
 #include <QMenu>
 #include <QScreen>
 #include <QScrollArea>
@@ -19,6 +21,7 @@
 #include "ui/control_ids.h"
 #include "ui/create_hint.h"
 #include "ui/dialogs.h"
+#include "ui/edit_commands.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
 #include "ui/export_commands.h"
@@ -59,7 +62,7 @@ std::int32_t NumberOf(const UpdateHint* argument) {
 class TypedInModel final {
  public:
   TypedInModel(std::vector<TypedValue> typedValues, TemplateCore& template_)
-      : core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
+      : unrecorded(template_.History()), core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
     for (const TypedValue& value : values) value.store();
   }
   TypedInModel(const TypedInModel&) = delete;
@@ -71,6 +74,7 @@ class TypedInModel final {
 
  private:
   NotificationsOff silent;
+  RecordingOff unrecorded;
   TemplateCore& core;
   bool wasModified;
   std::vector<TypedValue> values;
@@ -98,6 +102,8 @@ TemplateCore& CMainView::Core() const {
 void CMainView::OnInitialUpdate() {
   BuildToolBar();
   BuildLayout();
+  edits = MakeChild<CEditCommands>(*this, dialogs);
+  edits->AddTo(*editBar);
   connect(errorList, &CErrorList::Refreshed, this,
           [this] { tree->ShowMessages(errorList->MessagesOfElements()); });
   connect(errorList, &CErrorList::Refreshed, this, [this] { accountStrip->Show(Core().Account()); });
@@ -121,6 +127,9 @@ void CMainView::OnInitialUpdate() {
 }
 
 void CMainView::BuildToolBar() {
+  editBar = MakeChild<QToolBar>(this);
+  editBar->setIconSize(kIcons);
+  editBar->setAccessibleName(strings::kEditing);
   toolBar = MakeChild<QToolBar>(this);
   toolBar->setObjectName(QString::number(control_id::kNavigation));
   toolBar->setIconSize(kIcons);
@@ -168,7 +177,10 @@ void CMainView::BuildLayout() {
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
   layout->setSpacing(0);
-  layout->addWidget(toolBar);
+  auto* bars = MakeChild<QHBoxLayout>();
+  bars->addWidget(toolBar);
+  bars->addWidget(editBar, 1);
+  layout->addLayout(bars);
   layout->addWidget(topBottom, 1);
 }
 
@@ -238,6 +250,8 @@ QWidget* CMainView::MakeTitleDetail() {
 
 void CMainView::MarkDocument() {
   if (Core().Modified()) document.SetModifiedFlag(true);
+  if (edits != nullptr) edits->Update();
+  UpdateStatus();
 }
 
 void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHint* argument) {
@@ -265,6 +279,9 @@ void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHi
     case hint::kMoveDown:
       if (QTreeWidgetItem* item = tree->FindById(Uid{number}))
         tree->MoveNode(*item, hintNumber == hint::kMoveUp ? -1 : 1);
+      break;
+    case hint::kStructure:
+      tree->Follow(Core());
       break;
     case hint::kAddGroup: {
       const std::int32_t group = Core().AddVisibilityGroup();
@@ -305,6 +322,7 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
     helpNumber = NodeRowOf(node).help;
   }
   UpdateNavigation();
+  edits->Update();
   // A click selects the row under the pointer, where a node that the commit has made may lie by then.
   QTimer::singleShot(0, this, [this] {
     QTreeWidgetItem* item = tree->currentItem();
@@ -469,7 +487,80 @@ void CMainView::CreateFromMenu(const CItemData& clicked) {
   request.kind = commands.kindToCreate;
   request.ownerId = commands.ownerId;
   const Uid uid = CreateElement(request);
-  if (uid != Uid::None) SelectById(uid);
+  if (uid != Uid::None) {
+    SelectById(uid);
+    FocusSymbol();
+  }
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
+}
+
+void CMainView::CreateBeside() {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr) return;
+  CommitAll();
+  const CItemData node = CElementTree::DataOf(*item);
+  const NodeCommands commands = CommandsOfNode(node, Core());
+  if (commands.kindToCreate != ElementKind::None && commands.canCreate) CreateFromMenu(node);
+}
+
+void CMainView::FocusSymbol() {
+  auto* symbol = form ? form->findChild<QLineEdit*>(QString::number(control_id::kSymbol)) : nullptr;
+  if (symbol == nullptr || !symbol->isEnabled()) return FocusForm();
+  symbol->setFocus(Qt::ShortcutFocusReason);
+  symbol->selectAll();
+}
+
+void CMainView::Say(const QString& text) {
+  UpdateStatus(text.toStdString());
+}
+
+std::string CMainView::StatusText() const {
+  const auto count = Core().CountNamedElements() + Core().GetSpecieCount();
+  return (count == 1 ? strings::kOneElement : strings::kElementCount.arg(count)).toStdString();
+}
+
+QString CMainView::FocusedControl() const {
+  const QWidget* focus = QApplication::focusWidget();
+  return form && focus != nullptr && form->isAncestorOf(focus) ? focus->objectName() : QString();
+}
+
+void CMainView::Act(const std::function<StepEffect()>& act) {
+  CommitAll();
+  const QString control = FocusedControl();
+  // It shows what may go.
+  CloseForm();
+  Follow(act());
+  QWidget* again = form && !control.isEmpty() ? form->findChild<QWidget*>(control) : nullptr;
+  if (again != nullptr && again->isEnabled()) {
+    again->setFocus(Qt::OtherFocusReason);
+  } else {
+    tree->setFocus(Qt::OtherFocusReason);
+  }
+}
+
+QTreeWidgetItem* CMainView::NodeOfSubject(const StepEffect& effect) const {
+  QTreeWidgetItem* node = IsElement(effect.subject) ? tree->FindById(effect.subject) : nullptr;
+  const auto group = static_cast<std::size_t>(effect.group);
+  if (node == nullptr && effect.group > 0) {
+    node = group <= tree->GroupItems().size() ? tree->GroupItems()[group - 1]
+                                              : tree->FindById(folder_id::kVisibilityGroups);
+  }
+  return node == nullptr ? tree->currentItem() : node;
+}
+
+void CMainView::Follow(const StepEffect& effect) {
+  tree->Follow(Core());
+  for (const Uid uid : effect.changed) {
+    if (const CEL_Element* element = Core().GetElement(uid)) tree->FollowCaption(*element);
+  }
+  QTreeWidgetItem* node = NodeOfSubject(effect);
+  if (node == tree->currentItem()) {
+    OnSelectionChanged(node, nullptr);
+  } else {
+    tree->setCurrentItem(node);
+  }
+  if (node != nullptr) tree->scrollToItem(node);
   errorList->RefreshErrorList(Core());
   MarkDocument();
 }
@@ -532,10 +623,6 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
       FocusForm();
       return true;
     }
-    if (key->modifiers() == Qt::AltModifier && (key->key() == Qt::Key_Up || key->key() == Qt::Key_Down)) {
-      MoveSelected(key->key() == Qt::Key_Up ? -1 : 1);
-      return true;
-    }
   }
   return QWidget::eventFilter(watched, happened);
 }
@@ -549,7 +636,8 @@ QList<QWidget*> CMainView::StopsOfForm() const {
 }
 
 std::vector<ViewCommand> CMainView::Commands() {
-  std::vector<ViewCommand> commands = ExportCommands(document, dialogs, *this);
+  std::vector<ViewCommand> commands = edits->Commands();
+  for (ViewCommand& command : ExportCommands(document, dialogs, *this)) commands.push_back(std::move(command));
   commands.push_back(StrongColoursCommand());
   return commands;
 }

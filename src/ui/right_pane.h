@@ -50,6 +50,9 @@ class CRightPaneBase : public QWidget {
   /// What the next commit would write, without the symbol: a rename asks first.
   virtual std::vector<TypedValue> TypedValues() const { return {}; }
 
+  /// The elements that are selected in the form itself: those of a list's rows.
+  virtual std::vector<Uid> SelectedElements() const { return {}; }
+
   /// Elements or groups were made, moved or deleted elsewhere: a page that lists them shows them again.
   virtual void OnStructureChanged() {}
 

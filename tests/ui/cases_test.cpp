@@ -17,7 +17,7 @@ TEST_P(Cases, GiveWhatTheFileSays) {
 
 INSTANTIATE_TEST_SUITE_P(Editor, Cases,
                          testing::Values("commits", "names", "choices", "expressions", "messages", "nodes",
-                                         "visits", "groups", "lists", "root", "visibility", "particles",
+                                         "undo", "visits", "groups", "lists", "root", "visibility", "particles",
                                          "exports"),
                          [](const auto& file) { return file.param; });
 

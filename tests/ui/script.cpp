@@ -203,9 +203,34 @@ std::string Marks(Editor& editor, const Words& /*words*/) {
 }
 
 /// "Export Overview" runs the command of the view whose text has this in it, and lists the files then there.
+/// The action of the edit menu whose text begins so.
+QAction* EditAction(Editor& editor, const QString& text) {
+  for (const ViewCommand& command : editor.View().Commands()) {
+    if (command.action != nullptr && command.action->text().remove(u'&').startsWith(text)) return command.action;
+  }
+  return nullptr;
+}
+
+void UseEditMenu(Editor& editor, const Words& words) {
+  QAction* action = EditAction(editor, words.first);
+  ASSERT_TRUE(action != nullptr && action->isEnabled()) << words.all;
+  action->trigger();
+}
+
+/// What can be taken back and done again, and whether there is anything to save.
+std::string Steps(Editor& editor, const Words& /*words*/) {
+  std::string text;
+  for (const char* name : {"Undo", "Redo"}) {
+    const QAction* action = EditAction(editor, QString::fromLatin1(name));
+    text += action->isEnabled() ? action->text().remove(u'&').toStdString() + "\n" : "";
+  }
+  const bool isMarked = editor.Document().Title().find("Modified") != std::string::npos;
+  return text + (isMarked && editor.Document().IsModified() ? "modified\n" : "as saved\n");
+}
+
 std::string RunCommand(Editor& editor, const Words& words) {
   for (const ViewCommand& command : editor.View().Commands()) {
-    if (ToScreen(command.text).remove(u'&').contains(words.first)) command.run();
+    if (command.run && ToScreen(command.text).remove(u'&').contains(words.first)) command.run();
   }
   QDirIterator file(QFileInfo(ToScreen(editor.Path())).path(), QDir::Files, QDirIterator::Subdirectories);
   QStringList found;
@@ -304,6 +329,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"revisit", Revisit},
     {"right-click", RightClick},
     {"menu-key", UseMenuKey},
+    {"edit", UseEditMenu},
 };
 
 const std::map<std::string, std::string (*)(Editor& editor, const Words& words)> kLooks = {
@@ -322,6 +348,7 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"row-menu", RowMenu},
     {"marks", Marks},
     {"command", RunCommand},
+    {"steps", Steps},
     {"tabs", PressTab},
     {"save", Save},
     {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},
