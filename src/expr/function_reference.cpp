@@ -6,6 +6,7 @@
 #include <numeric>
 #include <utility>
 
+#include "expr/carbonate/option_tables.h"
 #include "expr/function_reference_rows.h"
 #include "platform/ascii.h"
 #include "platform/number_text.h"
@@ -32,6 +33,14 @@ std::optional<std::size_t> ArgumentNamed(const FunctionReference& function, std:
                                 [name](const ArgumentReference& argument) { return argument.name == name; });
   if (hit == function.arguments.end()) return std::nullopt;
   return static_cast<std::size_t>(hit - function.arguments.begin());
+}
+
+template <typename Options>
+std::vector<std::string_view> SourcesOf(const Options& options) {
+  std::vector<std::string_view> sources;
+  sources.reserve(options.size());
+  for (const auto& option : options) sources.push_back(option.source);
+  return sources;
 }
 
 /// Takes a power into a rule: a number, or the name of the argument that has it.
@@ -92,6 +101,25 @@ const FunctionGroup& GroupOfFunction(const FunctionReference& function) {
   });
 }
 
+std::vector<std::string_view> FormulaeOf(const FunctionReference& function) {
+  struct Row {
+    std::string_view name;
+    std::vector<std::string_view> (*sources)();
+  };
+  static constexpr Row kRows[] = {
+      {"SET_K1K2_OPTION", [] { return SourcesOf(kCarbonicAcidOptions); }},
+      {"SET_KW_OPTION", [] { return SourcesOf(kWaterOptions); }},
+      {"SET_KB_OPTION", [] { return SourcesOf(kBoricAcidOptions); }},
+      {"SET_KS_OPTION", [] { return SourcesOf(kBisulphateOptions); }},
+      {"SET_FH_OPTION", [] { return SourcesOf(kActivityOptions); }},
+      {"SET_B_OPTION", [] { return SourcesOf(kBoronOptions); }},
+  };
+  for (const Row& row : kRows) {
+    if (row.name == function.name) return row.sources();
+  }
+  return {};
+}
+
 std::string CallText(const FunctionReference& function) {
   std::string text(function.name);
   text += '(';
@@ -127,8 +155,8 @@ std::string UnitInWords(const FunctionReference& function, std::string_view unit
 
 std::vector<std::string_view> NearestNames(std::string_view typed, std::span<const std::string_view> names) {
   constexpr std::size_t kMostNames = 3;
-  // One letter in three may be wrong.
-  const std::size_t farthest = std::max<std::size_t>(1, typed.size() / 3);
+  // About one letter in three may be wrong, none of a single one.
+  const std::size_t farthest = (typed.size() + 1) / 3;
   std::vector<std::pair<std::size_t, std::string_view>> near;
   for (const std::string_view name : names) {
     const std::size_t shorter = std::min(name.size(), typed.size());

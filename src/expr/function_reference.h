@@ -47,6 +47,9 @@ const FunctionReference* ReferenceOfFunction(std::string_view name);
 /// The subject that a function belongs to.
 const FunctionGroup& GroupOfFunction(const FunctionReference& function);
 
+/// The sources of the formulae that an option function chooses from, option 1 first; empty for any other.
+std::vector<std::string_view> FormulaeOf(const FunctionReference& function);
+
 /// A call with the names of the arguments, "ARCTAN2(x, y)".
 std::string CallText(const FunctionReference& function);
 
