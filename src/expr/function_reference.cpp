@@ -22,7 +22,8 @@ constexpr char kPowerSign = '^';
 
 std::vector<FunctionGroup> AllGroups() {
   std::vector<FunctionGroup> groups;
-  for (const std::span<const FunctionGroup> part : {GeneralFunctionGroups(), SeaWaterFunctionGroups()}) {
+  for (const std::span<const FunctionGroup> part :
+       {GeneralFunctionGroups(), SeaWaterFunctionGroups(), DeprecatedFunctionGroups()}) {
     groups.insert(groups.end(), part.begin(), part.end());
   }
   return groups;

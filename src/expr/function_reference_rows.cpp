@@ -499,6 +499,9 @@ constexpr FunctionGroup kGroups[] = {
     {"Random numbers", kRandom},
     {"Movement", kMoves},
     {"The simulation engine", kEngine},
+};
+
+constexpr FunctionGroup kDeprecatedGroups[] = {
     {"Deprecated", kOld},
 };
 
@@ -506,6 +509,10 @@ constexpr FunctionGroup kGroups[] = {
 
 std::span<const FunctionGroup> GeneralFunctionGroups() {
   return kGroups;
+}
+
+std::span<const FunctionGroup> DeprecatedFunctionGroups() {
+  return kDeprecatedGroups;
 }
 
 }  // namespace tessal

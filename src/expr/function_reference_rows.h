@@ -9,6 +9,8 @@ namespace tessal {
 
 /// Mathematics, calendar, rates, light, random numbers, movement and what the engine computes.
 std::span<const FunctionGroup> GeneralFunctionGroups();
+/// What old templates may still call.
+std::span<const FunctionGroup> DeprecatedFunctionGroups();
 /// Sea water and its carbonate system.
 std::span<const FunctionGroup> SeaWaterFunctionGroups();
 

@@ -11,6 +11,7 @@
 #include <QSplitter>
 #include <QTest>
 #include <QTextBlock>
+#include <QTextBrowser>
 #include <QTextLayout>
 #include <QTimer>
 #include <filesystem>
@@ -411,6 +412,21 @@ TEST(Help, IsNotTakenFromTheCurrentFolder) {
   }
   EXPECT_EQ(FindHelpPage(QDir::currentPath()), page);
   QDir::setCurrent(former);
+}
+
+TEST(Help, OpensTheReferenceAtAName) {
+  QWidget owner;
+  const std::pair<const char*, const char*> cases[] = {{"sinh", "SINH(x)"},
+                                                       {"Temperature", "TEMPERATURE"},
+                                                       {"GET_HSO4", "GET_HSO4("},
+                                                       {"", "Functions"},
+                                                       {"nobody", "Functions"}};
+  for (const auto& [name, heading] : cases) {
+    OpenReference(&owner, QString::fromLatin1(name));
+    const auto* window = owner.findChild<QTextBrowser*>(QStringLiteral("help"));
+    ASSERT_NE(window, nullptr);
+    QTRY_VERIFY(window->cursorForPosition({5, 25}).block().text().startsWith(heading));
+  }
 }
 
 }  // namespace
