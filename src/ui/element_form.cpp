@@ -69,12 +69,12 @@ QString MeaningOf(const FormField& field, const QString& choice) {
   return QString::fromStdString(MeaningOfChoice(field.label, choice.toStdString()));
 }
 
-/// Has a closed combo box explain the choice that it shows, after its field.
+/// Has a closed combo box explain its field, and in a line below the choice that it shows.
 void ShowChoiceTip(QComboBox& combo, const FormField& field) {
-  QString tip = Meaning(field);
+  QStringList lines(Meaning(field));
   const QString meaning = MeaningOf(field, combo.currentText());
-  if (!meaning.isEmpty()) tip += u' ' + combo.currentText() + QStringLiteral(": ") + meaning;
-  combo.setToolTip(tip.isEmpty() ? tip : PlainTip(tip));
+  if (!meaning.isEmpty()) lines.append(combo.currentText() + QStringLiteral(": ") + meaning);
+  combo.setToolTip(PlainTip(lines.join(u'\n')).replace(u'\n', QStringLiteral("<br>")));
 }
 
 }  // namespace
