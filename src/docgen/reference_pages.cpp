@@ -40,18 +40,24 @@ std::string LimitText(double limit) {
   return limit >= kNoLimit || limit <= -kNoLimit ? "none" : ShortestNumberText(limit);
 }
 
-/// The name that a page of Markdown gives to a heading of letters, digits, underscores and blanks.
+/// The name that a page of Markdown gives to a heading.
 std::string MarkdownAnchor(std::string_view heading) {
   std::string anchor;
   for (const char character : heading) {
     if (character == ' ') anchor += '-';
     if (character >= 'A' && character <= 'Z') {
       anchor += static_cast<char>(character - 'A' + 'a');
-    } else if (character != ' ' && character != ':') {
+    } else if (character != ' ' && character != ':' && character != ',') {
       anchor += character;
     }
   }
   return anchor;
+}
+
+ReferenceSection SectionOf(std::string_view title, std::span<const WordReference> words) {
+  ReferenceSection section{title, {}};
+  for (const WordReference& word : words) section.entries.push_back(EntryOf(word));
+  return section;
 }
 
 std::string Element(std::string_view tag, std::string_view content) {
@@ -100,6 +106,17 @@ ReferenceEntry EntryOf(const CatalogueBuiltin& builtin) {
   AddFact(entry, "Default", ShortestNumberText(builtin.defaultValue));
   AddFact(entry, "Limits", LimitText(builtin.minimum) + " to " + LimitText(builtin.maximum));
   if (IsDeprecatedBuiltin(builtin.id)) AddFact(entry, "Deprecated", "not for new templates");
+  return entry;
+}
+
+ReferenceEntry EntryOf(const WordReference& word) {
+  ReferenceEntry entry{.name = std::string(word.word),
+                       .heading = std::string(word.word),
+                       .purpose = word.meaning,
+                       .quantities = {},
+                       .facts = {},
+                       .formulae = {}};
+  AddFact(entry, "Unit", word.unit);
   return entry;
 }
 
@@ -168,6 +185,8 @@ ReferencePage PageOfFunctions() {
     ReferenceSection& section = page.sections.emplace_back(ReferenceSection{group.title, {}});
     for (const FunctionReference& function : group.functions) section.entries.push_back(EntryOf(function));
   }
+  page.sections.push_back(SectionOf("Properties of particles, in square brackets", PropertyReferences()));
+  page.sections.push_back(SectionOf("Interactions of particles", VerbReferences()));
   return page;
 }
 

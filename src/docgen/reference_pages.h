@@ -1,6 +1,6 @@
-// The reference of functions and built-ins laid out for people: an entry as plain text, Markdown or HTML, and
-// pages of all entries. docs/functions.md, docs/builtins.md and the help's pages of functions and of
-// built-ins are these pages.
+// The reference of functions, built-ins and words laid out for people: an entry as plain text, Markdown or
+// HTML, and pages of all entries. docs/functions.md, docs/builtins.md and the help's pages of functions and
+// of built-ins are these pages.
 #pragma once
 
 #include <span>
@@ -10,6 +10,7 @@
 
 #include "expr/builtin_catalogue.h"
 #include "expr/function_reference.h"
+#include "expr/word_reference.h"
 
 namespace tessal {
 
@@ -36,6 +37,8 @@ struct ReferenceEntry {
 
 ReferenceEntry EntryOf(const FunctionReference& function);
 ReferenceEntry EntryOf(const CatalogueBuiltin& builtin);
+/// Of a property of particles, or a verb.
+ReferenceEntry EntryOf(const WordReference& word);
 
 /// Lines of plain text, the heading first.
 std::string EntryText(const ReferenceEntry& entry);
@@ -54,7 +57,7 @@ struct ReferencePage {
   std::vector<ReferenceSection> sections;
 };
 
-/// All functions by subject, and all built-ins by kind.
+/// All functions by subject, and then the other words of the language; all built-ins by kind.
 ReferencePage PageOfFunctions();
 ReferencePage PageOfBuiltins();
 

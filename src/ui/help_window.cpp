@@ -10,6 +10,7 @@
 
 #include "expr/builtin_reference.h"
 #include "expr/function_reference.h"
+#include "expr/word_reference.h"
 #include "ui/child.h"
 #include "ui/strings.h"
 
@@ -84,9 +85,10 @@ void OpenReference(QWidget* parent, const QString& name) {
     ShowPage(parent, kBuiltins, QString::fromStdString(std::string(builtin->name)));
     return;
   }
-  const FunctionReference* function = ReferenceOfFunction(text);
-  ShowPage(parent, kFunctions,
-           function == nullptr ? QString() : QString::fromStdString(std::string(function->name)));
+  std::string_view anchor;
+  if (const FunctionReference* function = ReferenceOfFunction(text)) anchor = function->name;
+  if (const WordReference* word = ReferenceOfWord(text)) anchor = word->word;
+  ShowPage(parent, kFunctions, QString::fromStdString(std::string(anchor)));
 }
 
 }  // namespace tessal

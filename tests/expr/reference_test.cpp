@@ -3,11 +3,14 @@
 
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 #include "expr/builtin_catalogue.h"
 #include "expr/builtin_reference.h"
 #include "expr/function_catalogue.h"
 #include "expr/function_reference.h"
+#include "expr/semantic_checks.h"
+#include "expr/word_reference.h"
 #include "support/catalogue_call.h"
 
 namespace tessal {
@@ -53,6 +56,26 @@ TEST(Reference, HasOneRowForEachBuiltin) {
   }
   EXPECT_NE(ReferenceOfBuiltin("temperature"), nullptr);
   EXPECT_EQ(ReferenceOfBuiltin("HEAT"), nullptr);
+  // Quantities that the catalogue measures in one unit have one in the reference too.
+  std::map<std::string_view, std::string_view> units = {{"", "1"}, {"mg/", "unknown"}, {"auto", "unknown"}};
+  for (const CatalogueBuiltin& builtin : Builtins()) {
+    const std::string_view unit = ReferenceOfBuiltin(builtin.name)->unit;
+    EXPECT_EQ(units.emplace(builtin.unit, unit).first->second, unit) << builtin.name;
+  }
+}
+
+TEST(Reference, HasOneRowForEachWordOfTheLanguage) {
+  EXPECT_EQ(PropertyReferences().size(), PropertyNames().size());
+  EXPECT_EQ(VerbReferences().size(), InteractionVerbs().size());
+  for (const auto words : {PropertyNames(), InteractionVerbs()}) {
+    for (const std::string_view word : words) {
+      const WordReference* row = ReferenceOfWord(word);
+      ASSERT_NE(row, nullptr) << word;
+      EXPECT_TRUE(row->meaning.ends_with('.')) << word;
+      EXPECT_EQ(row->unit.empty(), IsInteractionVerb(word)) << word;
+    }
+  }
+  EXPECT_EQ(ReferenceOfWord("xpos"), nullptr) << "the check takes capitals alone";
 }
 
 /// By what a quantity with that rule grows when all that may have any unit is measured in units a `scale`-th
