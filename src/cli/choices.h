@@ -28,20 +28,20 @@ inline constexpr std::array<Choice<Format>, 3> kCheckFormats = {{
 /// What a table is printed in.
 inline constexpr Choices<Format> kTableFormats = Choices<Format>(kCheckFormats).first<2>();
 
-/// What descriptions are printed in.
-inline constexpr std::array<Choice<Format>, 4> kDescriptionFormats = {{
-    {"text", Format::Text},
-    {"json", Format::Json},
-    {"markdown", Format::Markdown},
-    {"html", Format::Html},
-}};
-
 /// Severities, by their words in small letters.
 inline constexpr std::array<Choice<int>, 4> kLevels = {{
     {"notice", 1},
     {"warning", 2},
     {"critical", 3},
     {"fatal", 4},
+}};
+
+/// What descriptions are printed in.
+inline constexpr std::array<Choice<Format>, 4> kDescriptionFormats = {{
+    {"text", Format::Text},
+    {"json", Format::Json},
+    {"markdown", Format::Markdown},
+    {"html", Format::Html},
 }};
 
 /// What a word means; nothing for a word that is no choice.

@@ -232,7 +232,8 @@ void AddCatalogue(CLI::App& app, CommandLine& line, const char* name, const char
   CLI::App* catalogue = app.add_subcommand(name, description)->group(kCatalogues);
   const CLI::Option* one = catalogue->add_option("NAME", line.name, "one of them");
   CLI::Option* describe = catalogue->add_flag("--describe", line.asPage, "says what they mean");
-  AddFormat(*catalogue, line, kDescriptionFormats)->needs(describe);
+  AddFormat(*catalogue, line, kDescriptionFormats);
+  catalogue->get_option("--format")->needs(describe);
   catalogue->callback([&line, one, run] {
     // An empty name is a name too, and no row's.
     const bool asksForOne = one->count() > 0;
