@@ -21,7 +21,9 @@
 #include "ui/expression_editor_dialog.h"
 #include "ui/expression_field.h"
 #include "ui/focus_watch.h"
+#include "ui/format_words.h"
 #include "ui/label.h"
+#include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -58,6 +60,23 @@ bool IsStored(FieldEditor editor) {
   }
 }
 
+QString Meaning(const FormField& field) {
+  const std::string_view meaning = MeaningOfField(field.label);
+  return QString::fromUtf8(meaning.data(), static_cast<qsizetype>(meaning.size()));
+}
+
+QString MeaningOf(const FormField& field, const QString& choice) {
+  return QString::fromStdString(MeaningOfChoice(field.label, choice.toStdString()));
+}
+
+/// Has a closed combo box explain its field, and in a line below the choice that it shows.
+void ShowChoiceTip(QComboBox& combo, const FormField& field) {
+  QStringList lines(Meaning(field));
+  const QString meaning = MeaningOf(field, combo.currentText());
+  if (!meaning.isEmpty()) lines.append(combo.currentText() + QStringLiteral(": ") + meaning);
+  combo.setToolTip(PlainTip(lines.join(u'\n')).replace(u'\n', QStringLiteral("<br>")));
+}
+
 }  // namespace
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
@@ -83,7 +102,19 @@ void CElementForm::LabelFields() {
   for (Control& control : controls) {
     control.label = MakeChild<QLabel>(labels.takeFirst(), this);
     control.label->setBuddy(control.editor);
+    ExplainField(control);
   }
+}
+
+void CElementForm::ExplainField(const Control& control) {
+  const QString meaning = Meaning(*control.field);
+  if (meaning.isEmpty()) return;
+  control.label->setToolTip(PlainTip(meaning));
+  // The tip of an editor would be read out with its markup.
+  control.editor->setAccessibleDescription(meaning);
+  // Where a field has text of its own to point at, the tip is for that.
+  if (qobject_cast<CAutoRichEditCtrl*>(control.editor) == nullptr)
+    control.editor->setToolTip(PlainTip(meaning));
 }
 
 QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
@@ -96,7 +127,7 @@ QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
       return control.editor = MakeLines();
     case FieldEditor::SortedChoice:
     case FieldEditor::OrderedChoice:
-      return control.editor = MakeCombo();
+      return control.editor = MakeCombo(field);
     case FieldEditor::ReferencedIn:
       return control.editor = MakeReferences();
     default:
@@ -119,13 +150,14 @@ QWidget* CElementForm::MakeLines() {
   return lines;
 }
 
-QWidget* CElementForm::MakeCombo() {
+QWidget* CElementForm::MakeCombo(const FormField& field) {
   auto* combo = MakeChild<QComboBox>(this);
   combo->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
   // The wheel that scrolls the form must not choose on its way.
   combo->setFocusPolicy(Qt::StrongFocus);
   IgnoreWheelWithoutFocus(*combo);
   connect(combo, &QComboBox::activated, this, [this] { NoteChosen(); });
+  connect(combo, &QComboBox::currentTextChanged, this, [combo, &field] { ShowChoiceTip(*combo, field); });
   return combo;
 }
 
@@ -212,7 +244,7 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
   const CEL_Property& property = field.property(element);
   const bool enabled = IsEnabled(field, property);
   if (auto* combo = qobject_cast<QComboBox*>(control.editor)) {
-    FillCombo(*combo, field.editor, property, enabled);
+    FillCombo(*combo, field, property, enabled);
     return;
   }
   control.editor->setEnabled(enabled);
@@ -243,7 +275,7 @@ std::string CElementForm::ReferrerText(const CEL_Element& element) const {
   return text;
 }
 
-void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property,
+void CElementForm::FillCombo(QComboBox& combo, const FormField& field, const CEL_Property& property,
                              bool enabled) {
   combo.clear();
   combo.setEnabled(property.HasChoices() && enabled);
@@ -251,12 +283,16 @@ void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Pro
   for (const CEL_Choice& choice : property.Choices()) {
     entries.append({ToScreen(choice.display), static_cast<int>(entries.size())});
   }
-  if (editor == FieldEditor::SortedChoice) {
+  if (field.editor == FieldEditor::SortedChoice) {
     std::stable_sort(entries.begin(), entries.end(), [](const auto& left, const auto& right) {
       return left.first.compare(right.first, Qt::CaseInsensitive) < 0;
     });
   }
-  for (const auto& [caption, index] : entries) combo.addItem(caption, index);
+  for (const auto& [caption, index] : entries) {
+    combo.addItem(caption, index);
+    const QString meaning = MeaningOf(field, caption);
+    if (!meaning.isEmpty()) combo.setItemData(combo.count() - 1, PlainTip(meaning), Qt::ToolTipRole);
+  }
   const std::int32_t present = property.PresentChoice();
   combo.setCurrentIndex(combo.findData(present < 0 ? property.Selected() : present));
 }
