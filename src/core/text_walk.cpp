@@ -8,9 +8,6 @@ namespace tessal {
 
 namespace {
 
-constexpr std::string_view kName = "Name";
-constexpr std::string_view kDescription = "Description";
-
 using Visitor = std::function<void(const TextOfTemplate&)>;
 
 class TextWalk final {
@@ -67,9 +64,9 @@ class TextWalk final {
 
   template <class Named>
   void VisitNamed(TextPlace place, const Named& named) {
-    place.field = kName;
+    place.field = kNameField;
     visit({place, TextRole::Text, ElementKind::VisibilityGroup, nullptr, named.name});
-    place.field = kDescription;
+    place.field = kDescriptionField;
     visit({place, TextRole::Text, ElementKind::VisibilityGroup, nullptr, named.description});
   }
 
@@ -105,7 +102,7 @@ const VisibilityLevel* LevelAt(const TemplateCore& core, const TextPlace& place)
 template <class Named>
 const std::string* TextOf(const Named* named, std::string_view field) {
   if (named == nullptr) return nullptr;
-  return field == kName ? &named->name : &named->description;
+  return field == kNameField ? &named->name : &named->description;
 }
 
 const std::string* GroupText(const TemplateCore& core, const TextPlace& place) {
@@ -117,7 +114,7 @@ bool SetGroupText(TemplateCore& core, const TextPlace& place, std::string_view t
   const std::string* former = GroupText(core, place);
   if (former == nullptr) return false;
   if (*former == text) return true;
-  if (place.field == kName) {
+  if (place.field == kNameField) {
     return place.level > 0 ? core.SetLevelName(place.group, place.level, text)
                            : core.SetGroupName(place.group, text);
   }

@@ -21,6 +21,10 @@ class TemplateCore;
 /// A symbol has uses that only a rename takes along.
 enum class TextRole : std::uint8_t { Symbol, Expression, Text };
 
+/// The fields of a visibility group or level.
+inline constexpr std::string_view kNameField = "Name";
+inline constexpr std::string_view kDescriptionField = "Description";
+
 /// Where a text is, for as long as its element or group is there.
 struct TextPlace {
   Uid element = Uid::None;  ///< none for the texts of visibility groups
