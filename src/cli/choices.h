@@ -28,6 +28,13 @@ inline constexpr std::array<Choice<Format>, 3> kCheckFormats = {{
 /// What a table is printed in.
 inline constexpr Choices<Format> kTableFormats = Choices<Format>(kCheckFormats).first<2>();
 
+/// What a search looks in.
+inline constexpr std::array<Choice<FindIn>, 3> kFindIn = {{
+    {"expressions", FindIn::Expressions},
+    {"texts", FindIn::Texts},
+    {"all", FindIn::All},
+}};
+
 /// Severities, by their words in small letters.
 inline constexpr std::array<Choice<int>, 4> kLevels = {{
     {"notice", 1},

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "cli/output.h"
+#include "core/find.h"
 
 namespace tessal::cli {
 
@@ -40,6 +41,17 @@ struct RenameCall {
   bool force = false;
 };
 ExitCode RunRename(const RenameCall& call);
+/// Ends as a search does: with a fault of the content where nothing is found.
+struct FindCall {
+  std::string file;
+  std::string pattern;
+  FindIn in = FindIn::All;
+  bool isRegex = false;
+  bool wholeSymbols = false;
+  bool ignoreCase = false;
+  Format format = Format::Text;
+};
+ExitCode RunFind(const FindCall& call);
 ExitCode RunOverview(const std::string& file);
 /// With an empty output the page goes to its usual place. What is no page is replaced only when forced, and
 /// never there.

@@ -10,15 +10,14 @@ ExitCode RunExplain(const std::string& code) {
     Complain("no message has the code '" + code + "'");
     return kContentFault;
   }
-  PrintLine(code + ": " + std::string(LevelWordOf(*row)) + ": " + std::string(TextOf(*row)));
-  PrintLine("Meaning: " + std::string(row->meaning));
-  PrintLine(HelpText(*row));
+  PrintLine(ExplanationText(*row));
   return kFine;
 }
 
 ExitCode RunExplainAll() {
   for (const MessageRow& row : AllMessages()) {
-    PrintLine(std::string(row.code) + '\t' + std::string(LevelWordOf(row)) + '\t' + std::string(TextOf(row)));
+    PrintLine(std::string(row.code) + '\t' + std::string(LevelWordOf(row)) + '\t' +
+              std::string(MessageText(row)));
   }
   return kFine;
 }

@@ -2,6 +2,7 @@
 
 #include "cli/output.h"
 #include "docgen/safe_text.h"
+#include <string_view>
 
 namespace tessal::cli {
 
@@ -17,19 +18,6 @@ constexpr std::string_view kPageStart =
 
 }  // namespace
 
-std::string_view LevelWordOf(const MessageRow& row) {
-  return row.level == ErrorLevel::Undefined ? kUndefinedWord
-                                            : LevelWord(static_cast<std::uint32_t>(row.level));
-}
-
-std::string_view TextOf(const MessageRow& row) {
-  return WithoutLineFeed(row.text);
-}
-
-std::string HelpText(const MessageRow& row) {
-  return "Example: " + std::string(row.example) + "\nRemedy: " + std::string(row.remedy);
-}
-
 std::string HelpMarkdown(const MessageRow& row) {
   return "**Example:** " + MarkdownText(row.example) + "\n\n**Remedy:** " + MarkdownText(row.remedy);
 }
@@ -38,7 +26,7 @@ std::string MessagesPage() {
   std::string page(kPageStart);
   for (const MessageRow& row : AllMessages()) {
     page += "\n## " + std::string(row.code) + "\n\n";
-    page += std::string(LevelWordOf(row)) + ": `" + std::string(TextOf(row)) + "`\n\n";
+    page += std::string(LevelWordOf(row)) + ": `" + std::string(MessageText(row)) + "`\n\n";
     page += MarkdownText(row.meaning) + "\n\n" + HelpMarkdown(row) + "\n";
   }
   return page;

@@ -38,6 +38,7 @@ struct CommandLine {
   int lowestLevel = 0;
   SaveCall save;
   RenameCall rename;
+  FindCall find;
   HtmlCall html;
   ExpressionCall expression;
   std::function<ExitCode()> run;
@@ -73,15 +74,21 @@ CLI::Option* AddForce(CLI::App& command, bool& force) {
   return command.add_flag("--force", force, "replaces an existing file");
 }
 
-CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
-  const auto read = [&line, formats](const std::string& word) {
-    const std::optional<Format> format = ValueOf(formats, word);
-    if (!format) {
-      throw CLI::ValidationError("--format", "'" + ShownNumber(word) + "' is none of " + WordsOf(formats));
-    }
-    line.format = *format;
+/// An option that takes one of a few words.
+template <class Value>
+void AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
+               Value& chosen) {
+  const auto read = [&chosen, name, choices](const std::string& word) {
+    const std::optional<Value> value = ValueOf(choices, word);
+    if (!value)
+      throw CLI::ValidationError(name, "'" + ShownNumber(word) + "' is none of " + WordsOf(choices));
+    chosen = *value;
   };
-  return command.add_option_function<std::string>("--format", read, WordsOf(formats))->type_name("FORMAT");
+  command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
+}
+
+void AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
+  AddChoice(command, "--format", "FORMAT", formats, line.format);
 }
 
 /// The level that a word or a number names. Numbers are read here, as the option parser does not know those
@@ -123,6 +130,18 @@ void AddCheck(CLI::App& app, CommandLine& line) {
       ->type_name("LEVEL");
 }
 
+void AddFind(CLI::App& app, CommandLine& line) {
+  CLI::App* find = AddCommand(app, line, kTemplates, "find", "finds a pattern in texts and expressions",
+                              [&line] { return RunFind(line.find); });
+  AddFile(*find, line.find.file);
+  find->add_option("PATTERN", line.find.pattern, "what to look for")->required();
+  AddChoice(*find, "--in", "WHERE", Choices<FindIn>(kFindIn), line.find.in);
+  find->add_flag("--regex", line.find.isRegex, "takes the pattern as a regular expression");
+  find->add_flag("--whole", line.find.wholeSymbols, "finds whole symbols only");
+  find->add_flag("--ignore-case", line.find.ignoreCase, "takes capitals and small letters as the same");
+  AddChoice(*find, "--format", "FORMAT", kTableFormats, line.find.format);
+}
+
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddCheck(app, line);
   AddExplain(app, line);
@@ -161,6 +180,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
       ->excludes(wholeWords);
   AddOutput(*rename, line.rename.output, "saves under this name, not in place");
   AddForce(*rename, line.rename.force);
+
+  AddFind(app, line);
 
   CLI::App* overview = AddCommand(app, line, kTemplates, "overview", "prints the overview table",
                                   [&line] { return RunOverview(line.file); });
@@ -272,10 +293,10 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 void ShowNumbers(CommandLine& line) {
-  for (std::string* text :
-       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
-        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.html.file,
-        &line.html.output, &line.expression.text, &line.expression.symbol}) {
+  for (std::string* text : {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output,
+                            &line.rename.file, &line.rename.oldSymbol, &line.rename.newSymbol,
+                            &line.rename.output, &line.find.file, &line.find.pattern, &line.html.file,
+                            &line.html.output, &line.expression.text, &line.expression.symbol}) {
     *text = ShownNumber(*text);
   }
   for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {

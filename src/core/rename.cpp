@@ -7,6 +7,7 @@
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
+#include "expr/token_walk.h"
 #include "platform/ascii.h"
 
 namespace tessal {
@@ -47,23 +48,6 @@ std::string ReplaceWordAt(std::string_view text, std::string_view oldWord, std::
 
 std::string Quoted(std::string_view expression) {
   return '"' + std::string(expression) + '"';
-}
-
-/// Calls the visitor with the code and the lexeme, a view into the expression, of each of its tokens. Scans
-/// to come begin as if nobody had looked.
-template <class Visitor>
-void ForEachToken(std::string_view expression, Visitor visit) {
-  const std::string_view text = StripExpressionQuotes(expression);
-  const ScannerStart start = ExpressionScannerStart();
-  ResetExpressionScanner();
-  {
-    ExpressionScan scan(text);
-    for (TokenCode code = scan.Next(); code != TokenCode::End; code = scan.Next()) {
-      const std::size_t length = scan.Lexeme().size();
-      visit(code, text.substr(scan.Consumed() - length, length));
-    }
-  }
-  SetExpressionScannerStart(start);
 }
 
 /// Collects the names that a rename loses, over the expressions that use its symbol.

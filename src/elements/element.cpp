@@ -376,6 +376,25 @@ std::string_view CEL_Element::LabelOf(const CEL_Property& property) const {
   return {};
 }
 
+PropertyPlace CEL_Element::PlaceWithLabel(std::string_view label) const {
+  for (const BaseRow& row : kBaseRows) {
+    if (row.label == label) return row.property;
+  }
+  for (const PropertyRow& row : rows) {
+    if (row.label == label) return row.place;
+  }
+  return nullptr;
+}
+
+void CEL_Element::AppendTexts(std::vector<ElementText>& texts) const {
+  const auto append = [this, &texts](std::string_view label, PropertyPlace place) {
+    const CEL_Property& property = this->*place;
+    if (IsTextType(property.Type()) && !property.HasChoices()) texts.push_back({label, &property});
+  };
+  for (const BaseRow& row : kBaseRows) append(row.label, row.property);
+  for (const PropertyRow& row : rows) append(row.label, row.place);
+}
+
 bool CEL_Element::ParseExpression() {
   bool good = true;
   ForEachExpression([this, &good](const PropertyRow& row, const CEL_Property& expression) {

@@ -73,6 +73,12 @@ constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
   return row;
 }
 
+/// A text that people write into an element: the label of its field, and its property.
+struct ElementText {
+  std::string_view label;
+  const CEL_Property* property;
+};
+
 /// Which unit data an element has in the file.
 enum class UnitMode : std::uint8_t { None = 0, Type = 1, Unit = 2, Both = 3 };
 
@@ -158,6 +164,10 @@ class CEL_Element : public PropertyHolder {
 
   /// The label of one of the element's properties; empty for any other.
   std::string_view LabelOf(const CEL_Property& property) const;
+  /// Where the property with a label is; none for any other text.
+  PropertyPlace PlaceWithLabel(std::string_view label) const;
+  /// Appends the texts and expressions, in the order of field lists. What is chosen from a list is none.
+  void AppendTexts(std::vector<ElementText>& texts) const;
 
   bool HasExpression() const { return expressions > 0; }
   /// What the symbol table holds for an element without expressions: the number of an input, the name that a

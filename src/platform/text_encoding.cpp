@@ -113,4 +113,11 @@ std::optional<std::string> Utf8ToWindows1252(std::string_view text) {
   return bytes;
 }
 
+std::string EncodedText(std::string text, TextEncoding encoding) {
+  if (encoding == TextEncoding::Utf8) return text;
+  // A character that the encoding lacks, or bytes that would show as others.
+  std::optional<std::string> bytes = Utf8ToWindows1252(text);
+  return bytes && ToUtf8(*bytes) == text ? *std::move(bytes) : text;
+}
+
 }  // namespace tessal

@@ -22,4 +22,8 @@ std::string ToUtf8(std::string_view bytes);
 /// A UTF-8 text in Windows-1252; nothing when it holds a character that the encoding lacks.
 std::optional<std::string> Utf8ToWindows1252(std::string_view text);
 
+/// The bytes of a UTF-8 text in an encoding; in UTF-8 where its bytes in that encoding would not show as the
+/// same text.
+std::string EncodedText(std::string text, TextEncoding encoding);
+
 }  // namespace tessal

@@ -47,6 +47,20 @@ QString TextIn(const QWidget& editor) {
   return {};
 }
 
+/// Marks a part of the text that an editor shows; one that shows a shorter text marks what there is.
+void MarkIn(QWidget& editor, int start, int length) {
+  if (auto* line = qobject_cast<QLineEdit*>(&editor)) {
+    line->setSelection(start, length);
+  } else if (auto* field = qobject_cast<CPlainTextField*>(&editor)) {
+    const int end = field->document()->characterCount() - 1;
+    QTextCursor cursor(field->document());
+    cursor.setPosition(std::min(start, end));
+    cursor.setPosition(std::min(start + length, end), QTextCursor::KeepAnchor);
+    field->setTextCursor(cursor);
+    field->ensureCursorVisible();
+  }
+}
+
 /// Whether a commit writes the field. A symbol is renamed in a way of its own.
 bool IsStored(FieldEditor editor) {
   switch (editor) {
@@ -273,6 +287,18 @@ std::string CElementForm::ReferrerText(const CEL_Element& element) const {
     text += name;
   }
   return text;
+}
+
+QWidget* CElementForm::ShowText(const TextToShow& text) {
+  CEL_Element* element = Element();
+  const auto shows = [&text, element](const Control& control) {
+    return control.field->property != nullptr && &control.field->property(*element) == text.property;
+  };
+  const auto control = std::find_if(controls.begin(), controls.end(), shows);
+  if (element == nullptr || text.property == nullptr || control == controls.end()) return nullptr;
+  control->editor->setFocus(Qt::OtherFocusReason);
+  MarkIn(*control->editor, text.start, text.length);
+  return control->editor;
 }
 
 void CElementForm::FillCombo(QComboBox& combo, const FormField& field, const CEL_Property& property,

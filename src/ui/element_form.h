@@ -74,6 +74,7 @@ class CElementForm : public CRightPaneBase {
   QSize minimumSizeHint() const override;
   bool HasUnwritten() const override;
   std::vector<TypedValue> TypedValues() const override;
+  QWidget* ShowText(const TextToShow& text) override;
 
  protected:
   void resizeEvent(QResizeEvent* resize) override;

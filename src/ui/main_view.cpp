@@ -26,16 +26,20 @@
 #include "ui/error_list.h"
 #include "ui/export_commands.h"
 #include "ui/expression_colours.h"
+#include "ui/find_pane.h"
+#include "ui/find_tools.h"
 #include "ui/folder_elements.h"
 #include "ui/help_window.h"
 #include "ui/icons.h"
 #include "ui/kept_splitter.h"
 #include "ui/label.h"
+#include "ui/message_bar.h"
 #include "ui/node_kinds.h"
 #include "ui/offered_creation.h"
 #include "ui/right_pane.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
+#include "ui/tree_filter.h"
 
 namespace tessal {
 
@@ -154,10 +158,13 @@ void CMainView::BuildLayout() {
   tree = MakeChild<CElementTree>(this);
   tree->setMinimumWidth(kSmallestTree);
   tree->installEventFilter(this);
+  QWidget* messages = MakeMessages();
+  findTools = MakeChild<CFindTools>(FindSurroundings{*this, document, dialogs, *tree, *errorList,
+                                                     [this] { CommitAll(); }, [this] { return form.get(); }});
 
   auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
   treeDetail->setObjectName(QStringLiteral("TreeDetail"));
-  treeDetail->addWidget(tree);
+  treeDetail->addWidget(MakeTree());
   treeDetail->addWidget(MakeTitleDetail());
   treeDetail->setStretchFactor(1, 1);
   treeDetail->setMinimumHeight(kSmallestUpper);
@@ -168,11 +175,14 @@ void CMainView::BuildLayout() {
   auto* topBottom = MakeChild<QSplitter>(Qt::Vertical, this);
   topBottom->setObjectName(QStringLiteral("TopBottom"));
   topBottom->addWidget(treeDetail);
-  topBottom->addWidget(MakeMessages());
+  topBottom->addWidget(messages);
+  topBottom->addWidget(&findTools->Pane());
   topBottom->setStretchFactor(0, 1);
   topBottom->setChildrenCollapsible(false);
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
   KeepSplitter(*topBottom);
+  QWidget::setTabOrder(&findTools->TreeFilter(), tree);
+  ChainAfter(ChainAfter(tree, *messages), findTools->Pane());
 
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
@@ -184,6 +194,16 @@ void CMainView::BuildLayout() {
   layout->addWidget(topBottom, 1);
 }
 
+QWidget* CMainView::MakeTree() {
+  auto* filtered = MakeChild<QWidget>(this);
+  auto* layout = MakeChild<QVBoxLayout>(filtered);
+  layout->setContentsMargins(0, 0, 0, 0);
+  layout->setSpacing(0);
+  layout->addWidget(&findTools->TreeFilter());
+  layout->addWidget(tree, 1);
+  return filtered;
+}
+
 QWidget* CMainView::MakeMessages() {
   auto* messages = MakeChild<QWidget>(this);
   accountStrip = MakeChild<CAccountStrip>(messages);
@@ -193,6 +213,7 @@ QWidget* CMainView::MakeMessages() {
   layout->setContentsMargins(0, 0, 0, 0);
   layout->setSpacing(0);
   layout->addWidget(accountStrip);
+  layout->addWidget(MakeChild<CMessageBar>(*errorList, messages));
   layout->addWidget(errorList, 1);
   return messages;
 }
@@ -348,9 +369,8 @@ void CMainView::ReplaceForm(QTreeWidgetItem* item) {
   form = MakeForm({document, dialogs, CElementTree::DataOf(*item)}, holder);
   holderLayout->addWidget(form.get());
   form->Load();
-  // From the last field on to the messages.
-  const QList<QWidget*> stops = StopsOfForm();
-  if (!stops.isEmpty()) QWidget::setTabOrder(stops.last(), errorList);
+  // From the tree into the form, and from its last field on to the messages.
+  ChainAfter(tree, *form);
 }
 
 void CMainView::Commit() {
@@ -627,16 +647,25 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
   return QWidget::eventFilter(watched, happened);
 }
 
-QList<QWidget*> CMainView::StopsOfForm() const {
+QList<QWidget*> CMainView::StopsIn(const QWidget& part) const {
   QList<QWidget*> stops;
   for (QWidget* next = tree->nextInFocusChain(); next != tree; next = next->nextInFocusChain()) {
-    if (form->isAncestorOf(next) && (next->focusPolicy() & Qt::TabFocus) != 0) stops.append(next);
+    if (part.isAncestorOf(next) && (next->focusPolicy() & Qt::TabFocus) != 0) stops.append(next);
   }
   return stops;
 }
 
+QWidget* CMainView::ChainAfter(QWidget* stop, const QWidget& part) {
+  for (QWidget* next : StopsIn(part)) {
+    QWidget::setTabOrder(stop, next);
+    stop = next;
+  }
+  return stop;
+}
+
 std::vector<ViewCommand> CMainView::Commands() {
   std::vector<ViewCommand> commands = edits->Commands();
+  for (ViewCommand& command : findTools->Commands()) commands.push_back(std::move(command));
   for (ViewCommand& command : ExportCommands(document, dialogs, *this)) commands.push_back(std::move(command));
   commands.push_back(StrongColoursCommand());
   return commands;
@@ -653,7 +682,7 @@ void CMainView::CreateSymbol(const std::string& symbol) {
 }
 
 void CMainView::FocusForm() {
-  const QList<QWidget*> stops = StopsOfForm();
+  const QList<QWidget*> stops = StopsIn(*form);
   const auto first = std::find_if(stops.begin(), stops.end(),
                                   [](const QWidget* stop) { return stop->isEnabled() && stop->isVisible(); });
   QWidget* target = first == stops.end() ? static_cast<QWidget*>(errorList) : *first;

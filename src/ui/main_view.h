@@ -28,6 +28,7 @@ class CEditCommands;
 class CElementTree;
 class CAccountStrip;
 class CErrorList;
+class CFindTools;
 class CLabel;
 class CRightPaneBase;
 class CTessalDoc;
@@ -56,6 +57,7 @@ class CMainView final : public QWidget, public CView {
   CTessalDoc& Document() const { return document; }
   CElementTree& Tree() const { return *tree; }
   CErrorList& ErrorList() const { return *errorList; }
+  CFindTools& FindTools() const { return *findTools; }
   CAccountStrip& AccountStrip() const { return *accountStrip; }
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
@@ -104,12 +106,16 @@ class CMainView final : public QWidget, public CView {
   /// Takes over what the load passed over, and shows it.
   void ReadPassedOver();
   void ShowAccount();
-  /// The strip over the list of messages.
+  /// The list of messages with the strip and the bar over it.
   QWidget* MakeMessages();
+  /// The tree with its filter over it.
+  QWidget* MakeTree();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
-  /// What Tab may reach in the form, in its order.
-  QList<QWidget*> StopsOfForm() const;
+  /// What Tab may reach in a part of the view, in its order.
+  QList<QWidget*> StopsIn(const QWidget& part) const;
+  /// Has Tab walk a part of the view after a stop; the last stop of the part.
+  QWidget* ChainAfter(QWidget* stop, const QWidget& part);
   void ShowHelp();
   void UpdateNavigation();
   void FillHistoryMenu();
@@ -140,6 +146,7 @@ class CMainView final : public QWidget, public CView {
   CEditCommands* edits = nullptr;
   CElementTree* tree = nullptr;
   CErrorList* errorList = nullptr;
+  CFindTools* findTools = nullptr;
   CAccountStrip* accountStrip = nullptr;
   QWidget* holder = nullptr;
   QVBoxLayout* holderLayout = nullptr;

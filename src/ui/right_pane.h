@@ -8,11 +8,13 @@
 #include <string>
 #include <vector>
 
+#include "core/text_walk.h"
 #include "ui/item_data.h"
 
 namespace tessal {
 
 class CEL_Element;
+class CEL_Property;
 class CTessalDoc;
 class TemplateCore;
 class UserDialogs;
@@ -31,6 +33,14 @@ struct FormContext {
 struct TypedValue {
   std::function<void()> store;
   std::function<void()> takeBack;
+};
+
+/// A part of a text that a form is to show: its place in the template, and in characters what is marked.
+struct TextToShow {
+  TextPlace place;
+  const CEL_Property* property;  ///< none in a visibility group
+  int start;
+  int length;
 };
 
 class CRightPaneBase : public QWidget {
@@ -52,6 +62,8 @@ class CRightPaneBase : public QWidget {
 
   /// The elements that are selected in the form itself: those of a list's rows.
   virtual std::vector<Uid> SelectedElements() const { return {}; }
+  /// Gives the field of a text the focus, and marks a part of the text; the field, or none without one.
+  virtual QWidget* ShowText(const TextToShow& /*text*/) { return nullptr; }
 
   /// Elements or groups were made, moved or deleted elsewhere: a page that lists them shows them again.
   virtual void OnStructureChanged() {}

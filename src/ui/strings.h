@@ -148,4 +148,67 @@ inline const QString kTargetRefused = QStringLiteral(
 inline const QString kCreateSymbol = QStringLiteral("&Create symbol '%1'...");
 inline const QString kHasMessages = QStringLiteral("%1 in the list of messages: %2");
 
+// Finding, replacing and going to places.
+inline const QString kFilterTree = QStringLiteral("Filter by symbol, description or unit");
+inline const QString kNoMatch = QStringLiteral("none");
+inline const QString kMatchCount = QStringLiteral("%1 found");
+inline const QString kMatchOf = QStringLiteral("%1 of %2");
+inline const QString kFindInTemplate = QStringLiteral("Find in Template");
+inline const QString kFindPattern = QStringLiteral("Find");
+inline const QString kFindAll = QStringLiteral("Find All");
+inline const QString kCloseFind = QStringLiteral("Close");
+inline const QString kReplaceWith = QStringLiteral("Replace with");
+inline const QString kPreview = QStringLiteral("Preview");
+inline const QString kReplaceChosen = QStringLiteral("Replace Ticked");
+inline const QString kFindWhere = QStringLiteral("In");
+inline const QString kInAll = QStringLiteral("All");
+inline const QString kInExpressions = QStringLiteral("Expressions");
+inline const QString kInTexts = QStringLiteral("Texts");
+inline const QString kMatchCase = QStringLiteral("Match case");
+inline const QString kWholeSymbols = QStringLiteral("Whole symbols");
+inline const QString kRegex = QStringLiteral("Regular expression");
+inline const QString kFindState = QStringLiteral("What was found");
+inline const QString kFoundList = QStringLiteral("Found places");
+inline const QString kNothingFound = QStringLiteral("Nothing was found.");
+inline const QString kOneMatch = QStringLiteral("1 match");
+inline const QString kFoundMatches = QStringLiteral("%1 matches in %2 texts");
+inline const QString kOneUse = QStringLiteral("1 use of '%1'");
+inline const QString kFoundUses = QStringLiteral("Uses of '%1': %2 in %3 expressions");
+inline const QString kPreviewCount =
+    QStringLiteral("%1 texts match. Those that are ticked will be replaced.");
+inline const QString kReplaced = QStringLiteral("Texts replaced: %1");
+inline const QString kReplacedSome = QStringLiteral("Texts replaced: %1, refused: %2");
+inline const QString kSymbolStays = QStringLiteral("A symbol: rename it, so that its uses follow.");
+inline const QString kLockedStays = QStringLiteral("Locked: its built-in variable or unit type decides.");
+inline const QString kElementColumn = QStringLiteral("Element");
+inline const QString kFieldColumn = QStringLiteral("Field");
+inline const QString kTextColumn = QStringLiteral("Text");
+inline const QString kAfterColumn = QStringLiteral("Becomes");
+inline const QString kGoToSymbol = QStringLiteral("Go to Symbol");
+inline const QString kSymbolLetters = QStringLiteral("Letters of the symbol");
+inline const QString kFittingSymbols = QStringLiteral("Symbols that fit");
+inline const QString kCommandFilter = QStringLiteral("&Filter Tree");
+inline const QString kCommandFind = QStringLiteral("Find in &Template...");
+inline const QString kCommandNextMatch = QStringLiteral("&Next Match");
+inline const QString kCommandFormerMatch = QStringLiteral("&Previous Match");
+inline const QString kCommandGoTo = QStringLiteral("Go to &Symbol...");
+inline const QString kCommandUses = QStringLiteral("Find &Uses");
+inline const QString kCommandNextMessage = QStringLiteral("&Next Message");
+inline const QString kCommandFormerMessage = QStringLiteral("&Previous Message");
+
+// The bar and the menu of the list of messages.
+inline const QString kOneError = QStringLiteral("%1 Error");
+inline const QString kErrors = QStringLiteral("%1 Errors");
+inline const QString kOneWarning = QStringLiteral("%1 Warning");
+inline const QString kWarnings = QStringLiteral("%1 Warnings");
+inline const QString kOneNotice = QStringLiteral("%1 Notice");
+inline const QString kNotices = QStringLiteral("%1 Notices");
+inline const QString kFilterMessages = QStringLiteral("Filter messages");
+inline const QString kExplain = QStringLiteral("&Explain");
+inline const QString kExplanation = QStringLiteral("What the Message Means");
+inline const QString kCopyRows = QStringLiteral("Co&py");
+inline const QString kSortByItem = QStringLiteral("Sort by &Item");
+inline const QString kSortByMessage = QStringLiteral("Sort by &Message");
+inline const QString kUsualOrder = QStringLiteral("Usual &Order");
+
 }  // namespace tessal::strings

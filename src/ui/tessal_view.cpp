@@ -41,6 +41,11 @@ std::vector<TypedValue> CTessalView::TypedValues() const {
   return general->TypedValues();
 }
 
+QWidget* CTessalView::ShowText(const TextToShow& text) {
+  pages->setCurrentWidget(general);
+  return general->ShowText(text);
+}
+
 void CTessalView::FormToItem() {
   general->Commit();
   Item().viewState[kActiveTab] = std::to_string(pages->currentIndex());

@@ -15,6 +15,7 @@ class CTessalView final : public CRightPaneBase {
   CTessalView(const FormContext& context, QWidget* parent);
 
   std::vector<TypedValue> TypedValues() const override;
+  QWidget* ShowText(const TextToShow& text) override;
 
  protected:
   /// Fills the pages, and opens the one that was open at the last visit.

@@ -187,6 +187,8 @@ void CVisibilityGroupDlg::ItemToForm() {
   if (group == nullptr) return;
   ShowLine(*name, group->name);
   ShowLine(*description, group->description);
+  // The level that is left stores its lines, which may still show what the template held before.
+  ShowLevelFields();
   ShowLevels(0);
 }
 
@@ -278,6 +280,16 @@ std::vector<TypedValue> CVisibilityGroupDlg::TypedValues() const {
   add(*levelDescription, Level()->description,
       [&core, group, level](const std::string& text) { core.SetLevelDescription(group, level, text); });
   return typed;
+}
+
+QWidget* CVisibilityGroupDlg::ShowText(const TextToShow& text) {
+  const bool isName = text.place.field == kNameField;
+  if (text.place.level > 0) levels->SelectRow(text.place.level - 1);
+  QLineEdit* ofLevel = isName ? levelName : levelDescription;
+  QLineEdit* line = text.place.level > 0 ? ofLevel : (isName ? name : description);
+  line->setFocus(Qt::OtherFocusReason);
+  line->setSelection(text.start, text.length);
+  return line;
 }
 
 void CVisibilityGroupDlg::StoreGroup() {

@@ -21,6 +21,7 @@ class CVisibilityGroupDlg final : public CRightPaneBase {
   CVisibilityGroupDlg(const FormContext& context, QWidget* parent);
 
   std::vector<TypedValue> TypedValues() const override;
+  QWidget* ShowText(const TextToShow& text) override;
 
  protected:
   void ItemToForm() override;

@@ -67,6 +67,7 @@ constexpr Row kRows[] = {
     {"SaveOutput", "save FILE --output FILE-saved", kOpen, true, 3},
     {"Repair", "repair FILE", kOpen, true, 11},
     {"Rename", "rename FILE k quota", kOpen, false, 11},
+    {"Find", "find FILE k.*f|x --regex --ignore-case", kOpen, false, 11},
     {"Html", "html FILE", kOpen, false, 11},
     {"Json", "check FILE --format json", kOpen, true, 11, 1},
     {"Tree", "tree FILE", kOpen, true, 1},

@@ -130,8 +130,11 @@ TEST(Json, IsValidWhateverTheBytes) {
     text.insert(text.find(place), bytes);
   }
   session.Write("odd \xE9 name.tessal", text);
-  for (const std::string command : {"check --format json", "check --format sarif", "symbols --format json"}) {
-    const ShellRun run = session.Run("tessal " + command + " *.tessal");
+  for (const std::string command : {"check --format json", "check --format sarif", "symbols --format json",
+                                    "find [^a]+ --regex --format json"}) {
+    const std::size_t verb = command.find(' ');
+    const ShellRun run =
+        session.Run("tessal " + command.substr(0, verb) + " *.tessal" + command.substr(verb));
     EXPECT_TRUE(nlohmann::json::accept(run.output)) << command << "\n" << run.errors;
     EXPECT_GT(run.output.size(), 500U) << command;
   }

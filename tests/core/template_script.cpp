@@ -10,6 +10,7 @@
 #include "core/error_registry.h"
 #include "core/loaded_template.h"
 #include "core/rename.h"
+#include "core/symbol_ranking.h"
 #include "elements/version_stamp.h"
 #include "expr/scanner.h"
 #include "platform/number_text.h"
@@ -87,6 +88,41 @@ ElementKind ListOf(ElementKind kind) {
   const auto place = static_cast<std::size_t>(
       NumberOf(kind) - NumberOf(isMember ? ElementKind::SpecieStateVariable : ElementKind::StateVariable));
   return KindAfter(isMember ? ElementKind::SpecieStateVariableList : ElementKind::StateVariableList, place);
+}
+
+/// The pattern, and after so many words what is said of it.
+FindQuery QueryOf(const std::vector<std::string>& words, std::size_t options) {
+  FindQuery query;
+  query.pattern.text = words.at(0);
+  for (std::size_t place = options; place < words.size(); ++place) {
+    const std::string& word = words[place];
+    query.pattern.isRegex |= word == "regex";
+    query.pattern.wholeSymbols |= word == "whole";
+    query.pattern.ignoreCase |= word == "nocase";
+    if (word == "expressions") query.in = FindIn::Expressions;
+    if (word == "texts") query.in = FindIn::Texts;
+  }
+  return query;
+}
+
+std::string FoundLine(const FoundText& found) {
+  std::string text = found.text;
+  for (auto match = found.matches.rbegin(); match != found.matches.rend(); ++match) {
+    text.insert(match->start + match->length, 1, '>').insert(match->start, 1, '<');
+  }
+  return found.owner + ": " + std::string(found.place.field) + ": " + text;
+}
+
+std::string FoundLines(const std::vector<FoundText>& found) {
+  std::string text = std::to_string(CountMatches(found)) + "\n";
+  for (const FoundText& each : found) text += FoundLine(each) + "\n";
+  return text;
+}
+
+std::string Ranked(const TemplateCore& core, const std::string& letters) {
+  std::string names;
+  for (const SymbolRecord* record : SymbolsByRank(core, letters, 8)) names += NameToGoTo(*record) + " ";
+  return names + "\n";
 }
 
 CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Specie* specie) {
@@ -528,6 +564,10 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},
       {"rename-failure", [](S, W w) { return RenameFailure(w.at(0)); }},
       {"lost-by-rename", [](S s, W w) { return s.Lost(w.at(0), w.at(1)); }},
+      {"find", [](S s, W w) { return FoundLines(FindTexts(s.core, QueryOf(w, 1)).found); }},
+      {"uses", [](S s, W w) { return FoundLines(FindUses(s.core, w.at(0))); }},
+      {"preview", [](S s, W w) { return s.Preview(w); }},
+      {"rank", [](S s, W w) { return Ranked(s.core, w.empty() ? "" : w[0]); }},
       {"replace", [](S, W w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
   };
   return kQuestions;
@@ -556,6 +596,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"rename", [](S s, W w) { return YesNo(s.core.RenameSymbol(w.at(0), w.at(1), w.size() < 3)); }},
       {"rename-whole",
        [](S s, W w) { return YesNo(s.core.Rename(w.at(0), w.at(1), Rewriting::WholeNames)); }},
+      {"apply", [](S s, W w) { return s.Apply(w); }},
       {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
       {"reset", [](S s, W w) { return s.Element(w.at(0)).Reset(), ""; }},
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},
@@ -579,6 +620,28 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
        }},
   };
   return kChanges;
+}
+
+std::string TemplateScript::Preview(const Words& words) {
+  ReplacePreview made = PreviewReplacements(core, QueryOf(words, 2), words.at(1));
+  preview = std::move(made.replacements);
+  std::string text = made.failure;
+  for (const Replacement& each : preview) {
+    constexpr std::array<std::string_view, 3> kObstacles = {"", " (a symbol)", " (locked)"};
+    text += FoundLine(each.found) + " -> " + each.after;
+    text.append(kObstacles[static_cast<std::size_t>(each.obstacle)])
+        .append(each.isChosen ? "\n" : " not chosen\n");
+  }
+  return text;
+}
+
+std::string TemplateScript::Apply(const Words& unwanted) {
+  for (const std::string& place : unwanted) preview.at(Place(place)).isChosen = false;
+  const ReplaceOutcome outcome = ApplyReplacements(core, preview, EncodingOf(core.SourceText()));
+  std::string text = std::to_string(outcome.applied) + "\n";
+  for (const RefusedReplacement& each : outcome.refused)
+    text += FoundLine(preview[each.place].found) + ": " + each.reason + "\n";
+  return text;
 }
 
 }  // namespace tessal::test

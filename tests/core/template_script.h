@@ -9,6 +9,7 @@
 #include <string_view>
 #include <vector>
 
+#include "core/replace.h"
 #include "core/template_core.h"
 #include "support/case_file.h"
 #include "support/temporary_folder.h"
@@ -53,6 +54,9 @@ class TemplateScript final {
   std::string Create(const Words& words);
   std::string Lost(const std::string& oldSymbol, const std::string& newSymbol) const;
   std::string Offer(const Words& words);
+  std::string Preview(const Words& words);
+  /// Applies the preview without those of the named places, from 1.
+  std::string Apply(const Words& unwanted);
   std::string Groups();
   std::string Items(const Words& words);
   std::string Locks(const std::string& name);
@@ -65,6 +69,7 @@ class TemplateScript final {
 
   TemporaryFolder folder;
   TemplateCore core;
+  std::vector<Replacement> preview;
 };
 
 }  // namespace tessal::test

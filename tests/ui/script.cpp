@@ -20,8 +20,14 @@
 #include <set>
 
 #include "ui/create_hint.h"
+#include "ui/find_pane.h"
+#include "ui/find_tools.h"
+#include "ui/found_list.h"
+#include "ui/go_to_symbol.h"
+#include "ui/message_bar.h"
 #include "ui/page_actions.h"
 #include "ui/text_bytes.h"
+#include "ui/tree_filter.h"
 
 namespace tessal::test {
 
@@ -39,6 +45,14 @@ struct Words {
   QString first;
   QString second;
 };
+
+/// The captions of the nodes that are shown, by their depth.
+void AppendShown(const QTreeWidgetItem& item, QStringList& shown, int depth = 0) {
+  if (item.isHidden()) return;
+  shown.append(QString(2 * depth, u' ') + item.text(0));
+  for (int place = 0; place < item.childCount() && item.isExpanded(); ++place)
+    AppendShown(*item.child(place), shown, depth + 1);
+}
 
 std::string Lines(const QStringList& lines) {
   return lines.isEmpty() ? "none\n" : lines.join(u'\n').toStdString() + "\n";
@@ -174,7 +188,7 @@ void ClickError(Editor& editor, const Words& words) {
   QTest::mouseClick(list.viewport(), Qt::LeftButton, {}, row.center());
 }
 
-/// "0: Create" uses the menu of a row of the list, by the menu key.
+/// "0: Create" uses the entry of a row's menu that has this in it, by the menu key.
 std::string RowMenu(Editor& editor, const Words& words) {
   CErrorList& list = editor.View().ErrorList();
   list.setCurrentItem(list.topLevelItem(words.Number()));
@@ -183,12 +197,16 @@ std::string RowMenu(Editor& editor, const Words& words) {
     auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
     if (menu == nullptr) return;
     for (QAction* action : menu->actions()) entries += action->text() + u'\n';
-    menu->setActiveAction(words.second.isEmpty() ? nullptr : menu->actions().at(0));
+    for (QAction* action : menu->actions()) {
+      if (!words.second.isEmpty() && action->text().remove(u'&').startsWith(words.second))
+        menu->setActiveAction(action);
+    }
     QTest::keyClick(menu, words.second.isEmpty() ? Qt::Key_Escape : Qt::Key_Return);
   });
   QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
   QApplication::sendEvent(list.viewport(), &byKey);
   QCoreApplication::processEvents();
+  QApplication::setActiveWindow(&editor.View());
   return entries.isEmpty() ? "none\n" : entries.toStdString();
 }
 
@@ -260,6 +278,80 @@ std::string Save(Editor& editor, const Words& words) {
   return editor.Document().OnSaveDocument(editor.Path() + words.all) ? "saved\n" : "not saved\n";
 }
 
+/// What the pane shows: its state, then its rows, what is marked between angles and a box for a choice.
+std::string Found(Editor& editor, const Words& /*words*/) {
+  const CFindPane& pane = editor.View().FindTools().Pane();
+  if (!pane.isVisible()) return "no pane\n";
+  const auto& list = *pane.findChild<CFoundList*>();
+  QStringList lines = {pane.findChild<QLabel*>(QStringLiteral("FindState"))->text()};
+  for (int row = 0; row < list.Rows().rowCount(); ++row) {
+    QStringList cells;
+    for (int column = 0; column < list.Rows().columnCount(); ++column) {
+      MarkedText marked = list.Rows().Marked(list.Rows().index(row, column));
+      for (auto mark = marked.marks.rbegin(); mark != marked.marks.rend(); ++mark)
+        marked.text.insert(mark->first + mark->second, u'>').insert(mark->first, u'<');
+      cells.append(marked.text);
+    }
+    const QVariant box = list.Rows().index(row, 0).data(Qt::CheckStateRole);
+    const QString choice = !box.isValid() ? QString() : (box.toInt() == Qt::Checked ? "[x] " : "[ ] ");
+    lines.append((row == list.currentIndex().row() ? "* " : "  ") + choice +
+                 cells.join(QStringLiteral(" | ")));
+  }
+  return Lines(lines);
+}
+
+/// The bar of the messages, then the rows that are shown, with a mark where they are selected.
+std::string ShownMessages(Editor& editor, const Words& /*words*/) {
+  const CErrorList& list = editor.View().ErrorList();
+  QStringList bar;
+  for (const auto* button : editor.View().findChild<CMessageBar*>()->findChildren<QToolButton*>())
+    bar.append(button->text() + (button->isChecked() ? "" : " hidden"));
+  QStringList lines = {bar.join(u'|')};
+  for (int place = 0; place < list.topLevelItemCount(); ++place) {
+    const QTreeWidgetItem& row = *list.topLevelItem(place);
+    if (!row.isHidden()) lines.append((row.isSelected() ? "* " : "  ") + row.text(0) + ": " + row.text(1));
+  }
+  return Lines(lines);
+}
+
+/// What has the focus, with what is marked in it.
+std::string Focus(Editor& /*editor*/, const Words& /*words*/) {
+  const QWidget* focus = QApplication::focusWidget();
+  if (focus == nullptr) return "nothing\n";
+  QString marked;
+  if (const auto* line = qobject_cast<const QLineEdit*>(focus)) marked = line->selectedText();
+  if (const auto* field = qobject_cast<const QTextEdit*>(focus)) marked = field->textCursor().selectedText();
+  return focus->accessibleName().toStdString() + ": " + marked.toStdString() + "\n";
+}
+
+/// "g_r" shows what the window that goes to symbols offers for the letters; "g_r: 2" goes to the second row.
+std::string GoToSymbol(Editor& editor, const Words& words) {
+  // A window or a menu that was closed before gives nothing back on a screen without a window manager.
+  QApplication::setActiveWindow(&editor.View());
+  QTest::keyClick(&editor.Tree(), Qt::Key_K, Qt::ControlModifier);
+  // The window before it may be about to go.
+  auto* window = editor.View().findChildren<CGoToSymbol*>().last();
+  QTest::keyClicks(window->findChild<QLineEdit*>(), words.first);
+  QStringList offered;
+  const auto& list = *window->findChild<QTreeWidget*>();
+  for (int place = 0; place < list.topLevelItemCount(); ++place)
+    offered.append(list.topLevelItem(place)->text(0) + " | " + list.topLevelItem(place)->text(1));
+  for (int row = words.second.toInt(); row > 1; --row) QTest::keyClick(window->focusWidget(), Qt::Key_Down);
+  QTest::keyClick(window->focusWidget(), words.second.isEmpty() ? Qt::Key_Escape : Qt::Key_Return);
+  return Lines(offered);
+}
+
+/// A control of the whole window by its name, or by what follows its count.
+QWidget& Control(Editor& editor, const QString& name) {
+  for (QWidget* widget : editor.View().findChildren<QWidget*>()) {
+    const auto* button = qobject_cast<const QAbstractButton*>(widget);
+    const QString shown =
+        button != nullptr && widget->accessibleName().isEmpty() ? button->text() : widget->accessibleName();
+    if (widget->isVisible() && (shown == name || shown.endsWith(u' ' + name))) return *widget;
+  }
+  throw std::runtime_error("no control " + name.toStdString());
+}
+
 const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActions = {
     {"select", [](Editor& editor, auto& words) { editor.Select(words.first); }},
     {"type", [](Editor& editor, auto& words) { editor.Type(words.first, words.second); }},
@@ -276,6 +368,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"press", Press},
     {"key",
      [](auto& /*editor*/, auto& words) {
+       if (QApplication::focusWidget() == nullptr) throw std::runtime_error("nothing has the focus");
        const QKeyCombination keys = QKeySequence(words.first)[0];
        QTest::keyClick(QApplication::focusWidget(), keys.key(), keys.keyboardModifiers());
      }},
@@ -327,6 +420,30 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        editor.View().findChild<QToolBar*>()->actions().at(words.first == "back" ? 0 : 1)->trigger();
      }},
     {"revisit", Revisit},
+    {"use",
+     [](Editor& editor, auto& words) {
+       auto& button = dynamic_cast<QAbstractButton&>(Control(editor, words.first));
+       button.click();
+     }},
+    {"type-into",
+     [](Editor& editor, auto& words) {
+       auto& line = dynamic_cast<QLineEdit&>(Control(editor, words.first));
+       line.setFocus();
+       line.selectAll();
+       words.second.isEmpty() ? line.clear() : QTest::keyClicks(&line, words.second);
+       QCoreApplication::processEvents();
+     }},
+    {"tick-row",
+     [](Editor& editor, auto& words) {
+       auto& list = *editor.View().FindTools().Pane().template findChild<CFoundList*>();
+       list.setCurrentIndex(list.Rows().index(words.Number() - 1, 0));
+       QTest::keyClick(&list, Qt::Key_Space);
+     }},
+    {"select-rows",
+     [](Editor& editor, auto& words) {
+       CErrorList& list = editor.View().ErrorList();
+       for (const QString& row : words.first.split(u' ')) list.topLevelItem(row.toInt())->setSelected(true);
+     }},
     {"right-click", RightClick},
     {"menu-key", UseMenuKey},
     {"edit", UseEditMenu},
@@ -347,6 +464,20 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"colours", Colours},
     {"row-menu", RowMenu},
     {"marks", Marks},
+    {"found", Found},
+    {"shown-messages", ShownMessages},
+    {"focused", Focus},
+    {"go-to", GoToSymbol},
+    {"shown-nodes",
+     [](Editor& editor, auto& /*words*/) {
+       QCoreApplication::processEvents();
+       QStringList shown;
+       AppendShown(*editor.Tree().RootItem(), shown);
+       for (const QLabel* label : editor.View().FindTools().TreeFilter().findChildren<QLabel*>()) {
+         if (label->isVisible()) shown.append(label->text());
+       }
+       return Lines(shown);
+     }},
     {"command", RunCommand},
     {"steps", Steps},
     {"tabs", PressTab},
