@@ -74,6 +74,8 @@ class TemplateCore final : public ElementOwner {
   const TemplateState::ListHeads& ListHeads() const { return state.listHeads; }
 
   const std::vector<SymbolRecord>& SymbolTable() const { return state.table.Records(); }
+  /// Whether several elements have the same symbol.
+  bool HasSharedSymbols() const { return state.table.HasSharedSymbols(); }
   const std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() const {
     return state.table.Undefined();
   }
@@ -175,6 +177,9 @@ class TemplateCore final : public ElementOwner {
   void RebuildSymbolTable() override;
   /// Adds what it finds to the error registry; true when nothing was found.
   bool ValidateTemplate();
+  /// What the rules of order, place and class find in a use of one element by another's expression; nothing
+  /// when it is allowed. Reports nothing.
+  std::optional<Finding> FindUseFault(const SymbolRecord& user, const SymbolRecord& used) const;
   bool CheckElementOrder(Uid uid) const;
   bool CheckDeclarationOrder() const;
   bool CheckScopeRule() const;

@@ -121,6 +121,14 @@ int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view e
   return CheckFunctions(symbol, uid, *ParseExpression(expression)) ? 1 : 0;
 }
 
+std::span<const std::string_view> PropertyNames() {
+  return kProperties;
+}
+
+std::span<const std::string_view> InteractionVerbs() {
+  return kVerbs;
+}
+
 bool IsPropertyName(std::string_view text) {
   return Holds(kProperties, text);
 }

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <string_view>
 
 #include "platform/uid.h"
@@ -18,7 +19,11 @@ bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& pa
 /// Parses and checks an expression: 0 when it does not parse, else 1, also with findings.
 int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression);
 
-/// The words of the tables, exactly.
+/// The words of the tables.
+std::span<const std::string_view> PropertyNames();
+std::span<const std::string_view> InteractionVerbs();
+
+/// Whether a text is one of the words of a table, exactly.
 bool IsPropertyName(std::string_view text);
 bool IsInteractionVerb(std::string_view text);
 bool IsConditionalWord(std::string_view text);

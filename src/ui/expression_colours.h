@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QColor>
+#include <string>
 
 #include "platform/docview.h"
 
@@ -18,6 +19,8 @@ struct TokenStyle {
   bool link = false;  ///< names an element: it can be jumped to
 };
 
+/// The style of an identifier.
+TokenStyle StyleOfName(const std::string& name, const TemplateCore& core);
 TokenStyle StyleOfToken(const ExpressionToken& token, const TemplateCore& core);
 
 /// A colour that is made for a light ground, as it is shown on a given one: unchanged on a light one,

@@ -12,6 +12,7 @@
 #include "expr/parser.h"
 #include "expr/scanner.h"
 #include "ui/child.h"
+#include "ui/expression_colours.h"
 #include "ui/expression_highlighter.h"
 #include "ui/text_bytes.h"
 
@@ -85,7 +86,16 @@ QString CAutoRichEditCtrl::TipOf(Uid uid) const {
   return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.TextOf());
 }
 
+QColor CAutoRichEditCtrl::ColourOf(const std::string& name) const {
+  const TokenStyle style = StyleOfName(name, source.Core());
+  return ReadableColour(style.colour, palette().color(QPalette::Base));
+}
+
 bool CAutoRichEditCtrl::event(QEvent* happened) {
+  // Before Tab leaves the field.
+  if (keys != nullptr && happened->type() == QEvent::KeyPress &&
+      keys->TakesKey(static_cast<QKeyEvent&>(*happened)))
+    return true;
   if (happened->type() != QEvent::ToolTip) return CPlainTextField::event(happened);
   const auto* help = static_cast<QHelpEvent*>(happened);
   const Uid uid = LinkAt(viewport()->mapFrom(this, help->pos()));
@@ -95,6 +105,11 @@ bool CAutoRichEditCtrl::event(QEvent* happened) {
     QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
   }
   return true;
+}
+
+void CAutoRichEditCtrl::keyPressEvent(QKeyEvent* key) {
+  CPlainTextField::keyPressEvent(key);
+  if (keys != nullptr) keys->FollowKey(*key);
 }
 
 void CAutoRichEditCtrl::mouseMoveEvent(QMouseEvent* move) {

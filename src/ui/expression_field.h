@@ -12,6 +12,21 @@ namespace tessal {
 class CExpressionHighlighter;
 class CTessalDoc;
 
+/// What takes part in the keys of a field that is typed into.
+class ExpressionKeys {
+ public:
+  virtual ~ExpressionKeys() = default;
+  /// Before the field acts on a key; true when it is not to.
+  virtual bool TakesKey(QKeyEvent& key) = 0;
+  /// After the field has acted on it.
+  virtual void FollowKey(const QKeyEvent& key) = 0;
+
+ protected:
+  ExpressionKeys() = default;
+  ExpressionKeys(const ExpressionKeys&) = default;
+  ExpressionKeys& operator=(const ExpressionKeys&) = default;
+};
+
 class CAutoRichEditCtrl final : public CPlainTextField {
   Q_OBJECT
 
@@ -27,6 +42,12 @@ class CAutoRichEditCtrl final : public CPlainTextField {
 
   /// The identity of the element that the text under a point of the viewport names, 0 for none.
   Uid LinkAt(const QPoint& point) const;
+  /// The colour in which a name is shown.
+  QColor ColourOf(const std::string& name) const;
+
+  /// Keys go by a helper from now on, which must live as long as the field.
+  void SetKeys(ExpressionKeys& helper) { keys = &helper; }
+
   /// What is shown while the pointer rests on an element's link: its kind and its description.
   QString TipOf(Uid uid) const;
 
@@ -38,6 +59,7 @@ class CAutoRichEditCtrl final : public CPlainTextField {
 
  protected:
   bool event(QEvent* happened) override;
+  void keyPressEvent(QKeyEvent* key) override;
   void mouseMoveEvent(QMouseEvent* move) override;
   void contextMenuEvent(QContextMenuEvent* request) override;
   void changeEvent(QEvent* change) override;
@@ -57,6 +79,7 @@ class CAutoRichEditCtrl final : public CPlainTextField {
   bool isStale = false;             ///< the colours may be others though the text is the same
   bool looksChangedBefore = false;  ///< before the part of the text that has changed
   bool isUnreported = false;
+  ExpressionKeys* keys = nullptr;
 };
 
 }  // namespace tessal

@@ -20,6 +20,7 @@
 #include <set>
 
 #include "ui/create_hint.h"
+#include "ui/expression_actions.h"
 #include "ui/page_actions.h"
 #include "ui/text_bytes.h"
 
@@ -320,6 +321,7 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
     {"command", RunCommand},
     {"tabs", PressTab},
