@@ -28,6 +28,14 @@ inline constexpr std::array<Choice<Format>, 3> kCheckFormats = {{
 /// What a table is printed in.
 inline constexpr Choices<Format> kTableFormats = Choices<Format>(kCheckFormats).first<2>();
 
+/// What descriptions are printed in.
+inline constexpr std::array<Choice<Format>, 4> kDescriptionFormats = {{
+    {"text", Format::Text},
+    {"json", Format::Json},
+    {"markdown", Format::Markdown},
+    {"html", Format::Html},
+}};
+
 /// Severities, by their words in small letters.
 inline constexpr std::array<Choice<int>, 4> kLevels = {{
     {"notice", 1},
