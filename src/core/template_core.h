@@ -74,6 +74,8 @@ class TemplateCore final : public ElementOwner {
   const TemplateState::ListHeads& ListHeads() const { return state.listHeads; }
 
   const std::vector<SymbolRecord>& SymbolTable() const { return state.table.Records(); }
+  /// Whether a name that no element has means something all the same.
+  bool CountsAsDefined(std::string_view name) const { return tessal::CountsAsDefined(name, state.misc); }
   /// Whether several elements have the same symbol.
   bool HasSharedSymbols() const { return state.table.HasSharedSymbols(); }
   const std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() const {

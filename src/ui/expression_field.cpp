@@ -9,8 +9,6 @@
 #include <utility>
 
 #include "core/document.h"
-#include "expr/parser.h"
-#include "expr/scanner.h"
 #include "ui/child.h"
 #include "ui/expression_colours.h"
 #include "ui/expression_highlighter.h"
@@ -31,7 +29,6 @@ CAutoRichEditCtrl::CAutoRichEditCtrl(const CTessalDoc& shownDocument, QWidget* p
 
 void CAutoRichEditCtrl::SetColouredText(const std::string& text) {
   setUpdatesEnabled(false);
-  content = text;
   isStale = true;
   ShowText(ToScreen(text));
   setUpdatesEnabled(true);
@@ -52,18 +49,27 @@ void CAutoRichEditCtrl::ReportText() {
   if (std::exchange(isUnreported, false)) emit ContentChanged();
 }
 
-QString CAutoRichEditCtrl::ParserMessage() const {
-  const ScannerRest rest;
-  const std::string text = FromScreen(ContentText(), content, source.Encoding());
-  const auto parsed = ParseExpression(text);
-  const ParseFailure* failure = parsed->Failure();
-  return failure == nullptr ? QString() : ToScreen(failure->finding.text).trimmed();
+int CAutoRichEditCtrl::CharacterAt(const QPoint& point) const {
+  const QPoint scrolled(horizontalScrollBar()->value(), verticalScrollBar()->value());
+  return document()->documentLayout()->hitTest(point + scrolled, Qt::ExactHit);
 }
 
 Uid CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
-  const QPoint scrolled(horizontalScrollBar()->value(), verticalScrollBar()->value());
-  return ElementNamed(
-      highlighter->LinkAt(document()->documentLayout()->hitTest(point + scrolled, Qt::ExactHit)));
+  return ElementNamed(highlighter->LinkAt(CharacterAt(point)));
+}
+
+QString CAutoRichEditCtrl::TipAt(const QPoint& point) const {
+  const int position = CharacterAt(point);
+  const Uid uid = LinkAt(point);
+  QString tip = uid == Uid::None ? QString() : TipOf(uid).toHtmlEscaped();
+  if (!tips || position < 0) return tip;
+  QTextCursor word(document());
+  word.setPosition(position);
+  word.select(QTextCursor::WordUnderCursor);
+  const QString further =
+      tips(uid == Uid::None ? word.selectedText().toStdString() : std::string(), position);
+  if (!tip.isEmpty() && !further.isEmpty()) tip += QStringLiteral("<br>");
+  return tip + further;
 }
 
 Uid CAutoRichEditCtrl::LinkAtCaret() const {
@@ -98,12 +104,8 @@ bool CAutoRichEditCtrl::event(QEvent* happened) {
     return true;
   if (happened->type() != QEvent::ToolTip) return CPlainTextField::event(happened);
   const auto* help = static_cast<QHelpEvent*>(happened);
-  const Uid uid = LinkAt(viewport()->mapFrom(this, help->pos()));
-  if (uid == Uid::None) {
-    QToolTip::hideText();
-  } else {
-    QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
-  }
+  // An empty tip takes the present one away.
+  QToolTip::showText(help->globalPos(), TipAt(viewport()->mapFrom(this, help->pos())), this);
   return true;
 }
 

@@ -10,6 +10,7 @@ class QHBoxLayout;
 namespace tessal {
 
 class CAutoRichEditCtrl;
+class CExpressionMarks;
 class CLabel;
 class CTessalDoc;
 
@@ -25,8 +26,18 @@ class CExpressionPanel final : public QWidget {
   /// Puts a button into the row under the field.
   void AddButton(QWidget& button);
 
+ signals:
+  /// The caret is at a line and a column, both from 1.
+  void CaretMoved(int line, int column);
+  /// What is wrong at the caret or before anything else, in plain language; empty when nothing is.
+  void FaultChanged(const QString& plain);
+
  private:
+  void ReportCaret();
+  void ShowFault();
+
   CAutoRichEditCtrl* field;
+  CExpressionMarks* marks;
   CLabel* note;
   QHBoxLayout* foot;
 };

@@ -9,6 +9,7 @@
 #include "core/comparison.h"
 #include "core/completion.h"
 #include "core/error_registry.h"
+#include "core/expression_faults.h"
 #include "core/loaded_template.h"
 #include "core/rename.h"
 #include "elements/version_stamp.h"
@@ -113,6 +114,16 @@ std::string Offered(const TemplateCore& core, const CEL_Element& user, std::stri
   }
   return matching.size() <= kShown ? rows
                                    : rows + "and " + std::to_string(matching.size() - kShown) + " more\n";
+}
+
+/// What is wrong with a text as the expression of an element, at the offset where it is.
+std::string FaultsIn(const TemplateCore& core, const CEL_Element& user, const std::string& expression) {
+  std::string rows;
+  for (const ExpressionFault& fault : FindExpressionFaults(core, user, expression)) {
+    rows += std::to_string(fault.at.start) + "-" + std::to_string(fault.at.start + fault.at.length) + " " +
+            fault.plain + (fault.words.empty() ? "" : " [" + fault.words + "]") + "\n";
+  }
+  return rows.empty() ? "none" : rows;
 }
 
 }  // namespace
@@ -544,6 +555,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"rebuilds", [](S s, W w) { return s.core.SetRebuildEnabled(w.at(0) == "on"), ""; }},
       {"all-builtins", [](S s, W w) { return s.core.SetShowAllBuiltIns(w.at(0) == "yes"), ""; }},
       {"complete", [](S s, W w) { return Offered(s.core, s.Element(w.at(0)), w.at(1)); }},
+      {"faults", [](S s, W w) { return FaultsIn(s.core, s.Element(w.at(0)), w.at(1)); }},
       {"can-delete", [](S s, W w) { return YesNo(s.core.CanDelete(s.UidOf(w.at(0)))); }},
       {"can-move", [](S s, W w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
       {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},

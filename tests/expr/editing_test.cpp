@@ -6,6 +6,8 @@
 #include <string>
 
 #include "expr/caret_context.h"
+#include "expr/function_catalogue.h"
+#include "expr/plain_language.h"
 #include "support/case_file.h"
 
 namespace tessal {
@@ -37,6 +39,23 @@ TEST(Editing, KnowsWhatLiesAtTheCaret) {
   test::RunCases("expr/cases/caret.txt", [](const test::Case& each) -> test::Answer {
     return [input = each.input](const test::CaseCall& /*call*/) { return test::AnswerEach(input, Context); };
   });
+}
+
+/// The faults of a text: what is underlined, and the sentences.
+std::string Faults(const std::string& text) {
+  std::string rows;
+  for (const ExpressionFault& fault : FindLanguageFaults(text)) {
+    rows += Marked(text, fault.at) + ": " + fault.plain + "\n";
+  }
+  return rows;
+}
+
+TEST(Editing, SaysInPlainLanguageWhatIsWrong) {
+  InitCatalogues();
+  test::RunCases("expr/cases/faults.txt", [](const test::Case& each) -> test::Answer {
+    return [input = each.input](const test::CaseCall& /*call*/) { return test::AnswerEach(input, Faults); };
+  });
+  ReleaseCatalogues();
 }
 
 }  // namespace

@@ -17,8 +17,8 @@ TEST_P(Cases, GiveWhatTheFileSays) {
 
 INSTANTIATE_TEST_SUITE_P(Editor, Cases,
                          testing::Values("commits", "names", "choices", "expressions", "completion",
-                                         "messages", "nodes", "visits", "groups", "lists", "root",
-                                         "visibility", "particles", "exports"),
+                                         "expression_help", "messages", "nodes", "visits", "groups", "lists",
+                                         "root", "visibility", "particles", "exports"),
                          [](const auto& file) { return file.param; });
 
 }  // namespace

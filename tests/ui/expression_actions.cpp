@@ -3,6 +3,7 @@
 #include <QAbstractItemView>
 #include <QApplication>
 #include <QKeySequence>
+#include <QLabel>
 #include <QTest>
 #include <algorithm>
 
@@ -10,11 +11,21 @@ namespace tessal::test {
 
 namespace {
 
-/// The text with a bar at the caret, and the rows of the list of completions, the chosen one with a mark.
+/// The text with a bar at the caret, the marks over it, the tip of a call, and the rows of the list of
+/// completions, the chosen one with a mark.
 std::string Shown(const CAutoRichEditCtrl& field) {
   QString text = field.ContentText();
   text.insert(field.textCursor().position(), u'|');
   QString shown = text + u'\n';
+  for (const QTextEdit::ExtraSelection& mark : field.extraSelections()) {
+    const bool isFault = mark.format.underlineStyle() == QTextCharFormat::WaveUnderline;
+    shown += QStringLiteral("%1 at %2: %3\n")
+                 .arg(isFault ? QStringLiteral("fault") : QStringLiteral("bracket"))
+                 .arg(mark.cursor.selectionStart())
+                 .arg(mark.cursor.selectedText());
+  }
+  const auto* tip = field.findChild<QLabel*>(QStringLiteral("CallTip"));
+  if (tip != nullptr && tip->isVisible()) shown += QStringLiteral("tip: ") + tip->text() + u'\n';
   if (const auto* list = qobject_cast<const QAbstractItemView*>(QApplication::activePopupWidget())) {
     constexpr int kShown = 5;
     const QAbstractItemModel& rows = *list->model();
@@ -46,6 +57,13 @@ std::string PressKeys(Editor& editor, const QString& label, const QString& keys)
     place = end;
   }
   return Shown(field);
+}
+
+std::string TipIn(Editor& editor, const QString& label, int position) {
+  auto& field = editor.Field<CAutoRichEditCtrl>(label);
+  QTextCursor cursor(field.document());
+  cursor.setPosition(position);
+  return field.TipAt(field.cursorRect(cursor).center() + QPoint(2, 0)).toStdString() + "\n";
 }
 
 }  // namespace tessal::test

@@ -12,4 +12,7 @@ namespace tessal::test {
 /// "<Ctrl+Space>". They go where a user's would: to the list of completions while it is open.
 std::string PressKeys(Editor& editor, const QString& label, const QString& keys);
 
+/// What the pointer's tip says over a position.
+std::string TipIn(Editor& editor, const QString& label, int position);
+
 }  // namespace tessal::test

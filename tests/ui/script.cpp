@@ -264,6 +264,14 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        QInputMethodEvent unsure(words.first, {});
        QApplication::sendEvent(QApplication::focusWidget(), &unsure);
      }},
+    // Typing pauses long enough.
+    {"pause",
+     [](Editor& editor, auto& /*words*/) {
+       for (auto* timer : editor.View().findChildren<QTimer*>(QStringLiteral("TypingPause"))) {
+         if (timer->isActive()) QTest::qWait(timer->interval());
+         if (timer->isActive()) QTest::qWait(1);
+       }
+     }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
     {"answer",
      [](Editor& editor, auto& words) {
@@ -321,6 +329,7 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
     {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
     {"command", RunCommand},
