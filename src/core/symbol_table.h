@@ -56,6 +56,10 @@ std::string RecordSymbol(const SymbolRecord& record);
 /// The expression of a record, the number of an input as text, or the name that a search looks for.
 std::string RecordText(const SymbolRecord& record);
 
+/// Whether a name that no element has means something all the same: a word of the language, a function, or a
+/// user function of the settings.
+bool CountsAsDefined(std::string_view name, const CEL_Miscanellous& settings);
+
 class SymbolTable final {
  public:
   const std::vector<SymbolRecord>& Records() const { return records; }

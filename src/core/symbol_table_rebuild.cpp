@@ -77,7 +77,6 @@ class SymbolTable::RebuildSteps final {
   void Refer(const SymbolRecord& record, NameNumber name);
   Meaning MeaningOf(NameNumber name);
   Meaning MeaningOfUnknown(std::string_view name);
-  bool CountsAsDefined(std::string_view name) const;
   void BuildReverseReferences();
   void ClassifyArithmeticExpressions();
 
@@ -320,7 +319,7 @@ SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOf(NameNumb
 /// Of a name that no record has.
 SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOfUnknown(std::string_view name) {
   // One that was undefined may have become a reserved one since: a user function has taken it.
-  if (CountsAsDefined(name)) return DefinedElsewhere();
+  if (CountsAsDefined(name, settings)) return DefinedElsewhere();
   const auto known = undefinedByName.find(name);
   if (known != undefinedByName.end()) {
     undefined[known->second]->stale = false;
@@ -332,7 +331,7 @@ SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOfUnknown(s
   return FirstUndefined() + static_cast<Meaning>(undefined.size() - 1);
 }
 
-bool SymbolTable::RebuildSteps::CountsAsDefined(std::string_view name) const {
+bool CountsAsDefined(std::string_view name, const CEL_Miscanellous& settings) {
   if (IsReservedName(name) || IsPropertyName(name)) return true;
   const auto& functions = settings.ExternalFunctions();
   return std::any_of(functions.begin(), functions.end(),

@@ -75,6 +75,10 @@ class TemplateCore final : public ElementOwner {
   const TemplateState::ListHeads& ListHeads() const { return state.listHeads; }
 
   const std::vector<SymbolRecord>& SymbolTable() const { return state.table.Records(); }
+  /// Whether a name that no element has means something all the same.
+  bool CountsAsDefined(std::string_view name) const { return tessal::CountsAsDefined(name, state.misc); }
+  /// Whether several elements have the same symbol.
+  bool HasSharedSymbols() const { return state.table.HasSharedSymbols(); }
   const std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() const {
     return state.table.Undefined();
   }
@@ -186,6 +190,9 @@ class TemplateCore final : public ElementOwner {
   void RebuildSymbolTable() override;
   /// Adds what it finds to the error registry; true when nothing was found.
   bool ValidateTemplate();
+  /// What the rules of order, place and class find in a use of one element by another's expression; nothing
+  /// when it is allowed. Reports nothing.
+  std::optional<Finding> FindUseFault(const SymbolRecord& user, const SymbolRecord& used) const;
   bool CheckElementOrder(Uid uid) const;
   bool CheckDeclarationOrder() const;
   bool CheckScopeRule() const;

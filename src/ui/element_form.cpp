@@ -20,6 +20,7 @@
 #include "ui/documentation_link.h"
 #include "ui/expression_editor_dialog.h"
 #include "ui/expression_field.h"
+#include "ui/expression_panel.h"
 #include "ui/focus_watch.h"
 #include "ui/format_words.h"
 #include "ui/label.h"
@@ -204,33 +205,23 @@ QWidget* CElementForm::MakeDocumentation(const FormField& field, Control& contro
 }
 
 QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) {
-  auto* cell = MakeChild<QWidget>(this);
-  auto* rows = MakeChild<QVBoxLayout>(cell);
-  rows->setContentsMargins(0, 0, 0, 0);
-  auto* edit = MakeChild<CAutoRichEditCtrl>(Document(), cell);
-  auto* note = MakeChild<CLabel>(cell);
-  note->setWordWrap(true);
-  note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
+  auto* cell = MakeChild<CExpressionPanel>(
+      Document(), [this] { return Element(); }, QString::fromLatin1(field.label), this);
+  CAutoRichEditCtrl* edit = &cell->Field();
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
   keypad->setObjectName(QString::number(field.keypad));
   // In a form with several expressions each button has a name of its own.
   const bool isOnly = field.keypad == control_id::kKeypad;
   keypad->setAccessibleName(isOnly ? strings::kExpressionEditor
                                    : strings::kExpressionEditor + u' ' + QString::fromLatin1(field.label));
-  auto* foot = MakeChild<QHBoxLayout>();
-  foot->addWidget(note, 1);
-  foot->addWidget(keypad, 0, Qt::AlignTop);
-  rows->addWidget(edit, 1);
-  rows->addLayout(foot);
-  connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit, note] {
-    note->setText(edit->ParserMessage());
+  cell->AddButton(*keypad);
+  connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit] {
     if (edit->IsEdited()) NoteTyped();
   });
   connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
   WatchFocusLoss(*edit, [this] { NoteFocusLost(); });
   connect(keypad, &QPushButton::clicked, this, [this] { CExpressionEditorDlg(this).exec(); });
   control.editor = edit;
-  control.note = note;
   return cell;
 }
 

@@ -98,7 +98,6 @@ class CElementForm : public CRightPaneBase {
     QWidget* editor = nullptr;
     QLabel* label = nullptr;
     QWidget* cell = nullptr;  ///< the editor with what lies beside it
-    QLabel* note = nullptr;   ///< under an expression: what the parser says
     bool isInBlock = false;   ///< lies in a block of its own under the rows
     QString shown;            ///< the text that the last load gave a line
   };

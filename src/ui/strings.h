@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QString>
+#include <array>
 
 namespace tessal::strings {
 
@@ -128,6 +129,16 @@ inline const QString kSelectDocumentation = QStringLiteral("Select documentation
 inline const QString kOpenDocumentation = QStringLiteral("Open documentation");
 inline const QString kDocumentationFilter =
     QStringLiteral("Portable data files (*.pdf);;Word documents (*.doc *.docx);;All files (*)");
+
+// Expressions while they are typed. The groups are in the order of their enumeration.
+inline const QString kCompletions = QStringLiteral("Completions");
+inline const std::array<QString, 7> kCompletionGroups = {QStringLiteral("symbol"),
+                                                         QStringLiteral("function"),
+                                                         QStringLiteral("user function"),
+                                                         QStringLiteral("interaction of particles"),
+                                                         QStringLiteral("keyword"),
+                                                         QStringLiteral("built-in, not in the template yet"),
+                                                         QStringLiteral("property of a particle")};
 
 // The creation dialog.
 inline const QString kSkip = QStringLiteral("Skip");

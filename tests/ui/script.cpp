@@ -25,6 +25,7 @@
 #include "ui/found_list.h"
 #include "ui/go_to_symbol.h"
 #include "ui/message_bar.h"
+#include "ui/expression_actions.h"
 #include "ui/page_actions.h"
 #include "ui/text_bytes.h"
 #include "ui/tree_filter.h"
@@ -381,6 +382,14 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        QInputMethodEvent unsure(words.first, {});
        QApplication::sendEvent(QApplication::focusWidget(), &unsure);
      }},
+    // Typing pauses long enough.
+    {"pause",
+     [](Editor& editor, auto& /*words*/) {
+       for (auto* timer : editor.View().findChildren<QTimer*>(QStringLiteral("TypingPause"))) {
+         if (timer->isActive()) QTest::qWait(timer->interval());
+         if (timer->isActive()) QTest::qWait(1);
+       }
+     }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
     {"answer",
      [](Editor& editor, auto& words) {
@@ -463,6 +472,8 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
+    {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
     {"found", Found},
     {"shown-messages", ShownMessages},
