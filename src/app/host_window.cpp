@@ -33,6 +33,7 @@
 #include "app/notice_bar.h"
 #include "app/open_document.h"
 #include "app/recent_files.h"
+#include "app/session.h"
 #include "app/start_page.h"
 #include "app/view_commands.h"
 #include "platform/busy_notice.h"
@@ -138,6 +139,11 @@ void HostWindow::MakeMenus() {
   file->addAction(tr("&Open..."), QKeySequence::Open, this, &HostWindow::ChooseFiles);
   recentMenu = file->addMenu(tr("Open &Recent"));
   connect(recentMenu, &QMenu::aboutToShow, this, &HostWindow::FillRecentMenu);
+  file->addAction(tr("Reopen &Last Session"), this, &HostWindow::RestoreSession);
+  QAction* restores = file->addAction(tr("Reopen It at Star&t"));
+  restores->setCheckable(true);
+  restores->setChecked(RestoresSession());
+  connect(restores, &QAction::toggled, this, &SetRestoresSession);
   file->addSeparator();
   documentActions.append(file->addAction(tr("&Save"), QKeySequence::Save, this, &HostWindow::SaveCurrent));
   documentActions.append(
@@ -193,6 +199,30 @@ void HostWindow::ChooseFiles() {
 
 void HostWindow::OpenFiles(const QStringList& paths) {
   for (const QString& path : paths) OpenFile(path);
+}
+
+void HostWindow::RestoreSession() {
+  const Session session = KeptSession();
+  OpenDocument* front = nullptr;
+  int number = 0;
+  for (const SessionFile& file : session.files) {
+    const bool isFront = number++ == session.front;
+    if (!OpenFile(file.path)) continue;
+    Current()->View().GoTo(file.place);
+    if (isFront) front = Current();
+  }
+  if (front != nullptr) tabs->setCurrentWidget(front->Widget());
+}
+
+void HostWindow::KeepOpenFiles() const {
+  Session session;
+  for (int tab = 0; tab < tabs->count(); ++tab) {
+    const OpenDocument* open = FindByWidget(tabs->widget(tab));
+    if (open == nullptr || open->Path().isEmpty()) continue;
+    if (open == Current()) session.front = static_cast<int>(session.files.size());
+    session.files.push_back({open->Path(), open->View().Place()});
+  }
+  KeepSession(session);
 }
 
 bool HostWindow::OpenFile(const QString& path) {
@@ -493,6 +523,7 @@ void HostWindow::closeEvent(QCloseEvent* close) {
     close->ignore();
     return;
   }
+  KeepOpenFiles();
   for (const auto& open : documents) open->DropWork();
   QSettings().setValue(kGeometryKey, saveGeometry());
   close->accept();

@@ -1,8 +1,8 @@
 #include "cli/explanation.h"
 
-#include "cli/output.h"
-#include "docgen/safe_text.h"
 #include <string_view>
+
+#include "docgen/safe_text.h"
 
 namespace tessal::cli {
 

@@ -76,7 +76,7 @@ CLI::Option* AddForce(CLI::App& command, bool& force) {
 
 /// An option that takes one of a few words.
 template <class Value>
-void AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
+CLI::Option* AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
                Value& chosen) {
   const auto read = [&chosen, name, choices](const std::string& word) {
     const std::optional<Value> value = ValueOf(choices, word);
@@ -84,11 +84,11 @@ void AddChoice(CLI::App& command, const char* name, const char* typeName, Choice
       throw CLI::ValidationError(name, "'" + ShownNumber(word) + "' is none of " + WordsOf(choices));
     chosen = *value;
   };
-  command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
+  return command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
 }
 
-void AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
-  AddChoice(command, "--format", "FORMAT", formats, line.format);
+CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
+  return AddChoice(command, "--format", "FORMAT", formats, line.format);
 }
 
 /// The level that a word or a number names. Numbers are read here, as the option parser does not know those
@@ -253,8 +253,7 @@ void AddCatalogue(CLI::App& app, CommandLine& line, const char* name, const char
   CLI::App* catalogue = app.add_subcommand(name, description)->group(kCatalogues);
   const CLI::Option* one = catalogue->add_option("NAME", line.name, "one of them");
   CLI::Option* describe = catalogue->add_flag("--describe", line.asPage, "says what they mean");
-  AddFormat(*catalogue, line, kDescriptionFormats);
-  catalogue->get_option("--format")->needs(describe);
+  AddFormat(*catalogue, line, kDescriptionFormats)->needs(describe);
   catalogue->callback([&line, one, run] {
     // An empty name is a name too, and no row's.
     const bool asksForOne = one->count() > 0;

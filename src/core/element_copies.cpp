@@ -294,7 +294,7 @@ bool CanCopy(const CEL_Element& element) {
          element.Kind() <= ElementKind::HorizontalVector;
 }
 
-ElementText TextOfElements(const TemplateCore& core, const std::vector<Uid>& uids) {
+CopiedText TextOfElements(const TemplateCore& core, const std::vector<Uid>& uids) {
   const MessagesAside aside;
   const ScannerRest rest;
   TemplateCore fragment;
@@ -315,7 +315,7 @@ ElementText TextOfElements(const TemplateCore& core, const std::vector<Uid>& uid
   fragment.RebuildSymbolTable();
   copying.Connect(beside.links);
   fragment.RefreshSearchFunctionChoices();
-  ElementText result;
+  CopiedText result;
   std::optional<std::string> text = fragment.CopyText(result.refusal);
   if (text) result.text = *text + TextBeside(beside);
   return result;
@@ -379,7 +379,7 @@ PastedElements DuplicateElements(TemplateCore& core, const std::vector<Uid>& uid
   ForEachToCopy(core, uids, [&originals](const CEL_Element& element, const CEL_Lagrange_Specie*) {
     originals.push_back(element.GetUid());
   });
-  const ElementText copied = TextOfElements(core, originals);
+  const CopiedText copied = TextOfElements(core, originals);
   if (copied.text.empty()) return {{}, copied.refusal};
   const EditStep step(core.History(), {});
   PastedElements pasted = PasteElements(core, copied.text, {});

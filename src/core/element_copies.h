@@ -16,13 +16,13 @@ class TemplateCore;
 /// movement of a class.
 bool CanCopy(const CEL_Element& element);
 
-struct ElementText {
+struct CopiedText {
   std::string text{};     ///< empty where nothing can be copied
   std::string refusal{};  ///< why there is none, for people: the format cannot hold an element
 };
 
 /// The text of those of the elements that can be copied, in the order of the template.
-ElementText TextOfElements(const TemplateCore& core, const std::vector<Uid>& uids);
+CopiedText TextOfElements(const TemplateCore& core, const std::vector<Uid>& uids);
 
 /// Where copies go.
 struct CopyPlace {

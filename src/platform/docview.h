@@ -124,6 +124,9 @@ class CView {
   virtual std::vector<ViewCommand> Commands() { return {}; }
   /// What a host shows of the view all the time in its status bar.
   virtual std::string StatusText() const { return {}; }
+  /// Which part of the document is in front, as a text by which another run finds it again; empty for none.
+  virtual std::string Place() const { return {}; }
+  virtual void GoTo(const std::string& /*place*/) {}
   /// The widget that a host puts into its frame; none for a view without a screen.
   virtual QWidget* Widget() { return nullptr; }
 

@@ -236,7 +236,7 @@ std::vector<Uid> CEditCommands::Selected() const {
 
 void CEditCommands::CutOrCopy(bool removes) {
   view.CommitAll();
-  const ElementText copied = TextOfElements(Core(), Selected());
+  const CopiedText copied = TextOfElements(Core(), Selected());
   if (!copied.refusal.empty()) return dialogs.Warn(&view, ToScreen(copied.refusal));
   if (copied.text.empty()) return;
   const std::size_t count = Selected().size();

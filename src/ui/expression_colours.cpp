@@ -15,6 +15,7 @@
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
 #include "platform/ascii.h"
+#include "ui/strings.h"
 
 namespace tessal {
 
@@ -125,7 +126,7 @@ QColor StrongColour(const QColor& colour, const QColor& ground) {
 
 ViewCommand StrongColoursCommand() {
   const bool strong = UsesStrongColours();
-  return {"&View", "&Strong Colours", [strong] { UseStrongColours(!strong); }, true, strong};
+  return {strings::kViewMenu, "S&trong Colours", [strong] { UseStrongColours(!strong); }, true, strong};
 }
 
 bool UsesStrongColours() {

@@ -14,6 +14,9 @@
 #include <QToolButton>
 #include <QVBoxLayout>
 #include <algorithm>
+#include <iterator>
+#include <string_view>
+#include <utility>
 
 #include "core/document.h"
 #include "ui/account_strip.h"
@@ -39,6 +42,7 @@
 #include "ui/right_pane.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
+#include "ui/text_zoom.h"
 #include "ui/tree_filter.h"
 
 namespace tessal {
@@ -106,6 +110,7 @@ TemplateCore& CMainView::Core() const {
 void CMainView::OnInitialUpdate() {
   BuildToolBar();
   BuildLayout();
+  zoom = MakeChild<CTextZoom>(*this);
   edits = MakeChild<CEditCommands>(*this, dialogs);
   edits->AddTo(*editBar);
   connect(errorList, &CErrorList::Refreshed, this,
@@ -118,11 +123,11 @@ void CMainView::OnInitialUpdate() {
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
   connect(tree, &QTreeWidget::customContextMenuRequested, this, &CMainView::OpenContextMenu);
   connect(errorList, &CErrorList::ElementChosen, this, &CMainView::SelectById);
-  auto* help = MakeChild<QAction>(strings::kHelp, this);
-  help->setShortcut(QKeySequence::HelpContents);
-  help->setShortcutContext(Qt::WidgetWithChildrenShortcut);
-  connect(help, &QAction::triggered, this, &CMainView::ShowHelp);
-  addAction(help);
+  helpContents = MakeChild<QAction>(strings::kContents, this);
+  helpContents->setShortcut(QKeySequence::HelpContents);
+  helpContents->setShortcutContext(Qt::WidgetWithChildrenShortcut);
+  connect(helpContents, &QAction::triggered, this, &CMainView::ShowHelp);
+  addAction(helpContents);
   // The first selection fills the list of messages too.
   tree->setCurrentItem(tree->RootItem());
   // A host that gives the view the focus gives it to the tree.
@@ -131,9 +136,6 @@ void CMainView::OnInitialUpdate() {
 }
 
 void CMainView::BuildToolBar() {
-  editBar = MakeChild<QToolBar>(this);
-  editBar->setIconSize(kIcons);
-  editBar->setAccessibleName(strings::kEditing);
   toolBar = MakeChild<QToolBar>(this);
   toolBar->setObjectName(QString::number(control_id::kNavigation));
   toolBar->setIconSize(kIcons);
@@ -152,6 +154,9 @@ void CMainView::BuildToolBar() {
   button->setMenu(historyMenu);
   button->setPopupMode(QToolButton::InstantPopup);
   historyAction = toolBar->addWidget(button);
+  editBar = MakeChild<QToolBar>(this);
+  editBar->setIconSize(kIcons);
+  editBar->setAccessibleName(strings::kEditing);
 }
 
 void CMainView::BuildLayout() {
@@ -540,6 +545,50 @@ std::string CMainView::StatusText() const {
   return (count == 1 ? strings::kOneElement : strings::kElementCount.arg(count)).toStdString();
 }
 
+namespace {
+
+// How a place is written: what sort of node it is, and what names it.
+constexpr std::string_view kSymbolPlace = "symbol ";
+constexpr std::string_view kNodePlace = "node ";
+constexpr std::string_view kGroupPlace = "group ";
+constexpr std::string_view kListPlace = "list ";
+
+}  // namespace
+
+std::string CMainView::Place() const {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr) return {};
+  const CItemData& node = CElementTree::DataOf(*item);
+  if (node.groupIndex > 0) return std::string(kGroupPlace) + std::to_string(node.groupIndex);
+  if (!IsElement(node.id)) return std::string(kNodePlace) + std::to_string(NumberOf(node.id));
+  if (const CEL_Lagrange_Specie* specie = Core().GetParentSpecie(node.id)) {
+    return std::string(kListPlace) + std::to_string(NumberOf(node.kind)) + ' ' + specie->symbol.TextOf();
+  }
+  const CEL_Element* element = Core().GetElement(node.id);
+  return element == nullptr ? std::string() : std::string(kSymbolPlace) + element->FullSymbol();
+}
+
+void CMainView::GoTo(const std::string& place) {
+  const std::string_view text = place;
+  const auto rest = [text](std::string_view sort) { return std::string(text.substr(sort.size())); };
+  if (text.starts_with(kGroupPlace)) return SelectGroup(QString::fromStdString(rest(kGroupPlace)).toInt() - 1);
+  if (text.starts_with(kNodePlace)) return SelectById(Uid{QString::fromStdString(rest(kNodePlace)).toInt()});
+  std::uint32_t sequence = 0;
+  if (text.starts_with(kSymbolPlace) && Core().FindSymbol(rest(kSymbolPlace), sequence)) {
+    return SelectById(Core().FindRecordBySequence(sequence)->uid);
+  }
+  if (!text.starts_with(kListPlace)) return;
+  const QString list = ToScreen(rest(kListPlace));
+  const std::string name = list.section(u' ', 1).toStdString();
+  for (const auto& specie : Core().Species()) {
+    for (const auto& head : specie->Heads()) {
+      if (specie->symbol.Text() == name && NumberOf(head->Kind()) == list.section(u' ', 0, 0).toInt()) {
+        return SelectById(head->GetUid());
+      }
+    }
+  }
+}
+
 QString CMainView::FocusedControl() const {
   const QWidget* focus = QApplication::focusWidget();
   return form && focus != nullptr && form->isAncestorOf(focus) ? focus->objectName() : QString();
@@ -664,9 +713,21 @@ QWidget* CMainView::ChainAfter(QWidget* stop, const QWidget& part) {
 }
 
 std::vector<ViewCommand> CMainView::Commands() {
-  std::vector<ViewCommand> commands = edits->Commands();
-  for (ViewCommand& command : findTools->Commands()) commands.push_back(std::move(command));
-  for (ViewCommand& command : ExportCommands(document, dialogs, *this)) commands.push_back(std::move(command));
+  std::vector<ViewCommand> commands;
+  const auto append = [&commands](std::vector<ViewCommand> some) {
+    std::move(some.begin(), some.end(), std::back_inserter(commands));
+  };
+  append(ExportCommands(document, dialogs, *this));
+  append(edits->Commands());
+  append(zoom->Commands());
+  for (QAction* action : {back, forward})
+    commands.push_back({.menu = strings::kGoMenu, .text = {}, .action = action});
+  commands.push_back({.menu = strings::kGoMenu, .text = {}});
+  append(findTools->Commands());
+  commands.push_back({.menu = strings::kHelpMenu, .text = {}, .action = helpContents});
+  commands.push_back({.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] {
+                        OpenReference(this, {});
+                      }});
   commands.push_back(StrongColoursCommand());
   return commands;
 }

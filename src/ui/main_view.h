@@ -30,6 +30,7 @@ class CAccountStrip;
 class CErrorList;
 class CFindTools;
 class CLabel;
+class CTextZoom;
 class CRightPaneBase;
 class CTessalDoc;
 class TemplateCore;
@@ -52,6 +53,8 @@ class CMainView final : public QWidget, public CView {
   void OnActivate() override;
   std::vector<ViewCommand> Commands() override;
   std::string StatusText() const override;
+  std::string Place() const override;
+  void GoTo(const std::string& place) override;
   QWidget* Widget() override { return this; }
 
   CTessalDoc& Document() const { return document; }
@@ -138,12 +141,14 @@ class CMainView final : public QWidget, public CView {
   UserDialogs& dialogs;
   QToolBar* toolBar = nullptr;
   QToolBar* editBar = nullptr;
+  QAction* helpContents = nullptr;
   QAction* back = nullptr;
   QAction* forward = nullptr;
   QAction* historyAction = nullptr;
   QMenu* historyMenu = nullptr;
   CLabel* title = nullptr;
   CEditCommands* edits = nullptr;
+  CTextZoom* zoom = nullptr;
   CElementTree* tree = nullptr;
   CErrorList* errorList = nullptr;
   CFindTools* findTools = nullptr;

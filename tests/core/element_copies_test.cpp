@@ -31,7 +31,7 @@ TEST(ElementCopies, AreAllThatTheOriginalsAre) {
   for (unsigned seed = 1; seed <= 40; ++seed) {
     ResetExpressionScanner();
     test::LoadedTemplate original(test::RandomTemplate(seed, 30));
-    const ElementText copied = TextOfElements(*original, AllElements(*original));
+    const CopiedText copied = TextOfElements(*original, AllElements(*original));
     ASSERT_EQ(copied.refusal, "");
     TemplateCore other;
     SetNotifyChanges(true);
@@ -65,7 +65,7 @@ class.state Crab_w 1
 TEST(ElementCopies, GetFreeNamesAndUseEachOther) {
   test::LoadedTemplate loaded(test::TemplateFromNotation(kModel));
   TemplateCore& core = *loaded;
-  const ElementText copied = TextOfElements(core, {UidOf(core, "B"), UidOf(core, "k1")});
+  const CopiedText copied = TextOfElements(core, {UidOf(core, "B"), UidOf(core, "k1")});
   const PastedElements pasted = PasteElements(core, copied.text, {UidOf(core, "k"), Uid::None});
   EXPECT_EQ(SymbolsOf(core, pasted.uids), "k2 B2");
   // The constant that was not copied is the same for both.
@@ -80,7 +80,7 @@ TEST(ElementCopies, GetFreeNamesAndUseEachOther) {
 TEST(ElementCopies, OfMembersGoToTheClassThatTakesThem) {
   test::LoadedTemplate loaded(test::TemplateFromNotation(kModel));
   TemplateCore& core = *loaded;
-  const ElementText copied = TextOfElements(core, {UidOf(core, "Fish_w"), UidOf(core, "Fish_r")});
+  const CopiedText copied = TextOfElements(core, {UidOf(core, "Fish_w"), UidOf(core, "Fish_r")});
   const Uid crab = core.GetSpecie(1).GetUid();
   EXPECT_EQ(SymbolsOf(core, PasteElements(core, copied.text, {Uid::None, crab}).uids), "Fish_w2 Fish_r2");
   EXPECT_EQ(core.GetSpecie(1).stateVariables[1]->equation.Text(), "Fish_r2");
