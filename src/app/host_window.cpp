@@ -473,6 +473,8 @@ void HostWindow::changeEvent(QEvent* change) {
 }
 
 void HostWindow::Activate() {
+  // It was about the document that was in front.
+  if (notKept.isEmpty()) statusBar()->clearMessage();
   if (OpenDocument* front = Current()) front->View().OnActivate();
   ShowFront();
 }

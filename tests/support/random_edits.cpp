@@ -199,7 +199,10 @@ struct Sight {
 std::string TableOf(const TemplateCore& core) {
   std::string text;
   for (const SymbolRecord& record : core.SymbolTable()) {
-    text += std::to_string(record.sequence) + " " + core.RecordSymbol(record) + ":";
+    // The captions of these are in no file.
+    const bool hasCaption =
+        record.kind == ElementKind::DerivedOutput || record.kind == ElementKind::HorizontalVector;
+    text += std::to_string(record.sequence) + " " + (hasCaption ? "" : core.RecordSymbol(record)) + ":";
     for (const std::uint32_t used : record.references) text += " " + std::to_string(used);
     text += " <";
     for (const std::uint32_t user : record.referencedBy) text += " " + std::to_string(user);
@@ -241,8 +244,6 @@ std::string FaultOfTable(TemplateCore& core, const std::string& path) {
   TemplateCore fresh;
   if (!fresh.LoadWrapper(path)) return "the text does not load";
   SetNotifyChanges(true);
-  // Only the place of a derived output names it in a file.
-  if (core.GetDerivedOutputCount() > 0) return {};
   return TableOf(fresh) == present ? "" : "a load gives another table" + Difference(present, TableOf(fresh));
 }
 
