@@ -170,7 +170,7 @@ void CFindTools::GoTo(const FoundText& found, const TextMatch& match) {
     const Uid fixed = FixedNodeOf(found.kind);
     Uid node = fixed == Uid::None ? found.place.element : fixed;
     const CEL_Element* element = fixed == Uid::None ? core.GetElement(node) : nullptr;
-    // The forcings of a particle class have no nodes: the class stands in.
+    // The forcings of a particle class have no nodes: the way leads to the class.
     for (; element != nullptr && around.tree.FindById(node) == nullptr; element = element->Parent())
       node = element->Parent() == nullptr ? Uid::None : element->Parent()->GetUid();
     SelectById(node);
