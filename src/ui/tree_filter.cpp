@@ -151,9 +151,12 @@ bool CTreeFilter::Fits(QTreeWidgetItem& item) const {
 void CTreeFilter::Apply(std::vector<NodeName> former) {
   std::sort(former.begin(), former.end());
   matches.clear();
+  QTreeWidgetItem* current = tree.currentItem();
+  const bool wasHidden = current != nullptr && current->isHidden();
   tree.setUpdatesEnabled(false);
   ApplyTo(*tree.RootItem(), former);
   tree.setUpdatesEnabled(true);
+  if (wasHidden) tree.scrollToItem(current);
   ShowCount();
 }
 
