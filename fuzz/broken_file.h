@@ -6,7 +6,7 @@
 #include <string_view>
 #include <vector>
 
-#include "choices.h"
+#include "support/choices.h"
 
 namespace tessal::fuzz {
 

@@ -113,9 +113,11 @@ class Monkey final {
   std::string PressKey();
   std::string UseErrorList();
   std::string Save();
+  std::string TakeBackAndDoAgain();
 
   std::mt19937 random;
   std::unique_ptr<test::Editor> editor;
+  std::string lost;  ///< what an action has found to be lost
 };
 
 template <class Widget>
@@ -291,6 +293,30 @@ std::string Monkey::Save() {
   return "save";
 }
 
+/// Takes some steps back and does them again: the template is the same to the byte.
+std::string Monkey::TakeBackAndDoAgain() {
+  editor->View().CommitAll();
+  // As in the checks: the table of before is that of a rebuild.
+  SetNotifyChanges(true);
+  TemplateCore& core = editor->Core();
+  core.RebuildSymbolTable();
+  std::string reason;
+  const auto before = core.CopyText(reason);
+  const std::size_t steps = Pick(core.History().UndoCount() + 1);
+  const auto take = [this](Qt::Key key, std::size_t count) {
+    editor->Tree().setFocus();
+    for (std::size_t step = 0; step < count; ++step)
+      QTest::keyClick(&editor->Tree(), key, Qt::ControlModifier);
+  };
+  const std::size_t left = core.History().UndoCount() - steps;
+  take(Qt::Key_Z, steps);
+  if (core.History().UndoCount() != left) lost = "undo has not taken the steps back";
+  take(Qt::Key_Y, steps);
+  const auto after = core.CopyText(reason);
+  if (before != after) lost = "steps that were taken back and done again have left another template";
+  return "back and again " + std::to_string(steps);
+}
+
 std::string Monkey::Act() {
   PrepareAnswers();
   std::string (Monkey::*const kActions[])() = {
@@ -299,6 +325,7 @@ std::string Monkey::Act() {
       &Monkey::UseRows,    &Monkey::UseRows,      &Monkey::RunCommand,    &Monkey::PressKey,
       &Monkey::PressKey,   &Monkey::UseErrorList, &Monkey::RunKeyCommand, &Monkey::RunKeyCommand,
       &Monkey::UseFound};
+  if (Sometimes(100)) return TakeBackAndDoAgain();
   const std::string name = Sometimes(200) ? Save() : (this->*kActions[Pick(std::size(kActions))])();
   QCoreApplication::processEvents();
   QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
@@ -307,6 +334,7 @@ std::string Monkey::Act() {
 }
 
 std::string Monkey::Fault() {
+  if (!lost.empty()) return lost;
   TemplateCore& core = editor->Core();
   if (!NotifyChanges()) {
     // A group that was made from the menu leaves the listeners off until the next element is made.

@@ -6,6 +6,8 @@
 #include <vector>
 
 #include "core/error_registry.h"
+#include "docgen/latex.h"
+#include "docgen/mathml.h"
 #include "expr/expression_node.h"
 #include "expr/identifiers.h"
 #include "expr/interaction_rewriter.h"
@@ -65,6 +67,8 @@ void CheckParse(const std::string& text) {
       nullptr, [&copied](NodeKind, std::string_view, std::int32_t) { ++copied; }, nullptr);
   Require(nodes == copied);
   Require(RewriteExpressionText(tree) == RewriteExpressionText(copy.Root()));
+  Require(TreeToLatex(tree, "s", true) == TreeToLatex(copy.Root(), "s", true));
+  Require(!TreeToMathML(tree, "s", true).empty());
 }
 
 /// A parse that came to the end knows the names that a scan finds, and leaves the scanner as the scan does.

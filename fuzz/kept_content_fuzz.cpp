@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "broken_file.h"
-#include "choices.h"
+#include "support/choices.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"

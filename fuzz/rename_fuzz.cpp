@@ -9,7 +9,7 @@
 #include <string_view>
 #include <vector>
 
-#include "choices.h"
+#include "support/choices.h"
 #include "core/error_registry.h"
 #include "core/rename.h"
 #include "core/template_core.h"

@@ -11,6 +11,7 @@
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QFontMetrics>
+#include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMessageBox>
@@ -32,6 +33,7 @@
 #include "app/notice_bar.h"
 #include "app/open_document.h"
 #include "app/recent_files.h"
+#include "app/session.h"
 #include "app/start_page.h"
 #include "app/view_commands.h"
 #include "platform/busy_notice.h"
@@ -75,7 +77,8 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
       pages(std::make_unique<QStackedWidget>(this).release()),
       tabs(std::make_unique<QTabWidget>(this).release()),
       startPage(std::make_unique<StartPage>(this).release()),
-      notice(std::make_unique<NoticeBar>(this).release()) {
+      notice(std::make_unique<NoticeBar>(this).release()),
+      status(std::make_unique<QLabel>(this).release()) {
   tabs->setDocumentMode(true);
   tabs->setTabsClosable(true);
   tabs->setMovable(true);
@@ -83,7 +86,7 @@ HostWindow::HostWindow(std::unique_ptr<CMultiDocTemplate> documentTemplate, cons
   LayOut();
   setAcceptDrops(true);
   // Made now, it shows what the widgets of the window have to say.
-  statusBar();
+  statusBar()->addPermanentWidget(status);
   FitToScreen();
   MakeMenus();
   connect(startPage, &StartPage::NewRequested, this, &HostWindow::NewDocument);
@@ -136,6 +139,11 @@ void HostWindow::MakeMenus() {
   file->addAction(tr("&Open..."), QKeySequence::Open, this, &HostWindow::ChooseFiles);
   recentMenu = file->addMenu(tr("Open &Recent"));
   connect(recentMenu, &QMenu::aboutToShow, this, &HostWindow::FillRecentMenu);
+  file->addAction(tr("Reopen &Last Session"), this, &HostWindow::RestoreSession);
+  QAction* restores = file->addAction(tr("Reopen It at Star&t"));
+  restores->setCheckable(true);
+  restores->setChecked(RestoresSession());
+  connect(restores, &QAction::toggled, this, &SetRestoresSession);
   file->addSeparator();
   documentActions.append(file->addAction(tr("&Save"), QKeySequence::Save, this, &HostWindow::SaveCurrent));
   documentActions.append(
@@ -145,8 +153,9 @@ void HostWindow::MakeMenus() {
   documentActions.append(close);
   file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
   QMenu* help = menuBar()->addMenu(tr("&Help"));
-  help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
-  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), *close).release();
+  QAction* about = help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
+  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), QList<QAction*>{close, about})
+                     .release();
 }
 
 void HostWindow::FillRecentMenu() {
@@ -192,6 +201,30 @@ void HostWindow::OpenFiles(const QStringList& paths) {
   for (const QString& path : paths) OpenFile(path);
 }
 
+void HostWindow::RestoreSession() {
+  const Session session = KeptSession();
+  OpenDocument* front = nullptr;
+  int number = 0;
+  for (const SessionFile& file : session.files) {
+    const bool isFront = number++ == session.front;
+    if (!OpenFile(file.path)) continue;
+    Current()->View().GoTo(file.place);
+    if (isFront) front = Current();
+  }
+  if (front != nullptr) tabs->setCurrentWidget(front->Widget());
+}
+
+void HostWindow::KeepOpenFiles() const {
+  Session session;
+  for (int tab = 0; tab < tabs->count(); ++tab) {
+    const OpenDocument* open = FindByWidget(tabs->widget(tab));
+    if (open == nullptr || open->Path().isEmpty()) continue;
+    if (open == Current()) session.front = static_cast<int>(session.files.size());
+    session.files.push_back({open->Path(), open->View().Place()});
+  }
+  KeepSession(session);
+}
+
 bool HostWindow::OpenFile(const QString& path) {
   const QString full = FullPath(path);
   if (OpenDocument* open = FindByPath(full)) {
@@ -234,6 +267,7 @@ OpenDocument* HostWindow::FindUntouched() const {
 void HostWindow::AddTab(std::unique_ptr<OpenDocument> opened) {
   opened->Show(*docTemplate);
   opened->View().SetFrameTitleUpdate([this] { UpdateTitles(); });
+  opened->View().SetStatusUpdate([this](const std::string& message) { ShowStatus(message); });
   connect(&opened->File(), &WatchedFile::StateChanged, this, &HostWindow::ShowNotice);
   documents.push_back(std::move(opened));
   OpenDocument& shown = *documents.back();
@@ -472,6 +506,14 @@ void HostWindow::UpdateTitles() {
                      : Shortened(front->Title(), kMostTitleCharacters) + QStringLiteral(" \u2013 ") + name);
   for (QAction* action : documentActions) action->setEnabled(front != nullptr);
   ShowNotice();
+  ShowStatus({});
+}
+
+void HostWindow::ShowStatus(const std::string& message) {
+  constexpr int kShownFor = 10000;  // milliseconds
+  const OpenDocument* front = Current();
+  status->setText(front == nullptr ? QString() : QString::fromStdString(front->View().StatusText()));
+  if (!message.empty()) statusBar()->showMessage(QString::fromStdString(message), kShownFor);
 }
 
 void HostWindow::closeEvent(QCloseEvent* close) {
@@ -481,6 +523,7 @@ void HostWindow::closeEvent(QCloseEvent* close) {
     close->ignore();
     return;
   }
+  KeepOpenFiles();
   for (const auto& open : documents) open->DropWork();
   QSettings().setValue(kGeometryKey, saveGeometry());
   close->accept();

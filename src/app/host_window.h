@@ -9,6 +9,7 @@
 
 #include "app/work_timer.h"
 
+class QLabel;
 class QMenu;
 class QStackedWidget;
 class QTabWidget;
@@ -38,6 +39,8 @@ class HostWindow final : public QMainWindow {
   /// The document in front; none when no document is open.
   OpenDocument* Current() const;
   int DocumentCount() const;
+  /// Opens what was open when the application was closed last, at the places that were in front.
+  void RestoreSession();
   bool SaveCurrent();
   bool SaveCurrentAs();
   /// Closes the document in front, and asks first when it holds unsaved work. False when the user
@@ -72,7 +75,10 @@ class HostWindow final : public QMainWindow {
   bool MayClose(OpenDocument& closing);
   void Drop(OpenDocument& closed);
   void KeepWork();
+  void KeepOpenFiles() const;
   void UpdateTitles();
+  /// What the view in front has to say, with a message for a while.
+  void ShowStatus(const std::string& message);
   // What can be done about a file that others have changed.
   void ShowNotice();
   void ReloadCurrent();
@@ -90,6 +96,7 @@ class HostWindow final : public QMainWindow {
   QTabWidget* tabs;
   StartPage* startPage;
   NoticeBar* notice;
+  QLabel* status;
   ViewCommands* viewCommands = nullptr;
   QMenu* recentMenu = nullptr;
   QList<QAction*> documentActions;  ///< those that need a document in front

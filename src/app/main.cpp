@@ -8,6 +8,7 @@
 
 #include "app/editor_module.h"
 #include "app/host_window.h"
+#include "app/session.h"
 #include "platform/docview.h"
 
 namespace {
@@ -38,6 +39,7 @@ int RunHost(QApplication& application) {
   tessal::HostWindow window(module.MakeDocTemplate(), module.EditorName());
   window.show();
   window.OpenFiles(line.positionalArguments());
+  if (line.positionalArguments().isEmpty() && tessal::RestoresSession()) window.RestoreSession();
   window.OfferLeftWork(line.positionalArguments());
   if (window.DocumentCount() == 0 && line.positionalArguments().isEmpty()) window.NewDocument();
   return QApplication::exec();

@@ -4,19 +4,21 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <algorithm>
+#include <utility>
 
 #include "platform/docview.h"
 
 namespace tessal {
 
-ViewCommands::ViewCommands(QMenuBar& menuBar, QAction& lastMenu, QAction& lastFileCommand)
-    : QObject(&menuBar), bar(menuBar), last(lastMenu), fileEnd(lastFileCommand) {}
+ViewCommands::ViewCommands(QMenuBar& menuBar, QAction& lastMenu, QList<QAction*> lastCommands)
+    : QObject(&menuBar), bar(menuBar), last(lastMenu), ends(std::move(lastCommands)) {}
 
 void ViewCommands::Show(CView* view) {
   // One of them may be the one that is running.
-  for (QAction* action : actions) {
-    static_cast<QWidget*>(action->parent())->removeAction(action);
-    action->deleteLater();
+  for (const Shown& command : actions) {
+    if (command.action == nullptr) continue;
+    command.menu->removeAction(command.action);
+    if (command.isOwn) command.action->deleteLater();
   }
   actions.clear();
   shown = view;
@@ -28,17 +30,23 @@ void ViewCommands::Show(CView* view) {
 
 void ViewCommands::Add(const ViewCommand& command) {
   QMenu& menu = MenuWithTitle(QString::fromStdString(command.menu));
-  auto* action = std::make_unique<QAction>(QString::fromStdString(command.text), &menu).release();
-  action->setCheckable(command.checkable);
-  action->setChecked(command.checked);
-  connect(action, &QAction::triggered, this, [this, run = command.run, view = shown] {
-    run();
-    // The commands may read otherwise now; another view may have come to the front meanwhile.
-    if (shown == view) Show(view);
-  });
+  QAction* action = command.action;
+  if (action == nullptr) {
+    action = std::make_unique<QAction>(QString::fromStdString(command.text), &menu).release();
+    action->setSeparator(command.text.empty());
+    action->setCheckable(command.checkable);
+    action->setChecked(command.checked);
+    connect(action, &QAction::triggered, this, [this, run = command.run, view = shown] {
+      run();
+      // The commands may read otherwise now; another view may have come to the front meanwhile.
+      if (shown == view) Show(view);
+    });
+  }
   const QList<QAction*> present = menu.actions();
-  menu.insertAction(present.contains(&fileEnd) ? &fileEnd : nullptr, action);
-  actions.push_back(action);
+  const auto end = std::find_if(present.begin(), present.end(),
+                                [this](QAction* each) { return ends.contains(each); });
+  menu.insertAction(end == present.end() ? nullptr : *end, action);
+  actions.push_back({&menu, action, command.action == nullptr});
 }
 
 QMenu& ViewCommands::MenuWithTitle(const QString& title) {

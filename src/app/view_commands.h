@@ -1,11 +1,13 @@
 // The commands that the view in front has for the menus of the host.
 #pragma once
 
+#include <QAction>
+#include <QList>
 #include <QObject>
+#include <QPointer>
 #include <functional>
 #include <vector>
 
-class QAction;
 class QMenu;
 class QMenuBar;
 
@@ -18,8 +20,9 @@ class ViewCommands final : public QObject {
   Q_OBJECT
 
  public:
-  /// A menu that is not in the bar yet is made before another; commands of the file menu go before an action.
-  ViewCommands(QMenuBar& menuBar, QAction& lastMenu, QAction& lastFileCommand);
+  /// A menu that is not in the bar yet is made before another. In a menu with one of the given actions the
+  /// commands go before it.
+  ViewCommands(QMenuBar& menuBar, QAction& lastMenu, QList<QAction*> lastCommands);
 
   /// Shows the commands of a view instead of the present ones; none for no view.
   void Show(CView* view);
@@ -30,9 +33,15 @@ class ViewCommands final : public QObject {
 
   QMenuBar& bar;
   QAction& last;
-  QAction& fileEnd;
+  QList<QAction*> ends;
   CView* shown = nullptr;
-  std::vector<QAction*> actions;
+  struct Shown {
+    QMenu* menu;
+    QPointer<QAction> action;  ///< the view's goes with it
+    bool isOwn;  ///< made here, not the view's
+  };
+
+  std::vector<Shown> actions;
   std::vector<QMenu*> madeMenus;
 };
 

@@ -1,15 +1,22 @@
 // Commands on the catalogues: their rows, and the values of their functions.
+#include <nlohmann/json.hpp>
 #include <optional>
 
 #include "cli/commands.h"
 #include "cli/numbers.h"
+#include "docgen/reference_pages.h"
 #include "expr/builtin_catalogue.h"
+#include "expr/builtin_reference.h"
 #include "expr/evaluate.h"
 #include "expr/function_catalogue.h"
+#include "expr/function_reference.h"
+#include "platform/ascii.h"
 
 namespace tessal::cli {
 
 namespace {
+
+using Json = nlohmann::ordered_json;
 
 /// The catalogues, set up for as long as a command needs them.
 class CatalogueUse final {
@@ -35,11 +42,123 @@ std::string BuiltinRow(const CatalogueBuiltin& row) {
   return text + '\t' + (IsDeprecatedBuiltin(row.id) ? "1" : "0");
 }
 
+Json Described(const CatalogueFunction& function) {
+  const FunctionReference& row = *ReferenceOfFunction(function.name);
+  Json arguments = Json::array();
+  for (const ArgumentReference& argument : row.arguments) {
+    arguments.push_back({{"name", argument.name}, {"meaning", argument.meaning}, {"unit", argument.unit}});
+  }
+  return {{"name", row.name},
+          {"group", GroupOfFunction(row).title},
+          {"purpose", row.purpose},
+          {"arguments", arguments},
+          {"result", {{"meaning", row.result}, {"unit", row.resultUnit}, {"range", row.range}}},
+          {"source", row.source},
+          {"formulae", FormulaeOf(row)},
+          {"deprecated", function.traits.isDeprecated}};
+}
+
+Json Described(const CatalogueBuiltin& builtin) {
+  const BuiltinReference& row = *ReferenceOfBuiltin(builtin.name);
+  return {{"name", row.name},
+          {"kind", builtin.kind},
+          {"purpose", row.purpose},
+          {"use", row.use},
+          {"unit", row.unit},
+          {"default", builtin.defaultValue},
+          {"minimum", builtin.minimum},
+          {"maximum", builtin.maximum},
+          {"deprecated", IsDeprecatedBuiltin(builtin.id)}};
+}
+
+ReferenceEntry EntryOfRow(const CatalogueFunction& function) {
+  return EntryOf(*ReferenceOfFunction(function.name));
+}
+
+ReferenceEntry EntryOfRow(const CatalogueBuiltin& builtin) {
+  return EntryOf(builtin);
+}
+
+/// One of the catalogues, as the commands that list and describe it see it.
+template <class Row>
+struct Catalogue {
+  std::string_view kind;  ///< what a row is called
+  const std::vector<Row>& (*rows)();
+  std::string (*line)(const Row& row);
+  ReferencePage (*page)();
+};
+
+constexpr Catalogue<CatalogueFunction> kFunctions{"function", Functions, FunctionRow, PageOfFunctions};
+constexpr Catalogue<CatalogueBuiltin> kBuiltins{"built-in variable", Builtins, BuiltinRow, PageOfBuiltins};
+
+/// A diagnostic that no row has the name, with the names that may have been meant.
+template <class Row>
+void ComplainOfName(const Catalogue<Row>& catalogue, const std::string& name) {
+  std::vector<std::string_view> names;
+  for (const Row& row : catalogue.rows()) names.emplace_back(row.name);
+  std::string complaint = "no " + std::string(catalogue.kind) + " '" + OnOneLine(name) + "'";
+  std::string_view separator = "; did you mean ";
+  for (const std::string_view nearest : NearestNames(name, names)) {
+    complaint += separator;
+    complaint += nearest;
+    separator = ", ";
+  }
+  Complain(complaint);
+}
+
+/// The rows that a question is about: all, or the one of a name in any case, if there is one.
+template <class Row>
+std::vector<const Row*> RowsAskedFor(const Catalogue<Row>& catalogue, const CatalogueQuestion& question) {
+  std::vector<const Row*> rows;
+  for (const Row& row : catalogue.rows()) {
+    if (!question.name || EqualIgnoringCase(row.name, *question.name)) rows.push_back(&row);
+  }
+  return rows;
+}
+
+template <class Row>
+void PrintDescriptions(const std::vector<const Row*>& rows, Format format) {
+  if (format == Format::Json) {
+    const EndsWithoutMemory end;
+    Json list = Json::array();
+    for (const Row* row : rows) list.push_back(Described(*row));
+    PrintLine(list.dump());
+    return;
+  }
+  for (const Row* row : rows) {
+    if (row != rows.front()) PrintLine("");
+    const ReferenceEntry entry = EntryOfRow(*row);
+    Print(format == Format::Markdown ? EntryMarkdown(entry)
+          : format == Format::Html   ? EntryHtml(entry)
+                                     : EntryText(entry));
+  }
+}
+
+template <class Row>
+ExitCode AnswerFrom(const Catalogue<Row>& catalogue, const CatalogueQuestion& question) {
+  const std::vector<const Row*> rows = RowsAskedFor(catalogue, question);
+  if (rows.empty()) {
+    ComplainOfName(catalogue, *question.name);
+    return kContentFault;
+  }
+  const bool isPage =
+      !question.name && (question.format == Format::Markdown || question.format == Format::Html);
+  if (!question.describe) {
+    for (const Row* row : rows) PrintLine(catalogue.line(*row));
+  } else if (isPage) {
+    const ReferencePage page = catalogue.page();
+    Print(question.format == Format::Html ? PageHtml(page) : PageMarkdown(page));
+  } else {
+    PrintDescriptions(rows, question.format);
+  }
+  return kFine;
+}
+
 /// Calls the evaluator of a row; nothing, with a diagnostic, when that cannot be done.
 std::optional<double> CallRow(const std::string& name, const std::vector<double>& values) {
   const CatalogueFunction* function = FindFunction(name);
   if (function == nullptr) {
-    Complain("no function '" + name + "'");
+    ComplainOfName(kFunctions, name);
     return std::nullopt;
   }
   if (function->argumentCount != static_cast<std::int32_t>(values.size())) {
@@ -77,21 +196,12 @@ std::optional<std::vector<double>> ValuesOrComplain(const std::vector<std::strin
 
 }  // namespace
 
-ExitCode RunFunctions() {
-  for (const CatalogueFunction& function : Functions()) PrintLine(FunctionRow(function));
-  return kFine;
+ExitCode RunFunctions(const CatalogueQuestion& question) {
+  return AnswerFrom(kFunctions, question);
 }
 
-ExitCode RunFunction(const std::string& name) {
-  const CatalogueFunction* function = FindFunction(name);
-  if (function == nullptr) return kContentFault;
-  PrintLine(FunctionRow(*function));
-  return kFine;
-}
-
-ExitCode RunBuiltins() {
-  for (const CatalogueBuiltin& row : Builtins()) PrintLine(BuiltinRow(row));
-  return kFine;
+ExitCode RunBuiltins(const CatalogueQuestion& question) {
+  return AnswerFrom(kBuiltins, question);
 }
 
 ExitCode RunEval(const std::string& name, const std::vector<std::string>& values) {

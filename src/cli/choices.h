@@ -43,6 +43,14 @@ inline constexpr std::array<Choice<int>, 4> kLevels = {{
     {"fatal", 4},
 }};
 
+/// What descriptions are printed in.
+inline constexpr std::array<Choice<Format>, 4> kDescriptionFormats = {{
+    {"text", Format::Text},
+    {"json", Format::Json},
+    {"markdown", Format::Markdown},
+    {"html", Format::Html},
+}};
+
 /// What a word means; nothing for a word that is no choice.
 template <class Value>
 std::optional<Value> ValueOf(Choices<Value> choices, std::string_view word) {

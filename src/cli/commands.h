@@ -1,6 +1,7 @@
 // The commands of the tool. Each prints its result and returns how it ended.
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -9,7 +10,7 @@
 
 namespace tessal::cli {
 
-enum class Format { Text, Json, Sarif };
+enum class Format { Text, Json, Sarif, Markdown, Html };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
@@ -78,14 +79,20 @@ struct ExpressionCall {
 ExitCode RunTokens(const ExpressionCall& call);
 ExitCode RunParse(const ExpressionCall& call);
 ExitCode RunMathml(const ExpressionCall& call);
+ExitCode RunLatex(const ExpressionCall& call);
 ExitCode RunRewrite(const ExpressionCall& call);
 ExitCode RunExpressionCheck(const ExpressionCall& call);
 ExitCode RunIdentifiers(const ExpressionCall& call);
 
 // Catalogues.
-ExitCode RunFunctions();
-ExitCode RunFunction(const std::string& name);
-ExitCode RunBuiltins();
+/// The rows of a catalogue, or what they mean in words; all of them, or the one of a name.
+struct CatalogueQuestion {
+  std::optional<std::string> name;
+  bool describe = false;
+  Format format = Format::Text;  ///< of what they mean
+};
+ExitCode RunFunctions(const CatalogueQuestion& question);
+ExitCode RunBuiltins(const CatalogueQuestion& question);
 ExitCode RunEval(const std::string& name, const std::vector<std::string>& values);
 ExitCode RunCall(const std::string& name, const std::vector<std::string>& values,
                  const std::vector<std::string>& settings);

@@ -2,6 +2,8 @@
 
 #include <string_view>
 
+#include "docgen/safe_text.h"
+
 namespace tessal::cli {
 
 namespace {
@@ -13,17 +15,6 @@ constexpr std::string_view kPageStart =
     "the places of its values. `tessal explain CODE` prints the same, and `tessal check --format json` "
     "names\n"
     "the code of each message.\n";
-
-/// A text in which Markdown finds no markup.
-std::string MarkdownText(std::string_view text) {
-  constexpr std::string_view kMarks = "\\`*<";
-  std::string escaped;
-  for (const char character : text) {
-    if (kMarks.find(character) != std::string_view::npos) escaped += '\\';
-    escaped += character;
-  }
-  return escaped;
-}
 
 }  // namespace
 

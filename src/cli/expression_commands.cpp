@@ -7,6 +7,7 @@
 #include "cli/commands.h"
 #include "cli/tree_json.h"
 #include "core/error_registry.h"
+#include "docgen/latex.h"
 #include "docgen/mathml.h"
 #include "expr/expression_node.h"
 #include "expr/identifiers.h"
@@ -121,6 +122,17 @@ Answer Findings(const std::string& expression) {
   return answer;
 }
 
+/// The expression as an equation, by what makes one of an expression, a symbol and whether the left side is a
+/// derivative. Nothing for an expression that does not parse.
+ExitCode AskForEquation(const ExpressionCall& call,
+                        std::string (*equationOf)(const std::string&, const std::string&, bool)) {
+  return Ask(call, [&call, equationOf](const std::string& expression) {
+    Answer answer{equationOf(expression, call.symbol, call.isDerivative), kFine};
+    if (answer.text.empty()) answer.exitCode = kContentFault;
+    return answer;
+  });
+}
+
 }  // namespace
 
 ExitCode RunTokens(const ExpressionCall& call) {
@@ -132,11 +144,11 @@ ExitCode RunParse(const ExpressionCall& call) {
 }
 
 ExitCode RunMathml(const ExpressionCall& call) {
-  return Ask(call, [&call](const std::string& expression) {
-    Answer answer{ExpressionToMathML(expression, call.symbol, call.isDerivative), kFine};
-    if (answer.text.empty()) answer.exitCode = kContentFault;
-    return answer;
-  });
+  return AskForEquation(call, ExpressionToMathML);
+}
+
+ExitCode RunLatex(const ExpressionCall& call) {
+  return AskForEquation(call, ExpressionToLatex);
 }
 
 ExitCode RunRewrite(const ExpressionCall& call) {

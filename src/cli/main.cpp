@@ -76,7 +76,7 @@ CLI::Option* AddForce(CLI::App& command, bool& force) {
 
 /// An option that takes one of a few words.
 template <class Value>
-void AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
+CLI::Option* AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
                Value& chosen) {
   const auto read = [&chosen, name, choices](const std::string& word) {
     const std::optional<Value> value = ValueOf(choices, word);
@@ -84,11 +84,11 @@ void AddChoice(CLI::App& command, const char* name, const char* typeName, Choice
       throw CLI::ValidationError(name, "'" + ShownNumber(word) + "' is none of " + WordsOf(choices));
     chosen = *value;
   };
-  command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
+  return command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
 }
 
-void AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
-  AddChoice(command, "--format", "FORMAT", formats, line.format);
+CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
+  return AddChoice(command, "--format", "FORMAT", formats, line.format);
 }
 
 /// The level that a word or a number names. Numbers are read here, as the option parser does not know those
@@ -225,6 +225,7 @@ void AddExpressionCommands(CLI::App& app, CommandLine& line) {
       {"tokens", "lists the tokens", RunTokens},
       {"parse", "prints the tree", RunParse},
       {"mathml", "prints the MathML block", RunMathml},
+      {"latex", "prints LaTeX", RunLatex},
       {"rewrite", "prints the engine's form", RunRewrite},
       {"check", "lists the findings", RunExpressionCheck},
       {"identifiers", "lists the identifiers", RunIdentifiers},
@@ -240,23 +241,33 @@ void AddExpressionCommands(CLI::App& app, CommandLine& line) {
     command->parse_complete_callback([&line, text] {
       if (!line.expression.eachLine && text->count() == 0) throw CLI::RequiredError("EXPR");
     });
-    if (row.run == RunMathml) {
+    if (row.run == RunMathml || row.run == RunLatex) {
       command->add_option("--symbol", line.expression.symbol, "the left side")->type_name("SYMBOL");
       command->add_flag("--derivative", line.expression.isDerivative, "the left side is a time derivative");
     }
   }
 }
 
-void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
-  CLI::App* functions = app.add_subcommand("functions", "lists the function catalogue")->group(kCatalogues);
-  const CLI::Option* one = functions->add_option("NAME", line.name, "one function");
-  functions->callback([&line, one] {
-    // An empty name is a name too, and no function's.
+void AddCatalogue(CLI::App& app, CommandLine& line, const char* name, const char* description,
+                  ExitCode (*run)(const CatalogueQuestion&)) {
+  CLI::App* catalogue = app.add_subcommand(name, description)->group(kCatalogues);
+  const CLI::Option* one = catalogue->add_option("NAME", line.name, "one of them");
+  CLI::Option* describe = catalogue->add_flag("--describe", line.asPage, "says what they mean");
+  AddFormat(*catalogue, line, kDescriptionFormats)->needs(describe);
+  catalogue->callback([&line, one, run] {
+    // An empty name is a name too, and no row's.
     const bool asksForOne = one->count() > 0;
-    line.run = [&line, asksForOne] { return asksForOne ? RunFunction(line.name) : RunFunctions(); };
+    line.run = [&line, asksForOne, run] {
+      CatalogueQuestion question{std::nullopt, line.asPage, line.format};
+      if (asksForOne) question.name = line.name;
+      return run(question);
+    };
   });
-  AddCommand(app, line, kCatalogues, "builtins", "lists the built-in variables",
-             [] { return RunBuiltins(); });
+}
+
+void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
+  AddCatalogue(app, line, "functions", "lists the function catalogue", RunFunctions);
+  AddCatalogue(app, line, "builtins", "lists the built-in variables", RunBuiltins);
 
   CLI::App* eval = AddCommand(app, line, kCatalogues, "eval", "computes a plain function",
                               [&line] { return RunEval(line.name, line.values); });

@@ -108,6 +108,36 @@ inline CEL_Lagrange_Specie& ClassOf(const Collections& collections, const Symbol
   return At(collections.species, static_cast<std::size_t>(record.specieIndex));
 }
 
+/// Where a list of elements is: a collection of the template or, for a class, a list of its members.
+struct ListPlace {
+  ElementKind kind = ElementKind::None;
+  CEL_Lagrange_Specie* specie = nullptr;  ///< none for the template's own collections
+};
+
+/// Calls the operation with the sequence at the place; false where there is none.
+template <class Operation>
+bool WithList(Collections& collections, const ListPlace& place, Operation operation) {
+  if (place.specie == nullptr) {
+    return WithCollection(
+        place.kind, [&collections, &operation](const auto& row) { operation(collections.*row.elements); });
+  }
+  return WithMemberList(place.kind,
+                        [&place, &operation](const auto& list) { operation(place.specie->*list.members); });
+}
+
+/// Moves the element at a place so that it is at another one when the move is done.
+template <class Element>
+void MoveWithinSequence(Sequence<Element>& elements, std::size_t from, std::size_t to) {
+  const auto at = [&elements](std::size_t place) {
+    return elements.begin() + static_cast<std::ptrdiff_t>(place);
+  };
+  if (to <= from) {
+    std::rotate(at(to), at(from), at(from + 1));
+  } else {
+    std::rotate(at(from), at(from + 1), at(to + 1));
+  }
+}
+
 template <class Visitor>
 void ForEachSearchFunction(const Collections& collections, Visitor visit) {
   for (const auto& specie : collections.species) {

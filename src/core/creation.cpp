@@ -66,6 +66,7 @@ void GiveDefaultTexts(CEL_Element& element, const std::string& symbol, std::stri
 }  // namespace
 
 CreatedElement TemplateCore::CreateElement(const CreateRequest& request) {
+  const EditStep step(history);
   // Off through the defaults below, and on after them, whatever it was before.
   SetNotifyChanges(false);
   CreatedElement created;

@@ -6,22 +6,22 @@
 
 namespace tessal {
 
+std::optional<Finding> OrderViolation(const SymbolRecord& user, const SymbolRecord& used) {
+  const std::string_view symbol = used.element->symbol.Text();
+  if (user.kind == ElementKind::StateVariable) {
+    if (used.kind == ElementKind::Process) return std::nullopt;
+    return Finding("not-a-process", {symbol});
+  }
+  if (used.sequence <= static_cast<std::uint32_t>(user.element->id.IntValue())) return std::nullopt;
+  return Finding("order-violated", {symbol, RecordSymbol(user)});
+}
+
 bool CheckRecordOrder(const SymbolTable& table, const SymbolRecord& record) {
-  const CEL_Element& user = *record.element;
-  const bool isEquation = record.kind == ElementKind::StateVariable;
   bool good = true;
   for (const std::uint32_t sequence : record.references) {
-    const SymbolRecord& usedRecord = table.Used(sequence);
-    const bool isFine = isEquation ? usedRecord.kind == ElementKind::Process
-                                   : sequence <= static_cast<std::uint32_t>(user.id.IntValue());
-    if (isFine) continue;
-    const CEL_Element& used = *usedRecord.element;
-    if (isEquation) {
-      Errors().Report(RecordSymbol(record), user.GetUid(), {"not-a-process", {used.symbol.Text()}});
-    } else {
-      const std::string symbol = RecordSymbol(record);
-      Errors().Report(symbol, user.GetUid(), {"order-violated", {used.symbol.Text(), symbol}});
-    }
+    const std::optional<Finding> violation = OrderViolation(record, table.Used(sequence));
+    if (!violation) continue;
+    Errors().Report(RecordSymbol(record), record.uid, *violation);
     good = false;
   }
   return good;

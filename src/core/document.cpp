@@ -48,6 +48,7 @@ void AppendRows(const SymbolChange& change, std::vector<DocumentDifference>& row
 
 bool CTessalDoc::OnNewDocument() {
   core.SetModified(false);
+  core.History().Start();
   SetNotifyChanges(true);
   return true;
 }
@@ -71,6 +72,9 @@ bool CTessalDoc::Open(const std::string& source, const std::string& path) {
   } else {
     dialogs.ShowMessage(FailureText("load", source));
   }
+  core.History().Start();
+  // A copy is not what the file holds.
+  if (source != path) core.History().ForgetSaved();
   // From here on changes of values reach their listeners.
   SetNotifyChanges(true);
   return loaded;
@@ -135,6 +139,26 @@ DocumentComparison CTessalDoc::CompareWithFile(const std::string& path) const {
   DocumentComparison comparison;
   for (const SymbolChange& change : CompareBySymbol(file, core)) AppendRows(change, comparison.differences);
   return comparison;
+}
+
+std::optional<StepEffect> CTessalDoc::Undo() {
+  std::optional<StepEffect> effect = core.Undo();
+  if (effect) FollowMark();
+  return effect;
+}
+
+std::optional<StepEffect> CTessalDoc::Redo() {
+  std::optional<StepEffect> effect = core.Redo();
+  if (effect) FollowMark();
+  return effect;
+}
+
+void CTessalDoc::FollowMark() {
+  if (core.Modified()) return SetModifiedFlag(true);
+  CDocument::SetModifiedFlag(false);
+  const std::size_t mark = Title().rfind(kModifiedMark);
+  if (mark != std::string::npos) SetTitle(Title().substr(0, mark));
+  for (CView* view : Views()) view->UpdateFrameTitle();
 }
 
 void CTessalDoc::SetModifiedFlag(bool flag) {

@@ -27,6 +27,8 @@ inline constexpr int kAddGroup = 11;
 inline constexpr int kDeleteGroup = 12;
 inline constexpr int kSelectGroup = 13;
 inline constexpr int kRenameGroup = 14;
+/// Several elements have come, gone or moved at once.
+inline constexpr int kStructure = 15;
 }  // namespace hint
 
 /// A hint whose argument is a number: an element's identity, a group's place, or a switch.
@@ -72,6 +74,10 @@ class CTessalDoc final : public CDocument {
   std::optional<std::string> Copy(std::string& reason) override;
   bool OnOpenCopy(const std::string& source, const std::string& path) override;
   DocumentComparison CompareWithFile(const std::string& path) const override;
+  /// Takes the last step of the template back, or does the next one again, with the mark of the document; none
+  /// when there is no step.
+  std::optional<StepEffect> Undo();
+  std::optional<StepEffect> Redo();
   /// Marks the title too. The mark is taken off by the title that a save gives.
   void SetModifiedFlag(bool flag) override;
 
@@ -90,6 +96,8 @@ class CTessalDoc final : public CDocument {
   bool Open(const std::string& source, const std::string& path);
   /// The file of that path holds what a copy of the work in it does not: a save that replaces it must ask.
   void NoteLossesOf(const std::string& path);
+  /// Takes the mark off, or puts it on, after a step.
+  void FollowMark();
   /// Whether the file may lose what the load did not take over.
   bool MayLose(const std::string& path);
 

@@ -27,17 +27,10 @@ bool AreSiblings(const SymbolRecord& one, const SymbolRecord& other) {
   return !IsParticleKind(elementKind) || one.specieIndex == other.specieIndex;
 }
 
-/// Calls the operation with the sequence that holds the record's element; false for a kind without one.
-template <class Operation>
-bool WithSequenceOf(Collections& collections, const SymbolRecord& record, Operation operation) {
+/// The list that holds the record's element.
+ListPlace ListOf(const Collections& collections, const SymbolRecord& record) {
   const ElementKind elementKind = record.element->Kind();
-  if (!IsParticleKind(elementKind)) {
-    return WithCollection(
-        elementKind, [&collections, &operation](const auto& row) { operation(collections.*row.elements); });
-  }
-  CEL_Lagrange_Specie& specie = ClassOf(collections, record);
-  return WithMemberList(elementKind,
-                        [&specie, &operation](const auto& list) { operation(specie.*list.members); });
+  return {elementKind, IsParticleKind(elementKind) ? &ClassOf(collections, record) : nullptr};
 }
 
 }  // namespace
@@ -48,6 +41,7 @@ Element& TemplateCore::Add(const Collection<Element>& row) {
   Element& element =
       AppendElement(row, FirstFreeName(row.symbolPrefix, number,
                                        [this](const std::string& symbol) { return SymbolExists(symbol); }));
+  history.NoteInserted({row.kind, nullptr}, number - 1, element);
   element.documentation.SetText(state.root.documentation.Text());
   RebuildSymbolTable();
   return element;
@@ -103,6 +97,7 @@ bool TemplateCore::CanDelete(Uid uid) const {
 bool TemplateCore::DeleteElement(Uid uid) {
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr) return false;
+  const EditStep step(history);
   // First, so that an element whose deletion is refused has left its groups all the same.
   if (state.hasMisc) VisibilityGroups(state).Leave(*record->element);
   const ElementKind elementKind = record->element->Kind();
@@ -117,14 +112,31 @@ bool TemplateCore::DeleteElement(Uid uid) {
   return true;
 }
 
+std::vector<Uid> TemplateCore::DeleteElements(std::vector<Uid> uids) {
+  const EditStep step(history);
+  // A use comes after its definition: the last go first, and one round is the rule.
+  for (std::size_t before = uids.size() + 1; uids.size() < before;) {
+    before = uids.size();
+    for (auto uid = uids.rbegin(); uid != uids.rend(); ++uid) {
+      if (CanDelete(*uid) && DeleteElement(*uid)) *uid = Uid::None;
+    }
+    std::erase(uids, Uid::None);
+  }
+  return uids;
+}
+
 bool TemplateCore::EraseElement(const SymbolRecord& record) {
   const std::size_t index = record.index;
   const ElementKind elementKind = record.element->Kind();
   // A class keeps its last horizontal movement.
   if (elementKind == ElementKind::HorizontalVector && !CanDelete(record.uid)) return false;
   if (elementKind == ElementKind::Specie) ForgetSpecie(Elements(), At(Species(), index).Index());
-  const bool erased = WithSequenceOf(state.collections, record, [index](auto& sequence) {
-    sequence.erase(sequence.begin() + static_cast<std::ptrdiff_t>(index));
+  const ListPlace list = ListOf(Elements(), record);
+  const bool erased = WithList(state.collections, list, [this, &list, index](auto& sequence) {
+    const auto place = sequence.begin() + static_cast<std::ptrdiff_t>(index);
+    std::unique_ptr<CEL_Element> gone = std::move(*place);
+    sequence.erase(place);
+    history.NoteRemoved(list, index, std::move(gone));
   });
   if (elementKind == ElementKind::Specie) NumberSpecies(Elements());
   return erased;
@@ -153,29 +165,27 @@ bool TemplateCore::MoveElement(Uid uid, Uid targetUid, bool before) {
   const SymbolRecord* target = FindRecordByUid(targetUid);
   if (moved == nullptr || target == nullptr || !AreSiblings(*moved, *target)) return false;
   if (moved->element->Kind() == ElementKind::VerticalEquation) return false;
-  MoveWithin(*moved, target->index + (before ? 0 : 1));
+  const EditStep step(history);
+  // The moved element makes room where it has been.
+  const std::size_t place = target->index + (before ? 0 : 1);
+  MoveWithin(*moved, moved->index < place ? place - 1 : place);
   state.flags.modified = true;
   RebuildSymbolTable();
   return true;
 }
 
-/// Moves the record's element so that it is where the one at `target` is, which makes room.
-void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t target) {
-  const std::size_t from = record.index;
-  WithSequenceOf(state.collections, record, [from, target](auto& sequence) {
-    const auto source = sequence.begin() + static_cast<std::ptrdiff_t>(from);
-    const auto place = sequence.begin() + static_cast<std::ptrdiff_t>(std::min(target, sequence.size()));
-    if (place <= source) {
-      std::rotate(place, source, source + 1);
-    } else {
-      std::rotate(source, source + 1, place);
-    }
-  });
+/// Moves the record's element so that it has the place when the move is done.
+void TemplateCore::MoveWithin(const SymbolRecord& record, std::size_t place) {
+  const ListPlace list = ListOf(Elements(), record);
+  WithList(state.collections, list,
+           [&record, place](auto& sequence) { MoveWithinSequence(sequence, record.index, place); });
+  history.NoteMoved(list, record.index, place, *record.element);
   if (record.element->Kind() == ElementKind::Specie) NumberSpecies(Elements());
 }
 
 bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
   predecessor = Uid::None;
+  const EditStep step(history);
   const SymbolRecord* record = FindRecordByUid(uid);
   if (record == nullptr || record->referencedBy.empty()) return false;
   const ElementKind elementKind = record->element->Kind();
@@ -191,7 +201,7 @@ bool TemplateCore::MoveBeforeFirstUser(Uid uid, Uid& predecessor) {
     const std::size_t place = std::min(last->index, record->index);
     MoveWithin(*record, place);
     if (place > 0) {
-      WithSequenceOf(state.collections, *record, [place, &predecessor](const auto& sequence) {
+      WithList(state.collections, ListOf(Elements(), *record), [place, &predecessor](const auto& sequence) {
         predecessor = At(sequence, place - 1).GetUid();
       });
     }

@@ -27,7 +27,7 @@ constexpr std::string_view kLoadSymbol = "LOAD ";
 /// Closes the library's file on every way out.
 class OpenFile final {
  public:
-  explicit OpenFile(const std::string& path) : handle(kvfLoadFile(path, 1)), error(kvfGetErrorGlb()) {}
+  explicit OpenFile(KvfHandle loaded) : handle(loaded), error(kvfGetErrorGlb()) {}
   OpenFile(const OpenFile&) = delete;
   OpenFile& operator=(const OpenFile&) = delete;
   ~OpenFile() { kvfClose(&handle); }
@@ -94,10 +94,14 @@ class Reading final {
   Reading(TemplateCore& target, TemplateState& targetState) : core(target), state(targetState) {}
 
   /// False when the file could not be read; the registry then holds the reason.
-  bool Load(const std::string& path);
+  bool LoadFile(const std::string& path);
+  /// The same for the text of one.
+  bool LoadText(std::string text);
 
  private:
-  bool ReadFile(const std::string& path);
+  template <class Open>
+  bool Load(const std::string& path, Open open);
+  bool Read(const OpenFile& file, const std::string& path);
   /// Reports why the reader of the item tree refuses the text, where it does.
   void CheckStrictly(bool isCut);
   /// Whether the numbers of all elements are among those of the records; one that is not gets the last of
@@ -118,8 +122,7 @@ class Reading final {
   bool isSettled = false;
 };
 
-bool Reading::ReadFile(const std::string& path) {
-  OpenFile file(path);
+bool Reading::Read(const OpenFile& file, const std::string& path) {
   if (file.Error() != kKvfOk || file.Handle() == 0) {
     ReportFailedLoad(file, path);
     return false;
@@ -231,11 +234,21 @@ void Reading::RebuildUnlessSettled() {
   core.RebuildSymbolTable();
 }
 
-bool Reading::Load(const std::string& path) {
+bool Reading::LoadFile(const std::string& path) {
+  return Load(path, [&path] { return kvfLoadFile(path, 1); });
+}
+
+bool Reading::LoadText(std::string text) {
+  return Load({}, [&text] { return kvfLoadText(std::move(text)); });
+}
+
+template <class Open>
+bool Reading::Load(const std::string& path, Open open) {
   const NotificationsOff silent;
   try {
     core.Clear();
-    if (!ReadFile(path)) return false;
+    const OpenFile file(open());
+    if (!Read(file, path)) return false;
     RebuildUnlessSettled();
     state.SettleSpatialTree();
     state.flags.strictScopeRule ? core.CheckScopeRule() : core.CheckProcessRule();
@@ -260,7 +273,11 @@ bool Reading::Load(const std::string& path) {
 
 bool TemplateCore::LoadWrapper(const std::string& path) {
   // A copy: the path may be the template's own file name, which the load empties first.
-  return Reading(*this, state).Load(std::string(path));
+  return Reading(*this, state).LoadFile(std::string(path));
+}
+
+bool TemplateCore::LoadText(std::string text) {
+  return Reading(*this, state).LoadText(std::move(text));
 }
 
 bool TemplateCore::LoadCopy(const std::string& source, const std::string& path) {

@@ -128,14 +128,19 @@ std::string ReplaceInExpression(std::string_view expression, std::string_view ol
 }
 
 std::string ReplaceName(std::string_view expression, std::string_view oldName, std::string_view newName) {
+  return ReplaceNames(expression, {{std::string(oldName), std::string(newName)}});
+}
+
+std::string ReplaceNames(std::string_view expression, const NewNames& newNames) {
   std::string result;
   const char* copied = expression.data();
-  ForEachToken(expression, [&result, &copied, oldName, newName](TokenCode code, std::string_view lexeme) {
-    if (code != TokenCode::Identifier || lexeme != oldName) return;
+  ForEachToken(expression, [&result, &copied, &newNames](TokenCode code, std::string_view lexeme) {
+    const auto found = code == TokenCode::Identifier ? newNames.find(lexeme) : newNames.end();
+    if (found == newNames.end()) return;
     result.append(copied, lexeme.data());
     // In "2a", which does not parse, a new name `e5` would become part of a number.
     if (!result.empty() && IsAsciiDigit(result.back())) result += ' ';
-    result += newName;
+    result += found->second;
     copied = lexeme.data() + lexeme.size();
   });
   return result.append(copied, expression.data() + expression.size());
@@ -182,6 +187,7 @@ bool TemplateCore::Rename(std::string_view oldSymbol, std::string_view newSymbol
   // The caller's may be a view into what is about to change.
   const std::string oldName(oldSymbol);
   const std::string newName(newSymbol);
+  const EditStep step(history);
   const bool wasModified = state.flags.modified;
   {
     // The rewrites must not change the table under the walk.

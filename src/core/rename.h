@@ -3,6 +3,8 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
+#include <map>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -30,6 +32,12 @@ std::string ReplaceInExpression(std::string_view expression, std::string_view ol
 /// Replaces a name where it is the whole of an identifier, as the language reads it: `a_1`, numbers and
 /// comments stay. What the rename looks at leaves no trace in the scanner.
 std::string ReplaceName(std::string_view expression, std::string_view oldName, std::string_view newName);
+
+/// New names by the old ones.
+using NewNames = std::map<std::string, std::string, std::less<>>;
+
+/// The same with several names at once: one may take the place of another.
+std::string ReplaceNames(std::string_view expression, const NewNames& newNames);
 
 /// A longer name, or a number, that a rename by letters would change into one that means nothing, or
 /// something else.

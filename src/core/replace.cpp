@@ -61,6 +61,7 @@ ReplacePreview PreviewReplacements(const TemplateCore& core, const FindQuery& qu
 ReplaceOutcome ApplyReplacements(TemplateCore& core, std::span<const Replacement> replacements,
                                  TextEncoding encoding) {
   ReplaceOutcome outcome;
+  const EditStep step(core.History(), "Replace in texts and expressions");
   {
     const OneRebuild oneRebuild(core);
     TextsByPlace texts(core);

@@ -208,11 +208,15 @@ bool Writing::WriteSections(KvfHandle file) {
 }  // namespace
 
 bool TemplateCore::SaveWrapper(const std::string& path) {
+  const RecordingOff unrecorded(history);
   Writing writing(state);
-  return path == state.saveFileName ? writing.SaveInPlace(path) : writing.SaveAs(path);
+  const bool isSaved = path == state.saveFileName ? writing.SaveInPlace(path) : writing.SaveAs(path);
+  if (isSaved) history.MarkSaved();
+  return isSaved;
 }
 
 std::optional<std::string> TemplateCore::CopyText(std::string& reason) {
+  const RecordingOff unrecorded(history);
   return Writing(state).CopyText(reason);
 }
 

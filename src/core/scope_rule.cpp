@@ -1,17 +1,13 @@
 #include "core/scope_rule.h"
 
-#include <optional>
-
 #include "core/error_registry.h"
 #include "core/symbol_table.h"
 #include "elements/element.h"
 
 namespace tessal {
 
-namespace {
-
-/// What does not vary in space uses nothing that does; what varies horizontally in the water column uses
-/// nothing of the water column that varies in all three dimensions.
+// What does not vary in space uses nothing that does; what varies horizontally in the water column uses
+// nothing of the water column that varies in all three dimensions.
 std::optional<Message> ScopeRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
   if (user.kind >= ElementKind::Specie) return std::nullopt;
   const bool bothInColumn = user.scope == Scope::WaterColumn && used.scope == Scope::WaterColumn;
@@ -23,7 +19,6 @@ std::optional<Message> ScopeRuleViolation(const SymbolRecord& user, const Symbol
   return violated ? std::optional(kViolated) : std::nullopt;
 }
 
-/// What a use violates of the process rule; nothing when it is allowed.
 std::optional<Message> ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used) {
   constexpr std::optional<Message> kAllowed;
   constexpr Message kNoProcess = "no-process-by-rule";
@@ -46,6 +41,8 @@ std::optional<Message> ProcessRuleViolation(const SymbolRecord& user, const Symb
       return kAllowed;
   }
 }
+
+namespace {
 
 /// Reports what the rule finds in any use of the table.
 template <class Rule>

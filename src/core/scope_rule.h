@@ -3,9 +3,19 @@
 // when there is nothing.
 #pragma once
 
+#include <optional>
+
+#include "core/messages.h"
+
 namespace tessal {
 
 class SymbolTable;
+struct SymbolRecord;
+
+/// What one use violates of a rule; nothing when it is allowed. The message has the symbol used for its
+/// value.
+std::optional<Message> ScopeRuleViolation(const SymbolRecord& user, const SymbolRecord& used);
+std::optional<Message> ProcessRuleViolation(const SymbolRecord& user, const SymbolRecord& used);
 
 bool CheckScopeRule(const SymbolTable& table);
 bool CheckProcessRule(const SymbolTable& table);

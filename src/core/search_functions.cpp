@@ -70,9 +70,8 @@ class SearchChoices final {
     }
   }
 
-  /// Offers to a search of the class of that number, to which it belongs from now on.
+  /// Offers to a search of the class of that number.
   void OfferTo(CEL_Lagrange_Spatial_Function& function, std::int32_t specie) const {
-    function.specieId.SetInt(specie);
     owners.OfferTo(function.specieId);
     lookedFor.OfferTo(function.lookFor);
     ValuesFor(function, specie).OfferTo(function.variableId);
@@ -164,6 +163,13 @@ bool NeedSpatialTree(const Collections& collections) {
 }
 
 void OfferSearchChoices(const Collections& collections) {
+  for (const auto& specie : collections.species) {
+    for (const auto& function : specie->spatialFunctions) function->specieId.SetInt(specie->Index());
+  }
+  FillSearchChoices(collections);
+}
+
+void FillSearchChoices(const Collections& collections) {
   const SearchChoices choices(collections);
   for (const auto& specie : collections.species) {
     for (const auto& function : specie->spatialFunctions) choices.OfferTo(*function, specie->Index());

@@ -23,6 +23,8 @@ void ForgetSpecie(const Collections& collections, std::int32_t number);
 /// Fills the choice lists of all searches from the present classes and their values, and gives each search to
 /// the class that holds it.
 void OfferSearchChoices(const Collections& collections);
+/// The same without a change of any value.
+void FillSearchChoices(const Collections& collections);
 /// Whether a search looks at particles, and so needs the spatial tree.
 bool NeedSpatialTree(const Collections& collections);
 

@@ -56,6 +56,10 @@ std::string RecordSymbol(const SymbolRecord& record);
 /// The expression of a record, the number of an input as text, or the name that a search looks for.
 std::string RecordText(const SymbolRecord& record);
 
+/// Whether a name that no element has means something all the same: a word of the language, a function, or a
+/// user function of the settings.
+bool CountsAsDefined(std::string_view name, const CEL_Miscanellous& settings);
+
 class SymbolTable final {
  public:
   const std::vector<SymbolRecord>& Records() const { return records; }
@@ -66,6 +70,8 @@ class SymbolTable final {
   /// Numbers the elements, makes the records and finds who uses whom. Reports nothing. The public names of
   /// the settings' user functions count as defined.
   void Rebuild(const Collections& collections, const CEL_Miscanellous& settings);
+  /// The same where the links of searches, which are numbers, are those of the numbers to come.
+  void RebuildUnderLinks(const Collections& collections, const CEL_Miscanellous& settings);
 
   // Finding; none when there is no such record. The sizes are those of hand-written templates: the searches
   // are linear, and no index is kept between rebuilds.

@@ -30,11 +30,26 @@ class SymbolTable::RebuildSteps final {
         settings(misc) {}
 
   void Run() {
-    MarkUndefinedStale();
     ResolveReferencesToNames(collections);
+    Number();
+    Finish();
+  }
+
+  void RunUnderLinks() {
+    Number();
+    ResolveReferencesToNames(collections);
+    Finish();
+  }
+
+ private:
+  void Number() {
     records.clear();
     NumberTemplateElements();
     NumberParticleElements();
+  }
+
+  void Finish() {
+    MarkUndefinedStale();
     ExtractReferences();
     BuildReverseReferences();
     ClassifyArithmeticExpressions();
@@ -42,7 +57,6 @@ class SymbolTable::RebuildSteps final {
     std::erase_if(undefined, [](const auto& name) { return name->stale; });
   }
 
- private:
   /// What a name means: 0 before anybody asked, the number of its record, or one of the two kinds after them.
   using Meaning = std::uint32_t;
   Meaning DefinedElsewhere() const { return static_cast<Meaning>(records.size() + 1); }
@@ -63,7 +77,6 @@ class SymbolTable::RebuildSteps final {
   void Refer(const SymbolRecord& record, NameNumber name);
   Meaning MeaningOf(NameNumber name);
   Meaning MeaningOfUnknown(std::string_view name);
-  bool CountsAsDefined(std::string_view name) const;
   void BuildReverseReferences();
   void ClassifyArithmeticExpressions();
 
@@ -86,6 +99,10 @@ class SymbolTable::RebuildSteps final {
 
 void SymbolTable::Rebuild(const Collections& collections, const CEL_Miscanellous& settings) {
   RebuildSteps(*this, collections, settings).Run();
+}
+
+void SymbolTable::RebuildUnderLinks(const Collections& collections, const CEL_Miscanellous& settings) {
+  RebuildSteps(*this, collections, settings).RunUnderLinks();
 }
 
 void SymbolTable::RebuildSteps::MarkUndefinedStale() {
@@ -302,7 +319,7 @@ SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOf(NameNumb
 /// Of a name that no record has.
 SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOfUnknown(std::string_view name) {
   // One that was undefined may have become a reserved one since: a user function has taken it.
-  if (CountsAsDefined(name)) return DefinedElsewhere();
+  if (CountsAsDefined(name, settings)) return DefinedElsewhere();
   const auto known = undefinedByName.find(name);
   if (known != undefinedByName.end()) {
     undefined[known->second]->stale = false;
@@ -314,7 +331,7 @@ SymbolTable::RebuildSteps::Meaning SymbolTable::RebuildSteps::MeaningOfUnknown(s
   return FirstUndefined() + static_cast<Meaning>(undefined.size() - 1);
 }
 
-bool SymbolTable::RebuildSteps::CountsAsDefined(std::string_view name) const {
+bool CountsAsDefined(std::string_view name, const CEL_Miscanellous& settings) {
   if (IsReservedName(name) || IsPropertyName(name)) return true;
   const auto& functions = settings.ExternalFunctions();
   return std::any_of(functions.begin(), functions.end(),

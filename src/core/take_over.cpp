@@ -28,8 +28,12 @@ std::unordered_map<Uid, CEL_Element*> ElementsOfFile(TemplateState& state) {
 }  // namespace
 
 bool TemplateCore::TakeOverPassedOver() {
+  const CEL_Visibility& visibilities = state.misc.Visibilities();
+  TakenOver before{visibilities.groups, visibilities.groupsPassedOver, state.account};
   const std::vector<AccountEntry> entries = state.account.TakePassedOver();
   if (!entries.empty()) {
+    const EditStep step(history);
+    history.Note(TakeOverEdit{std::make_unique<TakenOver>(std::move(before))});
     // As in a load, a value changes nothing but itself.
     const NotificationsOff silent;
     const auto elements = ElementsOfFile(state);

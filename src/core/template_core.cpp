@@ -36,6 +36,7 @@ void TemplateState::SettleSpatialTree() {
 
 TemplateCore::TemplateCore() {
   InitCatalogues();
+  state.history = &history;
   for (std::size_t place = 0; place < state.listHeads.size(); ++place) {
     const ElementKind listKind = KindAfter(ElementKind::StateVariableList, place);
     state.listHeads[place] = std::make_unique<CEL_ListHead>(listKind, KindText(listKind));
@@ -49,11 +50,13 @@ TemplateCore::TemplateCore() {
 }
 
 TemplateCore::~TemplateCore() {
+  history.Stop();
   ForEachCollection([this](const auto& row) { (state.collections.*row.elements).clear(); });
   ReleaseCatalogues();
 }
 
 void TemplateCore::Clear() {
+  history.Stop();
   state.templateFileName.clear();
   state.saveFileName.clear();
   state.root.ClearTexts();
@@ -94,6 +97,7 @@ std::size_t TemplateCore::CountNamedElements() const {
 }
 
 void TemplateCore::SetShowAllBuiltIns(bool value) {
+  if (state.flags.showAllBuiltIns != value) history.Note(BuiltInsEdit{state.flags.showAllBuiltIns});
   state.flags.showAllBuiltIns = value;
   for (const auto& constant : Constants()) constant->RebuildBuiltInChoices(value);
   for (const auto& forcing : Forcings()) forcing->RebuildBuiltInChoices(value);

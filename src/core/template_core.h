@@ -15,6 +15,7 @@
 
 #include "core/collections.h"
 #include "core/creation.h"
+#include "core/edit_history.h"
 #include "core/symbol_table.h"
 #include "core/template_state.h"
 #include "elements/element_owner.h"
@@ -74,6 +75,10 @@ class TemplateCore final : public ElementOwner {
   const TemplateState::ListHeads& ListHeads() const { return state.listHeads; }
 
   const std::vector<SymbolRecord>& SymbolTable() const { return state.table.Records(); }
+  /// Whether a name that no element has means something all the same.
+  bool CountsAsDefined(std::string_view name) const { return tessal::CountsAsDefined(name, state.misc); }
+  /// Whether several elements have the same symbol.
+  bool HasSharedSymbols() const { return state.table.HasSharedSymbols(); }
   const std::vector<std::unique_ptr<UndefinedSymbol>>& UndefinedSymbols() const {
     return state.table.Undefined();
   }
@@ -144,6 +149,9 @@ class TemplateCore final : public ElementOwner {
   bool CanDelete(Uid uid) const;
   /// Deletes an element that nobody uses. One that is refused has left its visibility groups all the same.
   bool DeleteElement(Uid uid);
+  /// Deletes several, as one step, each as soon as nobody uses it any more; those that stay are as they were. The
+  /// ones that were not deleted.
+  std::vector<Uid> DeleteElements(std::vector<Uid> uids);
   /// Whether a move keeps every use after its definition. Only auxiliaries, processes and arithmetic
   /// expressions can be refused.
   bool CanMove(Uid uid, Uid targetUid) const;
@@ -170,11 +178,21 @@ class TemplateCore final : public ElementOwner {
   /// The same with any of the ways to rewrite the uses.
   bool Rename(std::string_view oldSymbol, std::string_view newSymbol, Rewriting rewriting);
 
+  // Taking back. Off until the history is started.
+  EditHistory& History() { return history; }
+  /// Takes the last step back, or does the next one again, and brings up to date what follows; none when there
+  /// is no step. The template counts as modified unless the file holds it as it is then.
+  std::optional<StepEffect> Undo();
+  std::optional<StepEffect> Redo();
+
   // The structural pass and the check pass.
   /// Numbers the elements, makes the symbol table and finds who uses whom. Reports nothing.
   void RebuildSymbolTable() override;
   /// Adds what it finds to the error registry; true when nothing was found.
   bool ValidateTemplate();
+  /// What the rules of order, place and class find in a use of one element by another's expression; nothing
+  /// when it is allowed. Reports nothing.
+  std::optional<Finding> FindUseFault(const SymbolRecord& user, const SymbolRecord& used) const;
   bool CheckElementOrder(Uid uid) const;
   bool CheckDeclarationOrder() const;
   bool CheckScopeRule() const;
@@ -214,6 +232,11 @@ class TemplateCore final : public ElementOwner {
   std::string LevelText(std::int32_t group, std::int32_t level) const;
   std::string LevelListText(std::int32_t group, std::int32_t level) const;
 
+  // What elements report to their template.
+  void OnChanging(CEL_Element& element, CEL_Property& property) override;
+  void OnAppended(CEL_Element& element) override;
+  void OnRemoved(std::unique_ptr<CEL_Element> element, std::size_t place) override;
+
   // What elements ask of their template.
   std::vector<const CEL_Element*> ReferencedElements(const CEL_Element& element) const override;
   std::size_t SpecieCount() const override { return Species().size(); }
@@ -223,6 +246,8 @@ class TemplateCore final : public ElementOwner {
   /// Loads a file in the place of the present template. False when it could not be read; the registry then
   /// holds the reason.
   bool LoadWrapper(const std::string& path);
+  /// Loads the text of a file that has no name.
+  bool LoadText(std::string text);
   /// Loads the content of one file as that of another, which a plain save then replaces; of none where `path`
   /// is empty. Fails as a load does.
   bool LoadCopy(const std::string& source, const std::string& path);
@@ -247,10 +272,14 @@ class TemplateCore final : public ElementOwner {
   Element& Add(const Collection<Element>& collection);
   void Adopt(CEL_Element& element, CEL_Element& parent);
   bool EraseElement(const SymbolRecord& record);
-  void MoveWithin(const SymbolRecord& record, std::size_t target);
+  void MoveWithin(const SymbolRecord& record, std::size_t place);
   CreationOffer OfferFor(const UndefinedSymbol& undefined) const;
 
+  StepEffect Take(StepEffect (EditHistory::*step)());
+  void FollowStep(const StepEffect& effect);
+
   TemplateState state;
+  EditHistory history{state};
 };
 
 template <class Element>

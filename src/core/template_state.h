@@ -23,6 +23,8 @@ struct TemplateFlags {
   bool strictScopeRule = true;  ///< the scope rule; otherwise the process rule
 };
 
+class EditHistory;
+
 struct TemplateState {
   static constexpr std::size_t kListHeadCount = 6;
   using ListHeads = std::array<std::unique_ptr<CEL_ListHead>, kListHeadCount>;
@@ -50,6 +52,7 @@ struct TemplateState {
   mutable std::unique_ptr<CKvfItemTree> keptTree;  ///< of the source; none before somebody asks
   LoadAccount account;                             ///< what the load did not take over
   std::uint32_t groupCounter = 0;
+  EditHistory* history = nullptr;  ///< where edits are recorded
   std::string templateFileName;
   std::string saveFileName;
 };

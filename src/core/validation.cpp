@@ -88,6 +88,15 @@ bool TemplateCore::ParseAllExpressions() {
   return ParseAll(Species()) && good;
 }
 
+std::optional<Finding> TemplateCore::FindUseFault(const SymbolRecord& user, const SymbolRecord& used) const {
+  if (user.kind > ElementKind::Specie)
+    return ClassOf(Elements(), user).FindUseFault(*user.element, *used.element);
+  if (auto fault = OrderViolation(user, used)) return fault;
+  const auto message =
+      state.flags.strictScopeRule ? ScopeRuleViolation(user, used) : ProcessRuleViolation(user, used);
+  return message ? std::optional(Finding(*message, {RecordSymbol(used)})) : std::nullopt;
+}
+
 bool TemplateCore::CheckElementOrder(Uid uid) const {
   const SymbolRecord* record = FindRecordByUid(uid);
   return record == nullptr || CheckRecordOrder(state.table, *record);

@@ -5,6 +5,7 @@
 #include <unordered_map>
 #include <utility>
 
+#include "core/edit_history.h"
 #include "core/template_core.h"
 #include "elements/free_name.h"
 
@@ -130,19 +131,32 @@ void VisibilityGroups::TakeOverPassedOver() {
   EnterElements();
 }
 
+void VisibilityGroups::Reenter() {
+  state.table.ForEachElement([](const SymbolRecord& record) { record.element->ClearVisibility(); });
+  EnterElements();
+}
+
 void VisibilityGroups::Leave(CEL_Element& element) {
-  for (VisibilityGroup& group : Groups()) {
-    for (VisibilityLevel& level : group.levels) level.items.erase(element.GetUid());
+  std::int32_t group = 0;
+  for (VisibilityGroup& each : Groups()) {
+    ++group;
+    std::int32_t number = 0;
+    for (VisibilityLevel& level : each.levels) {
+      ++number;
+      if (level.items.erase(element.GetUid()) == 0) continue;
+      state.history->Note(MembershipEdit{group, number, element.GetUid()});
+    }
   }
   const auto memberships = element.Visibility();
   if (memberships.empty()) return;
-  for (const auto& [group, level] : memberships) element.RemoveVisibility(group, level);
+  for (const auto& [itsGroup, level] : memberships) element.RemoveVisibility(itsGroup, level);
   state.flags.modified = true;
 }
 
 std::int32_t VisibilityGroups::AddGroup() {
   if (!state.hasMisc) return 0;
   auto& groups = Groups();
+  const std::uint32_t formerCounter = state.groupCounter;
   const auto nameOf = [](std::uint32_t number) { return "Group_" + std::to_string(number); };
   if (state.groupCounter > 0 || groups.empty()) {
     ++state.groupCounter;
@@ -152,12 +166,17 @@ std::int32_t VisibilityGroups::AddGroup() {
   }
   groups.push_back({nameOf(state.groupCounter), "", {}});
   state.flags.modified = true;
-  return static_cast<std::int32_t>(groups.size());
+  const auto number = static_cast<std::int32_t>(groups.size());
+  state.history->Note(GroupEdit{number, nullptr, formerCounter});
+  return number;
 }
 
 void VisibilityGroups::RemoveGroup(std::int32_t group) {
   if (GroupOf(state, group) == nullptr) return;
-  Groups().erase(Groups().begin() + (group - 1));
+  const auto place = Groups().begin() + (group - 1);
+  auto gone = std::make_unique<VisibilityGroup>(std::move(*place));
+  Groups().erase(place);
+  state.history->Note(GroupEdit{group, std::move(gone), state.groupCounter});
   state.table.ForEachElement([group](const SymbolRecord& record) {
     record.element->RemoveVisibilityGroup(group);
     record.element->CloseVisibilityGroupGap(group);
@@ -173,46 +192,56 @@ std::int32_t VisibilityGroups::CreateLevel(std::int32_t group) {
                                   [&levels](const std::string& name) { return HasName(levels, name); }),
                     ""});
   state.flags.modified = true;
-  return static_cast<std::int32_t>(levels.size());
+  const auto number = static_cast<std::int32_t>(levels.size());
+  state.history->Note(LevelEdit{group, number, nullptr});
+  return number;
 }
 
 template <class Named>
-bool VisibilityGroups::Rename(const std::vector<Named>& siblings, Named& renamed, std::string_view name) {
-  if (renamed.name == name) return true;
-  if (name.empty() || HasName(siblings, name, &renamed)) return false;
-  renamed.name = name;
+bool VisibilityGroups::Rename(const std::vector<Named>& siblings, Named& renamed, GroupTextEdit edit) {
+  if (renamed.name == edit.other) return true;
+  if (edit.other.empty() || HasName(siblings, edit.other, &renamed)) return false;
+  std::swap(renamed.name, edit.other);
+  state.history->Note(std::move(edit));
   state.flags.modified = true;
   return true;
 }
 
-void VisibilityGroups::Describe(std::string& description, std::string_view text) {
-  if (description == text) return;
-  description = text;
+void VisibilityGroups::Describe(std::string& description, GroupTextEdit edit) {
+  if (description == edit.other) return;
+  std::swap(description, edit.other);
+  state.history->Note(std::move(edit));
   state.flags.modified = true;
 }
 
 bool VisibilityGroups::SetGroupName(std::int32_t group, std::string_view name) {
   VisibilityGroup* found = GroupOf(state, group);
-  return found != nullptr && Rename(Groups(), *found, name);
+  return found != nullptr && Rename(Groups(), *found, GroupTextEdit{group, 0, true, std::string(name)});
 }
 
 void VisibilityGroups::SetGroupDescription(std::int32_t group, std::string_view text) {
-  if (VisibilityGroup* found = GroupOf(state, group)) Describe(found->description, text);
+  VisibilityGroup* found = GroupOf(state, group);
+  if (found != nullptr) Describe(found->description, GroupTextEdit{group, 0, false, std::string(text)});
 }
 
 bool VisibilityGroups::SetLevelName(std::int32_t group, std::int32_t level, std::string_view name) {
   VisibilityLevel* found = LevelOf(state, group, level);
-  return found != nullptr && Rename(GroupOf(state, group)->levels, *found, name);
+  if (found == nullptr) return false;
+  return Rename(GroupOf(state, group)->levels, *found, GroupTextEdit{group, level, true, std::string(name)});
 }
 
 void VisibilityGroups::SetLevelDescription(std::int32_t group, std::int32_t level, std::string_view text) {
-  if (VisibilityLevel* found = LevelOf(state, group, level)) Describe(found->description, text);
+  VisibilityLevel* found = LevelOf(state, group, level);
+  if (found != nullptr) Describe(found->description, GroupTextEdit{group, level, false, std::string(text)});
 }
 
 void VisibilityGroups::DeleteLevel(std::int32_t group, std::int32_t level) {
   if (LevelOf(state, group, level) == nullptr) return;
   auto& levels = GroupOf(state, group)->levels;
-  levels.erase(levels.begin() + (level - 1));
+  const auto place = levels.begin() + (level - 1);
+  auto gone = std::make_unique<VisibilityLevel>(std::move(*place));
+  levels.erase(place);
+  state.history->Note(LevelEdit{group, level, std::move(gone)});
   state.table.ForEachElement([group, level](const SymbolRecord& record) {
     record.element->RemoveVisibility(group, level);
     record.element->CloseVisibilityLevelGap(group, level);
@@ -225,6 +254,7 @@ void VisibilityGroups::AddItem(std::int32_t group, std::int32_t level, std::uint
   VisibilityLevel* found = LevelOf(state, group, level);
   if (record == nullptr || found == nullptr || !found->items.insert(record->uid).second) return;
   record->element->SetVisibility(group, level);
+  state.history->Note(MembershipEdit{group, level, record->uid});
   state.flags.modified = true;
 }
 
@@ -233,6 +263,7 @@ void VisibilityGroups::RemoveItem(std::int32_t group, std::int32_t level, std::u
   VisibilityLevel* found = LevelOf(state, group, level);
   if (record == nullptr || found == nullptr || found->items.erase(record->uid) == 0) return;
   record->element->RemoveVisibility(group, level);
+  state.history->Note(MembershipEdit{group, level, record->uid});
   state.flags.modified = true;
 }
 

@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "core/edits.h"
 #include "core/template_state.h"
 
 namespace tessal {
@@ -29,6 +30,8 @@ class VisibilityGroups final {
   void DeleteLevel(std::int32_t group, std::int32_t level);
   void AddItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
   void RemoveItem(std::int32_t group, std::int32_t level, std::uint32_t sequence);
+  /// Gives the elements the memberships that the levels have, after those were put back as they were.
+  void Reenter();
   /// Takes an element out of all groups; an edit when it was in one.
   void Leave(CEL_Element& element);
 
@@ -36,8 +39,8 @@ class VisibilityGroups final {
   /// Gives each element its memberships by the items of the levels.
   void EnterElements();
   template <class Named>
-  bool Rename(const std::vector<Named>& siblings, Named& renamed, std::string_view name);
-  void Describe(std::string& description, std::string_view text);
+  bool Rename(const std::vector<Named>& siblings, Named& renamed, GroupTextEdit edit);
+  void Describe(std::string& description, GroupTextEdit edit);
   std::vector<VisibilityGroup>& Groups() { return state.misc.Visibilities().groups; }
 
   TemplateState& state;

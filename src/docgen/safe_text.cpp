@@ -31,6 +31,16 @@ std::string SafeText(std::string_view text) {
   return safe;
 }
 
+std::string MarkdownText(std::string_view text) {
+  constexpr std::string_view kMarks = "\\`*<|";
+  std::string escaped;
+  for (const char character : text) {
+    if (kMarks.find(character) != std::string_view::npos) escaped += '\\';
+    escaped += character;
+  }
+  return escaped;
+}
+
 std::string AnchorText(std::string_view symbol) {
   constexpr std::string_view kDigits = "0123456789abcdef";
   constexpr unsigned kBase = 16;

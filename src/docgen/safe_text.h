@@ -10,6 +10,9 @@ namespace tessal {
 /// between tags and into quoted values.
 std::string SafeText(std::string_view text);
 
+/// A text in which Markdown finds no markup, not even in a table.
+std::string MarkdownText(std::string_view text);
+
 /// A symbol as a part of an anchor's name: letters, digits and underscores stay, every other byte is a hyphen
 /// and two hexadecimal digits. Different symbols have different names.
 std::string AnchorText(std::string_view symbol);

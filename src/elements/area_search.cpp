@@ -206,6 +206,11 @@ void CEL_Lagrange_Spatial_Function::OnPropertyChanged(CEL_Property& changed) {
   }
 }
 
+void CEL_Lagrange_Spatial_Function::FollowValues() {
+  RebuildChoices();
+  CEL_Element::FollowValues();
+}
+
 void CEL_Lagrange_Spatial_Function::OnFrameworkChanged() {
   if (framework.Text() == kEuler || framework.Text() == kLagrange) {
     variableId.SetInt(-1);

@@ -22,6 +22,7 @@ class CEL_Lagrange_Spatial_Function final : public CEL_Element {
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
   std::string RecordText() const override { return variableName; }
+  void FollowValues() override;
 
   /// Fills the choices of purpose and mathematics from the framework and the purpose.
   void RebuildChoices();

@@ -168,6 +168,24 @@ void CEL_Element::SelectPresentValues() {
   }
 }
 
+void CEL_Element::TakeValuesOf(const CEL_Element& other) {
+  assert(rows.data() == other.rows.data());
+  const NotificationsOff silent;
+  const auto take = [this, &other](PropertyPlace place) {
+    const CEL_Property& from = other.*place;
+    CEL_Property& to = this->*place;
+    to.SetReal(from.RealValue());
+    to.SetInt(from.IntValue());
+    to.SetBool(from.BoolValue());
+    to.SetText(from.Text());
+  };
+  for (const BaseRow& row : kBaseRows) {
+    if (row.property != &CEL_Element::symbol && row.property != &CEL_Element::id) take(row.property);
+  }
+  for (const PropertyRow& row : rows) take(row.place);
+  FollowValues();
+}
+
 void CEL_Element::ClearTexts() {
   for (CEL_Property* text : {&description, &onlineHelp, &documentation}) text->SetText("");
 }
@@ -387,6 +405,16 @@ bool CEL_Element::ParseExpression() {
 
 void CEL_Element::OnPropertyChanged(CEL_Property& /*changed*/) {
   RebuildOwner();
+}
+
+void CEL_Element::OnChanging(CEL_Property& property) {
+  // Numbers follow from places.
+  if (owner != nullptr && &property != &id) owner->OnChanging(*this, property);
+}
+
+void CEL_Element::FollowValues() {
+  SelectPresentValues();
+  UpdateLocks();
 }
 
 std::string CEL_Element::FullSymbol() const {

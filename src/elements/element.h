@@ -139,10 +139,16 @@ class CEL_Element : public PropertyHolder {
 
   void OnPropertyChanged(CEL_Property& changed) override;
   void OnTableChanged() override { RebuildOwner(); }
+  void OnChanging(CEL_Property& property) override;
 
   /// Makes editable what the present values leave to the modeller, and locks what they fix: after a load, a
   /// reset, and a change of what decides it. Values stay as they are.
   virtual void UpdateLocks() {}
+  /// After values were put back as they were: what follows from them (choices, selections, locks) does too. No
+  /// value changes.
+  virtual void FollowValues();
+  /// The element leaves its template, and may come back.
+  virtual void Withdraw() {}
 
   /// Calls the visitor with each expression, its row and its property, in the order of the class's table.
   template <class Visitor>
@@ -170,6 +176,10 @@ class CEL_Element : public PropertyHolder {
 
   /// Points each property's selection at the choice of its value.
   void SelectPresentValues();
+
+  /// Takes the values of another element of the same class, but for its symbol and its number. Nobody hears of
+  /// it; choices and locks follow.
+  void TakeValuesOf(const CEL_Element& other);
 
   /// Empties the descriptive texts.
   void ClearTexts();
@@ -219,6 +229,7 @@ class CEL_Element : public PropertyHolder {
   void SetVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibility(std::int32_t group, std::int32_t level);
   void RemoveVisibilityGroup(std::int32_t group);
+  void ClearVisibility() { visibility.clear(); }
   /// Takes memberships of the groups (or, within a group, levels) after a removed one along to their new
   /// numbers.
   void CloseVisibilityGroupGap(std::int32_t removedGroup);

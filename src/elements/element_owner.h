@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <map>
+#include <memory>
 #include <set>
 #include <string_view>
 #include <vector>
@@ -13,6 +14,7 @@
 namespace tessal {
 
 class CEL_Element;
+class CEL_Property;
 
 class ElementOwner {
  public:
@@ -40,6 +42,14 @@ class ElementOwner {
 
   /// Fills the choice lists of all search functions from the present classes and their values.
   virtual void RefreshSearchFunctionChoices() = 0;
+
+  // What happens to elements, for who keeps a record of it.
+  /// A property is about to get another value.
+  virtual void OnChanging(CEL_Element& /*element*/, CEL_Property& /*property*/) {}
+  /// A member of a particle class, or a user function, was appended to its list.
+  virtual void OnAppended(CEL_Element& /*element*/) {}
+  /// A user function was taken out of the place that it had in its list.
+  virtual void OnRemoved(std::unique_ptr<CEL_Element> /*element*/, std::size_t /*place*/) {}
 
  protected:
   ElementOwner() = default;

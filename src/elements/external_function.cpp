@@ -73,6 +73,15 @@ void CEL_ExternalFunction::OnPropertyChanged(CEL_Property& changed) {
   }
 }
 
+void CEL_ExternalFunction::FollowValues() {
+  CEL_Element::FollowValues();
+  claim.Claim(publicName.Text());
+}
+
+void CEL_ExternalFunction::Withdraw() {
+  claim.Release();
+}
+
 void CEL_ExternalFunction::UpdateLocks() {
   // The engine fixes the argument count of its hooks.
   parameters.SetEditable(usedAs.Text() == kMathFunction);

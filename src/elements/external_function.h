@@ -15,6 +15,9 @@ class CEL_ExternalFunction final : public CEL_Element {
   void Reset() override;
   void OnPropertyChanged(CEL_Property& changed) override;
   void UpdateLocks() override;
+  void FollowValues() override;
+  /// Gives the public name up.
+  void Withdraw() override;
 
   CEL_Property publicName{ValueType::Text};
   CEL_Property dll{ValueType::Text};

@@ -141,6 +141,11 @@ void CEL_Input::UpdateLocks() {
   if (!LeavesUnitOpen(kInputUnitTypes)) unit.SetEditable(false);
 }
 
+void CEL_Input::FollowValues() {
+  RebuildBuiltInChoices(showDeprecated);
+  CEL_Element::FollowValues();
+}
+
 void CEL_Input::ApplyBuiltin() {
   if (builtInId.IntValue() < 1) {
     isUserSpecified.SetBool(true);

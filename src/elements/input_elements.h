@@ -21,6 +21,7 @@ class CEL_Input : public CEL_Element {
   bool Check() override;
   void OnPropertyChanged(CEL_Property& changed) override;
   void UpdateLocks() override;
+  void FollowValues() override;
   std::string RecordText() const override;
 
   /// Fills the choices of the built-in id: the catalogue's rows of this kind by name, deprecated ones only

@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "elements/element_checks.h"
+#include "elements/element_owner.h"
 #include "elements/list_section.h"
 #include "elements/property_io.h"
 #include "elements/version_stamp.h"
@@ -141,14 +142,19 @@ CEL_ExternalFunction& CEL_Miscanellous::AddExternalFunction() {
   function->SetModifiedFlag(templateModified);
   functions.push_back(std::move(function));
   MarkModified();
+  if (Owner() != nullptr) Owner()->OnAppended(*functions.back());
   RebuildOwner();
   return *functions.back();
 }
 
 bool CEL_Miscanellous::RemoveExternalFunction(std::size_t index) {
   if (index >= functions.size()) return false;
-  functions.erase(functions.begin() + static_cast<std::ptrdiff_t>(index));
+  const auto place = functions.begin() + static_cast<std::ptrdiff_t>(index);
+  std::unique_ptr<CEL_ExternalFunction> removed = std::move(*place);
+  functions.erase(place);
+  removed->Withdraw();
   MarkModified();
+  if (Owner() != nullptr) Owner()->OnRemoved(std::move(removed), index);
   RebuildOwner();
   return true;
 }

@@ -7,6 +7,7 @@
 
 #include "elements/element.h"
 #include "elements/external_function.h"
+#include "elements/sequence.h"
 #include "elements/visibility.h"
 
 namespace tessal {
@@ -32,7 +33,9 @@ class CEL_Miscanellous final : public CEL_Element {
   CEL_ExternalFunction& AddExternalFunction();
   /// Removes the function at the place (from 0) and its public name; false when there is no such place.
   bool RemoveExternalFunction(std::size_t index);
-  const std::vector<std::unique_ptr<CEL_ExternalFunction>>& ExternalFunctions() const { return functions; }
+  const Sequence<CEL_ExternalFunction>& ExternalFunctions() const { return functions; }
+  /// For who puts functions back where they were.
+  Sequence<CEL_ExternalFunction>& ExternalFunctionList() { return functions; }
   CEL_ListHead& ExternalFunctionHead() { return functionHead; }
 
   CEL_Visibility& Visibilities() { return visibilities; }
@@ -56,7 +59,7 @@ class CEL_Miscanellous final : public CEL_Element {
 
   bool* templateModified = nullptr;
   CEL_ListHead functionHead{ElementKind::ExternalFunction, ""};
-  std::vector<std::unique_ptr<CEL_ExternalFunction>> functions;
+  Sequence<CEL_ExternalFunction> functions;
   CEL_Visibility visibilities;
 };
 

@@ -113,6 +113,7 @@ std::string_view CEL_Property::PrevText() const {
 bool CEL_Property::SetInt(std::int32_t number) {
   if (Type() != ValueType::Integer) return false;
   if (number == value.integer) return true;
+  AnnounceChange();
   KeepFormer(&Extra::formerInt, value.integer);
   value.integer = number;
   RaiseChange();
@@ -122,6 +123,7 @@ bool CEL_Property::SetInt(std::int32_t number) {
 bool CEL_Property::SetReal(double number) {
   if (Type() != ValueType::Real) return false;
   if (number == value.real) return true;
+  AnnounceChange();
   KeepFormer(&Extra::formerReal, value.real);
   value.real = number;
   RaiseChange();
@@ -131,6 +133,7 @@ bool CEL_Property::SetReal(double number) {
 bool CEL_Property::SetBool(bool truth) {
   if (Type() != ValueType::Boolean) return false;
   if (truth == value.boolean) return true;
+  AnnounceChange();
   KeepFormer(&Extra::formerBool, value.boolean);
   value.boolean = truth;
   RaiseChange();
@@ -141,6 +144,7 @@ bool CEL_Property::SetText(std::string_view text) {
   if (!IsTextType(Type())) return false;
   if (text == Text()) return true;
   std::string replacement(text);  // the view may lie in the text that is replaced
+  AnnounceChange();
   Extra& more = More();
   more.formerText = Text();
   more.text = std::move(replacement);

@@ -71,6 +71,8 @@ class PropertyHolder : public PropertyListener {
 
   /// A property that reports to the symbol table only has changed.
   virtual void OnTableChanged() = 0;
+  /// A setter is about to give the property another value. Not called for the value that a file gives.
+  virtual void OnChanging(CEL_Property& /*property*/) {}
   void MarkModified() {
     ++changes;
     if (modifiedFlag != nullptr) *modifiedFlag = true;
@@ -220,6 +222,9 @@ class CEL_Property final {
   template <class Former>
   void KeepFormer(Former Extra::*former, Former previous);
   void PointTo(std::string_view lasting);
+  void AnnounceChange() {
+    if (holder != nullptr) holder->OnChanging(*this);
+  }
   void MarkModified() {
     if (holder != nullptr) holder->MarkModified();
   }

@@ -122,6 +122,7 @@ Member& CEL_Lagrange_Specie::Add(const MemberList<Member>& list) {
   members.push_back(std::make_unique<Member>(NewName(list.kind, list.word, members.size() + 1)));
   Member& member = *members.back();
   Adopt(member, list.listKind);
+  if (Owner() != nullptr) Owner()->OnAppended(member);
   if constexpr (requires { member.specie; }) member.specie.SetInt(index);
   // A class's parent is the template's root, whose text every new element starts with.
   if (Parent() != nullptr) member.documentation.SetText(Parent()->documentation.Text());

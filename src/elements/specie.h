@@ -5,8 +5,10 @@
 
 #include <array>
 #include <memory>
+#include <optional>
 #include <tuple>
 
+#include "core/messages.h"
 #include "elements/area_search.h"
 #include "elements/element.h"
 #include "elements/sequence.h"
@@ -78,6 +80,9 @@ class CEL_Lagrange_Specie final : public CEL_Element {
   const std::array<std::unique_ptr<CEL_ListHead>, kListCount>& Heads() const { return heads; }
   /// Whether an element is a member of this class, or the class itself (as the target of an interaction).
   bool Owns(const CEL_Element& element) const;
+
+  /// Why an expression of a member may not use an element; nothing when it may.
+  std::optional<Finding> FindUseFault(const CEL_Element& member, const CEL_Element& used) const;
 
   Sequence<CEL_Lagrange_StateVariable> stateVariables;
   Sequence<CEL_Lagrange_Constant> constants;

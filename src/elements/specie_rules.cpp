@@ -80,16 +80,20 @@ bool CEL_Lagrange_Specie::Check() {
   return good;
 }
 
+std::optional<Finding> CEL_Lagrange_Specie::FindUseFault(const CEL_Element& member,
+                                                         const CEL_Element& used) const {
+  // Equations use what they use regardless of order: state variables are integrated.
+  if (member.Kind() == ElementKind::SpecieStateVariable) return FindEquationFault(used, *this);
+  if (IsDeclaredAfter(used, member, *this))
+    return Finding("order-violated", {used.symbol.Text(), member.FullSymbol()});
+  return FindExpressionFault(used, *this);
+}
+
 bool CEL_Lagrange_Specie::CheckMemberReferences(const CEL_Element& member) const {
   if (Owner() == nullptr) return true;
-  const bool isEquation = member.Kind() == ElementKind::SpecieStateVariable;
   bool good = true;
   for (const CEL_Element* used : Owner()->ReferencedElements(member)) {
-    auto finding = isEquation ? FindEquationFault(*used, *this) : FindExpressionFault(*used, *this);
-    // Equations use what they use regardless of order: state variables are integrated.
-    if (!isEquation && IsDeclaredAfter(*used, member, *this)) {
-      finding = Finding("order-violated", {used->symbol.Text(), member.FullSymbol()});
-    }
+    const auto finding = FindUseFault(member, *used);
     if (!finding) continue;
     Errors().Report(member.FullSymbol(), member.GetUid(), *finding);
     good = false;

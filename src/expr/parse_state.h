@@ -60,6 +60,8 @@ class ParseState final {
   const Finding& Failure() const { return *failure; }
   std::int32_t Line() const { return static_cast<std::int32_t>(scan.Lines()); }
   std::int32_t Position() const { return static_cast<std::int32_t>(scan.Consumed() - scan.LineStart()); }
+  /// The token pulled last.
+  LexemeSpan Place() const { return scan.Span(); }
   /// Whether the parse came to the end of the text.
   bool ScannedAll() const { return scannedAll; }
   /// The identifiers of a text that was scanned to its end and holds plain tokens alone; of others none.

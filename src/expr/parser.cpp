@@ -55,8 +55,8 @@ std::unique_ptr<const ParsedExpression> ParseExpression(std::string_view text) {
     const bool good = RunAutomaton(state);
     parsed = ParsedExpression::InBlock(good ? &parseArrays.tree : nullptr, state.Identifiers());
     if (!good) {
-      parsed->failure =
-          std::make_unique<const ParseFailure>(ParseFailure{state.Failure(), state.Line(), state.Position()});
+      parsed->failure = std::make_unique<const ParseFailure>(
+          ParseFailure{state.Failure(), state.Line(), state.Position(), state.Place()});
     }
     parsed->knowsIdentifiers = state.ScannedAll();
   }

@@ -23,6 +23,7 @@ struct ParseFailure {
   Finding finding;        ///< its text is "Line L position P : ...", ends in a line feed
   std::int32_t line;      ///< line feeds scanned until then
   std::int32_t position;  ///< characters of the last line scanned until then
+  LexemeSpan at{0, 0};    ///< the token at which the parse stopped; empty at the end of the text
 };
 
 /// What the parse of a text gives, in one block of memory. The result depends on the text and on where its

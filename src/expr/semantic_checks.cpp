@@ -48,10 +48,12 @@ bool ReadsAsNumber(std::string_view text) {
   return result.ec != std::errc::invalid_argument && result.ptr == digits.data() + digits.size();
 }
 
-/// One check of one expression.
+/// One check of one expression. `report` is called with each finding, the name that it is about, and the
+/// number of arguments given to it.
+template <class Report>
 class FunctionCheck final {
  public:
-  FunctionCheck(std::string_view checkedSymbol, Uid checkedUid) : symbol(checkedSymbol), uid(checkedUid) {}
+  explicit FunctionCheck(Report reportFinding) : report(reportFinding) {}
 
   void Walk(const ExpressionNode& root) {
     root.WalkPostOrder(
@@ -64,15 +66,13 @@ class FunctionCheck final {
   bool IsBalanced() const { return callDepth < 1; }
   std::string_view LastCall() const { return lastCall; }
 
-  void Report(const Finding& finding) { Errors().ReportCheck(symbol, uid, finding); }
-
  private:
   void Visit(NodeKind kind, std::string_view text) {
     if (kind == NodeKind::Argument) {
       // The walk comes to a list after all calls in it, so this counts the arguments of one call only.
       ++arguments;
     } else if (kind == NodeKind::Property) {
-      if (!IsPropertyName(text)) Report({"unknown-property", {text}});
+      if (!IsPropertyName(text)) report({"unknown-property", {text}}, text, 0);
     } else if (kind == NodeKind::Call) {
       CheckCall(text);
       ++callDepth;
@@ -84,19 +84,18 @@ class FunctionCheck final {
   void CheckCall(std::string_view name) {
     const CatalogueFunction* function = FindFunction(name);
     if (function == nullptr) {
-      if (!IsUserFunctionName(name)) Report({"unknown-function", {name}});
+      if (!IsUserFunctionName(name)) report({"unknown-function", {name}}, name, arguments);
       return;
     }
     if (function->argumentCount != arguments) {
-      Report({"argument-count", {name, JoinedArguments(*function)}});
+      report({"argument-count", {name, JoinedArguments(*function)}}, name, arguments);
     }
     if (function->traits.isDeprecated) {
-      Report({"deprecated-function", {name}});
+      report({"deprecated-function", {name}}, name, arguments);
     }
   }
 
-  std::string_view symbol;
-  Uid uid;
+  Report report;
   std::int32_t arguments = 0;
   std::int32_t callDepth = 0;
   std::string_view lastCall;
@@ -105,20 +104,41 @@ class FunctionCheck final {
 }  // namespace
 
 bool CheckFunctions(std::string_view symbol, Uid uid, const ParsedExpression& parsed) {
-  FunctionCheck check(symbol, uid);
+  const auto report = [symbol, uid](const Finding& finding, std::string_view /*name*/,
+                                    std::int32_t /*arguments*/) {
+    Errors().ReportCheck(symbol, uid, finding);
+  };
   const ExpressionNode* tree = parsed.Tree();
   if (tree == nullptr) {
-    check.Report(parsed.Failure()->finding);
+    report(parsed.Failure()->finding, {}, 0);
     return false;
   }
+  FunctionCheck check(report);
   check.Walk(*tree);
   if (check.IsBalanced()) return true;
-  check.Report({"call-incomplete", {check.LastCall()}});
+  report({"call-incomplete", {check.LastCall()}}, {}, 0);
   return false;
+}
+
+std::vector<CallFinding> FindCallFaults(const ExpressionNode& tree) {
+  std::vector<CallFinding> faults;
+  FunctionCheck check([&faults](const Finding& finding, std::string_view name, std::int32_t arguments) {
+    faults.push_back({finding, name, arguments});
+  });
+  check.Walk(tree);
+  return faults;
 }
 
 int CheckFunctionsSpecified(std::string_view symbol, Uid uid, std::string_view expression) {
   return CheckFunctions(symbol, uid, *ParseExpression(expression)) ? 1 : 0;
+}
+
+std::span<const std::string_view> PropertyNames() {
+  return kProperties;
+}
+
+std::span<const std::string_view> InteractionVerbs() {
+  return kVerbs;
 }
 
 bool IsPropertyName(std::string_view text) {

@@ -33,10 +33,10 @@ class UserFunctionClaim final {
 
   /// Gives the name claimed so far up, and registers this one.
   void Claim(std::string_view name);
-
- private:
+  /// Gives the name up.
   void Release();
 
+ private:
   std::string claimed;
   bool holds = false;
 };

@@ -9,6 +9,7 @@
 #include <utility>
 #include <vector>
 
+class QAction;
 class QWidget;
 
 namespace tessal {
@@ -92,10 +93,12 @@ class CDocument {
 /// menu and text an ampersand marks the shortcut key.
 struct ViewCommand {
   std::string menu;
-  std::string text;
-  std::function<void()> run;
+  std::string text;  ///< empty for a line between commands
+  std::function<void()> run{};
   bool checkable = false;
   bool checked = false;
+  /// An action of the view's own, which the menu shows as it is at any time; then there is no text.
+  QAction* action = nullptr;
 };
 
 class CView {
@@ -119,6 +122,11 @@ class CView {
   virtual void OnActivate() {}
   /// What the view offers for the menus of a host, in order. Asked for again after a command has run.
   virtual std::vector<ViewCommand> Commands() { return {}; }
+  /// What a host shows of the view all the time in its status bar.
+  virtual std::string StatusText() const { return {}; }
+  /// Which part of the document is in front, as a text by which another run finds it again; empty for none.
+  virtual std::string Place() const { return {}; }
+  virtual void GoTo(const std::string& /*place*/) {}
   /// The widget that a host puts into its frame; none for a view without a screen.
   virtual QWidget* Widget() { return nullptr; }
 
@@ -128,8 +136,17 @@ class CView {
     if (frameTitleUpdate) frameTitleUpdate();
   }
 
+  /// How a view has the frame around it show its status, with a message for a while; empty for none.
+  void SetStatusUpdate(std::function<void(const std::string& message)> update) {
+    statusUpdate = std::move(update);
+  }
+  void UpdateStatus(const std::string& message = {}) {
+    if (statusUpdate) statusUpdate(message);
+  }
+
  private:
   std::function<void()> frameTitleUpdate;
+  std::function<void(const std::string& message)> statusUpdate;
 };
 
 /// What a host needs to know of one kind of documents.

@@ -20,8 +20,11 @@
 #include "ui/documentation_link.h"
 #include "ui/expression_editor_dialog.h"
 #include "ui/expression_field.h"
+#include "ui/expression_panel.h"
 #include "ui/focus_watch.h"
+#include "ui/format_words.h"
 #include "ui/label.h"
+#include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
 
@@ -72,6 +75,23 @@ bool IsStored(FieldEditor editor) {
   }
 }
 
+QString Meaning(const FormField& field) {
+  const std::string_view meaning = MeaningOfField(field.label);
+  return QString::fromUtf8(meaning.data(), static_cast<qsizetype>(meaning.size()));
+}
+
+QString MeaningOf(const FormField& field, const QString& choice) {
+  return QString::fromStdString(MeaningOfChoice(field.label, choice.toStdString()));
+}
+
+/// Has a closed combo box explain its field, and in a line below the choice that it shows.
+void ShowChoiceTip(QComboBox& combo, const FormField& field) {
+  QStringList lines(Meaning(field));
+  const QString meaning = MeaningOf(field, combo.currentText());
+  if (!meaning.isEmpty()) lines.append(combo.currentText() + QStringLiteral(": ") + meaning);
+  combo.setToolTip(PlainTip(lines.join(u'\n')).replace(u'\n', QStringLiteral("<br>")));
+}
+
 }  // namespace
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
@@ -97,7 +117,19 @@ void CElementForm::LabelFields() {
   for (Control& control : controls) {
     control.label = MakeChild<QLabel>(labels.takeFirst(), this);
     control.label->setBuddy(control.editor);
+    ExplainField(control);
   }
+}
+
+void CElementForm::ExplainField(const Control& control) {
+  const QString meaning = Meaning(*control.field);
+  if (meaning.isEmpty()) return;
+  control.label->setToolTip(PlainTip(meaning));
+  // The tip of an editor would be read out with its markup.
+  control.editor->setAccessibleDescription(meaning);
+  // Where a field has text of its own to point at, the tip is for that.
+  if (qobject_cast<CAutoRichEditCtrl*>(control.editor) == nullptr)
+    control.editor->setToolTip(PlainTip(meaning));
 }
 
 QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
@@ -110,7 +142,7 @@ QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
       return control.editor = MakeLines();
     case FieldEditor::SortedChoice:
     case FieldEditor::OrderedChoice:
-      return control.editor = MakeCombo();
+      return control.editor = MakeCombo(field);
     case FieldEditor::ReferencedIn:
       return control.editor = MakeReferences();
     default:
@@ -133,13 +165,14 @@ QWidget* CElementForm::MakeLines() {
   return lines;
 }
 
-QWidget* CElementForm::MakeCombo() {
+QWidget* CElementForm::MakeCombo(const FormField& field) {
   auto* combo = MakeChild<QComboBox>(this);
   combo->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
   // The wheel that scrolls the form must not choose on its way.
   combo->setFocusPolicy(Qt::StrongFocus);
   IgnoreWheelWithoutFocus(*combo);
   connect(combo, &QComboBox::activated, this, [this] { NoteChosen(); });
+  connect(combo, &QComboBox::currentTextChanged, this, [combo, &field] { ShowChoiceTip(*combo, field); });
   return combo;
 }
 
@@ -172,33 +205,23 @@ QWidget* CElementForm::MakeDocumentation(const FormField& field, Control& contro
 }
 
 QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) {
-  auto* cell = MakeChild<QWidget>(this);
-  auto* rows = MakeChild<QVBoxLayout>(cell);
-  rows->setContentsMargins(0, 0, 0, 0);
-  auto* edit = MakeChild<CAutoRichEditCtrl>(Document(), cell);
-  auto* note = MakeChild<CLabel>(cell);
-  note->setWordWrap(true);
-  note->setAccessibleName(QStringLiteral("Parser message of %1").arg(QString::fromLatin1(field.label)));
+  auto* cell = MakeChild<CExpressionPanel>(
+      Document(), [this] { return Element(); }, QString::fromLatin1(field.label), this);
+  CAutoRichEditCtrl* edit = &cell->Field();
   auto* keypad = MakeChild<QPushButton>(strings::kEdit, cell);
   keypad->setObjectName(QString::number(field.keypad));
   // In a form with several expressions each button has a name of its own.
   const bool isOnly = field.keypad == control_id::kKeypad;
   keypad->setAccessibleName(isOnly ? strings::kExpressionEditor
                                    : strings::kExpressionEditor + u' ' + QString::fromLatin1(field.label));
-  auto* foot = MakeChild<QHBoxLayout>();
-  foot->addWidget(note, 1);
-  foot->addWidget(keypad, 0, Qt::AlignTop);
-  rows->addWidget(edit, 1);
-  rows->addLayout(foot);
-  connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit, note] {
-    note->setText(edit->ParserMessage());
+  cell->AddButton(*keypad);
+  connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit] {
     if (edit->IsEdited()) NoteTyped();
   });
   connect(edit, &CAutoRichEditCtrl::LinkActivated, this, &CElementForm::JumpTo);
   WatchFocusLoss(*edit, [this] { NoteFocusLost(); });
   connect(keypad, &QPushButton::clicked, this, [this] { CExpressionEditorDlg(this).exec(); });
   control.editor = edit;
-  control.note = note;
   return cell;
 }
 
@@ -226,7 +249,7 @@ void CElementForm::Show(Control& control, CEL_Element& element) {
   const CEL_Property& property = field.property(element);
   const bool enabled = IsEnabled(field, property);
   if (auto* combo = qobject_cast<QComboBox*>(control.editor)) {
-    FillCombo(*combo, field.editor, property, enabled);
+    FillCombo(*combo, field, property, enabled);
     return;
   }
   control.editor->setEnabled(enabled);
@@ -269,7 +292,7 @@ QWidget* CElementForm::ShowText(const TextToShow& text) {
   return control->editor;
 }
 
-void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property,
+void CElementForm::FillCombo(QComboBox& combo, const FormField& field, const CEL_Property& property,
                              bool enabled) {
   combo.clear();
   combo.setEnabled(property.HasChoices() && enabled);
@@ -277,12 +300,16 @@ void CElementForm::FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Pro
   for (const CEL_Choice& choice : property.Choices()) {
     entries.append({ToScreen(choice.display), static_cast<int>(entries.size())});
   }
-  if (editor == FieldEditor::SortedChoice) {
+  if (field.editor == FieldEditor::SortedChoice) {
     std::stable_sort(entries.begin(), entries.end(), [](const auto& left, const auto& right) {
       return left.first.compare(right.first, Qt::CaseInsensitive) < 0;
     });
   }
-  for (const auto& [caption, index] : entries) combo.addItem(caption, index);
+  for (const auto& [caption, index] : entries) {
+    combo.addItem(caption, index);
+    const QString meaning = MeaningOf(field, caption);
+    if (!meaning.isEmpty()) combo.setItemData(combo.count() - 1, PlainTip(meaning), Qt::ToolTipRole);
+  }
   const std::int32_t present = property.PresentChoice();
   combo.setCurrentIndex(combo.findData(present < 0 ? property.Selected() : present));
 }

@@ -98,7 +98,6 @@ class CElementForm : public CRightPaneBase {
     QWidget* editor = nullptr;
     QLabel* label = nullptr;
     QWidget* cell = nullptr;  ///< the editor with what lies beside it
-    QLabel* note = nullptr;   ///< under an expression: what the parser says
     bool isInBlock = false;   ///< lies in a block of its own under the rows
     QString shown;            ///< the text that the last load gave a line
   };
@@ -114,6 +113,8 @@ class CElementForm : public CRightPaneBase {
   void AddField(const FormField& field);
   /// Labels the fields, each with an Alt key of its own.
   void LabelFields();
+  /// Has the label, and the editor where it has no text to point at, say what the field is for.
+  static void ExplainField(const Control& control);
   void LayOut();
   /// Puts several expressions into a splitter, each with the same share of the height.
   void SplitExpressions();
@@ -131,13 +132,13 @@ class CElementForm : public CRightPaneBase {
   QWidget* MakeEditor(const FormField& field, Control& control);
   QLineEdit* MakeLine(const FormField& field, QWidget* parent);
   QWidget* MakeLines();
-  QWidget* MakeCombo();
+  QWidget* MakeCombo(const FormField& field);
   QWidget* MakeReferences();
   QWidget* MakeDocumentation(const FormField& field, Control& control);
   QWidget* MakeExpression(const FormField& field, Control& control);
 
   void Show(Control& control, CEL_Element& element);
-  static void FillCombo(QComboBox& combo, FieldEditor editor, const CEL_Property& property, bool enabled);
+  static void FillCombo(QComboBox& combo, const FormField& field, const CEL_Property& property, bool enabled);
   std::string ReferrerText(const CEL_Element& element) const;
   static bool IsEdited(const Control& control);
   bool StoreText(const QString& text, CEL_Property& property) const;

@@ -5,6 +5,7 @@
 #include <QStyledItemDelegate>
 #include <algorithm>
 #include <memory>
+#include <unordered_set>
 #include <utility>
 
 #include "core/template_core.h"
@@ -310,6 +311,80 @@ void CElementTree::MoveNode(QTreeWidgetItem& item, int step) {
   item.setExpanded(wasExpanded);
   if (wasCurrent) setCurrentItem(&item);
   setUpdatesEnabled(true);
+}
+
+QTreeWidgetItem* CElementTree::MakeBranch(const CEL_Element& element) {
+  if (element.Kind() != ElementKind::Specie) return MakeElement(element);
+  return MakeSpecie(static_cast<const CEL_Lagrange_Specie&>(element));
+}
+
+template <class Elements>
+void CElementTree::FollowFolder(Uid folderId, const Elements& elements) {
+  QTreeWidgetItem* folder = FindById(folderId);
+  if (folder == nullptr) return;
+  std::unordered_set<Uid> present;
+  for (const auto& element : elements) present.insert(element->GetUid());
+  for (int place = folder->childCount() - 1; place >= 0; --place) {
+    QTreeWidgetItem* child = folder->child(place);
+    if (!present.contains(DataOf(*child).id)) RemoveNode(*child);
+  }
+  int place = 0;
+  for (const auto& element : elements) {
+    const Uid wanted = element->GetUid();
+    const auto isAt = [folder, wanted](int at) {
+      QTreeWidgetItem* child = folder->child(at);
+      return child != nullptr && DataOf(*child).id == wanted;
+    };
+    // One that has moved away comes in again at its new place.
+    if (!isAt(place) && isAt(place + 1)) folder->takeChild(place);
+    if (!isAt(place)) {
+      QTreeWidgetItem* node = FindById(wanted);
+      if (node == nullptr) node = MakeBranch(*element);
+      const bool wasExpanded = node->isExpanded();
+      if (node->parent() != nullptr) folder->takeChild(folder->indexOfChild(node));
+      folder->insertChild(place, node);
+      node->setExpanded(wasExpanded);
+    }
+    ++place;
+  }
+}
+
+void CElementTree::FollowGroups(TemplateCore& core) {
+  if (core.GetMisc() == nullptr) return;
+  const auto& groups = core.GetMisc()->Visibilities().groups;
+  while (groupItems.size() > groups.size()) RemoveGroup(groupItems.size() - 1);
+  while (groupItems.size() < groups.size() && FindById(folder_id::kVisibilityGroups) != nullptr) {
+    AddGroup(groups[groupItems.size()].name);
+  }
+  for (std::size_t place = 0; place < groupItems.size(); ++place) {
+    groupItems[place]->setText(0, ToScreen(groups[place].name));
+  }
+}
+
+void CElementTree::Follow(TemplateCore& core) {
+  const QSignalBlocker quiet(this);
+  setUpdatesEnabled(false);
+  if (core.GetSpecieCount() > 0) ShowParticles(core);
+  ForEachHeadedCollection([this, &core](const auto& collection) {
+    FollowFolder(NodeRowOfElements(collection.kind).folder, core.Elements().*collection.elements);
+  });
+  FollowFolder(folder_id::kParticleClasses, core.Species());
+  for (const auto& specie : core.Species()) {
+    ForEachMemberList([this, &specie](const auto& list) {
+      FollowFolder(specie->Head(list.listKind).GetUid(), (*specie).*list.members);
+    });
+  }
+  if (core.GetMisc() != nullptr) FollowFolder(folder_id::kPluginFunctions, core.GetMisc()->ExternalFunctions());
+  FollowGroups(core);
+  setUpdatesEnabled(true);
+}
+
+void CElementTree::FollowCaption(const CEL_Element& element) {
+  auto* item = static_cast<ElementItem*>(FindById(element.GetUid()));
+  const bool isNamed = item != nullptr && element.Kind() < ElementKind::Root;
+  if (!isNamed) return;
+  item->standIn = ToScreen(element.symbol.Text());
+  item->setText(0, ToScreen(MarkedCaption(element)));
 }
 
 void CElementTree::ShowMessages(const std::unordered_map<Uid, ElementMessages>& messages) {

@@ -50,6 +50,12 @@ class CElementTree final : public QTreeWidget {
   /// Exchanges a node with a neighbour; nothing happens without one.
   void MoveNode(QTreeWidgetItem& item, int step);
 
+  /// Brings the nodes in line with a template in which several elements or groups may have come, gone, moved or
+  /// changed. Nodes that stay keep their data. Reports no change of the selection.
+  void Follow(TemplateCore& core);
+  /// Shows the caption of an element as it is now, where it has a node.
+  void FollowCaption(const CEL_Element& element);
+
   /// Marks the nodes of the elements that have messages, and no others.
   void ShowMessages(const std::unordered_map<Uid, ElementMessages>& messages);
 
@@ -64,6 +70,11 @@ class CElementTree final : public QTreeWidget {
   QTreeWidgetItem* InsertFixed(QTreeWidgetItem& parent, int place, Uid id);
   template <class Elements>
   void InsertAll(QTreeWidgetItem& folder, const Elements& elements);
+  /// Gives a folder the nodes of its elements, in their order.
+  template <class Elements>
+  void FollowFolder(Uid folderId, const Elements& elements);
+  void FollowGroups(TemplateCore& core);
+  QTreeWidgetItem* MakeBranch(const CEL_Element& element);
 
   /// Makes the branch of a particle class, outside of the tree.
   QTreeWidgetItem* MakeSpecie(const CEL_Lagrange_Specie& specie);

@@ -15,6 +15,7 @@
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
 #include "platform/ascii.h"
+#include "ui/strings.h"
 
 namespace tessal {
 
@@ -52,20 +53,6 @@ bool IsCallable(const std::string& name) {
   return IsFunctionName(upper) || IsUserFunctionName(name) || IsInteractionVerb(UpperCase(name));
 }
 
-TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
-  std::int32_t id = 0;
-  ElementKind elementKind = ElementKind::None;
-  if (core.FindElementBySymbol(name, id, elementKind)) {
-    const auto row =
-        std::find_if(kKindColours.begin(), kKindColours.end(),
-                     [elementKind](const KindColour& entry) { return entry.kind == elementKind; });
-    return Style(row == kKindColours.end() ? kOtherElement : row->colour, true, false, true);
-  }
-  if (IsCallable(name)) return Style(kCallable, true, true, false);
-  if (IsPropertyName(name)) return Style(kProperty, true, false, false);
-  return Style(kUnknownName, true, false, false);
-}
-
 const QString kStrongKey = QStringLiteral("strongColours");
 
 /// The choice, read from the settings once: each coloured word asks for it.
@@ -83,6 +70,20 @@ double RelativeLuminance(const QColor& colour) {
 }
 
 }  // namespace
+
+TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
+  std::int32_t id = 0;
+  ElementKind elementKind = ElementKind::None;
+  if (core.FindElementBySymbol(name, id, elementKind)) {
+    const auto row =
+        std::find_if(kKindColours.begin(), kKindColours.end(),
+                     [elementKind](const KindColour& entry) { return entry.kind == elementKind; });
+    return Style(row == kKindColours.end() ? kOtherElement : row->colour, true, false, true);
+  }
+  if (IsCallable(name)) return Style(kCallable, true, true, false);
+  if (IsPropertyName(name)) return Style(kProperty, true, false, false);
+  return Style(kUnknownName, true, false, false);
+}
 
 TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
   const TokenCode code = expressionToken.code;
@@ -125,7 +126,7 @@ QColor StrongColour(const QColor& colour, const QColor& ground) {
 
 ViewCommand StrongColoursCommand() {
   const bool strong = UsesStrongColours();
-  return {"&View", "&Strong Colours", [strong] { UseStrongColours(!strong); }, true, strong};
+  return {strings::kViewMenu, "S&trong Colours", [strong] { UseStrongColours(!strong); }, true, strong};
 }
 
 bool UsesStrongColours() {

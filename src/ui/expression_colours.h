@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QColor>
+#include <string>
 
 #include "platform/docview.h"
 
@@ -18,6 +19,11 @@ struct TokenStyle {
   bool link = false;  ///< names an element: it can be jumped to
 };
 
+/// What is wrong, and names that mean nothing; for a light ground.
+inline constexpr QColor kFaultColour{255, 0, 0};
+
+/// The style of an identifier.
+TokenStyle StyleOfName(const std::string& name, const TemplateCore& core);
 TokenStyle StyleOfToken(const ExpressionToken& token, const TemplateCore& core);
 
 /// A colour that is made for a light ground, as it is shown on a given one: unchanged on a light one,

@@ -9,9 +9,8 @@
 #include <utility>
 
 #include "core/document.h"
-#include "expr/parser.h"
-#include "expr/scanner.h"
 #include "ui/child.h"
+#include "ui/expression_colours.h"
 #include "ui/expression_highlighter.h"
 #include "ui/text_bytes.h"
 
@@ -30,7 +29,6 @@ CAutoRichEditCtrl::CAutoRichEditCtrl(const CTessalDoc& shownDocument, QWidget* p
 
 void CAutoRichEditCtrl::SetColouredText(const std::string& text) {
   setUpdatesEnabled(false);
-  content = text;
   isStale = true;
   ShowText(ToScreen(text));
   setUpdatesEnabled(true);
@@ -51,18 +49,27 @@ void CAutoRichEditCtrl::ReportText() {
   if (std::exchange(isUnreported, false)) emit ContentChanged();
 }
 
-QString CAutoRichEditCtrl::ParserMessage() const {
-  const ScannerRest rest;
-  const std::string text = FromScreen(ContentText(), content, source.Encoding());
-  const auto parsed = ParseExpression(text);
-  const ParseFailure* failure = parsed->Failure();
-  return failure == nullptr ? QString() : ToScreen(failure->finding.text).trimmed();
+int CAutoRichEditCtrl::CharacterAt(const QPoint& point) const {
+  const QPoint scrolled(horizontalScrollBar()->value(), verticalScrollBar()->value());
+  return document()->documentLayout()->hitTest(point + scrolled, Qt::ExactHit);
 }
 
 Uid CAutoRichEditCtrl::LinkAt(const QPoint& point) const {
-  const QPoint scrolled(horizontalScrollBar()->value(), verticalScrollBar()->value());
-  return ElementNamed(
-      highlighter->LinkAt(document()->documentLayout()->hitTest(point + scrolled, Qt::ExactHit)));
+  return ElementNamed(highlighter->LinkAt(CharacterAt(point)));
+}
+
+QString CAutoRichEditCtrl::TipAt(const QPoint& point) const {
+  const int position = CharacterAt(point);
+  const Uid uid = LinkAt(point);
+  QString tip = uid == Uid::None ? QString() : TipOf(uid).toHtmlEscaped();
+  if (!tips || position < 0) return tip;
+  QTextCursor word(document());
+  word.setPosition(position);
+  word.select(QTextCursor::WordUnderCursor);
+  const QString further =
+      tips(uid == Uid::None ? word.selectedText().toStdString() : std::string(), position);
+  if (!tip.isEmpty() && !further.isEmpty()) tip += QStringLiteral("<br>");
+  return tip + further;
 }
 
 Uid CAutoRichEditCtrl::LinkAtCaret() const {
@@ -85,16 +92,26 @@ QString CAutoRichEditCtrl::TipOf(Uid uid) const {
   return ToScreen("[" + std::string(element->KindText()) + "] " + element->description.TextOf());
 }
 
+QColor CAutoRichEditCtrl::ColourOf(const std::string& name) const {
+  const TokenStyle style = StyleOfName(name, source.Core());
+  return ReadableColour(style.colour, palette().color(QPalette::Base));
+}
+
 bool CAutoRichEditCtrl::event(QEvent* happened) {
+  // Before Tab leaves the field.
+  if (keys != nullptr && happened->type() == QEvent::KeyPress &&
+      keys->TakesKey(static_cast<QKeyEvent&>(*happened)))
+    return true;
   if (happened->type() != QEvent::ToolTip) return CPlainTextField::event(happened);
   const auto* help = static_cast<QHelpEvent*>(happened);
-  const Uid uid = LinkAt(viewport()->mapFrom(this, help->pos()));
-  if (uid == Uid::None) {
-    QToolTip::hideText();
-  } else {
-    QToolTip::showText(help->globalPos(), TipOf(uid).toHtmlEscaped(), this);
-  }
+  // An empty tip takes the present one away.
+  QToolTip::showText(help->globalPos(), TipAt(viewport()->mapFrom(this, help->pos())), this);
   return true;
+}
+
+void CAutoRichEditCtrl::keyPressEvent(QKeyEvent* key) {
+  CPlainTextField::keyPressEvent(key);
+  if (keys != nullptr) keys->FollowKey(*key);
 }
 
 void CAutoRichEditCtrl::mouseMoveEvent(QMouseEvent* move) {

@@ -26,9 +26,6 @@ namespace tessal {
 
 namespace {
 
-constexpr const char* kEditMenu = "&Edit";
-constexpr const char* kGoMenu = "&Go";
-
 /// The node of a text's owner that is no element of the tree; None for an element, which has its own.
 Uid FixedNodeOf(ElementKind kind) {
   if (kind == ElementKind::Root) return folder_id::kRoot;
@@ -76,15 +73,18 @@ CFindTools::CFindTools(FindSurroundings surroundings)
 
 std::vector<CFindTools::Command> CFindTools::CommandRows() {
   return {
-      {kEditMenu, strings::kCommandFilter, QStringLiteral("Ctrl+F"), [this] { FilterTree(); }},
-      {kEditMenu, strings::kCommandFind, QStringLiteral("Ctrl+Shift+F"), [this] { FindInTemplate(); }},
-      {kEditMenu, strings::kCommandNextMatch, QStringLiteral("F3"), [this] { GoToMatch(1); }},
-      {kEditMenu, strings::kCommandFormerMatch, QStringLiteral("Shift+F3"), [this] { GoToMatch(-1); }},
-      {kGoMenu, strings::kCommandGoTo, QStringLiteral("Ctrl+K"), [this] { GoToSymbol(); }},
-      {kGoMenu, strings::kCommandUses, QStringLiteral("Shift+F12"), [this] { FindUsesOfSelected(); }},
-      {kGoMenu, strings::kCommandNextMessage, QStringLiteral("F8"),
+      {strings::kEditMenu, strings::kCommandFilter, QStringLiteral("Ctrl+F"), [this] { FilterTree(); }},
+      {strings::kEditMenu, strings::kCommandFind, QStringLiteral("Ctrl+Shift+F"),
+       [this] { FindInTemplate(); }},
+      {strings::kEditMenu, strings::kCommandNextMatch, QStringLiteral("F3"), [this] { GoToMatch(1); }},
+      {strings::kEditMenu, strings::kCommandFormerMatch, QStringLiteral("Shift+F3"),
+       [this] { GoToMatch(-1); }},
+      {strings::kGoMenu, strings::kCommandGoTo, QStringLiteral("Ctrl+K"), [this] { GoToSymbol(); }},
+      {strings::kGoMenu, strings::kCommandUses, QStringLiteral("Shift+F12"),
+       [this] { FindUsesOfSelected(); }},
+      {strings::kGoMenu, strings::kCommandNextMessage, QStringLiteral("F8"),
        [this] { around.messages.GoToMessage(1); }},
-      {kGoMenu, strings::kCommandFormerMessage, QStringLiteral("Shift+F8"),
+      {strings::kGoMenu, strings::kCommandFormerMessage, QStringLiteral("Shift+F8"),
        [this] { around.messages.GoToMessage(-1); }},
   };
 }

@@ -12,6 +12,7 @@
 #include "ui/alt_keys.h"
 #include "ui/child.h"
 #include "ui/create_hint.h"
+#include "ui/dialogs.h"
 #include "ui/folder_elements.h"
 #include "ui/icons.h"
 #include "ui/node_kinds.h"
@@ -79,6 +80,14 @@ CEL_Element* ElementOf(const TemplateCore& core, const CRowModel::Row& row) {
   return element != nullptr && element->GetUid() == row.uid ? element : core.GetElement(row.uid);
 }
 
+QString SymbolsOf(const TemplateCore& core, const std::vector<Uid>& uids) {
+  QStringList symbols;
+  for (const Uid uid : uids) {
+    if (const CEL_Element* element = core.GetElement(uid)) symbols.append(ToScreen(element->FullSymbol()));
+  }
+  return symbols.join(QStringLiteral(", "));
+}
+
 std::ptrdiff_t DistanceInFolder(const std::vector<const CEL_Element*>& elements, Uid first, Uid second) {
   const auto find = [&elements](Uid uid) {
     return std::find_if(elements.begin(), elements.end(),
@@ -95,6 +104,7 @@ CGenericListView::CGenericListView(const FormContext& context, QWidget* parent)
   constexpr int kNameColumn = 1;
   const ElementKind kind = KindInFolder(context.item);
   Table().Model().ShowIcons(kNameColumn, [kind](const CRowModel::Row&) { return IconOfKind(kind); });
+  Table().AllowSeveral([this](int row) { MoveRowsTo(row); });
 }
 
 void CGenericListView::BuildFilter() {
@@ -223,7 +233,7 @@ bool CGenericListView::CanRun(Command command, int row) const {
     case Edit:
       return row >= 0;
     case Delete:
-      return row >= 0 && Core().CanDelete(UidOf(row));
+      return row >= 0 && (Table().SelectedRows().size() > 1 || Core().CanDelete(UidOf(row)));
     case MoveDown:
       return CanMoveRow(row, 1);
     case MoveUp:
@@ -239,7 +249,7 @@ void CGenericListView::Run(Command command, int row) {
     case Edit:
       return EnterRow(row);
     case Delete:
-      return DeleteRow(row);
+      return Table().SelectedRows().size() > 1 ? DeleteRows() : DeleteRow(row);
     case MoveDown:
       return MoveRow(row, 1);
     case MoveUp:
@@ -270,6 +280,42 @@ void CGenericListView::DeleteRow(int row) {
   Document().UpdateAllViews(nullptr, hint::kDeleteItem, &argument);
   UpdateCommands();
   RequestCommit();
+}
+
+std::vector<Uid> CGenericListView::SelectedElements() const {
+  std::vector<Uid> uids;
+  for (const int row : Table().SelectedRows()) uids.push_back(UidOf(row));
+  return uids;
+}
+
+void CGenericListView::DeleteRows() {
+  const int first = Table().SelectedRows().front();
+  const std::vector<Uid> kept = Core().DeleteElements(SelectedElements());
+  Document().UpdateAllViews(nullptr, hint::kStructure);
+  Reload(first);
+  RequestCommit();
+  if (!kept.empty()) Dialogs().Warn(this, strings::kStillUsed.arg(SymbolsOf(Core(), kept)));
+}
+
+void CGenericListView::MoveRowsTo(int row) {
+  const std::vector<Uid> moved = SelectedElements();
+  const bool isEnd = row >= RowCount();
+  Uid target = UidOf(isEnd ? RowCount() - 1 : row);
+  std::vector<Uid> refused;
+  {
+    const EditStep step(Core().History());
+    for (const Uid uid : moved) {
+      if (uid == target) continue;
+      const bool isMoved = Core().MoveElement(uid, target, !isEnd);
+      if (!isMoved) refused.push_back(uid);
+      // To the end each goes after the one before it.
+      if (isMoved && isEnd) target = uid;
+    }
+  }
+  Document().UpdateAllViews(nullptr, hint::kStructure);
+  Reload(row);
+  RequestCommit();
+  if (!refused.empty()) Dialogs().Warn(this, strings::kNotMoved.arg(SymbolsOf(Core(), refused)));
 }
 
 void CGenericListView::MoveRow(int row, int step) {

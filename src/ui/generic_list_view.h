@@ -14,6 +14,8 @@ class CGenericListView final : public CListPage {
  public:
   CGenericListView(const FormContext& context, QWidget* parent);
 
+  std::vector<Uid> SelectedElements() const override;
+
  protected:
   void ItemToForm() override;
   bool CanRun(Command command, int row) const override;
@@ -31,6 +33,9 @@ class CGenericListView final : public CListPage {
   Uid UidOf(int row) const;
   void CreateNew();
   void DeleteRow(int row);
+  void DeleteRows();
+  /// Moves the selected rows before another, in their order, or to the end.
+  void MoveRowsTo(int row);
   void MoveRow(int row, int step);
   bool CanMoveRow(int row, int step) const;
   bool CanCreate(int row) const;

@@ -8,6 +8,9 @@
 #include <QUrl>
 #include <array>
 
+#include "expr/builtin_reference.h"
+#include "expr/function_reference.h"
+#include "expr/word_reference.h"
 #include "ui/child.h"
 #include "ui/strings.h"
 
@@ -16,7 +19,9 @@ namespace tessal {
 namespace {
 
 const QString kWindowName = QStringLiteral("help");
-const QString kPage = QStringLiteral("TessalOnline.html");
+const QString kGuide = QStringLiteral("TessalOnline.html");
+const QString kFunctions = QStringLiteral("Functions.html");
+const QString kBuiltins = QStringLiteral("Builtins.html");
 constexpr QSize kUsualSize(720, 560);
 
 /// Where the page may lie, seen from the executable.
@@ -36,34 +41,54 @@ QTextBrowser& HelpWindowOf(QWidget& owner) {
   return *window;
 }
 
-}  // namespace
-
-QString FindHelpPage(const QString& programFolder) {
+QString FindPage(const QString& programFolder, const QString& page) {
   // A folder that is not known would be the current one, which holds whatever somebody put there.
   if (QDir::isRelativePath(programFolder)) return {};
   for (const char* folder : kFolders) {
-    const QString path = QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + kPage);
+    const QString path = QDir(programFolder).filePath(QString::fromLatin1(folder) + u'/' + page);
     if (QFileInfo::exists(path)) return QDir::cleanPath(path);
   }
   return {};
 }
 
-void OpenHelp(QWidget* parent, int topic) {
+void ShowPage(QWidget* parent, const QString& page, const QString& anchor) {
   const QString programFolder = QCoreApplication::applicationDirPath();
-  const QString path = FindHelpPage(programFolder);
+  const QString path = FindPage(programFolder, page);
   if (path.isEmpty()) {
     QMessageBox::warning(
         parent, strings::kError,
-        QStringLiteral("The help page %1 is missing.").arg(QDir(programFolder).filePath(kPage)));
+        QStringLiteral("The help page %1 is missing.").arg(QDir(programFolder).filePath(page)));
     return;
   }
   QTextBrowser& window = HelpWindowOf(*parent->window());
   QUrl url = QUrl::fromLocalFile(path);
-  url.setFragment(QString::number(topic));
+  url.setFragment(anchor);
   window.setSource(url);
   window.show();
   window.raise();
   window.activateWindow();
+}
+
+}  // namespace
+
+QString FindHelpPage(const QString& programFolder) {
+  return FindPage(programFolder, kGuide);
+}
+
+void OpenHelp(QWidget* parent, int topic) {
+  ShowPage(parent, kGuide, QString::number(topic));
+}
+
+void OpenReference(QWidget* parent, const QString& name) {
+  const std::string text = name.toStdString();
+  if (const BuiltinReference* builtin = ReferenceOfBuiltin(text)) {
+    ShowPage(parent, kBuiltins, QString::fromStdString(std::string(builtin->name)));
+    return;
+  }
+  std::string_view anchor;
+  if (const FunctionReference* function = ReferenceOfFunction(text)) anchor = function->name;
+  if (const WordReference* word = ReferenceOfWord(text)) anchor = word->word;
+  ShowPage(parent, kFunctions, QString::fromStdString(std::string(anchor)));
 }
 
 }  // namespace tessal

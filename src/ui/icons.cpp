@@ -84,8 +84,9 @@ constexpr KindIcon kKindIcons[] = {
 };
 
 /// In the order of `IconCommand`; they have the colour of texts.
-constexpr std::array<const char*, 8> kCommandDrawings = {"new",       "edit", "delete",  "move-up",
-                                                         "move-down", "back", "forward", "history"};
+constexpr std::array<const char*, 15> kCommandDrawings = {
+    "new",  "edit", "delete", "move-up", "move-down", "back",      "forward", "history",
+    "undo", "redo", "cut",    "copy",    "paste",     "duplicate", "rename"};
 
 struct LevelIcon {
   const char* drawing;

@@ -10,7 +10,23 @@
 
 namespace tessal {
 
-enum class IconCommand { New, Edit, Delete, MoveUp, MoveDown, Back, Forward, History };
+enum class IconCommand {
+  New,
+  Edit,
+  Delete,
+  MoveUp,
+  MoveDown,
+  Back,
+  Forward,
+  History,
+  Undo,
+  Redo,
+  Cut,
+  Copy,
+  Paste,
+  Duplicate,
+  Rename
+};
 
 /// The icon of the nodes and rows of a kind: a letter or a sign for the kind, round for what belongs to a
 /// particle class; a folder in the colour of its elements for a collection.

@@ -42,6 +42,7 @@ CListPage::CListPage(const FormContext& context, const QString& name, QWidget* p
   BuildToolBar();
   layout->addWidget(table, 1);
   connect(table, &CRowTable::RowSelected, this, &CListPage::UpdateCommands);
+  connect(table->selectionModel(), &QItemSelectionModel::selectionChanged, this, &CListPage::UpdateCommands);
   connect(table, &CRowTable::RowEntered, this, [this](int row) { EnterRow(row); });
 }
 

@@ -1,8 +1,10 @@
 #include "ui/main_view.h"
 
 #include <QAction>
+#include <QApplication>
 #include <QFontInfo>
 #include <QKeyEvent>
+#include <QLineEdit>
 #include <QMenu>
 #include <QScreen>
 #include <QScrollArea>
@@ -12,6 +14,9 @@
 #include <QToolButton>
 #include <QVBoxLayout>
 #include <algorithm>
+#include <iterator>
+#include <string_view>
+#include <utility>
 
 #include "core/document.h"
 #include "ui/account_strip.h"
@@ -19,6 +24,7 @@
 #include "ui/control_ids.h"
 #include "ui/create_hint.h"
 #include "ui/dialogs.h"
+#include "ui/edit_commands.h"
 #include "ui/element_tree.h"
 #include "ui/error_list.h"
 #include "ui/export_commands.h"
@@ -37,6 +43,7 @@
 #include "ui/strings.h"
 #include "ui/tab_order.h"
 #include "ui/text_bytes.h"
+#include "ui/text_zoom.h"
 #include "ui/tree_filter.h"
 
 namespace tessal {
@@ -64,7 +71,7 @@ std::int32_t NumberOf(const UpdateHint* argument) {
 class TypedInModel final {
  public:
   TypedInModel(std::vector<TypedValue> typedValues, TemplateCore& template_)
-      : core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
+      : unrecorded(template_.History()), core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
     for (const TypedValue& value : values) value.store();
   }
   TypedInModel(const TypedInModel&) = delete;
@@ -76,6 +83,7 @@ class TypedInModel final {
 
  private:
   NotificationsOff silent;
+  RecordingOff unrecorded;
   TemplateCore& core;
   bool wasModified;
   std::vector<TypedValue> values;
@@ -103,6 +111,9 @@ TemplateCore& CMainView::Core() const {
 void CMainView::OnInitialUpdate() {
   BuildToolBar();
   BuildLayout();
+  zoom = MakeChild<CTextZoom>(*this);
+  edits = MakeChild<CEditCommands>(*this, dialogs);
+  edits->AddTo(*editBar);
   connect(errorList, &CErrorList::Refreshed, this,
           [this] { tree->ShowMessages(errorList->MessagesOfElements()); });
   connect(errorList, &CErrorList::Refreshed, this, [this] { accountStrip->Show(Core().Account()); });
@@ -113,11 +124,11 @@ void CMainView::OnInitialUpdate() {
   connect(tree, &QTreeWidget::currentItemChanged, this, &CMainView::OnSelectionChanged);
   connect(tree, &QTreeWidget::customContextMenuRequested, this, &CMainView::OpenContextMenu);
   connect(errorList, &CErrorList::ElementChosen, this, &CMainView::SelectById);
-  auto* help = MakeChild<QAction>(strings::kHelp, this);
-  help->setShortcut(QKeySequence::HelpContents);
-  help->setShortcutContext(Qt::WidgetWithChildrenShortcut);
-  connect(help, &QAction::triggered, this, &CMainView::ShowHelp);
-  addAction(help);
+  helpContents = MakeChild<QAction>(strings::kContents, this);
+  helpContents->setShortcut(QKeySequence::HelpContents);
+  helpContents->setShortcutContext(Qt::WidgetWithChildrenShortcut);
+  connect(helpContents, &QAction::triggered, this, &CMainView::ShowHelp);
+  addAction(helpContents);
   // The first selection fills the list of messages too.
   tree->setCurrentItem(tree->RootItem());
   // A host that gives the view the focus gives it to the tree.
@@ -144,6 +155,9 @@ void CMainView::BuildToolBar() {
   button->setMenu(historyMenu);
   button->setPopupMode(QToolButton::InstantPopup);
   historyAction = toolBar->addWidget(button);
+  editBar = MakeChild<QToolBar>(this);
+  editBar->setIconSize(kIcons);
+  editBar->setAccessibleName(strings::kEditing);
 }
 
 void CMainView::BuildLayout() {
@@ -179,7 +193,10 @@ void CMainView::BuildLayout() {
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
   layout->setSpacing(0);
-  layout->addWidget(toolBar);
+  auto* bars = MakeChild<QHBoxLayout>();
+  bars->addWidget(toolBar);
+  bars->addWidget(editBar, 1);
+  layout->addLayout(bars);
   layout->addWidget(topBottom, 1);
 }
 
@@ -260,6 +277,8 @@ QWidget* CMainView::MakeTitleDetail() {
 
 void CMainView::MarkDocument() {
   if (Core().Modified()) document.SetModifiedFlag(true);
+  if (edits != nullptr) edits->Update();
+  UpdateStatus();
 }
 
 void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHint* argument) {
@@ -287,6 +306,9 @@ void CMainView::OnUpdate(const CView* /*sender*/, int hintNumber, const UpdateHi
     case hint::kMoveDown:
       if (QTreeWidgetItem* item = tree->FindById(Uid{number}))
         tree->MoveNode(*item, hintNumber == hint::kMoveUp ? -1 : 1);
+      break;
+    case hint::kStructure:
+      tree->Follow(Core());
       break;
     case hint::kAddGroup: {
       const std::int32_t group = Core().AddVisibilityGroup();
@@ -327,6 +349,7 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
     helpNumber = NodeRowOf(node).help;
   }
   UpdateNavigation();
+  edits->Update();
   // A click selects the row under the pointer, where a node that the commit has made may lie by then.
   QTimer::singleShot(0, this, [this] {
     QTreeWidgetItem* item = tree->currentItem();
@@ -490,7 +513,124 @@ void CMainView::CreateFromMenu(const CItemData& clicked) {
   request.kind = commands.kindToCreate;
   request.ownerId = commands.ownerId;
   const Uid uid = CreateElement(request);
-  if (uid != Uid::None) SelectById(uid);
+  if (uid != Uid::None) {
+    SelectById(uid);
+    FocusSymbol();
+  }
+  errorList->RefreshErrorList(Core());
+  MarkDocument();
+}
+
+void CMainView::CreateBeside() {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr) return;
+  CommitAll();
+  const CItemData node = CElementTree::DataOf(*item);
+  const NodeCommands commands = CommandsOfNode(node, Core());
+  if (commands.kindToCreate != ElementKind::None && commands.canCreate) CreateFromMenu(node);
+}
+
+void CMainView::FocusSymbol() {
+  auto* symbol = form ? form->findChild<QLineEdit*>(QString::number(control_id::kSymbol)) : nullptr;
+  if (symbol == nullptr || !symbol->isEnabled()) return FocusForm();
+  symbol->setFocus(Qt::ShortcutFocusReason);
+  symbol->selectAll();
+}
+
+void CMainView::Say(const QString& text) {
+  UpdateStatus(text.toStdString());
+}
+
+std::string CMainView::StatusText() const {
+  const auto count = Core().CountNamedElements() + Core().GetSpecieCount();
+  return (count == 1 ? strings::kOneElement : strings::kElementCount.arg(count)).toStdString();
+}
+
+namespace {
+
+// How a place is written: what sort of node it is, and what names it.
+constexpr std::string_view kSymbolPlace = "symbol ";
+constexpr std::string_view kNodePlace = "node ";
+constexpr std::string_view kGroupPlace = "group ";
+constexpr std::string_view kListPlace = "list ";
+
+}  // namespace
+
+std::string CMainView::Place() const {
+  QTreeWidgetItem* item = tree->currentItem();
+  if (item == nullptr) return {};
+  const CItemData& node = CElementTree::DataOf(*item);
+  if (node.groupIndex > 0) return std::string(kGroupPlace) + std::to_string(node.groupIndex);
+  if (!IsElement(node.id)) return std::string(kNodePlace) + std::to_string(NumberOf(node.id));
+  if (const CEL_Lagrange_Specie* specie = Core().GetParentSpecie(node.id)) {
+    return std::string(kListPlace) + std::to_string(NumberOf(node.kind)) + ' ' + specie->symbol.TextOf();
+  }
+  const CEL_Element* element = Core().GetElement(node.id);
+  return element == nullptr ? std::string() : std::string(kSymbolPlace) + element->FullSymbol();
+}
+
+void CMainView::GoTo(const std::string& place) {
+  const std::string_view text = place;
+  const auto rest = [text](std::string_view sort) { return std::string(text.substr(sort.size())); };
+  if (text.starts_with(kGroupPlace)) return SelectGroup(QString::fromStdString(rest(kGroupPlace)).toInt() - 1);
+  if (text.starts_with(kNodePlace)) return SelectById(Uid{QString::fromStdString(rest(kNodePlace)).toInt()});
+  std::uint32_t sequence = 0;
+  if (text.starts_with(kSymbolPlace) && Core().FindSymbol(rest(kSymbolPlace), sequence)) {
+    return SelectById(Core().FindRecordBySequence(sequence)->uid);
+  }
+  if (!text.starts_with(kListPlace)) return;
+  const QString list = ToScreen(rest(kListPlace));
+  const std::string name = list.section(u' ', 1).toStdString();
+  for (const auto& specie : Core().Species()) {
+    for (const auto& head : specie->Heads()) {
+      if (specie->symbol.Text() == name && NumberOf(head->Kind()) == list.section(u' ', 0, 0).toInt()) {
+        return SelectById(head->GetUid());
+      }
+    }
+  }
+}
+
+QString CMainView::FocusedControl() const {
+  const QWidget* focus = QApplication::focusWidget();
+  return form && focus != nullptr && form->isAncestorOf(focus) ? focus->objectName() : QString();
+}
+
+void CMainView::Act(const std::function<StepEffect()>& act) {
+  CommitAll();
+  const QString control = FocusedControl();
+  // It shows what may go.
+  CloseForm();
+  Follow(act());
+  QWidget* again = form && !control.isEmpty() ? form->findChild<QWidget*>(control) : nullptr;
+  if (again != nullptr && again->isEnabled()) {
+    again->setFocus(Qt::OtherFocusReason);
+  } else {
+    tree->setFocus(Qt::OtherFocusReason);
+  }
+}
+
+QTreeWidgetItem* CMainView::NodeOfSubject(const StepEffect& effect) const {
+  QTreeWidgetItem* node = IsElement(effect.subject) ? tree->FindById(effect.subject) : nullptr;
+  const auto group = static_cast<std::size_t>(effect.group);
+  if (node == nullptr && effect.group > 0) {
+    node = group <= tree->GroupItems().size() ? tree->GroupItems()[group - 1]
+                                              : tree->FindById(folder_id::kVisibilityGroups);
+  }
+  return node == nullptr ? tree->currentItem() : node;
+}
+
+void CMainView::Follow(const StepEffect& effect) {
+  tree->Follow(Core());
+  for (const Uid uid : effect.changed) {
+    if (const CEL_Element* element = Core().GetElement(uid)) tree->FollowCaption(*element);
+  }
+  QTreeWidgetItem* node = NodeOfSubject(effect);
+  if (node == tree->currentItem()) {
+    OnSelectionChanged(node, nullptr);
+  } else {
+    tree->setCurrentItem(node);
+  }
+  if (node != nullptr) tree->scrollToItem(node);
   errorList->RefreshErrorList(Core());
   MarkDocument();
 }
@@ -553,18 +693,26 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
       FocusForm();
       return true;
     }
-    if (key->modifiers() == Qt::AltModifier && (key->key() == Qt::Key_Up || key->key() == Qt::Key_Down)) {
-      MoveSelected(key->key() == Qt::Key_Up ? -1 : 1);
-      return true;
-    }
   }
   return QWidget::eventFilter(watched, happened);
 }
 
 std::vector<ViewCommand> CMainView::Commands() {
-  std::vector<ViewCommand> commands = ExportCommands(document, dialogs, *this);
-  const std::vector<ViewCommand> find = findTools->Commands();
-  commands.insert(commands.end(), find.begin(), find.end());
+  std::vector<ViewCommand> commands;
+  const auto append = [&commands](std::vector<ViewCommand> some) {
+    std::move(some.begin(), some.end(), std::back_inserter(commands));
+  };
+  append(ExportCommands(document, dialogs, *this));
+  append(edits->Commands());
+  append(zoom->Commands());
+  for (QAction* action : {back, forward})
+    commands.push_back({.menu = strings::kGoMenu, .text = {}, .action = action});
+  commands.push_back({.menu = strings::kGoMenu, .text = {}});
+  append(findTools->Commands());
+  commands.push_back({.menu = strings::kHelpMenu, .text = {}, .action = helpContents});
+  commands.push_back({.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] {
+                        OpenReference(this, {});
+                      }});
   commands.push_back(StrongColoursCommand());
   return commands;
 }

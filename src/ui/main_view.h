@@ -3,11 +3,14 @@
 #pragma once
 
 #include <QWidget>
+#include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "core/creation.h"
+#include "core/edit_history.h"
 #include "platform/docview.h"
 #include "ui/item_data.h"
 
@@ -20,11 +23,13 @@ class QVBoxLayout;
 namespace tessal {
 
 class CEL_Element;
+class CEditCommands;
 class CElementTree;
 class CAccountStrip;
 class CErrorList;
 class CFindTools;
 class CLabel;
+class CTextZoom;
 class CRightPaneBase;
 class CTessalDoc;
 class TemplateCore;
@@ -46,6 +51,9 @@ class CMainView final : public QWidget, public CView {
   /// Makes the messages of the process those of this template again.
   void OnActivate() override;
   std::vector<ViewCommand> Commands() override;
+  std::string StatusText() const override;
+  std::string Place() const override;
+  void GoTo(const std::string& place) override;
   QWidget* Widget() override { return this; }
 
   CTessalDoc& Document() const { return document; }
@@ -63,6 +71,23 @@ class CMainView final : public QWidget, public CView {
   void SelectById(Uid id);
   /// Makes an element and its node; its identity, none when nothing was made.
   Uid CreateElement(const CreateRequest& request);
+
+  // Commands.
+  /// Commits what is being entered, has an act change the template in any way, and shows what has become of it,
+  /// with the node of its subject selected.
+  void Act(const std::function<StepEffect()>& act);
+  /// Makes an element of the kind that the selected node offers, and gives its symbol the focus.
+  void CreateBeside();
+  /// Gives the symbol in the form of the selected node the focus, with its text selected.
+  void FocusSymbol();
+  /// Moves the selected element past its neighbour in the template and in the tree, where that is allowed.
+  void MoveSelected(int step);
+  /// Deletes an element, or the group of a number from 1.
+  void DeleteFromMenu(Uid id, std::int32_t groupIndex);
+  /// Shows for a while what a command has done.
+  void Say(const QString& text);
+  /// Commits until nothing is left unwritten, for when the form goes or the document is saved.
+  void CommitAll();
 
  protected:
   bool eventFilter(QObject* watched, QEvent* happened) override;
@@ -87,8 +112,6 @@ class CMainView final : public QWidget, public CView {
   QWidget* MakeMessages();
   /// The tree with its filter over it.
   QWidget* MakeTree();
-  /// Commits until nothing is left unwritten, for when the form goes or the document is saved.
-  void CommitAll();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
   void ShowHelp();
@@ -99,9 +122,10 @@ class CMainView final : public QWidget, public CView {
 
   void OpenContextMenu(const QPoint& point);
   void CreateFromMenu(const CItemData& clicked);
-  void DeleteFromMenu(Uid id, std::int32_t groupIndex);
-  /// Moves the selected element past its neighbour in the template and in the tree, where that is allowed.
-  void MoveSelected(int step);
+  void Follow(const StepEffect& effect);
+  QTreeWidgetItem* NodeOfSubject(const StepEffect& effect) const;
+  /// The name of the control of the form that has the focus; empty for none.
+  QString FocusedControl() const;
   void DeleteNode(QTreeWidgetItem& item);
   void DeleteGroup(std::int32_t position);
   QTreeWidgetItem* FolderFor(const CreateRequest& request) const;
@@ -111,11 +135,15 @@ class CMainView final : public QWidget, public CView {
   CTessalDoc& document;
   UserDialogs& dialogs;
   QToolBar* toolBar = nullptr;
+  QToolBar* editBar = nullptr;
+  QAction* helpContents = nullptr;
   QAction* back = nullptr;
   QAction* forward = nullptr;
   QAction* historyAction = nullptr;
   QMenu* historyMenu = nullptr;
   CLabel* title = nullptr;
+  CEditCommands* edits = nullptr;
+  CTextZoom* zoom = nullptr;
   CElementTree* tree = nullptr;
   CErrorList* errorList = nullptr;
   CFindTools* findTools = nullptr;

@@ -25,8 +25,13 @@ void CPlainTextField::ShowText(const QString& text) {
     TakeAsShown();
   }
   moveCursor(QTextCursor::Start);
-  document()->clearUndoRedoStacks();
   emit textChanged();
+}
+
+void CPlainTextField::TakeAsShown() {
+  shown = ContentText();
+  // What was typed is taken back with the step that has stored it.
+  document()->clearUndoRedoStacks();
 }
 
 void CPlainTextField::Retype(const QString& text) {

@@ -21,8 +21,8 @@ class CPlainTextField : public QTextEdit {
   QString ContentText() const;
   /// Whether the content is another than the one shown last.
   bool IsEdited() const { return ContentText() != shown; }
-  /// From now on the present content is the one that counts as shown.
-  void TakeAsShown() { shown = ContentText(); }
+  /// From now on the present content is the one that counts as shown, and nothing is left to undo.
+  void TakeAsShown();
   /// Replaces the content as the user could, with the caret where it was.
   void Retype(const QString& text);
 

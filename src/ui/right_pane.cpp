@@ -62,7 +62,10 @@ void CRightPaneBase::Load() {
 void CRightPaneBase::Commit() {
   if (committing) return;
   committing = true;
-  FormToItem();
+  {
+    const EditStep step(Core().History());
+    FormToItem();
+  }
   const bool created = OfferUndefinedSymbols();
   dirty = false;
   committing = false;

@@ -60,6 +60,8 @@ class CRightPaneBase : public QWidget {
   /// What the next commit would write, without the symbol: a rename asks first.
   virtual std::vector<TypedValue> TypedValues() const { return {}; }
 
+  /// The elements that are selected in the form itself: those of a list's rows.
+  virtual std::vector<Uid> SelectedElements() const { return {}; }
   /// Gives the field of a text the focus, and marks a part of the text; the field, or none without one.
   virtual QWidget* ShowText(const TextToShow& /*text*/) { return nullptr; }
 

@@ -1,5 +1,6 @@
 #include "ui/row_model.h"
 
+#include <QTimer>
 #include <algorithm>
 #include <utility>
 
@@ -76,10 +77,21 @@ QVariant CRowModel::headerData(int section, Qt::Orientation orientation, int rol
   return titles.value(section);
 }
 
+bool CRowModel::dropMimeData(const QMimeData* /*data*/, Qt::DropAction /*action*/, int row, int /*column*/,
+                             const QModelIndex& parent) {
+  if (!moveRowsTo || parent.isValid()) return false;
+  const int target = row < 0 ? rowCount() : row;
+  // The view is still busy with the drag.
+  QTimer::singleShot(0, this, [this, target] { moveRowsTo(target); });
+  return true;
+}
+
 Qt::ItemFlags CRowModel::flags(const QModelIndex& index) const {
   const bool isEditable =
       std::find(editableColumns.begin(), editableColumns.end(), index.column()) != editableColumns.end();
-  const Qt::ItemFlags plain = QAbstractTableModel::flags(index) | Qt::ItemNeverHasChildren;
+  Qt::ItemFlags plain = QAbstractTableModel::flags(index) | Qt::ItemNeverHasChildren;
+  // What is dragged goes between rows, not into one.
+  if (moveRowsTo) plain |= index.isValid() ? Qt::ItemIsDragEnabled : Qt::ItemIsDropEnabled;
   return isEditable ? plain | Qt::ItemIsEditable : plain;
 }
 

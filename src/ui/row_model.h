@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <functional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/uid.h"
@@ -31,6 +32,8 @@ class CRowModel final : public QAbstractTableModel {
   void Fill(QStringList columnTitles, std::vector<Row> shownRows, TextOf lookUp);
   /// The columns that can be edited in place.
   void AllowEditing(std::vector<int> columns, StoreText store);
+  /// Rows can be dragged to another place among them, before the row of the number or to the end.
+  void AllowMoving(std::function<void(int row)> moveTo) { moveRowsTo = std::move(moveTo); }
   /// The column whose cells carry an icon, and which.
   void ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf);
 
@@ -47,6 +50,9 @@ class CRowModel final : public QAbstractTableModel {
   bool setData(const QModelIndex& index, const QVariant& value, int role) override;
   QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
   Qt::ItemFlags flags(const QModelIndex& index) const override;
+  Qt::DropActions supportedDropActions() const override { return Qt::MoveAction; }
+  bool dropMimeData(const QMimeData* data, Qt::DropAction action, int row, int column,
+                    const QModelIndex& parent) override;
 
  private:
   QStringList titles;
@@ -54,6 +60,7 @@ class CRowModel final : public QAbstractTableModel {
   TextOf textOf;
   std::vector<int> editableColumns;
   StoreText storeText;
+  std::function<void(int row)> moveRowsTo;
   int iconColumn = -1;
   std::function<QIcon(const Row&)> icon;
 };

@@ -49,6 +49,23 @@ void CRowTable::Fill(QStringList titles, std::vector<CRowModel::Row> shown, CRow
   emit RowSelected(-1);
 }
 
+void CRowTable::AllowSeveral(std::function<void(int row)> moveTo) {
+  rows->AllowMoving(std::move(moveTo));
+  setSelectionMode(ExtendedSelection);
+  setDragEnabled(true);
+  setAcceptDrops(true);
+  setDropIndicatorShown(true);
+  setDragDropOverwriteMode(false);
+  setDragDropMode(InternalMove);
+}
+
+std::vector<int> CRowTable::SelectedRows() const {
+  std::vector<int> selected;
+  for (const QModelIndex& row : selectionModel()->selectedRows()) selected.push_back(row.row());
+  std::sort(selected.begin(), selected.end());
+  return selected;
+}
+
 int CRowTable::CurrentRow() const {
   return currentIndex().isValid() ? currentIndex().row() : -1;
 }

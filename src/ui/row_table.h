@@ -2,6 +2,8 @@
 #pragma once
 
 #include <QTreeView>
+#include <functional>
+#include <vector>
 
 #include "ui/row_model.h"
 
@@ -16,6 +18,11 @@ class CRowTable final : public QTreeView {
   CRowModel& Model() const { return *rows; }
   /// Replaces the content, and sizes the columns to it.
   void Fill(QStringList titles, std::vector<CRowModel::Row> shown, CRowModel::TextOf textOf);
+
+  /// Several rows can be selected, and dragged to another place.
+  void AllowSeveral(std::function<void(int row)> moveTo);
+  /// The rows that are selected, in their order.
+  std::vector<int> SelectedRows() const;
 
   /// The selected row, -1 for none.
   int CurrentRow() const;

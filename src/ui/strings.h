@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QString>
+#include <array>
 
 namespace tessal::strings {
 
@@ -13,6 +14,38 @@ inline const QString kHelp = QStringLiteral("Tessal Help");
 inline const QString kNavigateBack = QStringLiteral("Navigate back");
 inline const QString kNavigateForward = QStringLiteral("Navigate forward");
 inline const QString kNavigationHistory = QStringLiteral("Navigation history");
+
+// The commands of the edit menu. The names of steps follow "Undo" and "Redo".
+inline constexpr const char* kEditMenu = "&Edit";
+inline constexpr const char* kViewMenu = "&View";
+inline constexpr const char* kGoMenu = "&Go";
+inline constexpr const char* kHelpMenu = "&Help";
+inline const QString kZoomIn = QStringLiteral("&Larger Texts");
+inline const QString kZoomOut = QStringLiteral("&Smaller Texts");
+inline const QString kZoomUsual = QStringLiteral("&Usual Size of Texts");
+inline const QString kContents = QStringLiteral("&Contents");
+inline constexpr const char* kFunctions = "&Functions";
+inline const QString kUndo = QStringLiteral("&Undo");
+inline const QString kRedo = QStringLiteral("&Redo");
+inline const QString kCut = QStringLiteral("Cu&t");
+inline const QString kCopy = QStringLiteral("&Copy");
+inline const QString kPaste = QStringLiteral("&Paste");
+inline const QString kDuplicate = QStringLiteral("Dup&licate");
+inline const QString kNewElement = QStringLiteral("&New Element");
+inline const QString kDeleteElement = QStringLiteral("&Delete");
+inline const QString kRenameElement = QStringLiteral("Rena&me");
+inline const QString kMoveElementUp = QStringLiteral("Move &Up");
+inline const QString kMoveElementDown = QStringLiteral("Move Do&wn");
+inline const QString kEditing = QStringLiteral("Editing");
+inline const QString kUndone = QStringLiteral("Undone: %1");
+inline const QString kRedone = QStringLiteral("Done again: %1");
+inline const QString kStillUsed = QStringLiteral("Not deleted, because others use them: %1");
+inline const QString kNotMoved =
+    QStringLiteral("Not moved, because a use would come before its definition: %1");
+inline const QString kCopied = QStringLiteral("Copied: %1");
+inline const QString kPasted = QStringLiteral("Pasted: %1");
+inline const QString kElementCount = QStringLiteral("%1 elements");
+inline const QString kOneElement = QStringLiteral("1 element");
 
 // The commands of the list pages.
 inline const QString kNew = QStringLiteral("New");
@@ -101,6 +134,16 @@ inline const QString kSelectDocumentation = QStringLiteral("Select documentation
 inline const QString kOpenDocumentation = QStringLiteral("Open documentation");
 inline const QString kDocumentationFilter =
     QStringLiteral("Portable data files (*.pdf);;Word documents (*.doc *.docx);;All files (*)");
+
+// Expressions while they are typed. The groups are in the order of their enumeration.
+inline const QString kCompletions = QStringLiteral("Completions");
+inline const std::array<QString, 7> kCompletionGroups = {QStringLiteral("symbol"),
+                                                         QStringLiteral("function"),
+                                                         QStringLiteral("user function"),
+                                                         QStringLiteral("interaction of particles"),
+                                                         QStringLiteral("keyword"),
+                                                         QStringLiteral("built-in, not in the template yet"),
+                                                         QStringLiteral("property of a particle")};
 
 // The creation dialog.
 inline const QString kSkip = QStringLiteral("Skip");

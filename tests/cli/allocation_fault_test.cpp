@@ -71,6 +71,7 @@ constexpr Row kRows[] = {
     {"Html", "html FILE", kOpen, false, 11},
     {"Json", "check FILE --format json", kOpen, true, 11, 1},
     {"Tree", "tree FILE", kOpen, true, 1},
+    {"Describe", "functions --describe --format json", kMain, false, 101},
     {"Help", "--help", kMain, true, 11},
 };
 

@@ -7,7 +7,9 @@
 #include <stdexcept>
 
 #include "core/comparison.h"
+#include "core/completion.h"
 #include "core/error_registry.h"
+#include "core/expression_faults.h"
 #include "core/loaded_template.h"
 #include "core/rename.h"
 #include "core/symbol_ranking.h"
@@ -129,6 +131,35 @@ CEL_Element& AddElement(TemplateCore& core, ElementKind kind, CEL_Lagrange_Speci
   CEL_Element* added = specie == nullptr ? core.AddElement(kind) : specie->AddMember(kind);
   if (added == nullptr) throw std::invalid_argument("no kind that can be made");
   return *added;
+}
+
+/// What is offered at the bar in an expression of an element: the first rows, with the group that each is of.
+std::string Offered(const TemplateCore& core, const CEL_Element& user, std::string expression) {
+  constexpr std::array<std::string_view, 7> kGroups = {"symbol",  "function", "user function", "verb",
+                                                       "keyword", "built-in", "property"};
+  const std::size_t caret = expression.find('|');
+  expression.erase(caret, 1);
+  const CaretContext context = ContextAt(expression, caret);
+  const std::string typed = expression.substr(context.word.start, caret - context.word.start);
+  std::string rows;
+  constexpr std::size_t kShown = 6;
+  const std::vector<Completion> matching = Matching(CompletionsFor(core, user, context.place), typed);
+  for (const Completion& row : std::span(matching).first(std::min(kShown, matching.size()))) {
+    rows +=
+        std::string(row.text) + ", " + std::string(kGroups.at(static_cast<std::size_t>(row.group))) + "\n";
+  }
+  return matching.size() <= kShown ? rows
+                                   : rows + "and " + std::to_string(matching.size() - kShown) + " more\n";
+}
+
+/// What is wrong with a text as the expression of an element, at the offset where it is.
+std::string FaultsIn(const TemplateCore& core, const CEL_Element& user, const std::string& expression) {
+  std::string rows;
+  for (const ExpressionFault& fault : FindExpressionFaults(core, user, expression)) {
+    rows += std::to_string(fault.at.start) + "-" + std::to_string(fault.at.start + fault.at.length) + " " +
+            fault.plain + (fault.words.empty() ? "" : " [" + fault.words + "]") + "\n";
+  }
+  return rows.empty() ? "none" : rows;
 }
 
 }  // namespace
@@ -559,6 +590,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"strict", [](S s, W w) { return s.core.SetStrictScopeRule(Number(w.at(0))), ""; }},
       {"rebuilds", [](S s, W w) { return s.core.SetRebuildEnabled(w.at(0) == "on"), ""; }},
       {"all-builtins", [](S s, W w) { return s.core.SetShowAllBuiltIns(w.at(0) == "yes"), ""; }},
+      {"complete", [](S s, W w) { return Offered(s.core, s.Element(w.at(0)), w.at(1)); }},
+      {"faults", [](S s, W w) { return FaultsIn(s.core, s.Element(w.at(0)), w.at(1)); }},
       {"can-delete", [](S s, W w) { return YesNo(s.core.CanDelete(s.UidOf(w.at(0)))); }},
       {"can-move", [](S s, W w) { return YesNo(s.core.CanMove(s.UidOf(w.at(0)), s.UidOf(w.at(1)))); }},
       {"refusal", [](S s, W w) { return RenameRefusal(s.core, w.at(0)); }},

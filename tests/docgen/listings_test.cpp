@@ -4,6 +4,7 @@
 #include "core/template_core.h"
 #include "docgen/html_documentation.h"
 #include "docgen/overview.h"
+#include "docgen/reference_pages.h"
 #include "support/case_file.h"
 
 namespace tessal {
@@ -63,11 +64,19 @@ INSTANTIATE_TEST_SUITE_P(Examples, Documentation,
                                          "lake_management", "faults"),
                          [](const auto& example) { return example.param; });
 
+TEST(ReferencePages, AreTheFilesOfTheDocumentationAndTheHelp) {
+  test::ExpectPage("../docs/functions.md", PageMarkdown(PageOfFunctions()));
+  test::ExpectPage("../docs/builtins.md", PageMarkdown(PageOfBuiltins()));
+  test::ExpectPage("../docs/help/Functions.html", PageHtml(PageOfFunctions()));
+  test::ExpectPage("../docs/help/Builtins.html", PageHtml(PageOfBuiltins()));
+}
+
 TEST(EmptyTemplate, HasAPageAndAnOverviewWithoutRows) {
   TemplateCore core;
   EXPECT_EQ(OverviewText(core, BuildOverview(core)),
             "Template \r\nNo.\tSymbol\tType\tExpression/ Default value\tDescription\r\n");
-  test::ExpectListing("docgen/cases/empty_page.txt", HtmlDocumentation(core, {std::string(UsualMathJax())}, std::tm{}));
+  test::ExpectListing("docgen/cases/empty_page.txt",
+                      HtmlDocumentation(core, {std::string(UsualMathJax())}, std::tm{}));
 }
 
 }  // namespace

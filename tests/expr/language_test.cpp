@@ -10,12 +10,14 @@
 #include <sstream>
 
 #include "core/error_registry.h"
+#include "docgen/latex.h"
 #include "docgen/mathml.h"
 #include "expr/identifiers.h"
 #include "expr/interaction_rewriter.h"
 #include "expr/parser.h"
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
+#include "platform/ascii.h"
 #include "support/case_file.h"
 
 namespace tessal {
@@ -109,6 +111,10 @@ std::string RightSide(const std::string& text) {
   return block.empty() ? "" : block.substr(start, block.size() - start - end) + "\n";
 }
 
+std::string Latex(const ExpressionNode& tree) {
+  return TreeToLatex(tree, "", false);
+}
+
 std::string NameUses(const std::string& text) {
   std::string uses;
   if (IsValidSymbolSpelling(text)) uses += " spelt";
@@ -129,6 +135,9 @@ const std::map<std::string, std::string (*)(const std::string&)> kQuestions = {
     {"right side", RightSide},
     {"name", NameUses},
     {"mathml", [](const std::string& text) { return ExpressionToMathML(text, "s", false); }},
+    {"latex", [](const std::string& text) { return OfTree(text, Latex); }},
+    {"latex equation", [](const std::string& text) { return ExpressionToLatex(text, "k_20", false) + "\n"; }},
+    {"latex derivative", [](const std::string& text) { return ExpressionToLatex(text, "DO", true) + "\n"; }},
     {"derivative", [](const std::string& text) { return ExpressionToMathML(text, "s", true); }},
     {"rewrite", [](const std::string& text) { return OfTree(text, RewriteExpressionText); }},
     {"unquoted", [](const std::string& text) { return std::string(StripExpressionQuotes(text)) + "\n"; }},
@@ -181,7 +190,7 @@ TEST_P(Language, IsAsTheCasesSay) {
 
 INSTANTIATE_TEST_SUITE_P(Cases, Language,
                          testing::Values("scanning.txt", "trees.txt", "failures.txt", "checks.txt",
-                                         "output.txt"));
+                                         "output.txt", "latex.txt"));
 
 /// What the bars of a text separate.
 std::vector<std::string> PartsOf(const std::string& text) {
@@ -215,6 +224,42 @@ TEST_F(Language, RandomExpressionsParseTheSameWhateverTheirBlanks) {
     std::string spaced;
     for (const char character : text) spaced += character == ' ' ? " \n\t/* */ " : std::string(1, character);
     ASSERT_EQ(Tree("(" + spaced + ")"), tree) << "seed " << seed;
+  }
+}
+
+/// What is open and not closed, or closed and not open, in a text of LaTeX; nothing where all is in order.
+std::string Unbalanced(const std::string& latex) {
+  static const std::map<std::string, std::string> ends = {
+      {"{", "}"}, {"\\left", "\\right"}, {"\\begin", "\\end"}};
+  std::vector<std::string> open;
+  for (std::size_t place = 0; place < latex.size();) {
+    std::size_t end = place + 1;
+    if (latex[place] == '\\') {
+      while (end < latex.size() && IsAsciiLetter(latex[end])) ++end;
+      if (end == place + 1) ++end;
+    }
+    const std::string token = latex.substr(place, end - place);
+    place = end;
+    if (ends.contains(token)) open.push_back(ends.at(token));
+    if (token != "}" && token != "\\right" && token != "\\end") continue;
+    if (open.empty() || open.back() != token) return token + " before " + latex.substr(place, 20);
+    open.pop_back();
+  }
+  return open.empty() ? "" : "no " + open.back();
+}
+
+TEST_F(Language, LatexOfRandomExpressionsClosesWhatItOpens) {
+  EXPECT_EQ(Unbalanced("{\\{a\\right"), "\\right before ");
+  EXPECT_EQ(Unbalanced("\\left({a}"), "no \\right");
+  for (unsigned seed = 1; seed <= 500; ++seed) {
+    std::mt19937 random(seed);
+    const std::string text = RandomExpression(random, 6);
+    const std::string latex = ExpressionToLatex(text, "s", seed % 2 == 0);
+    ASSERT_EQ(Unbalanced(latex), "") << "seed " << seed << ": " << text << "\n" << latex;
+    // Two signs side by side would be misread, and what is bracketed is never empty.
+    for (const char* fault : {"+ -", "- -", "\\cdot -", "\\left(\\right)("}) {
+      ASSERT_EQ(latex.find(fault), std::string::npos) << "seed " << seed << ": " << text << "\n" << latex;
+    }
   }
 }
 
@@ -259,6 +304,7 @@ TEST_F(Language, LongChainsNeedNoStack) {
       nullptr);
   EXPECT_EQ(deepest, 300'000);
   EXPECT_FALSE(TreeToMathML(copy.Root(), "s", false).empty());
+  EXPECT_EQ(Latex(copy.Root()), "\\mathrm{a}" + Repeated(" \\cdot \\mathrm{a}", 300'000));
   EXPECT_EQ(Findings(product), "");
 }
 

@@ -2,6 +2,7 @@
 // For tests and fuzz targets alike.
 #pragma once
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -38,7 +39,9 @@ inline std::string FieldsOf(const CEL_Element& element) {
   for (const ElementField& field : fields) {
     if (!IsInNoFile(element, field.name)) text += field.name + "=" + FieldText(field) + "\n";
   }
-  for (const auto& [group, level] : element.Visibility()) {
+  auto memberships = element.Visibility();
+  std::sort(memberships.begin(), memberships.end());
+  for (const auto& [group, level] : memberships) {
     text += "member of " + std::to_string(group) + "/" + std::to_string(level) + "\n";
   }
   return text;

@@ -16,9 +16,9 @@ TEST_P(Cases, GiveWhatTheFileSays) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Editor, Cases,
-                         testing::Values("commits", "names", "choices", "expressions", "messages", "finding",
-                                         "nodes", "visits", "groups", "lists", "root", "visibility",
-                                         "particles", "exports"),
+                         testing::Values("commits", "names", "choices", "expressions", "completion",
+                                         "expression_help", "messages", "finding", "nodes", "undo", "visits",
+                                         "groups", "lists", "root", "visibility", "particles", "exports"),
                          [](const auto& file) { return file.param; });
 
 }  // namespace

@@ -11,6 +11,7 @@
 #include <QSplitter>
 #include <QTest>
 #include <QTextBlock>
+#include <QTextBrowser>
 #include <QTextLayout>
 #include <QTimer>
 #include <filesystem>
@@ -412,6 +413,24 @@ TEST(Help, IsNotTakenFromTheCurrentFolder) {
   }
   EXPECT_EQ(FindHelpPage(QDir::currentPath()), page);
   QDir::setCurrent(former);
+}
+
+TEST(Help, OpensTheReferenceAtAName) {
+  QWidget owner;
+  const std::pair<const char*, const char*> cases[] = {
+      {"sinh", "SINH(x)"}, {"Temperature", "TEMPERATURE"}, {"GET_HSO4", "GET_HSO4("}, {"XPOS", "XPOS"},
+      {"", "Functions"},   {"nobody", "Functions"}};
+  for (const auto& [name, heading] : cases) {
+    OpenReference(&owner, QString::fromLatin1(name));
+    const auto* window = owner.findChild<QTextBrowser*>(QStringLiteral("help"));
+    ASSERT_NE(window, nullptr);
+    const auto isAtTop = [window, start = QString::fromLatin1(heading)] {
+      const QTextBlock top = window->cursorForPosition({0, 0}).block();
+      return top.text().startsWith(start) || top.next().text().startsWith(start);
+    };
+    EXPECT_TRUE(QTest::qWaitFor(isAtTop, 1000))
+        << name << " shows " << window->cursorForPosition({0, 0}).block().text().toStdString();
+  }
 }
 
 }  // namespace

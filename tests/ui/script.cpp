@@ -25,6 +25,7 @@
 #include "ui/found_list.h"
 #include "ui/go_to_symbol.h"
 #include "ui/message_bar.h"
+#include "ui/expression_actions.h"
 #include "ui/page_actions.h"
 #include "ui/text_bytes.h"
 #include "ui/tree_filter.h"
@@ -221,9 +222,34 @@ std::string Marks(Editor& editor, const Words& /*words*/) {
 }
 
 /// "Export Overview" runs the command of the view whose text has this in it, and lists the files then there.
+/// The action of the edit menu whose text begins so.
+QAction* EditAction(Editor& editor, const QString& text) {
+  for (const ViewCommand& command : editor.View().Commands()) {
+    if (command.action != nullptr && command.action->text().remove(u'&').startsWith(text)) return command.action;
+  }
+  return nullptr;
+}
+
+void UseEditMenu(Editor& editor, const Words& words) {
+  QAction* action = EditAction(editor, words.first);
+  ASSERT_TRUE(action != nullptr && action->isEnabled()) << words.all;
+  action->trigger();
+}
+
+/// What can be taken back and done again, and whether there is anything to save.
+std::string Steps(Editor& editor, const Words& /*words*/) {
+  std::string text;
+  for (const char* name : {"Undo", "Redo"}) {
+    const QAction* action = EditAction(editor, QString::fromLatin1(name));
+    text += action->isEnabled() ? action->text().remove(u'&').toStdString() + "\n" : "";
+  }
+  const bool isMarked = editor.Document().Title().find("Modified") != std::string::npos;
+  return text + (isMarked && editor.Document().IsModified() ? "modified\n" : "as saved\n");
+}
+
 std::string RunCommand(Editor& editor, const Words& words) {
   for (const ViewCommand& command : editor.View().Commands()) {
-    if (ToScreen(command.text).remove(u'&').contains(words.first)) command.run();
+    if (command.run && ToScreen(command.text).remove(u'&').contains(words.first)) command.run();
   }
   QDirIterator file(QFileInfo(ToScreen(editor.Path())).path(), QDir::Files, QDirIterator::Subdirectories);
   QStringList found;
@@ -356,6 +382,14 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        QInputMethodEvent unsure(words.first, {});
        QApplication::sendEvent(QApplication::focusWidget(), &unsure);
      }},
+    // Typing pauses long enough.
+    {"pause",
+     [](Editor& editor, auto& /*words*/) {
+       for (auto* timer : editor.View().findChildren<QTimer*>(QStringLiteral("TypingPause"))) {
+         if (timer->isActive()) QTest::qWait(timer->interval());
+         if (timer->isActive()) QTest::qWait(1);
+       }
+     }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
     {"answer",
      [](Editor& editor, auto& words) {
@@ -421,6 +455,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
      }},
     {"right-click", RightClick},
     {"menu-key", UseMenuKey},
+    {"edit", UseEditMenu},
 };
 
 const std::map<std::string, std::string (*)(Editor& editor, const Words& words)> kLooks = {
@@ -437,6 +472,8 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
+    {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
     {"found", Found},
     {"shown-messages", ShownMessages},
@@ -453,6 +490,7 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
        return Lines(shown);
      }},
     {"command", RunCommand},
+    {"steps", Steps},
     {"tabs", PressTab},
     {"save", Save},
     {"commands", [](Editor& editor, auto& /*words*/) { return CommandsText(editor); }},

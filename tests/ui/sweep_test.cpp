@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <QCheckBox>
+#include <QLabel>
 #include <QTabWidget>
 #include <QTest>
 
@@ -10,6 +11,7 @@
 #include "support/template_content.h"
 #include "support/template_text.h"
 #include "ui/editor.h"
+#include "ui/element_form.h"
 #include "ui/node_kinds.h"
 
 namespace tessal {
@@ -119,6 +121,55 @@ void SweepTemplate(const std::string& text) {
   ASSERT_TRUE(editor.Document().OnSaveDocument(saved));
   const std::string content = test::TemplateContent(editor.Core());
   EXPECT_EQ(ContentOf(saved), content);
+}
+
+/// What the fields of the form that is open do not explain: a label, or a choice that is no name of the
+/// template's own.
+QStringList Unexplained(Editor& editor) {
+  const QStringList ownNames = {"Fish", "Pike", "Fish_m", "Pike_m", "S", "k", "f"};
+  QStringList missing;
+  QList<CElementForm*> forms = editor.View().Form()->findChildren<CElementForm*>();
+  if (auto* whole = qobject_cast<CElementForm*>(editor.View().Form())) forms.append(whole);
+  for (const CElementForm* form : forms) {
+    for (const auto* label : form->findChildren<QLabel*>()) {
+      const auto* line = qobject_cast<const QLineEdit*>(label->buddy());
+      const bool isCount = line != nullptr && line->isReadOnly() && line->accessibleDescription().isEmpty();
+      if (label->buddy() != nullptr && !isCount && label->toolTip().isEmpty()) missing.append(label->text());
+    }
+    for (const auto* combo : form->findChildren<QComboBox*>()) {
+      for (int entry = 0; entry < combo->count(); ++entry) {
+        const QString word = combo->itemText(entry);
+        if (ownNames.contains(word)) continue;
+        const QString tip = combo->itemData(entry, Qt::ToolTipRole).toString();
+        const bool isShown = entry == combo->currentIndex();
+        if (tip.isEmpty() || (isShown && !combo->toolTip().contains(word))) {
+          missing.append(combo->accessibleName() + u' ' + word);
+        }
+      }
+    }
+  }
+  return missing;
+}
+
+TEST(Forms, ExplainTheirFieldsAndTheWordsThatTheyOffer) {
+  Editor editor(test::ModelText(kAllKinds));
+  editor.Core().SetShowAllBuiltIns(true);
+  int choices = 0;
+  for (const Path& path : AllNodes(*editor.Tree().RootItem())) {
+    editor.Tree().setCurrentItem(&NodeAt(editor, path));
+    choices += static_cast<int>(editor.View().Form()->findChildren<QComboBox*>().size());
+    EXPECT_EQ(Unexplained(editor), QStringList()) << editor.Selected().toStdString();
+  }
+  EXPECT_GE(choices, 50);
+  // A search offers other words in each of its frameworks and purposes.
+  editor.Select(QStringLiteral("Fish_s"));
+  for (const char* framework : {"LAGRANGE", "EULER"}) {
+    editor.Choose(QStringLiteral("Framework"), framework);
+    for (const QString& purpose : Editor::Offered(editor.Field<QComboBox>(QStringLiteral("Purpose")))) {
+      editor.Choose(QStringLiteral("Purpose"), purpose);
+      EXPECT_EQ(Unexplained(editor), QStringList()) << framework << " " << purpose.toStdString();
+    }
+  }
 }
 
 class Sweep : public testing::TestWithParam<const char*> {};
