@@ -3,6 +3,7 @@
 #include <benchmark/benchmark.h>
 
 #include <cstdint>
+#include <fstream>
 #include <stdexcept>
 #include <string>
 #include <utility>
@@ -163,5 +164,64 @@ void SymbolRanking(benchmark::State& state) {
     benchmark::DoNotOptimize(SymbolsByRank(core, "cs1", 100).data());
 }
 BENCHMARK(SymbolRanking)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// One step taken back: of a value, of a deletion with what follows for all numbers, of a rename.
+void Undo(benchmark::State& state) {
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  core.History().Start();
+  CEL_Process& process = core.GetProcess(core.GetProcessCount() / 2);
+  process.expression.SetText(process.expression.TextOf() + " + 1");
+  core.AddConstant();
+  core.RenameSymbol(core.GetConstant(0).symbol.TextOf(), "renamed", true);
+  for ([[maybe_unused]] auto iteration : state) {
+    if (!core.Undo()) {
+      state.PauseTiming();
+      while (core.Redo()) continue;
+      state.ResumeTiming();
+    }
+  }
+}
+BENCHMARK(Undo)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// How much of the process's memory is in use, in MB.
+double ResidentMegabytes() {
+  std::ifstream status("/proc/self/statm");
+  std::size_t all = 0;
+  std::size_t resident = 0;
+  status >> all >> resident;
+  return static_cast<double>(resident) * 4096.0 / 1e6;
+}
+
+/// What 10,000 steps take: texts, renames, creations and deletions in turns.
+void MemoryOfSteps(benchmark::State& state) {
+  constexpr int kSteps = 10'000;
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  double before = 0.0;
+  for ([[maybe_unused]] auto iteration : state) {
+    core.History().Start();
+    before = ResidentMegabytes();
+    core.SetRebuildEnabled(false);
+    for (int step = 0; step < kSteps; step += 2) {
+      const auto place = static_cast<std::size_t>(step) % core.GetProcessCount();
+      const EditStep changes(core.History());
+      core.GetProcess(place).expression.SetText(core.GetProcess(place).expression.TextOf() + " + 1");
+      core.GetProcess(place).description.SetText("A description of some length, number " +
+                                                 std::to_string(step));
+    }
+    core.SetRebuildEnabled(true);
+    for (int step = 1; step < kSteps; step += 2) {
+      if (step % 100 == 1) core.AddConstant();
+      const auto place = static_cast<std::size_t>(step) % core.GetConstantCount();
+      core.GetConstant(place).unit.SetText("unit " + std::to_string(step));
+    }
+    state.counters["steps"] = static_cast<double>(core.History().UndoCount());
+    state.counters["MB"] = ResidentMegabytes() - before;
+  }
+}
+BENCHMARK(MemoryOfSteps)->Arg(10'000)->Iterations(1)->Unit(benchmark::kMillisecond);
 
 }  // namespace

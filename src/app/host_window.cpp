@@ -450,8 +450,7 @@ void HostWindow::KeepCurrent() {
   OpenDocument* kept = Current();
   if (kept == nullptr) return;
   kept->File().TakeAsKnown();
-  // It is what the file does not hold.
-  kept->Document().SetModifiedFlag(true);
+  kept->Document().NoteOtherFile();
   workTimer.NoteInput();
   UpdateTitles();
 }

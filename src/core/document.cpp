@@ -153,6 +153,11 @@ std::optional<StepEffect> CTessalDoc::Redo() {
   return effect;
 }
 
+void CTessalDoc::NoteOtherFile() {
+  core.History().ForgetSaved();
+  SetModifiedFlag(true);
+}
+
 void CTessalDoc::FollowMark() {
   if (core.Modified()) return SetModifiedFlag(true);
   CDocument::SetModifiedFlag(false);

@@ -78,6 +78,7 @@ class CTessalDoc final : public CDocument {
   /// when there is no step.
   std::optional<StepEffect> Undo();
   std::optional<StepEffect> Redo();
+  void NoteOtherFile() override;
   /// Marks the title too. The mark is taken off by the title that a save gives.
   void SetModifiedFlag(bool flag) override;
 

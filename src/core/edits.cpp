@@ -17,6 +17,8 @@ template <class... Visitors>
 struct Overloaded : Visitors... {
   using Visitors::operator()...;
 };
+template <class... Visitors>
+Overloaded(Visitors...) -> Overloaded<Visitors...>;
 
 void SetValue(CEL_Property& property, const PropertyValue& value) {
   std::visit(Overloaded{[&property](double number) { property.SetReal(number); },

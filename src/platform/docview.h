@@ -68,6 +68,9 @@ class CDocument {
   virtual bool IsModified() const { return modified; }
   virtual void SetModifiedFlag(bool flag) { modified = flag; }
 
+  /// The document's file has come to hold something else, which the document does not follow.
+  virtual void NoteOtherFile() { SetModifiedFlag(true); }
+
   const std::string& Title() const { return title; }
   void SetTitle(const std::string& text) { title = text; }
   const std::string& PathName() const { return pathName; }

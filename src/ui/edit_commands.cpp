@@ -136,8 +136,20 @@ void CEditCommands::Update() {
   name(Redo, history.RedoName());
   QTreeWidgetItem* item = view.Tree().currentItem();
   if (item == nullptr) return;
-  const NodeCommands node = CommandsOfNode(CElementTree::DataOf(*item), Core());
+  const CItemData& data = CElementTree::DataOf(*item);
+  const NodeCommands node = CommandsOfNode(data, Core());
   actions[New]->setEnabled(node.kindToCreate != ElementKind::None && node.canCreate);
+  const QWidget* focus = QApplication::focusWidget();
+  const bool isInText =
+      qobject_cast<const QLineEdit*>(focus) != nullptr || qobject_cast<const QTextEdit*>(focus) != nullptr;
+  const std::vector<Uid> selected = Selected();
+  const bool hasCopyable = std::any_of(selected.begin(), selected.end(), [this](Uid uid) {
+    const CEL_Element* element = Core().GetElement(uid);
+    return element != nullptr && CanCopy(*element);
+  });
+  for (const Command command : {Cut, Copy}) actions[command]->setEnabled(isInText || hasCopyable);
+  for (const Command command : {Duplicate, MoveUp, MoveDown}) actions[command]->setEnabled(hasCopyable);
+  actions[Delete]->setEnabled(hasCopyable || data.groupIndex > 0);
 }
 
 void CEditCommands::WatchField(QWidget* field) {

@@ -2,7 +2,11 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdint>
+#include <functional>
 #include <random>
+#include <string>
+#include <vector>
 
 #include "core/document.h"
 #include "core/loaded_template.h"
@@ -32,6 +36,138 @@ TEST(History, TakesAnyEditsBackAndDoesThemAgain) {
     const std::string fault = test::FaultOfHistory(*loaded, choices, 60, folder.File("again.tessal"));
     ASSERT_EQ(fault, "") << "seed " << seed;
   }
+}
+
+class Steps : public testing::Test {
+ protected:
+  Steps()
+      : loaded(test::TemplateFromNotation("constant k 0.3\nconstant m 1\nauxiliary a k*2\nprocess p a + k\n"
+                                          "state S p\nclass Fish\nclass.state Fish_w k\nsettings\n")),
+        core(*loaded),
+        history(core.History()) {
+    history.Start();
+  }
+
+  std::string Undone() {
+    const auto effect = core.Undo();
+    return effect ? effect->name : "nothing";
+  }
+  CEL_Element& Named(const std::string& symbol) {
+    std::uint32_t sequence = 0;
+    EXPECT_TRUE(core.FindSymbol(symbol, sequence)) << symbol;
+    return *core.GetElementBySequence(sequence);
+  }
+
+  test::LoadedTemplate loaded;
+  TemplateCore& core;
+  EditHistory& history;
+};
+
+TEST_F(Steps, AreNamedAfterWhatTheyChange) {
+  core.RenameSymbol("k", "kd", true);
+  core.GetConstant(1).unit.SetText("d");
+  {
+    const EditStep step(history);
+    core.GetConstant(1).unit.SetText("g");
+    core.GetConstant(1).defaultValue.SetReal(2);
+  }
+  core.DeleteElement(core.GetConstant(1).GetUid());
+  CreateRequest request;
+  request.kind = ElementKind::Process;
+  request.symbol = "q";
+  core.CreateElement(request);
+  core.MoveElement(Named("q").GetUid(), Named("p").GetUid(), true);
+  std::int32_t group = 0;
+  const std::function<void()> acts[] = {
+      [this] { core.SetShowAllBuiltIns(true); },
+      [this, &group] { group = core.AddVisibilityGroup(); },
+      [this, &group] { core.SetGroupName(group, "Sources"); },
+      [this, &group] { core.CreateLevel(group); },
+      [this, &group] { core.AddItemToLevel(group, 1, 1), core.AddItemToLevel(group, 1, 2); },
+      [this, &group] { core.SetLevelDescription(group, 1, "all"); },
+      [this, &group] { core.DeleteLevel(group, 1); },
+      [this, &group] { core.RemoveVisibilityGroup(group); },
+  };
+  for (const auto& act : acts) {
+    act();
+    // What is edited without a beginning is one act until somebody asks.
+    history.UndoCount();
+  }
+  std::string names;
+  for (std::string name = Undone(); name != "nothing"; name = Undone()) names += name + "\n";
+  EXPECT_EQ(names,
+            "Delete group Sources\nDelete level Level_1\nChange description of Level_1\n"
+            "Change 2 memberships of Level_1\nCreate level Level_1\nRename Group_1 to Sources\n"
+            "Create group Group_1\nShow all built-ins\n"
+            "Move q\nCreate q\nDelete m\nEdit m\nChange Unit of m\nRename k to kd\n");
+  EXPECT_FALSE(core.Modified());
+}
+
+TEST_F(Steps, ThatWereRefusedOrWentBackAreNone) {
+  EXPECT_FALSE(core.RenameSymbol("k", "m", true));
+  EXPECT_FALSE(core.DeleteElement(core.GetConstant(0).GetUid()));
+  core.GetConstant(0).symbol.SetText("two words");
+  {
+    const EditStep step(history);
+    core.GetConstant(1).unit.SetText("g");
+    core.GetConstant(1).unit.SetText(std::string(core.GetConstant(1).unit.PrevText()));
+  }
+  EXPECT_EQ(history.UndoCount(), core.GetConstant(0).symbol.Text() == "two words" ? 1U : 0U);
+}
+
+TEST_F(Steps, KnowTheStateOfTheFile) {
+  core.GetConstant(0).unit.SetText("a");
+  core.GetConstant(1).unit.SetText("b");
+  ASSERT_TRUE(core.SaveWrapper(loaded.Path()));
+  EXPECT_EQ(history.UndoCount(), 1U) << "a save is no step";
+  core.Undo();
+  EXPECT_TRUE(core.Modified());
+  core.Redo();
+  EXPECT_FALSE(core.Modified());
+  core.Undo();
+  core.GetConstant(0).unit.SetText("c");
+  // What the file holds can be reached by no step any more.
+  core.Undo();
+  EXPECT_TRUE(core.Modified());
+  EXPECT_EQ(history.RedoCount(), 1U);
+}
+
+TEST_F(Steps, BringElementsBackAsTheyWere) {
+  const std::int32_t group = core.AddVisibilityGroup();
+  core.CreateLevel(group);
+  CEL_Element& fish = *core.Species()[0];
+  const Uid uid = core.GetConstant(1).GetUid();
+  core.GetConstant(1).builtInId.SelectIndex(3);
+  core.GetConstant(1).builtInId.ApplySelection();
+  core.AddItemToLevel(group, 1, core.FindRecordByUid(uid)->sequence);
+  EXPECT_FALSE(core.GetConstant(1).unit.Editable());
+  const auto place = [this, uid] { return core.FindRecordByUid(uid)->index; };
+  ASSERT_EQ(place(), 1U);
+  ASSERT_TRUE(core.DeleteElement(uid));
+  ASSERT_TRUE(core.DeleteElement(fish.GetUid()));
+  core.Undo();
+  EXPECT_EQ(core.Species()[0].get(), &fish);
+  core.Undo();
+  EXPECT_EQ(place(), 1U);
+  EXPECT_EQ(core.IncludedItems(group, 1).size(), 1U);
+  EXPECT_EQ(core.GetConstant(1).Visibility().size(), 1U);
+  EXPECT_FALSE(core.GetConstant(1).unit.Editable()) << "locks are as before";
+  EXPECT_EQ(core.GetConstant(1).builtInId.PresentChoice(), 3);
+  core.Undo();
+  EXPECT_TRUE(core.GetConstant(1).unit.Editable());
+}
+
+TEST_F(Steps, AreForgottenFromTheOldestOnWhenTheyTakeTooMuch) {
+  const std::string longText(200'000, 'x');
+  std::string reason;
+  for (int step = 0; step < 700; ++step) {
+    const EditStep act(history);
+    core.GetConstant(0).documentation.SetText(longText + std::to_string(step));
+  }
+  EXPECT_LE(history.Bytes(), EditHistory::kMostBytes);
+  EXPECT_GT(history.Bytes(), EditHistory::kMostBytes * 9 / 10);
+  while (core.Undo()) continue;
+  EXPECT_TRUE(core.Modified()) << "the oldest steps are still done";
 }
 
 }  // namespace
