@@ -12,8 +12,10 @@
 #include "generated_template.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
+#include "ui/find_tools.h"
 #include "ui/main_view.h"
 #include "ui/right_pane.h"
+#include "ui/tree_filter.h"
 
 namespace {
 
@@ -121,6 +123,41 @@ void FolderSelection(benchmark::State& state) {
   }
 }
 BENCHMARK(FolderSelection)->Arg(1'000)->Arg(10'000)->Arg(100'000)->Unit(benchmark::kMillisecond);
+
+/// Types a letter into the filter over the tree, and takes it away again; then both are painted.
+void TreeFilter(benchmark::State& state, const char* text) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  auto* line = editor.view->FindTools().TreeFilter().findChild<QLineEdit*>();
+  for ([[maybe_unused]] auto iteration : state) {
+    line->setText(QString::fromLatin1(text));
+    QCoreApplication::processEvents();
+    benchmark::DoNotOptimize(editor.view->grab().width());
+    state.PauseTiming();
+    line->clear();
+    QCoreApplication::processEvents();
+    state.ResumeTiming();
+  }
+}
+BENCHMARK_CAPTURE(TreeFilter, some, "constant17")->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(TreeFilter, most, "s")->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// The same for taking the text away.
+void TreeFilterCleared(benchmark::State& state) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  auto* line = editor.view->FindTools().TreeFilter().findChild<QLineEdit*>();
+  for ([[maybe_unused]] auto iteration : state) {
+    state.PauseTiming();
+    line->setText(QStringLiteral("constant17"));
+    QCoreApplication::processEvents();
+    state.ResumeTiming();
+    line->clear();
+    QCoreApplication::processEvents();
+    benchmark::DoNotOptimize(editor.view->grab().width());
+  }
+}
+BENCHMARK(TreeFilterCleared)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

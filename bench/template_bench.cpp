@@ -10,6 +10,9 @@
 #include <vector>
 
 #include "core/error_registry.h"
+#include "core/find.h"
+#include "core/replace.h"
+#include "core/symbol_ranking.h"
 #include "core/template_core.h"
 #include "generated_template.h"
 
@@ -105,6 +108,62 @@ void Rename(benchmark::State& state) {
   }
 }
 BENCHMARK(Rename)->Arg(5'000)->Unit(benchmark::kMillisecond);
+
+/// A pattern that is in every tenth text, by a regular expression and as it is.
+void Find(benchmark::State& state, const char* pattern, bool isRegex) {
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  const FindQuery query{{pattern, isRegex, false, false}, FindIn::All};
+  for ([[maybe_unused]] auto iteration : state) benchmark::DoNotOptimize(FindTexts(core, query).found.data());
+  state.SetComplexityN(state.range(0));
+}
+BENCHMARK_CAPTURE(Find, plain, "constant1", false)
+    ->Arg(5'000)
+    ->Arg(50'000)
+    ->Unit(benchmark::kMillisecond)
+    ->Complexity();
+BENCHMARK_CAPTURE(Find, regex, "constant[0-9]*7\\b", true)
+    ->Arg(5'000)
+    ->Arg(50'000)
+    ->Unit(benchmark::kMillisecond)
+    ->Complexity();
+
+void Uses(benchmark::State& state) {
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  const std::string name = core.GetConstant(1).symbol.TextOf();
+  for ([[maybe_unused]] auto iteration : state) benchmark::DoNotOptimize(FindUses(core, name).data());
+}
+BENCHMARK(Uses)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// A replacement in all expressions, and back.
+void Replace(benchmark::State& state) {
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  const char* former = "*";
+  const char* later = " * ";
+  for ([[maybe_unused]] auto iteration : state) {
+    const FindQuery query{{former, false, false, false}, FindIn::Expressions};
+    const ReplacePreview preview = PreviewReplacements(core, query, later);
+    const ReplaceOutcome outcome = ApplyReplacements(core, preview.replacements, TextEncoding::Utf8);
+    if (outcome.applied == 0) throw std::runtime_error("nothing replaced");
+    std::swap(former, later);
+  }
+  state.SetComplexityN(state.range(0));
+}
+BENCHMARK(Replace)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond)->Complexity();
+
+void SymbolRanking(benchmark::State& state) {
+  const ScratchFolder folder;
+  TemplateCore core;
+  Open(core, FileOfSize(folder, state.range(0)));
+  for ([[maybe_unused]] auto iteration : state)
+    benchmark::DoNotOptimize(SymbolsByRank(core, "cs1", 100).data());
+}
+BENCHMARK(SymbolRanking)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
 /// One step taken back: of a value, of a deletion with what follows for all numbers, of a rename.
 void Undo(benchmark::State& state) {

@@ -26,6 +26,7 @@
 #include "support/template_text.h"
 #include "ui/editor.h"
 #include "ui/folder_elements.h"
+#include "ui/found_list.h"
 #include "ui/node_kinds.h"
 #include "ui/row_table.h"
 
@@ -107,6 +108,8 @@ class Monkey final {
   std::string ClickButton();
   std::string UseRows();
   std::string RunCommand();
+  std::string RunKeyCommand();
+  std::string UseFound();
   std::string PressKey();
   std::string UseErrorList();
   std::string Save();
@@ -232,6 +235,31 @@ std::string Monkey::RunCommand() {
   return "command " + name;
 }
 
+/// A command of the view that has a key: to find, to filter, to go somewhere.
+std::string Monkey::RunKeyCommand() {
+  const QList<QAction*> actions = editor->View().actions();
+  QAction* action = actions[static_cast<qsizetype>(Pick(static_cast<std::size_t>(actions.size())))];
+  const std::string name = action->text().toStdString();
+  CloseWhatOpens();
+  action->trigger();
+  return "key command " + name;
+}
+
+/// A row of what was found is left out, or gone to.
+std::string Monkey::UseFound() {
+  auto* list = AnyOf<CFoundList>();
+  if (list == nullptr || list->Rows().rowCount() == 0) return "nothing found";
+  const QModelIndex cell =
+      list->Rows().index(static_cast<int>(Pick(static_cast<std::size_t>(list->Rows().rowCount()))), 0);
+  list->setCurrentIndex(cell);
+  if (Sometimes(2)) {
+    list->Rows().setData(cell, Sometimes(2) ? Qt::Checked : Qt::Unchecked, Qt::CheckStateRole);
+    return "choose a replacement";
+  }
+  emit list->RowChosen(cell.row());
+  return "go to what was found";
+}
+
 std::string Monkey::PressKey() {
   QWidget* target = QApplication::focusWidget() == nullptr ? &editor->View() : QApplication::focusWidget();
   constexpr Qt::Key kKeys[] = {Qt::Key_Tab,    Qt::Key_Return, Qt::Key_Escape, Qt::Key_Up,
@@ -277,7 +305,8 @@ std::string Monkey::TakeBackAndDoAgain() {
   const std::size_t steps = Pick(core.History().UndoCount() + 1);
   const auto take = [this](Qt::Key key, std::size_t count) {
     editor->Tree().setFocus();
-    for (std::size_t step = 0; step < count; ++step) QTest::keyClick(&editor->Tree(), key, Qt::ControlModifier);
+    for (std::size_t step = 0; step < count; ++step)
+      QTest::keyClick(&editor->Tree(), key, Qt::ControlModifier);
   };
   const std::size_t left = core.History().UndoCount() - steps;
   take(Qt::Key_Z, steps);
@@ -291,10 +320,11 @@ std::string Monkey::TakeBackAndDoAgain() {
 std::string Monkey::Act() {
   PrepareAnswers();
   std::string (Monkey::*const kActions[])() = {
-      &Monkey::SelectNode, &Monkey::SelectNode,  &Monkey::UseNodeMenu, &Monkey::TypeText,
-      &Monkey::TypeText,   &Monkey::ChooseEntry, &Monkey::ChooseEntry, &Monkey::ClickButton,
-      &Monkey::UseRows,    &Monkey::UseRows,     &Monkey::RunCommand,  &Monkey::PressKey,
-      &Monkey::PressKey,   &Monkey::UseErrorList};
+      &Monkey::SelectNode, &Monkey::SelectNode,   &Monkey::UseNodeMenu,   &Monkey::TypeText,
+      &Monkey::TypeText,   &Monkey::ChooseEntry,  &Monkey::ChooseEntry,   &Monkey::ClickButton,
+      &Monkey::UseRows,    &Monkey::UseRows,      &Monkey::RunCommand,    &Monkey::PressKey,
+      &Monkey::PressKey,   &Monkey::UseErrorList, &Monkey::RunKeyCommand, &Monkey::RunKeyCommand,
+      &Monkey::UseFound};
   if (Sometimes(100)) return TakeBackAndDoAgain();
   const std::string name = Sometimes(200) ? Save() : (this->*kActions[Pick(std::size(kActions))])();
   QCoreApplication::processEvents();

@@ -29,7 +29,6 @@ bool IsLookedIn(FindIn in, TextRole role) {
 
 std::vector<TextMatch> UsesIn(std::string_view expression, std::string_view name) {
   std::vector<TextMatch> uses;
-  if (expression.find(name) == std::string_view::npos) return uses;
   ForEachToken(expression, [&uses, expression, name](TokenCode code, std::string_view lexeme) {
     if (code != TokenCode::Identifier || lexeme != name) return;
     uses.push_back({static_cast<std::size_t>(lexeme.data() - expression.data()), lexeme.size()});
@@ -69,7 +68,7 @@ std::vector<FoundText> FindUses(const TemplateCore& core, std::string_view name)
   std::vector<FoundText> found;
   if (name.empty()) return found;
   ForEachText(core, [&core, name, &found](const TextOfTemplate& text) {
-    if (text.role != TextRole::Expression) return;
+    if (text.role != TextRole::Expression || text.text.find(name) == std::string_view::npos) return;
     // Identifiers are ASCII: they are the same in the text that is shown.
     std::string shown = ToUtf8(text.text);
     std::vector<TextMatch> uses = UsesIn(shown, name);

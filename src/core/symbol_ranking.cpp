@@ -6,6 +6,7 @@
 
 #include "core/template_core.h"
 #include "platform/ascii.h"
+#include "platform/text_encoding.h"
 
 namespace tessal {
 
@@ -85,7 +86,7 @@ std::optional<int> RankSymbol(std::string_view symbol, std::string_view letters)
 std::string NameToGoTo(const SymbolRecord& record) {
   const CEL_Element& element = *record.element;
   const bool hasCaption = element.Kind() == ElementKind::DerivedOutput && !element.description.Text().empty();
-  return hasCaption ? element.description.TextOf() : element.FullSymbol();
+  return ToUtf8(hasCaption ? element.description.TextOf() : element.FullSymbol());
 }
 
 std::vector<const SymbolRecord*> SymbolsByRank(const TemplateCore& core, std::string_view letters,

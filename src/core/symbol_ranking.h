@@ -19,8 +19,8 @@ struct SymbolRecord;
 /// texts the first 256 bytes count.
 std::optional<int> RankSymbol(std::string_view symbol, std::string_view letters);
 
-/// The name that people look for an element by: its symbol; of a derived output the description, where it has
-/// one.
+/// The name that people look for an element by, in UTF-8: its symbol; of a derived output the description,
+/// where it has one.
 std::string NameToGoTo(const SymbolRecord& record);
 
 /// The records of the elements that fit the letters, the best first, and of equals the shorter, then the

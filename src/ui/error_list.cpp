@@ -43,7 +43,7 @@ MessageGroup GroupOfLevel(std::uint32_t level) {
                                                                   : MessageGroup::Notices;
 }
 
-/// A row by its texts, which stay the same when the list is filled again. Equal rows are told apart by their
+/// A row by its texts, which stay the same when the list is filled again. Equal rows differ by their
 /// order.
 using RowTexts = std::pair<QString, QString>;
 
@@ -198,7 +198,7 @@ void CErrorList::ShowRows() {
     item->setHidden(!PassesFilter(RowOf(*item)));
     const RowTexts texts = TextsOf(*item);
     const int order = met[texts]++;
-    // Of fewer equal rows than before the last one stands in.
+    // Where there are fewer equal rows than before, it is the last one.
     if (texts == current.first && order <= current.second) again = item;
     const auto chosen = selected.find(texts);
     if (chosen != selected.end() && std::count(chosen->second.begin(), chosen->second.end(), order) > 0)

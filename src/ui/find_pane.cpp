@@ -62,7 +62,6 @@ CFindPane::CFindPane(CTessalDoc& searchedDocument, QWidget* parent)
   BuildOptions(*grid);
   state = MakeChild<QLabel>(this);
   state->setObjectName(QStringLiteral("FindState"));
-  state->setAccessibleName(strings::kFindState);
   state->setTextFormat(Qt::PlainText);
   // As wide as there is room, however long the pattern.
   state->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Fixed);
@@ -104,6 +103,11 @@ void CFindPane::BuildFindRow(QGridLayout& grid) {
   pattern = AddLine(grid, kFindRow, strings::kFindPattern);
   connect(pattern, &QLineEdit::returnPressed, this, &CFindPane::Find);
   AddButton(grid, kFindRow, 2, strings::kFindAll, &CFindPane::Find);
+  where = MakeChild<QComboBox>(this);
+  where->setAccessibleName(strings::kFindWhere);
+  for (const Place& place : kPlaces) where->addItem(place.text, static_cast<int>(place.in));
+  connect(where, &QComboBox::currentIndexChanged, this, &CFindPane::DropPreview);
+  grid.addWidget(where, kFindRow, 3);
   auto* close = MakeChild<QToolButton>(this);
   close->setIcon(style()->standardIcon(QStyle::SP_TitleBarCloseButton));
   close->setAutoRaise(true);
@@ -123,21 +127,12 @@ void CFindPane::BuildReplaceRow(QGridLayout& grid) {
 
 void CFindPane::BuildOptions(QGridLayout& grid) {
   auto* options = MakeChild<QHBoxLayout>();
-  where = MakeChild<QComboBox>(this);
-  where->setAccessibleName(strings::kFindWhere);
-  for (const Place& place : kPlaces) where->addItem(place.text, static_cast<int>(place.in));
-  connect(where, &QComboBox::currentIndexChanged, this, &CFindPane::DropPreview);
-  auto* name = MakeChild<QLabel>(strings::kFindWhere + u':', this);
-  name->setBuddy(where);
   matchCase = AddOption(strings::kMatchCase);
   wholeSymbols = AddOption(strings::kWholeSymbols);
   regex = AddOption(strings::kRegex);
   // Symbols are other symbols in other letters.
   matchCase->setChecked(true);
-  grid.addWidget(name, kOptionRow, 0);
-  for (QWidget* option : {static_cast<QWidget*>(where), static_cast<QWidget*>(matchCase),
-                          static_cast<QWidget*>(wholeSymbols), static_cast<QWidget*>(regex)})
-    options->addWidget(option);
+  for (QCheckBox* option : {matchCase, wholeSymbols, regex}) options->addWidget(option);
   options->addStretch(1);
   grid.addLayout(options, kOptionRow, 1, 1, kGridColumns - 1);
 }

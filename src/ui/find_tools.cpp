@@ -26,7 +26,6 @@ namespace tessal {
 
 namespace {
 
-
 /// The node of a text's owner that is no element of the tree; None for an element, which has its own.
 Uid FixedNodeOf(ElementKind kind) {
   if (kind == ElementKind::Root) return folder_id::kRoot;
@@ -75,11 +74,14 @@ CFindTools::CFindTools(FindSurroundings surroundings)
 std::vector<CFindTools::Command> CFindTools::CommandRows() {
   return {
       {strings::kEditMenu, strings::kCommandFilter, QStringLiteral("Ctrl+F"), [this] { FilterTree(); }},
-      {strings::kEditMenu, strings::kCommandFind, QStringLiteral("Ctrl+Shift+F"), [this] { FindInTemplate(); }},
+      {strings::kEditMenu, strings::kCommandFind, QStringLiteral("Ctrl+Shift+F"),
+       [this] { FindInTemplate(); }},
       {strings::kEditMenu, strings::kCommandNextMatch, QStringLiteral("F3"), [this] { GoToMatch(1); }},
-      {strings::kEditMenu, strings::kCommandFormerMatch, QStringLiteral("Shift+F3"), [this] { GoToMatch(-1); }},
+      {strings::kEditMenu, strings::kCommandFormerMatch, QStringLiteral("Shift+F3"),
+       [this] { GoToMatch(-1); }},
       {strings::kGoMenu, strings::kCommandGoTo, QStringLiteral("Ctrl+K"), [this] { GoToSymbol(); }},
-      {strings::kGoMenu, strings::kCommandUses, QStringLiteral("Shift+F12"), [this] { FindUsesOfSelected(); }},
+      {strings::kGoMenu, strings::kCommandUses, QStringLiteral("Shift+F12"),
+       [this] { FindUsesOfSelected(); }},
       {strings::kGoMenu, strings::kCommandNextMessage, QStringLiteral("F8"),
        [this] { around.messages.GoToMessage(1); }},
       {strings::kGoMenu, strings::kCommandFormerMessage, QStringLiteral("Shift+F8"),
@@ -168,7 +170,7 @@ void CFindTools::GoTo(const FoundText& found, const TextMatch& match) {
     const Uid fixed = FixedNodeOf(found.kind);
     Uid node = fixed == Uid::None ? found.place.element : fixed;
     const CEL_Element* element = fixed == Uid::None ? core.GetElement(node) : nullptr;
-    // The forcings of a particle class have no nodes: the class stands in.
+    // The forcings of a particle class have no nodes: the way leads to the class.
     for (; element != nullptr && around.tree.FindById(node) == nullptr; element = element->Parent())
       node = element->Parent() == nullptr ? Uid::None : element->Parent()->GetUid();
     SelectById(node);

@@ -83,11 +83,14 @@ CFoundList::CFoundList(QWidget* parent) : QTreeView(parent), rows(MakeChild<CFou
 
 void CFoundList::FitColumns() {
   constexpr int kMostPart = 3;
+  // Marks are bold, and so wider than the text that is measured.
+  constexpr int kForMarks = 8;
   for (const int column : {CFoundRows::Element, CFoundRows::Field, CFoundRows::Text}) {
     resizeColumnToContents(column);
     const int part = column == CFoundRows::Text ? 2 : kMostPart;
-    if (column < rows->columnCount() - 1)
-      setColumnWidth(column, std::min(columnWidth(column), viewport()->width() / part));
+    const int width =
+        columnWidth(column) + (column == CFoundRows::Text ? columnWidth(column) / kForMarks : 0);
+    if (column < rows->columnCount() - 1) setColumnWidth(column, std::min(width, viewport()->width() / part));
   }
 }
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "ui/icons.h"
+#include "ui/item_data.h"
 #include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
@@ -150,7 +151,8 @@ QVariant CFoundRows::CheckState(const QModelIndex& cell) const {
 QVariant CFoundRows::data(const QModelIndex& cell, int role) const {
   if (!cell.isValid()) return {};
   const FoundText& text = FoundAt(cell.row());
-  if (role == Qt::DecorationRole && cell.column() == Element) return IconOfKind(text.kind);
+  if (role == Qt::DecorationRole && cell.column() == Element)
+    return IconOfKind(text.kind == ElementKind::Root ? node_kind::kRoot : text.kind);
   if (role == Qt::CheckStateRole) return CheckState(cell);
   if (role == Qt::ToolTipRole) return PlainTip(data(cell, Qt::DisplayRole).toString());
   if (role != Qt::DisplayRole) return {};

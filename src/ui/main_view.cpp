@@ -41,6 +41,7 @@
 #include "ui/offered_creation.h"
 #include "ui/right_pane.h"
 #include "ui/strings.h"
+#include "ui/tab_order.h"
 #include "ui/text_bytes.h"
 #include "ui/text_zoom.h"
 #include "ui/tree_filter.h"
@@ -187,7 +188,7 @@ void CMainView::BuildLayout() {
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
   KeepSplitter(*topBottom);
   QWidget::setTabOrder(&findTools->TreeFilter(), tree);
-  ChainAfter(ChainAfter(tree, *messages), findTools->Pane());
+  ChainAfter(ChainAfter(*tree, *messages), findTools->Pane());
 
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
@@ -375,7 +376,7 @@ void CMainView::ReplaceForm(QTreeWidgetItem* item) {
   holderLayout->addWidget(form.get());
   form->Load();
   // From the tree into the form, and from its last field on to the messages.
-  ChainAfter(tree, *form);
+  ChainAfter(*tree, *form);
 }
 
 void CMainView::Commit() {
@@ -696,22 +697,6 @@ bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
   return QWidget::eventFilter(watched, happened);
 }
 
-QList<QWidget*> CMainView::StopsIn(const QWidget& part) const {
-  QList<QWidget*> stops;
-  for (QWidget* next = tree->nextInFocusChain(); next != tree; next = next->nextInFocusChain()) {
-    if (part.isAncestorOf(next) && (next->focusPolicy() & Qt::TabFocus) != 0) stops.append(next);
-  }
-  return stops;
-}
-
-QWidget* CMainView::ChainAfter(QWidget* stop, const QWidget& part) {
-  for (QWidget* next : StopsIn(part)) {
-    QWidget::setTabOrder(stop, next);
-    stop = next;
-  }
-  return stop;
-}
-
 std::vector<ViewCommand> CMainView::Commands() {
   std::vector<ViewCommand> commands;
   const auto append = [&commands](std::vector<ViewCommand> some) {
@@ -743,7 +728,7 @@ void CMainView::CreateSymbol(const std::string& symbol) {
 }
 
 void CMainView::FocusForm() {
-  const QList<QWidget*> stops = StopsIn(*form);
+  const QList<QWidget*> stops = TabStopsIn(*form, *tree);
   const auto first = std::find_if(stops.begin(), stops.end(),
                                   [](const QWidget* stop) { return stop->isEnabled() && stop->isVisible(); });
   QWidget* target = first == stops.end() ? static_cast<QWidget*>(errorList) : *first;

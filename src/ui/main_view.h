@@ -2,7 +2,6 @@
 // wrong. It is the hub of the editor: forms and dialogs speak to it through the document's hints.
 #pragma once
 
-#include <QList>
 #include <QWidget>
 #include <functional>
 #include <memory>
@@ -115,10 +114,6 @@ class CMainView final : public QWidget, public CView {
   QWidget* MakeTree();
   void RefreshCaption(QTreeWidgetItem* item);
   void FocusForm();
-  /// What Tab may reach in a part of the view, in its order.
-  QList<QWidget*> StopsIn(const QWidget& part) const;
-  /// Has Tab walk a part of the view after a stop; the last stop of the part.
-  QWidget* ChainAfter(QWidget* stop, const QWidget& part);
   void ShowHelp();
   void UpdateNavigation();
   void FillHistoryMenu();

@@ -78,9 +78,9 @@ void CTreeFilter::OnTyped() {
   if (!wasOn && IsOn()) {
     expandedBefore.clear();
     NoteExpanded(*tree.RootItem());
+    ReadTexts();
   }
   if (IsOn()) {
-    FindFitting();
     Apply({});
   } else if (wasOn) {
     TurnOff();
@@ -88,7 +88,7 @@ void CTreeFilter::OnTyped() {
 }
 
 void CTreeFilter::TurnOff() {
-  fitting.clear();
+  texts.clear();
   matches.clear();
   tree.setUpdatesEnabled(false);
   ShowAll(*tree.RootItem());
@@ -99,14 +99,14 @@ void CTreeFilter::TurnOff() {
 
 void CTreeFilter::NoteExpanded(QTreeWidgetItem& item) {
   if (item.childCount() == 0) return;
-  expandedBefore[NameOf(item).id] = item.isExpanded();
+  expandedBefore[NameOf(item).first] = item.isExpanded();
   for (int place = 0; place < item.childCount(); ++place) NoteExpanded(*item.child(place));
 }
 
 void CTreeFilter::ShowAll(QTreeWidgetItem& item) {
   if (item.isHidden()) item.setHidden(false);
   for (int place = 0; place < item.childCount(); ++place) ShowAll(*item.child(place));
-  const auto before = expandedBefore.find(NameOf(item).id);
+  const auto before = expandedBefore.find(NameOf(item).first);
   if (item.childCount() > 0 && before != expandedBefore.end()) item.setExpanded(before->second);
 }
 
@@ -122,38 +122,42 @@ void CTreeFilter::ScheduleRefresh() {
 
 void CTreeFilter::Refresh() {
   if (!IsOn()) return;
-  FindFitting();
+  ReadTexts();
   Apply(matches);
 }
 
-void CTreeFilter::FindFitting() {
-  fitting.clear();
-  const auto look = [this](const CEL_Element& element) {
-    if (HasAll(SearchedText(element), words)) fitting.emplace(element.GetUid(), true);
-  };
+void CTreeFilter::ReadTexts() {
+  texts.clear();
   const CEL_Element* previous = nullptr;
   // The two records of a movement are side by side.
   for (const SymbolRecord& record : core.SymbolTable()) {
-    if (record.element != previous) look(*record.element);
+    if (record.element != previous) texts.emplace(record.uid, SearchedText(*record.element));
     previous = record.element;
   }
   if (core.GetMisc() == nullptr) return;
-  for (const auto& function : core.GetMisc()->ExternalFunctions()) look(*function);
+  for (const auto& function : core.GetMisc()->ExternalFunctions()) {
+    const QString name = ToScreen(function->publicName.Text()).toLower();
+    texts.emplace(function->GetUid(), SearchedText(*function) + u'\n' + name);
+  }
 }
 
 bool CTreeFilter::Fits(QTreeWidgetItem& item) const {
   const CItemData& node = CElementTree::DataOf(item);
   if (IsFolder(node)) return false;
-  // What the caption shows counts too: a user function's public name, a group's name.
-  return fitting.contains(node.id) || HasAll(item.text(0).toLower(), words);
+  const auto text = texts.find(node.id);
+  // A visibility group has its caption alone.
+  return HasAll(text == texts.end() ? item.text(0).toLower() : text->second, words);
 }
 
 void CTreeFilter::Apply(std::vector<NodeName> former) {
   std::sort(former.begin(), former.end());
   matches.clear();
+  QTreeWidgetItem* current = tree.currentItem();
+  const bool wasHidden = current != nullptr && current->isHidden();
   tree.setUpdatesEnabled(false);
   ApplyTo(*tree.RootItem(), former);
   tree.setUpdatesEnabled(true);
+  if (wasHidden) tree.scrollToItem(current);
   ShowCount();
 }
 

@@ -5,10 +5,10 @@
 #include <QPointer>
 #include <QString>
 #include <QWidget>
-#include <compare>
 #include <cstddef>
 #include <cstdint>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "platform/uid.h"
@@ -40,12 +40,8 @@ class CTreeFilter final : public QWidget {
   bool eventFilter(QObject* watched, QEvent* happened) override;
 
  private:
-  /// A node, where several share an id.
-  struct NodeName {
-    Uid id;
-    std::int32_t groupIndex;
-    auto operator<=>(const NodeName&) const = default;
-  };
+  /// A node by its id and, where several share one, its group.
+  using NodeName = std::pair<Uid, std::int32_t>;
 
   void OnTyped();
   void TurnOff();
@@ -58,7 +54,8 @@ class CTreeFilter final : public QWidget {
   };
   Branch ApplyTo(QTreeWidgetItem& item, const std::vector<NodeName>& former);
   bool Fits(QTreeWidgetItem& item) const;
-  void FindFitting();
+  /// Reads what the elements are found by, which is kept from letter to letter.
+  void ReadTexts();
   void NoteExpanded(QTreeWidgetItem& item);
   void ShowAll(QTreeWidgetItem& item);
   void ShowCount();
@@ -69,8 +66,8 @@ class CTreeFilter final : public QWidget {
   QLineEdit* line;
   QLabel* count;
   QPointer<QWidget> focusBefore;
-  QStringList words;  ///< in small letters; none while the filter is off
-  std::unordered_map<Uid, bool> fitting;
+  QStringList words;                             ///< in small letters; none while the filter is off
+  std::unordered_map<Uid, QString> texts;        ///< of the elements, in small letters; none while it is off
   std::vector<NodeName> matches;                 ///< in the order of the tree
   std::unordered_map<Uid, bool> expandedBefore;  ///< the folders, as they were without a filter
   bool isScheduled = false;
