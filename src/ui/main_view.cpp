@@ -24,6 +24,7 @@
 #include "ui/export_commands.h"
 #include "ui/expression_colours.h"
 #include "ui/folder_elements.h"
+#include "ui/formula_preview.h"
 #include "ui/help_window.h"
 #include "ui/icons.h"
 #include "ui/kept_splitter.h"
@@ -551,6 +552,7 @@ QList<QWidget*> CMainView::StopsOfForm() const {
 std::vector<ViewCommand> CMainView::Commands() {
   std::vector<ViewCommand> commands = ExportCommands(document, dialogs, *this);
   commands.push_back(StrongColoursCommand());
+  commands.push_back(FormulasCommand());
   return commands;
 }
 

@@ -268,8 +268,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"pause",
      [](Editor& editor, auto& /*words*/) {
        for (auto* timer : editor.View().findChildren<QTimer*>(QStringLiteral("TypingPause"))) {
-         if (timer->isActive()) QTest::qWait(timer->interval());
-         if (timer->isActive()) QTest::qWait(1);
+         EXPECT_TRUE(QTest::qWaitFor([timer] { return !timer->isActive(); }));
        }
      }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
@@ -329,6 +328,12 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"insert",
+     [](Editor& editor, auto& words) {
+       return InsertFromPalette(editor, words.first, words.second.section(u'/', 0, 0),
+                                words.second.section(u'/', 1));
+     }},
+    {"formula", [](Editor& editor, auto& words) { return UseFormula(editor, words.first, words.second); }},
     {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
     {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
