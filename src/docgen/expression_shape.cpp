@@ -73,6 +73,16 @@ std::optional<Logic> LogicOf(const ExpressionNode& comparison) {
   return std::nullopt;
 }
 
+bool IsProduct(const ExpressionNode& node) {
+  return node.Kind() == NodeKind::Arithmetic && node.Text() == "*";
+}
+
+bool BeginsWithSign(const ExpressionNode& node) {
+  const ExpressionNode* first = &node;
+  while (IsProduct(*first)) first = first->Child(1);
+  return first->Kind() == NodeKind::Negate;
+}
+
 bool IsDirectModification(NodeKind kind) {
   return kind >= NodeKind::DirectAssign && kind <= NodeKind::DirectDivide;
 }

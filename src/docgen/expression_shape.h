@@ -41,6 +41,25 @@ struct Logic {
 /// Of a comparison; none where it is one as it was written.
 std::optional<Logic> LogicOf(const ExpressionNode& comparison);
 
+/// How tightly the parts of an expression hold together. What is looser than its place asks for gets brackets
+/// where it is set as mathematics.
+enum class Bond : std::uint8_t {
+  None,  ///< conditionals, direct modifications
+  Or,
+  And,
+  Comparison,
+  Sum,
+  Negation,
+  Product,
+  Power,  ///< whole as an operand, but not as the base of a power
+  Atom
+};
+
+bool IsProduct(const ExpressionNode& node);
+/// Whether what may be a product begins with a sign, which needs no brackets where nothing is to the left of
+/// it.
+bool BeginsWithSign(const ExpressionNode& node);
+
 bool IsDirectModification(NodeKind kind);
 /// "::=" and its like.
 std::string_view DirectSign(NodeKind kind);

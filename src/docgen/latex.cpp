@@ -16,20 +16,6 @@ namespace tessal {
 
 namespace {
 
-/// How tightly the parts of an expression hold together. What is looser than its place asks for gets
-/// brackets.
-enum class Bond : std::uint8_t {
-  None,  ///< conditionals, direct modifications
-  Or,
-  And,
-  Comparison,
-  Sum,
-  Negation,
-  Product,
-  Power,  ///< whole as an operand, but not as the base of a power
-  Atom
-};
-
 /// How a function is set: what comes before its arguments, between them and after them, and how tightly an
 /// argument must hold together there.
 struct FunctionStyle {
@@ -97,17 +83,6 @@ const Row* FindRow(const std::array<Row, Count>& rows, std::string_view Row::*ke
 const FunctionStyle* StyleOf(const ExpressionNode& call, std::size_t arguments) {
   const FunctionStyle* style = FindRow(kStyles, &FunctionStyle::name, call.Text());
   return style != nullptr && static_cast<std::size_t>(style->arguments) == arguments ? style : nullptr;
-}
-
-bool IsProduct(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && node.Text() == "*";
-}
-
-/// Whether a product begins with a sign, which needs no brackets where nothing is to the left of it.
-bool BeginsWithSign(const ExpressionNode& product) {
-  const ExpressionNode* first = &product;
-  while (IsProduct(*first)) first = first->Child(1);
-  return first->Kind() == NodeKind::Negate;
 }
 
 /// One run of the writer. Trees of long chains are as deep as they are long, so what is left to write lies on

@@ -18,10 +18,6 @@ constexpr int kDeepest = 60;
 constexpr std::size_t kMostBoxes = 4'000;
 constexpr qreal kLineWidth = 1.0;
 
-/// How tightly the parts of an expression hold together. What is looser than its place asks for gets
-/// brackets.
-enum class Bond : std::uint8_t { None, Or, And, Comparison, Sum, Negation, Product, Power, Atom };
-
 struct Relation {
   std::string_view text;
   char16_t sign;
@@ -38,10 +34,6 @@ constexpr std::array<Relation, 6> kRelations = {{
 
 bool IsSum(const ExpressionNode& node) {
   return node.Kind() == NodeKind::Arithmetic && (node.Text() == "+" || node.Text() == "-");
-}
-
-bool IsProduct(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && node.Text() == "*";
 }
 
 }  // namespace
@@ -305,12 +297,6 @@ class FormulaBuilder final {
           BoxOf(*(*link)->Child(2), BeginsWithSign(*(*link)->Child(2)) ? Bond::Atom : right, level));
     }
     return {Row(parts), isSum ? Bond::Sum : Bond::Product};
-  }
-
-  static bool BeginsWithSign(const ExpressionNode& node) {
-    const ExpressionNode* first = &node;
-    while (IsProduct(*first)) first = first->Child(1);
-    return first->Kind() == NodeKind::Negate;
   }
 
   Built Condition(const ExpressionNode& node, int level) {
