@@ -484,6 +484,67 @@ void FormulaLayout::Paint(QPainter& painter, QPointF corner) const {
   }
 }
 
+/// The lines of brackets and bars, in the width and the height of their box: from the left 0 to the right 1,
+/// from the top 0 to the bottom 1.
+QPainterPath FormulaLayout::Strokes(Shape shape, const QRectF& place) {
+  struct Polyline {
+    Shape shape;
+    std::size_t count;
+    std::array<QPointF, 4> points;
+  };
+  static constexpr std::array<Polyline, 8> kPolylines = {{
+      {Shape::Rule, 2, {{{0, 0.5}, {1, 0.5}}}},
+      {Shape::LeftSquare, 4, {{{1, 0}, {0, 0}, {0, 1}, {1, 1}}}},
+      {Shape::RightSquare, 4, {{{0, 0}, {1, 0}, {1, 1}, {0, 1}}}},
+      {Shape::Bar, 2, {{{0.5, 0}, {0.5, 1}}}},
+      {Shape::LeftFloor, 3, {{{0, 0}, {0, 1}, {1, 1}}}},
+      {Shape::RightFloor, 3, {{{1, 0}, {1, 1}, {0, 1}}}},
+      {Shape::LeftCeiling, 3, {{{1, 0}, {0, 0}, {0, 1}}}},
+      {Shape::RightCeiling, 3, {{{0, 0}, {1, 0}, {1, 1}}}},
+  }};
+  QPainterPath path;
+  const auto row = std::find_if(kPolylines.begin(), kPolylines.end(),
+                                [shape](const Polyline& each) { return each.shape == shape; });
+  if (row == kPolylines.end()) return path;
+  for (std::size_t point = 0; point < row->count; ++point) {
+    const QPointF at(place.left() + row->points.at(point).x() * place.width(),
+                     place.top() + row->points.at(point).y() * place.height());
+    if (point == 0) {
+      path.moveTo(at);
+    } else {
+      path.lineTo(at);
+    }
+  }
+  return path;
+}
+
+QPainterPath FormulaLayout::Brace(const QRectF& place, bool isLeft) {
+  const qreal open = isLeft ? place.right() : place.left();
+  const qreal tip = isLeft ? place.left() : place.right();
+  const qreal spine = place.center().x();
+  const qreal middle = place.center().y();
+  const qreal bend = std::min(place.height() / 4, place.width());
+  QPainterPath path(QPointF(open, place.top()));
+  path.quadTo(spine, place.top(), spine, place.top() + bend);
+  path.lineTo(spine, middle - bend);
+  path.quadTo(spine, middle, tip, middle);
+  path.quadTo(spine, middle, spine, middle + bend);
+  path.lineTo(spine, place.bottom() - bend);
+  path.quadTo(spine, place.bottom(), open, place.bottom());
+  return path;
+}
+
+/// The hook of a root, and the line over what is under it.
+QPainterPath FormulaLayout::RootSign(const QRectF& place, qreal hook) {
+  const qreal middle = place.center().y();
+  QPainterPath path(QPointF(place.left(), middle + hook / 4));
+  path.lineTo(place.left() + hook / 4, middle);
+  path.lineTo(place.left() + hook / 2, place.bottom());
+  path.lineTo(place.left() + hook - 1, place.top() + 1);
+  path.lineTo(place.right(), place.top() + 1);
+  return path;
+}
+
 void FormulaLayout::PaintBox(QPainter& painter, const Box& box, QPointF place) {
   if (box.shape == Shape::Row) return;
   painter.setPen(QPen(box.colour, kLineWidth));
@@ -493,79 +554,30 @@ void FormulaLayout::PaintBox(QPainter& painter, const Box& box, QPointF place) {
     return;
   }
   constexpr qreal kInset = 1.5;
-  const qreal left = place.x() + kInset;
-  const qreal right = place.x() + box.width - kInset;
-  const qreal top = place.y() - box.ascent;
-  const qreal bottom = place.y() + box.descent;
-  const qreal middle = (top + bottom) / 2;
-  QPainterPath path;
-  /// A line through points.
-  const auto draw = [&path](std::initializer_list<QPointF> points) {
-    path.moveTo(*points.begin());
-    for (const QPointF& point : points) path.lineTo(point);
-  };
-  switch (box.shape) {
-    case Shape::Rule:
-      draw({{place.x(), place.y()}, {place.x() + box.width, place.y()}});
-      break;
-    case Shape::LeftBracket:
-      path.moveTo(right, top);
-      path.quadTo(left - kInset, middle, right, bottom);
-      break;
-    case Shape::RightBracket:
-      path.moveTo(left, top);
-      path.quadTo(right + kInset, middle, left, bottom);
-      break;
-    case Shape::LeftBrace:
-    case Shape::RightBrace: {
-      const bool isLeft = box.shape == Shape::LeftBrace;
-      const qreal open = isLeft ? right : left;
-      const qreal tip = isLeft ? left : right;
-      const qreal spine = (left + right) / 2;
-      const qreal bend = std::min((bottom - top) / 4, box.width);
-      path.moveTo(open, top);
-      path.quadTo(spine, top, spine, top + bend);
-      path.lineTo(spine, middle - bend);
-      path.quadTo(spine, middle, tip, middle);
-      path.quadTo(spine, middle, spine, middle + bend);
-      path.lineTo(spine, bottom - bend);
-      path.quadTo(spine, bottom, open, bottom);
-      break;
-    }
-    case Shape::LeftSquare:
-      draw({{right, top}, {left, top}, {left, bottom}, {right, bottom}});
-      break;
-    case Shape::RightSquare:
-      draw({{left, top}, {right, top}, {right, bottom}, {left, bottom}});
-      break;
-    case Shape::Bar:
-      draw({{(left + right) / 2, top}, {(left + right) / 2, bottom}});
-      break;
-    case Shape::LeftFloor:
-      draw({{left, top}, {left, bottom}, {right, bottom}});
-      break;
-    case Shape::RightFloor:
-      draw({{right, top}, {right, bottom}, {left, bottom}});
-      break;
-    case Shape::LeftCeiling:
-      draw({{right, top}, {left, top}, {left, bottom}});
-      break;
-    case Shape::RightCeiling:
-      draw({{left, top}, {right, top}, {right, bottom}});
-      break;
-    default: {
-      // The hook of a root, and the line over what is under it.
-      const qreal hook = box.parts.front().second.x();
-      draw({{place.x(), middle + hook / 4},
-            {place.x() + hook / 4, middle},
-            {place.x() + hook / 2, bottom},
-            {place.x() + hook - kInset, top + kInset},
-            {place.x() + box.width, top + kInset}});
-      break;
-    }
-  }
+  const QRectF whole(place.x(), place.y() - box.ascent, box.width, box.ascent + box.descent);
+  const QRectF inner = whole.adjusted(kInset, 0, -kInset, 0);
   painter.setBrush(Qt::NoBrush);
-  painter.drawPath(path);
+  switch (box.shape) {
+    case Shape::LeftBracket:
+    case Shape::RightBracket: {
+      const bool isLeft = box.shape == Shape::LeftBracket;
+      const qreal end = isLeft ? inner.right() : inner.left();
+      QPainterPath path(QPointF(end, inner.top()));
+      path.quadTo(isLeft ? whole.left() - kInset : whole.right() + kInset, inner.center().y(), end,
+                  inner.bottom());
+      painter.drawPath(path);
+      return;
+    }
+    case Shape::LeftBrace:
+    case Shape::RightBrace:
+      painter.drawPath(Brace(inner, box.shape == Shape::LeftBrace));
+      return;
+    case Shape::Root:
+      painter.drawPath(RootSign(whole, box.parts.front().second.x()));
+      return;
+    default:
+      painter.drawPath(Strokes(box.shape, box.shape == Shape::Rule ? whole : inner));
+  }
 }
 
 }  // namespace tessal

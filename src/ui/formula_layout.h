@@ -17,6 +17,8 @@
 #include <vector>
 
 class QPainter;
+class QPainterPath;
+class QRectF;
 
 namespace tessal {
 
@@ -84,6 +86,9 @@ class FormulaLayout final {
     std::vector<std::pair<BoxNumber, QPointF>> parts = {};  ///< from the left end of the base line
   };
 
+  static QPainterPath Strokes(Shape shape, const QRectF& place);
+  static QPainterPath Brace(const QRectF& place, bool isLeft);
+  static QPainterPath RootSign(const QRectF& place, qreal hook);
   static void PaintBox(QPainter& painter, const Box& box, QPointF place);
 
   std::vector<Box> boxes;  ///< the last is the whole
