@@ -3,15 +3,18 @@
 #include <benchmark/benchmark.h>
 
 #include <QApplication>
+#include <QKeyEvent>
 #include <QLineEdit>
 #include <QPixmap>
 #include <memory>
 #include <stdexcept>
 
 #include "core/document.h"
+#include "core/expression_faults.h"
 #include "generated_template.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
+#include "ui/expression_field.h"
 #include "ui/find_tools.h"
 #include "ui/main_view.h"
 #include "ui/right_pane.h"
@@ -107,6 +110,42 @@ void Selection(benchmark::State& state) {
   }
 }
 BENCHMARK(Selection)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// A letter typed into an expression, with the list of completions, the marks and the formula that follow it.
+/// The list is closed and the letter taken back unmeasured.
+void KeyInExpression(benchmark::State& state) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  const TemplateCore& core = editor.view->Document().Core();
+  editor.view->SelectById(core.GetProcess(core.GetProcessCount() - 1).GetUid());
+  auto* field = editor.view->Form()->findChild<CAutoRichEditCtrl*>("1115");
+  field->setFocus();
+  field->setPlainText(field->toPlainText() + QStringLiteral("+p"));
+  field->moveCursor(QTextCursor::End);
+  QKeyEvent letter(QEvent::KeyPress, Qt::Key_R, Qt::NoModifier, QStringLiteral("r"));
+  for ([[maybe_unused]] auto iteration : state) {
+    QApplication::sendEvent(field, &letter);
+    QCoreApplication::processEvents();
+    state.PauseTiming();
+    if (QWidget* list = QApplication::activePopupWidget()) list->close();
+    field->textCursor().deletePreviousChar();
+    QCoreApplication::processEvents();
+    state.ResumeTiming();
+  }
+}
+BENCHMARK(KeyInExpression)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
+
+/// What is looked for when typing pauses.
+void FaultsOfExpression(benchmark::State& state) {
+  const ScratchFolder folder;
+  const OpenEditor editor(FileOfSize(folder, state.range(0)));
+  const TemplateCore& core = editor.view->Document().Core();
+  const CEL_Process& process = core.GetProcess(core.GetProcessCount() - 1);
+  const std::string text = process.expression.TextOf() + "+nobody+proces_1";
+  for ([[maybe_unused]] auto iteration : state)
+    benchmark::DoNotOptimize(FindExpressionFaults(core, process, text).size());
+}
+BENCHMARK(FaultsOfExpression)->Arg(500)->Arg(5'000)->Arg(50'000)->Unit(benchmark::kMillisecond);
 
 /// Selects the folder of many constants, and the root again; the time of the folder alone counts.
 void FolderSelection(benchmark::State& state) {

@@ -25,6 +25,8 @@
 #include "support/template_content.h"
 #include "support/template_text.h"
 #include "ui/editor.h"
+#include "ui/expression_palette.h"
+#include "ui/expression_panel.h"
 #include "ui/folder_elements.h"
 #include "ui/found_list.h"
 #include "ui/node_kinds.h"
@@ -104,6 +106,7 @@ class Monkey final {
   std::string SelectNode();
   std::string UseNodeMenu();
   std::string TypeText();
+  std::string TypeExpression();
   std::string ChooseEntry();
   std::string ClickButton();
   std::string UseRows();
@@ -181,6 +184,33 @@ std::string Monkey::TypeText() {
   typed.setCommitString(Word());
   QApplication::sendEvent(field, &typed);
   return "type into " + field->objectName().toStdString();
+}
+
+/// By keys, with the list of completions that they open, and the menus beside the field.
+std::string Monkey::TypeExpression() {
+  auto* panel = AnyOf<CExpressionPanel>();
+  if (panel == nullptr) return "no expression";
+  constexpr const char* kTyped[] = {"te", "MAX(", "[",  "sq",     "IF ",    "(",  ")",   "k",
+                                    "+",  ", ",   "^2", " THEN ", "KILL{(", "1e", "::+ "};
+  CAutoRichEditCtrl& field = panel->Field();
+  field.setFocus();
+  QTest::keyClicks(&field, kTyped[Pick(std::size(kTyped))]);
+  if (QWidget* list = QApplication::activePopupWidget()) {
+    if (Sometimes(2)) QTest::keyClick(list, Qt::Key_Down);
+    QTest::keyClick(list, Sometimes(3) ? Qt::Key_Escape : Qt::Key_Return);
+  }
+  if (Sometimes(4)) {
+    QMenu& palette = *panel->findChild<CExpressionPalette*>()->menu();
+    emit palette.aboutToShow();
+    const auto groups = palette.actions();
+    const auto entries =
+        groups[static_cast<qsizetype>(Pick(static_cast<std::size_t>(groups.size())))]->menu()->actions();
+    if (entries.isEmpty()) return "an empty menu of the palette";
+    QAction* entry = entries[static_cast<qsizetype>(Pick(static_cast<std::size_t>(entries.size())))];
+    // A comment that loses its end reaches the next expression, and would make each rebuild another.
+    if (!entry->text().startsWith(QStringLiteral("/*"))) entry->trigger();
+  }
+  return "type into an expression";
 }
 
 std::string Monkey::ChooseEntry() {
@@ -320,11 +350,11 @@ std::string Monkey::TakeBackAndDoAgain() {
 std::string Monkey::Act() {
   PrepareAnswers();
   std::string (Monkey::*const kActions[])() = {
-      &Monkey::SelectNode, &Monkey::SelectNode,   &Monkey::UseNodeMenu,   &Monkey::TypeText,
-      &Monkey::TypeText,   &Monkey::ChooseEntry,  &Monkey::ChooseEntry,   &Monkey::ClickButton,
-      &Monkey::UseRows,    &Monkey::UseRows,      &Monkey::RunCommand,    &Monkey::PressKey,
-      &Monkey::PressKey,   &Monkey::UseErrorList, &Monkey::RunKeyCommand, &Monkey::RunKeyCommand,
-      &Monkey::UseFound};
+      &Monkey::SelectNode,    &Monkey::SelectNode,     &Monkey::UseNodeMenu,  &Monkey::TypeText,
+      &Monkey::TypeText,      &Monkey::TypeExpression, &Monkey::ChooseEntry,  &Monkey::ChooseEntry,
+      &Monkey::ClickButton,   &Monkey::UseRows,        &Monkey::UseRows,      &Monkey::RunCommand,
+      &Monkey::PressKey,      &Monkey::PressKey,       &Monkey::UseErrorList, &Monkey::RunKeyCommand,
+      &Monkey::RunKeyCommand, &Monkey::UseFound};
   if (Sometimes(100)) return TakeBackAndDoAgain();
   const std::string name = Sometimes(200) ? Save() : (this->*kActions[Pick(std::size(kActions))])();
   QCoreApplication::processEvents();

@@ -154,8 +154,9 @@ void HostWindow::MakeMenus() {
   file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
   QMenu* help = menuBar()->addMenu(tr("&Help"));
   QAction* about = help->addAction(tr("&About"), this, &HostWindow::ShowAbout);
-  viewCommands = std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), QList<QAction*>{close, about})
-                     .release();
+  viewCommands =
+      std::make_unique<ViewCommands>(*menuBar(), *help->menuAction(), QList<QAction*>{close, about})
+          .release();
 }
 
 void HostWindow::FillRecentMenu() {

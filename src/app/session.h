@@ -1,5 +1,5 @@
-// What was open when the application was closed last: the files in the order of their tabs, the place in each, and
-// which was in front. Kept in the settings.
+// What was open when the application was closed last: the files in the order of their tabs, the place in
+// each, and which was in front. Kept in the settings.
 #pragma once
 
 #include <QString>

@@ -43,8 +43,8 @@ void ViewCommands::Add(const ViewCommand& command) {
     });
   }
   const QList<QAction*> present = menu.actions();
-  const auto end = std::find_if(present.begin(), present.end(),
-                                [this](QAction* each) { return ends.contains(each); });
+  const auto end =
+      std::find_if(present.begin(), present.end(), [this](QAction* each) { return ends.contains(each); });
   menu.insertAction(end == present.end() ? nullptr : *end, action);
   actions.push_back({&menu, action, command.action == nullptr});
 }

@@ -38,7 +38,7 @@ class ViewCommands final : public QObject {
   struct Shown {
     QMenu* menu;
     QPointer<QAction> action;  ///< the view's goes with it
-    bool isOwn;  ///< made here, not the view's
+    bool isOwn;                ///< made here, not the view's
   };
 
   std::vector<Shown> actions;

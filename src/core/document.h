@@ -74,8 +74,8 @@ class CTessalDoc final : public CDocument {
   std::optional<std::string> Copy(std::string& reason) override;
   bool OnOpenCopy(const std::string& source, const std::string& path) override;
   DocumentComparison CompareWithFile(const std::string& path) const override;
-  /// Takes the last step of the template back, or does the next one again, with the mark of the document; none
-  /// when there is no step.
+  /// Takes the last step of the template back, or does the next one again, with the mark of the document;
+  /// none when there is no step.
   std::optional<StepEffect> Undo();
   std::optional<StepEffect> Redo();
   void NoteOtherFile() override;

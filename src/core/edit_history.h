@@ -50,8 +50,8 @@ class EditHistory final {
   /// How much memory the steps take, roughly.
   std::size_t Bytes() const { return bytes; }
 
-  /// Exchanges what the last step that was done, or the next one, has changed. There must be one. What follows
-  /// from it for the whole template is the template's to bring up to date.
+  /// Exchanges what the last step that was done, or the next one, has changed. There must be one. What
+  /// follows from it for the whole template is the template's to bring up to date.
   StepEffect Undo();
   StepEffect Redo();
 
@@ -60,8 +60,8 @@ class EditHistory final {
   void ForgetSaved() { saved = kNever; }
   bool IsSaved();
 
-  // Recording. An act that begins within another is part of it. What is edited without an act is one act until
-  // the next begins, or somebody asks for the steps.
+  // Recording. An act that begins within another is part of it. What is edited without an act is one act
+  // until the next begins, or somebody asks for the steps.
   void Begin();
   /// Ends the act, and makes a step of it where it has changed anything. Takes what the name of the outermost
   /// act is, empty for one that says what was changed.
@@ -107,7 +107,7 @@ class EditHistory final {
   bool started = false;
   int pauses = 0;
   int depth = 0;
-  std::vector<TemplateEdit> open;                         ///< of the act that is going on
+  std::vector<TemplateEdit> open;                 ///< of the act that is going on
   std::unordered_set<const CEL_Property*> noted;  ///< values that it has changed already
   std::unordered_set<const CEL_Element*> fresh;   ///< elements that it has made
 };

@@ -42,8 +42,7 @@ void PutOrTake(Items& items, std::size_t place, std::unique_ptr<Away>& away) {
 
 template <class Element>
 void PutOrTakeElement(Sequence<Element>& elements, PresenceEdit& edit) {
-  const auto position =
-      elements.begin() + static_cast<std::ptrdiff_t>(std::min(edit.place, elements.size()));
+  const auto position = elements.begin() + static_cast<std::ptrdiff_t>(std::min(edit.place, elements.size()));
   if (edit.away) {
     edit.away->MarkModified();
     elements.insert(position, std::unique_ptr<Element>(static_cast<Element*>(edit.away.release())));
@@ -113,9 +112,7 @@ class Exchanging final {
 
  private:
   std::vector<VisibilityGroup>& Groups() const { return state.misc.Visibilities().groups; }
-  VisibilityGroup& Group(std::int32_t number) const {
-    return Groups()[static_cast<std::size_t>(number - 1)];
-  }
+  VisibilityGroup& Group(std::int32_t number) const { return Groups()[static_cast<std::size_t>(number - 1)]; }
 
   TemplateState& state;
 };

@@ -85,7 +85,7 @@ struct BuiltInsEdit {
 };
 
 using TemplateEdit = std::variant<ValueEdit, PresenceEdit, PlaceEdit, GroupTextEdit, GroupEdit, LevelEdit,
-                          MembershipEdit, TakeOverEdit, BuiltInsEdit>;
+                                  MembershipEdit, TakeOverEdit, BuiltInsEdit>;
 
 /// Takes the template from the present one of the edit's states to the other. Nobody hears of it, and what
 /// follows from the change is the caller's to bring up to date.
@@ -94,8 +94,8 @@ void Exchange(TemplateState& state, TemplateEdit& edit);
 /// How much memory an edit holds, in bytes and roughly.
 std::size_t SizeOf(const TemplateEdit& edit);
 
-/// The name of a step that has no name of its own, from what it has changed: "Rename k1 to kd". The edits are as
-/// after the step.
+/// The name of a step that has no name of its own, from what it has changed: "Rename k1 to kd". The edits are
+/// as after the step.
 std::string NameOfStep(const TemplateState& state, const std::vector<TemplateEdit>& edits);
 
 /// The element that a step is about; none for one about groups.

@@ -254,7 +254,8 @@ CEL_Lagrange_Specie& ShellOf(TemplateCore& fragment, const CEL_Lagrange_Specie& 
   return shell;
 }
 
-/// Calls the visitor with the elements of the identities, those of classes with them, in the template's order.
+/// Calls the visitor with the elements of the identities, those of classes with them, in the template's
+/// order.
 template <class Visitor>
 void ForEachToCopy(const TemplateCore& core, const std::vector<Uid>& uids, Visitor visit) {
   const std::set<Uid> wanted(uids.begin(), uids.end());

@@ -1,5 +1,5 @@
-// Elements as text, for a clipboard, and back: the text is a template file that holds them alone, so that it can
-// go into a text editor, a file or another template.
+// Elements as text, for a clipboard, and back: the text is a template file that holds them alone, so that it
+// can go into a text editor, a file or another template.
 #pragma once
 
 #include <string>

@@ -149,8 +149,8 @@ class TemplateCore final : public ElementOwner {
   bool CanDelete(Uid uid) const;
   /// Deletes an element that nobody uses. One that is refused has left its visibility groups all the same.
   bool DeleteElement(Uid uid);
-  /// Deletes several, as one step, each as soon as nobody uses it any more; those that stay are as they were. The
-  /// ones that were not deleted.
+  /// Deletes several, as one step, each as soon as nobody uses it any more; those that stay are as they were.
+  /// The ones that were not deleted.
   std::vector<Uid> DeleteElements(std::vector<Uid> uids);
   /// Whether a move keeps every use after its definition. Only auxiliaries, processes and arithmetic
   /// expressions can be refused.
@@ -180,8 +180,8 @@ class TemplateCore final : public ElementOwner {
 
   // Taking back. Off until the history is started.
   EditHistory& History() { return history; }
-  /// Takes the last step back, or does the next one again, and brings up to date what follows; none when there
-  /// is no step. The template counts as modified unless the file holds it as it is then.
+  /// Takes the last step back, or does the next one again, and brings up to date what follows; none when
+  /// there is no step. The template counts as modified unless the file holds it as it is then.
   std::optional<StepEffect> Undo();
   std::optional<StepEffect> Redo();
 

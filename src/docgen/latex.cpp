@@ -7,6 +7,7 @@
 #include <optional>
 #include <vector>
 
+#include "docgen/expression_shape.h"
 #include "expr/expression_node.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"
@@ -14,20 +15,6 @@
 namespace tessal {
 
 namespace {
-
-/// How tightly the parts of an expression hold together. What is looser than its place asks for gets
-/// brackets.
-enum class Bond : std::uint8_t {
-  None,  ///< conditionals, direct modifications
-  Or,
-  And,
-  Comparison,
-  Sum,
-  Negation,
-  Product,
-  Power,  ///< whole as an operand, but not as the base of a power
-  Atom
-};
 
 /// How a function is set: what comes before its arguments, between them and after them, and how tightly an
 /// argument must hold together there.
@@ -86,9 +73,6 @@ constexpr std::array<Infix, 9> kInfixes = {{
     {"<=", " \\leq ", Bond::Comparison, Bond::Sum, Bond::Sum},
 }};
 
-/// The signs of the direct modifications, in the order of their kinds.
-constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
-
 template <std::size_t Count, class Row>
 const Row* FindRow(const std::array<Row, Count>& rows, std::string_view Row::*key, std::string_view text) {
   const auto hit = std::find_if(rows.begin(), rows.end(),
@@ -96,88 +80,9 @@ const Row* FindRow(const std::array<Row, Count>& rows, std::string_view Row::*ke
   return hit == rows.end() ? nullptr : &*hit;
 }
 
-/// The items of a list that the tree holds as a chain to the left, in their order.
-std::vector<const ExpressionNode*> ItemsOf(const ExpressionNode* list, NodeKind link) {
-  std::vector<const ExpressionNode*> items;
-  while (list != nullptr && list->Kind() == link && list->ChildCount() == 2) {
-    items.push_back(list->Child(2));
-    list = list->Child(1);
-  }
-  if (list != nullptr) items.push_back(list->Kind() == link ? list->Child(1) : list);
-  items.erase(std::remove(items.begin(), items.end(), nullptr), items.end());
-  std::reverse(items.begin(), items.end());
-  return items;
-}
-
-std::vector<const ExpressionNode*> ArgumentsOf(const ExpressionNode& call) {
-  return ItemsOf(call.Child(1), NodeKind::Argument);
-}
-
 const FunctionStyle* StyleOf(const ExpressionNode& call, std::size_t arguments) {
   const FunctionStyle* style = FindRow(kStyles, &FunctionStyle::name, call.Text());
   return style != nullptr && static_cast<std::size_t>(style->arguments) == arguments ? style : nullptr;
-}
-
-bool IsNumber(const ExpressionNode& node, std::string_view text) {
-  return node.Kind() == NodeKind::Number && node.Text() == text;
-}
-
-/// The parts of IF, THEN and ELSE.
-struct Branches {
-  const ExpressionNode& condition;
-  const ExpressionNode& then;
-  const ExpressionNode& otherwise;
-};
-
-bool IsIf(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Conditional && node.ChildCount() == 2;
-}
-
-Branches BranchesOf(const ExpressionNode& conditional) {
-  const ExpressionNode& then = *conditional.Child(2);
-  return {*conditional.Child(1), *then.Child(1), *then.Child(2)->Child(1)};
-}
-
-/// A conditional that is 1 where a condition holds and 0 where it does not.
-bool IsIndicator(const ExpressionNode& node) {
-  if (!IsIf(node)) return false;
-  const Branches branches = BranchesOf(node);
-  return IsNumber(branches.then, "1") && IsNumber(branches.otherwise, "0");
-}
-
-/// What NOT, AND and OR were before the grammar made conditionals of them.
-struct Logic {
-  enum class Operator : std::uint8_t { Not, And, Or } which;
-  const ExpressionNode& left;
-  const ExpressionNode& right;  ///< the left side again with NOT
-};
-
-std::optional<Logic> LogicOf(const ExpressionNode& comparison) {
-  if (comparison.Text() != ">" || !IsIf(*comparison.Child(1)) || !IsNumber(*comparison.Child(2), "0")) {
-    return std::nullopt;
-  }
-  const auto [condition, then, otherwise] = BranchesOf(*comparison.Child(1));
-  if (IsNumber(then, "0") && IsNumber(otherwise, "1")) {
-    return Logic{Logic::Operator::Not, condition, condition};
-  }
-  if (IsNumber(then, "1") && IsIndicator(otherwise)) {
-    return Logic{Logic::Operator::Or, condition, BranchesOf(otherwise).condition};
-  }
-  if (IsIndicator(then) && IsNumber(otherwise, "0")) {
-    return Logic{Logic::Operator::And, condition, BranchesOf(then).condition};
-  }
-  return std::nullopt;
-}
-
-bool IsProduct(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && node.Text() == "*";
-}
-
-/// Whether a product begins with a sign, which needs no brackets where nothing is to the left of it.
-bool BeginsWithSign(const ExpressionNode& product) {
-  const ExpressionNode* first = &product;
-  while (IsProduct(*first)) first = first->Child(1);
-  return first->Kind() == NodeKind::Negate;
 }
 
 /// One run of the writer. Trees of long chains are as deep as they are long, so what is left to write lies on
@@ -358,9 +263,7 @@ class LatexWriter final {
 
   Bond MakeDirect(const ExpressionNode& node) {
     AddName(node.Text());
-    const auto sign =
-        static_cast<std::size_t>(node.Kind()) - static_cast<std::size_t>(NodeKind::DirectAssign);
-    Add(" \\mathrel{\\mathtt{" + std::string(kDirectSigns.at(sign)) + "}} ");
+    Add(" \\mathrel{\\mathtt{" + std::string(DirectSign(node.Kind())) + "}} ");
     Add(*node.Child(1));
     return Bond::None;
   }
@@ -378,11 +281,7 @@ class LatexWriter final {
   }
 
   Bond MakeModlist(const ExpressionNode& node) {
-    std::vector<const ExpressionNode*> values;
-    for (const ExpressionNode* field = node.Child(1); field != nullptr; field = field->Child(2)) {
-      values.push_back(field->Child(1));
-    }
-    AddList(values);
+    AddList(FieldsOf(node));
     return Bond::Atom;
   }
 

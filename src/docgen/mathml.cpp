@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "docgen/expression_shape.h"
 #include "expr/expression_node.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"
@@ -64,18 +65,11 @@ constexpr std::array<FunctionMarkUp, 5> kFunctions = {{
 constexpr std::string_view kRow = "<mtr><mtd columnalign=\"left\"><mtext mathcolor=\"blue\">";
 constexpr std::string_view kRowValue = "</mtext></mtd><mtd columnalign=\"left\">";
 
-/// The signs of the direct modifications, in the order of their kinds.
-constexpr std::array<std::string_view, 5> kDirectSigns = {"::=", "::+", "::-", "::*", "::/"};
-
 const FunctionMarkUp* FindMarkUp(std::string_view name) {
   const auto hit = std::find_if(kFunctions.begin(), kFunctions.end(), [name](const FunctionMarkUp& row) {
     return EqualIgnoringCase(row.name, name);
   });
   return hit == kFunctions.end() ? nullptr : &*hit;
-}
-
-std::string_view DirectSign(NodeKind kind) {
-  return kDirectSigns.at(static_cast<std::size_t>(kind) - static_cast<std::size_t>(NodeKind::DirectAssign));
 }
 
 bool IsSum(std::string_view text) {

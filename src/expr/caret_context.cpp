@@ -117,7 +117,7 @@ std::optional<BracketPair> BracketAt(std::string_view text, std::size_t caret) {
     if (&token == &*chosen)
       return BracketPair{token.span, fits ? std::optional(open.back()->span) : std::nullopt};
     if (fits && open.back() == &*chosen) return BracketPair{chosen->span, token.span};
-    // One of another kind closes nothing, and what it stands against stays open.
+    // One of another kind closes nothing.
     if (fits) open.pop_back();
   }
   return BracketPair{chosen->span, std::nullopt};

@@ -1,4 +1,4 @@
-// The table behind the sentences on syntax faults: what lies around the token at which the parse stopped, and
+// The sentences on syntax faults as a table: what lies around the token at which the parse stopped, and
 // what to say about it.
 #pragma once
 

@@ -90,13 +90,10 @@ class Surroundings final {
 
   const Level& Innermost() const { return levels.back(); }
 
-  /// The part of an IF around the place, with the ones outside plain parentheses.
+  /// The part of an IF around the place.
   around::Set Part() const {
-    for (auto level = levels.rbegin(); level != levels.rend(); ++level) {
-      if (!level->conditionals.empty()) return level->conditionals.back();
-      if (level->kind != around::kParentheses && level->kind != around::kIfCall) break;
-    }
-    return around::kNoIf;
+    const auto level = std::find_if(levels.rbegin(), levels.rend(), IsEdge);
+    return level == levels.rend() || level->conditionals.empty() ? around::kNoIf : level->conditionals.back();
   }
 
  private:
@@ -133,16 +130,20 @@ class Surroundings final {
     levels.push_back(inner);
   }
 
-  /// A comparison in parentheses counts for the condition around them too.
+  /// Whether a level has an IF of its own, or hides the ones around it, as plain parentheses do not.
+  static bool IsEdge(const Level& level) {
+    return !level.conditionals.empty() || level.kind != around::kParentheses;
+  }
+
   void SetPart(around::Set part) {
-    for (auto level = levels.rbegin(); level != levels.rend(); ++level) {
-      if (!level->conditionals.empty()) {
-        level->conditionals.back() = part;
-        if (part == around::kThenPart || level->kind != around::kIfCall) return;
-      } else if (level->kind != around::kParentheses) {
-        return;
-      }
-    }
+    const auto level = std::find_if(levels.rbegin(), levels.rend(), IsEdge);
+    if (level == levels.rend() || level->conditionals.empty()) return;
+    level->conditionals.back() = part;
+    // What looks like IF( may be a condition in parentheses, of an IF with THEN.
+    const auto outer = std::next(level);
+    if (level->kind == around::kIfCall && part != around::kThenPart && outer != levels.rend() &&
+        !outer->conditionals.empty())
+      outer->conditionals.back() = part;
   }
 
   void EndThen() {

@@ -18,7 +18,6 @@ CCallTip::CCallTip(CAutoRichEditCtrl& shownField, const CTessalDoc& shownDocumen
       field(shownField),
       document(shownDocument) {
   constexpr int kMargin = 4;
-  setObjectName(QStringLiteral("CallTip"));
   setTextFormat(Qt::RichText);
   setMargin(kMargin);
   setFrameShape(QFrame::Box);

@@ -1,5 +1,5 @@
-// The commands of the edit menu: taking back, cutting, copying and pasting, new elements and gone ones. Where a
-// field with text has the focus, those that it knows too are about its text.
+// The commands of the edit menu: taking back, cutting, copying and pasting, new elements and gone ones. Where
+// a field with text has the focus, those that it knows too are about its text.
 #pragma once
 
 #include <QObject>

@@ -374,7 +374,8 @@ void CElementTree::Follow(TemplateCore& core) {
       FollowFolder(specie->Head(list.listKind).GetUid(), (*specie).*list.members);
     });
   }
-  if (core.GetMisc() != nullptr) FollowFolder(folder_id::kPluginFunctions, core.GetMisc()->ExternalFunctions());
+  if (core.GetMisc() != nullptr)
+    FollowFolder(folder_id::kPluginFunctions, core.GetMisc()->ExternalFunctions());
   FollowGroups(core);
   setUpdatesEnabled(true);
 }

@@ -50,8 +50,8 @@ class CElementTree final : public QTreeWidget {
   /// Exchanges a node with a neighbour; nothing happens without one.
   void MoveNode(QTreeWidgetItem& item, int step);
 
-  /// Brings the nodes in line with a template in which several elements or groups may have come, gone, moved or
-  /// changed. Nodes that stay keep their data. Reports no change of the selection.
+  /// Brings the nodes in line with a template in which several elements or groups may have come, gone, moved
+  /// or changed. Nodes that stay keep their data. Reports no change of the selection.
   void Follow(TemplateCore& core);
   /// Shows the caption of an element as it is now, where it has a node.
   void FollowCaption(const CEL_Element& element);

@@ -37,15 +37,11 @@ constexpr std::array<KindColour, 7> kKindColours = {{
     {ElementKind::Process, qRgb(0, 115, 230)},
 }};
 constexpr QRgb kOtherElement = qRgb(0, 0, 255);
-constexpr QRgb kCallable = qRgb(0, 155, 0);
-constexpr QRgb kProperty = qRgb(0, 0, 255);
-constexpr QRgb kUnknownName = qRgb(255, 0, 0);
-constexpr QRgb kNumber = qRgb(255, 0, 255);
 constexpr QRgb kOperator = qRgb(0, 0, 0);
 constexpr QRgb kConditional = qRgb(64, 64, 64);
 
-TokenStyle Style(QRgb colour, bool bold, bool italic, bool link) {
-  return {true, QColor(colour), bold, italic, link};
+TokenStyle Style(const QColor& colour, bool bold, bool italic, bool link) {
+  return {true, colour, bold, italic, link};
 }
 
 bool IsCallable(const std::string& name) {
@@ -80,15 +76,16 @@ TokenStyle StyleOfName(const std::string& name, const TemplateCore& core) {
                      [elementKind](const KindColour& entry) { return entry.kind == elementKind; });
     return Style(row == kKindColours.end() ? kOtherElement : row->colour, true, false, true);
   }
-  if (IsCallable(name)) return Style(kCallable, true, true, false);
-  if (IsPropertyName(name)) return Style(kProperty, true, false, false);
-  return Style(kUnknownName, true, false, false);
+  if (IsCallable(name)) return Style(kCallableColour, true, true, false);
+  if (IsPropertyName(name)) return Style(kPropertyColour, true, false, false);
+  return Style(kFaultColour, true, false, false);
 }
 
 TokenStyle StyleOfToken(const ExpressionToken& expressionToken, const TemplateCore& core) {
   const TokenCode code = expressionToken.code;
   if (code == TokenCode::Identifier) return StyleOfName(expressionToken.text, core);
-  if (code >= TokenCode::IntNum && code <= TokenCode::ScientificNum) return Style(kNumber, true, true, false);
+  if (code >= TokenCode::IntNum && code <= TokenCode::ScientificNum)
+    return Style(kNumberColour, true, true, false);
   const bool isOperator = code >= TokenCode::AddOpPlus && code <= TokenCode::MulOpDivide;
   const bool isBracket = code >= TokenCode::LeftBracket && code <= TokenCode::RightCurly;
   if (isOperator || isBracket) return Style(kOperator, true, false, false);

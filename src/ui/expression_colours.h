@@ -21,6 +21,10 @@ struct TokenStyle {
 
 /// What is wrong, and names that mean nothing; for a light ground.
 inline constexpr QColor kFaultColour{255, 0, 0};
+// What is no symbol, for a light ground.
+inline constexpr QColor kCallableColour{0, 155, 0};
+inline constexpr QColor kPropertyColour{0, 0, 255};
+inline constexpr QColor kNumberColour{255, 0, 255};
 
 /// The style of an identifier.
 TokenStyle StyleOfName(const std::string& name, const TemplateCore& core);

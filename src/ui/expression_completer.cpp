@@ -198,7 +198,10 @@ CCompletionModel::Row CExpressionCompleter::RowOf(const Completion& completion) 
   row.detail = completion.element == nullptr
                    ? strings::kCompletionGroups.at(static_cast<std::size_t>(completion.group))
                    : field.TipOf(completion.element->GetUid()).trimmed();
-  row.colour = field.ColourOf(std::string(completion.text));
+  // A built-in that no element represents would look like a fault.
+  const bool isPlain =
+      completion.group == CompletionGroup::Builtin || completion.group == CompletionGroup::Keyword;
+  row.colour = isPlain ? field.palette().color(QPalette::Text) : field.ColourOf(std::string(completion.text));
   return row;
 }
 

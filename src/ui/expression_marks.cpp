@@ -130,7 +130,8 @@ void CExpressionMarks::AppendBrackets(QList<QTextEdit::ExtraSelection>& marks) c
 
 void CExpressionMarks::Append(QList<QTextEdit::ExtraSelection>& marks, int begin, int end,
                               const QTextCharFormat& looks) const {
-  if (begin >= end) return;
+  // The caret moves before the text counts as changed, when the faults are still those of the text before.
+  if (begin >= end || end >= field.document()->characterCount()) return;
   QTextEdit::ExtraSelection mark;
   mark.cursor = QTextCursor(field.document());
   mark.cursor.setPosition(begin);

@@ -11,6 +11,7 @@ namespace tessal {
 
 class CAutoRichEditCtrl;
 class CExpressionMarks;
+class CFormulaPreview;
 class CLabel;
 class CTessalDoc;
 
@@ -26,19 +27,30 @@ class CExpressionPanel final : public QWidget {
   /// Puts a button into the row under the field.
   void AddButton(QWidget& button);
 
+  /// The formula takes what room there is, and needs none.
+  QSize minimumSizeHint() const override;
+
  signals:
   /// The caret is at a line and a column, both from 1.
   void CaretMoved(int line, int column);
   /// What is wrong at the caret or before anything else, in plain language; empty when nothing is.
   void FaultChanged(const QString& plain);
 
+ protected:
+  void resizeEvent(QResizeEvent* resize) override;
+
  private:
   void ReportCaret();
   void ShowFault();
+  void ShowFormula();
+  /// Gives the formula the room that the field can spare.
+  void FitFormula();
 
   CAutoRichEditCtrl* field;
   CExpressionMarks* marks;
   CLabel* note;
+  CFormulaPreview* formula;
+  ElementSource element;
   QHBoxLayout* foot;
 };
 

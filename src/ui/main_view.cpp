@@ -29,9 +29,11 @@
 #include "ui/error_list.h"
 #include "ui/export_commands.h"
 #include "ui/expression_colours.h"
+#include "ui/expression_panel.h"
 #include "ui/find_pane.h"
 #include "ui/find_tools.h"
 #include "ui/folder_elements.h"
+#include "ui/formula_preview.h"
 #include "ui/help_window.h"
 #include "ui/icons.h"
 #include "ui/kept_splitter.h"
@@ -71,7 +73,10 @@ std::int32_t NumberOf(const UpdateHint* argument) {
 class TypedInModel final {
  public:
   TypedInModel(std::vector<TypedValue> typedValues, TemplateCore& template_)
-      : unrecorded(template_.History()), core(template_), wasModified(template_.Modified()), values(std::move(typedValues)) {
+      : unrecorded(template_.History()),
+        core(template_),
+        wasModified(template_.Modified()),
+        values(std::move(typedValues)) {
     for (const TypedValue& value : values) value.store();
   }
   TypedInModel(const TypedInModel&) = delete;
@@ -360,6 +365,7 @@ void CMainView::OnSelectionChanged(QTreeWidgetItem* current, QTreeWidgetItem* /*
 
 void CMainView::CloseForm() {
   shown = nullptr;
+  caretText.clear();
   if (!form) return;
   // What led here may be a signal of one of the form's own controls.
   form->Close();
@@ -375,6 +381,12 @@ void CMainView::ReplaceForm(QTreeWidgetItem* item) {
   form = MakeForm({document, dialogs, CElementTree::DataOf(*item)}, holder);
   holderLayout->addWidget(form.get());
   form->Load();
+  for (const auto* panel : form->findChildren<CExpressionPanel*>()) {
+    connect(panel, &CExpressionPanel::CaretMoved, this, [this](int line, int column) {
+      caretText = strings::kStatusGap + strings::kCaretPlace.arg(line).arg(column);
+      UpdateStatus();
+    });
+  }
   // From the tree into the form, and from its last field on to the messages.
   ChainAfter(*tree, *form);
 }
@@ -543,7 +555,10 @@ void CMainView::Say(const QString& text) {
 
 std::string CMainView::StatusText() const {
   const auto count = Core().CountNamedElements() + Core().GetSpecieCount();
-  return (count == 1 ? strings::kOneElement : strings::kElementCount.arg(count)).toStdString();
+  const QString elements = count == 1 ? strings::kOneElement : strings::kElementCount.arg(count);
+  const int rows = errorList->topLevelItemCount();
+  const QString messages = rows == 1 ? strings::kOneMessage : strings::kMessageCount.arg(rows);
+  return (elements + strings::kStatusGap + messages + caretText).toStdString();
 }
 
 namespace {
@@ -572,7 +587,8 @@ std::string CMainView::Place() const {
 void CMainView::GoTo(const std::string& place) {
   const std::string_view text = place;
   const auto rest = [text](std::string_view sort) { return std::string(text.substr(sort.size())); };
-  if (text.starts_with(kGroupPlace)) return SelectGroup(QString::fromStdString(rest(kGroupPlace)).toInt() - 1);
+  if (text.starts_with(kGroupPlace))
+    return SelectGroup(QString::fromStdString(rest(kGroupPlace)).toInt() - 1);
   if (text.starts_with(kNodePlace)) return SelectById(Uid{QString::fromStdString(rest(kNodePlace)).toInt()});
   std::uint32_t sequence = 0;
   if (text.starts_with(kSymbolPlace) && Core().FindSymbol(rest(kSymbolPlace), sequence)) {
@@ -710,10 +726,10 @@ std::vector<ViewCommand> CMainView::Commands() {
   commands.push_back({.menu = strings::kGoMenu, .text = {}});
   append(findTools->Commands());
   commands.push_back({.menu = strings::kHelpMenu, .text = {}, .action = helpContents});
-  commands.push_back({.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] {
-                        OpenReference(this, {});
-                      }});
+  commands.push_back(
+      {.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] { OpenReference(this, {}); }});
   commands.push_back(StrongColoursCommand());
+  commands.push_back(FormulasCommand());
   return commands;
 }
 

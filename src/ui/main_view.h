@@ -73,8 +73,8 @@ class CMainView final : public QWidget, public CView {
   Uid CreateElement(const CreateRequest& request);
 
   // Commands.
-  /// Commits what is being entered, has an act change the template in any way, and shows what has become of it,
-  /// with the node of its subject selected.
+  /// Commits what is being entered, has an act change the template in any way, and shows what has become of
+  /// it, with the node of its subject selected.
   void Act(const std::function<StepEffect()>& act);
   /// Makes an element of the kind that the selected node offers, and gives its symbol the focus.
   void CreateBeside();
@@ -151,6 +151,7 @@ class CMainView final : public QWidget, public CView {
   QWidget* holder = nullptr;
   QVBoxLayout* holderLayout = nullptr;
   std::unique_ptr<CRightPaneBase> form;
+  QString caretText;                 ///< where the caret of an expression is, for the status
   QTreeWidgetItem* shown = nullptr;  ///< the node that the form shows
   CNavigationHistory history;
   int helpNumber = 109;

@@ -36,6 +36,10 @@ inline const QString kDeleteElement = QStringLiteral("&Delete");
 inline const QString kRenameElement = QStringLiteral("Rena&me");
 inline const QString kMoveElementUp = QStringLiteral("Move &Up");
 inline const QString kMoveElementDown = QStringLiteral("Move Do&wn");
+inline const QString kOneMessage = QStringLiteral("1 message");
+inline const QString kMessageCount = QStringLiteral("%1 messages");
+inline const QString kCaretPlace = QStringLiteral("Line %1, column %2");
+inline const QString kStatusGap = QStringLiteral("    ");
 inline const QString kEditing = QStringLiteral("Editing");
 inline const QString kUndone = QStringLiteral("Undone: %1");
 inline const QString kRedone = QStringLiteral("Done again: %1");
@@ -136,6 +140,17 @@ inline const QString kDocumentationFilter =
     QStringLiteral("Portable data files (*.pdf);;Word documents (*.doc *.docx);;All files (*)");
 
 // Expressions while they are typed. The groups are in the order of their enumeration.
+inline const QString kInsert = QStringLiteral("Insert");
+inline const QString kPalette = QStringLiteral("Operators and functions to insert");
+inline const QString kPaletteOf = QStringLiteral("Insert into %1");
+inline const QString kOperators = QStringLiteral("Operators");
+inline const QString kFormulaOf = QStringLiteral("Formula of %1");
+inline const QString kFormerFormula = QStringLiteral("The formula of the text before: %1");
+inline const QString kFormulaTooLarge = QStringLiteral("too large to show");
+inline const QString kCopyMathML = QStringLiteral("Copy as &MathML");
+inline const QString kCopyLatex = QStringLiteral("Copy as &LaTeX");
+inline const QString kCopyPicture = QStringLiteral("Copy as &Picture");
+inline const QString kHideFormulas = QStringLiteral("&Hide Formulas");
 inline const QString kCompletions = QStringLiteral("Completions");
 inline const std::array<QString, 7> kCompletionGroups = {QStringLiteral("symbol"),
                                                          QStringLiteral("function"),

@@ -49,7 +49,8 @@ CTextZoom::CTextZoom(QWidget& zoomedView)
 
 std::vector<ViewCommand> CTextZoom::Commands() const {
   std::vector<ViewCommand> commands;
-  for (QAction* action : actions) commands.push_back({.menu = strings::kViewMenu, .text = {}, .action = action});
+  for (QAction* action : actions)
+    commands.push_back({.menu = strings::kViewMenu, .text = {}, .action = action});
   return commands;
 }
 

@@ -1,5 +1,5 @@
-// The size of all texts of a view: larger and smaller by the wheel with Ctrl, by keys, and back to the usual one.
-// The choice is kept in the settings, for all views.
+// The size of all texts of a view: larger and smaller by the wheel with Ctrl, by keys, and back to the usual
+// one. The choice is kept in the settings, for all views.
 #pragma once
 
 #include <QObject>

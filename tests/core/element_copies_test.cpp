@@ -42,8 +42,9 @@ TEST(ElementCopies, AreAllThatTheOriginalsAre) {
       const CEL_Element* element = original->GetElement(UidOf(*original, change.symbol));
       EXPECT_TRUE(element == nullptr || !CanCopy(*element))
           << "seed " << seed << ": " << change.kind << " " << change.symbol << " "
-          << (change.fields.empty() ? "" : change.fields[0].field + " " + change.fields[0].before + " -> " +
-                                               change.fields[0].after);
+          << (change.fields.empty()
+                  ? ""
+                  : change.fields[0].field + " " + change.fields[0].before + " -> " + change.fields[0].after);
     }
     EXPECT_EQ(other.History().UndoCount(), 1U);
     other.Undo();
@@ -100,7 +101,8 @@ TEST(ElementCopies, OfNoTemplateAreRefused) {
   TemplateCore core;
   core.SetModified(false);
   core.History().Start();
-  for (const std::string text : {"", "k = 3", "[TESSAL_SETUP]\nEndSect\n", "\x01\xff[", "[TESSAL_SETUP]\n[CONST"}) {
+  for (const std::string text :
+       {"", "k = 3", "[TESSAL_SETUP]\nEndSect\n", "\x01\xff[", "[TESSAL_SETUP]\n[CONST"}) {
     const PastedElements pasted = PasteElements(core, text, {});
     EXPECT_NE(pasted.refusal, "") << text;
     EXPECT_TRUE(pasted.uids.empty() && !core.Modified()) << text;

@@ -254,7 +254,8 @@ std::string Difference(const Sight& expected, const Sight& found) {
 
 }  // namespace
 
-std::string FaultOfHistory(TemplateCore& core, fuzz::Choices& choices, int mostEdits, const std::string& path) {
+std::string FaultOfHistory(TemplateCore& core, fuzz::Choices& choices, int mostEdits,
+                           const std::string& path) {
   constexpr std::size_t kLoadedStep = 4;
   EditHistory& history = core.History();
   history.Start();

@@ -1,5 +1,5 @@
-// Random edits of a template of every sort, good and bad ones, and what must be true of edits whatever they are.
-// For tests and fuzz targets alike.
+// Random edits of a template of every sort, good and bad ones, and what must be true of edits whatever they
+// are. For tests and fuzz targets alike.
 #pragma once
 
 #include <string>

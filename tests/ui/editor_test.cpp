@@ -18,6 +18,7 @@
 #include <map>
 #include <set>
 
+#include "elements/external_function.h"
 #include "support/case_file.h"
 #include "ui/account_strip.h"
 #include "ui/auto_create_dialog.h"
@@ -25,6 +26,7 @@
 #include "ui/editor.h"
 #include "ui/element_form.h"
 #include "ui/expression_colours.h"
+#include "ui/function_tips.h"
 #include "ui/help_window.h"
 #include "ui/icons.h"
 #include "ui/main_view.h"
@@ -248,6 +250,17 @@ TEST(Colours, ChangeInAllFieldsAtOnce) {
   EXPECT_NE(ColoursOf(field), usual);
   UseStrongColours(false);
   EXPECT_EQ(ColoursOf(field), usual);
+}
+
+TEST(Tips, NumberTheArgumentsOfAUserFunction) {
+  TemplateCore core;
+  CEL_ExternalFunction& function = core.GetMisc()->AddExternalFunction();
+  function.publicName.SetText("mine");
+  function.parameters.SetInt(2);
+  EXPECT_EQ(TipOfCall(core, "mine", 1), "mine(argument 1, <b>argument 2</b>)");
+  function.parameters.SetInt(-1);
+  EXPECT_EQ(TipOfCall(core, "mine", 0), "mine()");
+  EXPECT_EQ(TipOfCall(core, "Mine", 0), "") << "its case counts";
 }
 
 TEST(Icons, AreAllDrawnAndAllDifferent) {

@@ -2,10 +2,18 @@
 
 #include <QAbstractItemView>
 #include <QApplication>
+#include <QClipboard>
+#include <QContextMenuEvent>
+#include <QImage>
 #include <QKeySequence>
-#include <QLabel>
+#include <QMenu>
 #include <QTest>
+#include <QTimer>
 #include <algorithm>
+
+#include "ui/call_tip.h"
+#include "ui/expression_palette.h"
+#include "ui/formula_preview.h"
 
 namespace tessal::test {
 
@@ -24,7 +32,7 @@ std::string Shown(const CAutoRichEditCtrl& field) {
                  .arg(mark.cursor.selectionStart())
                  .arg(mark.cursor.selectedText());
   }
-  const auto* tip = field.findChild<QLabel*>(QStringLiteral("CallTip"));
+  const auto* tip = field.findChild<CCallTip*>();
   if (tip != nullptr && tip->isVisible()) shown += QStringLiteral("tip: ") + tip->text() + u'\n';
   if (const auto* list = qobject_cast<const QAbstractItemView*>(QApplication::activePopupWidget())) {
     constexpr int kShown = 5;
@@ -46,7 +54,8 @@ std::string PressKeys(Editor& editor, const QString& label, const QString& keys)
   if (QApplication::activePopupWidget() == nullptr) field.setFocus();
   for (qsizetype place = 0; place < keys.size(); ++place) {
     QWidget* popup = QApplication::activePopupWidget();
-    QWidget* target = popup != nullptr ? popup : QApplication::focusWidget();
+    QWidget* const focused = QApplication::focusWidget();
+    QWidget* target = popup != nullptr ? popup : focused != nullptr ? focused : &field;
     const qsizetype end = keys[place] == u'<' ? keys.indexOf(u'>', place) : -1;
     if (end < 0) {
       QTest::keyClicks(target, keys.mid(place, 1));
@@ -57,6 +66,47 @@ std::string PressKeys(Editor& editor, const QString& label, const QString& keys)
     place = end;
   }
   return Shown(field);
+}
+
+std::string InsertFromPalette(Editor& editor, const QString& label, const QString& menu,
+                              const QString& entry) {
+  auto& field = editor.Field<CAutoRichEditCtrl>(label);
+  QMenu& palette = *field.parentWidget()->findChild<CExpressionPalette*>()->menu();
+  emit palette.aboutToShow();
+  for (const QAction* group : palette.actions()) {
+    if (group->text() != menu) continue;
+    for (QAction* action : group->menu()->actions()) {
+      if (action->text().startsWith(entry)) {
+        action->trigger();
+        return Shown(field);
+      }
+    }
+  }
+  return "no such entry\n";
+}
+
+std::string UseFormula(Editor& editor, const QString& label, const QString& entry) {
+  auto& formula = *editor.Field(label).parentWidget()->findChild<CFormulaPreview*>();
+  QApplication::clipboard()->clear();
+  QTimer::singleShot(0, &formula, [&entry] {
+    auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    if (menu == nullptr) return;
+    for (QAction* action : menu->actions()) {
+      if (!entry.isEmpty() && action->text().remove(u'&').contains(entry)) menu->setActiveAction(action);
+    }
+    QTest::keyClick(menu, menu->activeAction() != nullptr ? Qt::Key_Return : Qt::Key_Escape);
+  });
+  QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
+  QApplication::sendEvent(formula.viewport(), &byKey);
+  QCoreApplication::processEvents();
+  QString text = formula.isVisible() ? formula.accessibleDescription() : QStringLiteral("hidden");
+  const QString copied = QApplication::clipboard()->text();
+  if (!copied.isEmpty()) text += u'\n' + copied.trimmed();
+  const QImage picture = QApplication::clipboard()->image();
+  if (!picture.isNull())
+    text += picture.width() > picture.height() ? QStringLiteral("\na wide picture")
+                                               : QStringLiteral("\na picture");
+  return text.toStdString() + "\n";
 }
 
 std::string TipIn(Editor& editor, const QString& label, int position) {

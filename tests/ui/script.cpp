@@ -20,12 +20,12 @@
 #include <set>
 
 #include "ui/create_hint.h"
+#include "ui/expression_actions.h"
 #include "ui/find_pane.h"
 #include "ui/find_tools.h"
 #include "ui/found_list.h"
 #include "ui/go_to_symbol.h"
 #include "ui/message_bar.h"
-#include "ui/expression_actions.h"
 #include "ui/page_actions.h"
 #include "ui/text_bytes.h"
 #include "ui/tree_filter.h"
@@ -225,7 +225,8 @@ std::string Marks(Editor& editor, const Words& /*words*/) {
 /// The action of the edit menu whose text begins so.
 QAction* EditAction(Editor& editor, const QString& text) {
   for (const ViewCommand& command : editor.View().Commands()) {
-    if (command.action != nullptr && command.action->text().remove(u'&').startsWith(text)) return command.action;
+    if (command.action != nullptr && command.action->text().remove(u'&').startsWith(text))
+      return command.action;
   }
   return nullptr;
 }
@@ -386,8 +387,7 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
     {"pause",
      [](Editor& editor, auto& /*words*/) {
        for (auto* timer : editor.View().findChildren<QTimer*>(QStringLiteral("TypingPause"))) {
-         if (timer->isActive()) QTest::qWait(timer->interval());
-         if (timer->isActive()) QTest::qWait(1);
+         EXPECT_TRUE(QTest::qWaitFor([timer] { return !timer->isActive(); }));
        }
      }},
     {"commit", [](Editor& editor, auto& /*words*/) { editor.View().OnCommit(); }},
@@ -472,6 +472,12 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"history", [](Editor& editor, auto& /*words*/) { return History(editor); }},
     {"colours", Colours},
     {"row-menu", RowMenu},
+    {"insert",
+     [](Editor& editor, auto& words) {
+       return InsertFromPalette(editor, words.first, words.second.section(u'/', 0, 0),
+                                words.second.section(u'/', 1));
+     }},
+    {"formula", [](Editor& editor, auto& words) { return UseFormula(editor, words.first, words.second); }},
     {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
     {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
