@@ -333,15 +333,21 @@ std::string Monkey::TakeBackAndDoAgain() {
   std::string reason;
   const auto before = core.CopyText(reason);
   const std::size_t steps = Pick(core.History().UndoCount() + 1);
-  const auto take = [this](Qt::Key key, std::size_t count) {
+  const auto take = [this](const QString& name, std::size_t count) {
     editor->Tree().setFocus();
-    for (std::size_t step = 0; step < count; ++step)
-      QTest::keyClick(&editor->Tree(), key, Qt::ControlModifier);
+    for (const ViewCommand& command : editor->View().Commands()) {
+      if (command.action == nullptr || !command.action->text().startsWith(name)) continue;
+      for (std::size_t step = 0; step < count; ++step) command.action->trigger();
+    }
   };
   const std::size_t left = core.History().UndoCount() - steps;
-  take(Qt::Key_Z, steps);
-  if (core.History().UndoCount() != left) lost = "undo has not taken the steps back";
-  take(Qt::Key_Y, steps);
+  take(QStringLiteral("&Undo"), steps);
+  if (core.History().UndoCount() != left) {
+    lost = "undo has taken back to step " + std::to_string(core.History().UndoCount()) + " instead of " +
+           std::to_string(left) + ", by " + std::to_string(steps) + "; next to it are '" +
+           std::string(core.History().UndoName()) + "' and '" + std::string(core.History().RedoName()) + "'";
+  }
+  take(QStringLiteral("&Redo"), steps);
   const auto after = core.CopyText(reason);
   if (before != after) lost = "steps that were taken back and done again have left another template";
   return "back and again " + std::to_string(steps);

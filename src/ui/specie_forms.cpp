@@ -144,7 +144,11 @@ constexpr FormTable kVerticalEquationForm = kVerticalEquationFields;
 constexpr FormTable kSpatialFunctionForm = kSpatialFunctionFields;
 
 void CSpecieSpatialFunctionView::ItemToForm() {
-  Core().RefreshSearchFunctionChoices();
+  {
+    // A look is no act: the class that the search belongs to follows from its place.
+    const RecordingOff unrecorded(Core().History());
+    Core().RefreshSearchFunctionChoices();
+  }
   CElementForm::ItemToForm();
 }
 
