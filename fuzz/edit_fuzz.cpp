@@ -5,11 +5,11 @@
 #include <string>
 #include <vector>
 
-#include "support/choices.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/user_function_names.h"
+#include "support/choices.h"
 #include "support/random_edits.h"
 #include "support/template_content.h"
 #include "template_file.h"

@@ -8,12 +8,12 @@
 #include <vector>
 
 #include "broken_file.h"
-#include "support/choices.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/user_function_names.h"
 #include "stable_save.h"
+#include "support/choices.h"
 #include "template_file.h"
 
 namespace {

@@ -9,13 +9,13 @@
 #include <string_view>
 #include <vector>
 
-#include "support/choices.h"
 #include "core/error_registry.h"
 #include "core/rename.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
 #include "expr/user_function_names.h"
+#include "support/choices.h"
 #include "template_file.h"
 
 namespace {

@@ -77,7 +77,7 @@ CLI::Option* AddForce(CLI::App& command, bool& force) {
 /// An option that takes one of a few words.
 template <class Value>
 CLI::Option* AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
-               Value& chosen) {
+                       Value& chosen) {
   const auto read = [&chosen, name, choices](const std::string& word) {
     const std::optional<Value> value = ValueOf(choices, word);
     if (!value)

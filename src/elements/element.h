@@ -144,8 +144,8 @@ class CEL_Element : public PropertyHolder {
   /// Makes editable what the present values leave to the modeller, and locks what they fix: after a load, a
   /// reset, and a change of what decides it. Values stay as they are.
   virtual void UpdateLocks() {}
-  /// After values were put back as they were: what follows from them (choices, selections, locks) does too. No
-  /// value changes.
+  /// After values were put back as they were: what follows from them (choices, selections, locks) does too.
+  /// No value changes.
   virtual void FollowValues();
   /// The element leaves its template, and may come back.
   virtual void Withdraw() {}
@@ -177,8 +177,8 @@ class CEL_Element : public PropertyHolder {
   /// Points each property's selection at the choice of its value.
   void SelectPresentValues();
 
-  /// Takes the values of another element of the same class, but for its symbol and its number. Nobody hears of
-  /// it; choices and locks follow.
+  /// Takes the values of another element of the same class, but for its symbol and its number. Nobody hears
+  /// of it; choices and locks follow.
   void TakeValuesOf(const CEL_Element& other);
 
   /// Empties the descriptive texts.
