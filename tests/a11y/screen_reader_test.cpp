@@ -35,9 +35,14 @@ bool IsMenuItem(const Control& control) {
   return control.role == ATSPI_ROLE_MENU_ITEM || control.role == ATSPI_ROLE_CHECK_MENU_ITEM;
 }
 
+bool IsButton(const Control& control) {
+  return control.role == ATSPI_ROLE_PUSH_BUTTON || control.role == ATSPI_ROLE_TOGGLE_BUTTON ||
+         control.role == ATSPI_ROLE_CHECK_BOX || control.role == ATSPI_ROLE_RADIO_BUTTON;
+}
+
 bool IsNamed(const Control& control) {
   if (control.role == ATSPI_ROLE_TABLE_CELL) return false;
-  return control.isFocusable || IsMenuItem(control) || control.role == ATSPI_ROLE_PUSH_BUTTON ||
+  return control.isFocusable || IsMenuItem(control) || IsButton(control) ||
          control.role == ATSPI_ROLE_TABLE_COLUMN_HEADER;
 }
 
@@ -54,9 +59,12 @@ class Complaints final {
  private:
   void Judge(const Control& control) {
     if (IsNamed(control)) JudgeName(control);
+    const bool isDescribed = control.isFocusable || control.role == ATSPI_ROLE_LABEL;
+    if (isDescribed && control.handle.Description().find('<') != std::string::npos)
+      Complain(control, "has markup in its description");
     if (control.role == ATSPI_ROLE_TEXT || control.role == ATSPI_ROLE_COMBO_BOX) JudgeField(control);
     // A button without a stop is a short cut to a command of a menu.
-    if (control.role == ATSPI_ROLE_PUSH_BUTTON && !control.isFocusable && !commands.contains(control.name))
+    if (IsButton(control) && !control.isFocusable && !commands.contains(control.name))
       Complain(control, "can be reached neither by Tab nor in a menu");
     if (control.role == ATSPI_ROLE_TREE || control.role == ATSPI_ROLE_TABLE) JudgeRows(control);
   }
@@ -65,8 +73,6 @@ class Complaints final {
     if (control.name.find_first_not_of(' ') == std::string::npos) Complain(control, "has no name");
     if (control.name.find_first_of("&\t\n") != std::string::npos)
       Complain(control, "has a mark of the keyboard in its name");
-    if (control.handle.Description().find('<') != std::string::npos)
-      Complain(control, "has markup in its description");
     if (IsTabStop(control) && !names.insert(control.Words()).second) Complain(control, "is there twice");
   }
 
