@@ -11,8 +11,8 @@ Keyboard::Keyboard() : display(XOpenDisplay(nullptr)) {
   if (display == nullptr) throw std::runtime_error("the display cannot be opened");
 }
 
-void Keyboard::Close::operator()(_XDisplay* display) const {
-  XCloseDisplay(display);
+void Keyboard::Close::operator()(_XDisplay* opened) const {
+  XCloseDisplay(opened);
 }
 
 bool Keyboard::FocusTopWindow() const {

@@ -7,7 +7,7 @@
 #include <initializer_list>
 #include <memory>
 
-struct _XDisplay;
+struct _XDisplay;  // NOLINT(bugprone-reserved-identifier): the name that Xlib gives it
 
 namespace tessal::test {
 
@@ -24,7 +24,7 @@ class Keyboard final {
 
  private:
   struct Close {
-    void operator()(_XDisplay* display) const;
+    void operator()(_XDisplay* opened) const;
   };
   std::unique_ptr<_XDisplay, Close> display;
 };

@@ -149,9 +149,8 @@ std::string WalkWithTab(const EditorReader& editor, const Controls& controls) {
 class ScreenReader : public testing::Test {
  protected:
   static void SetUpTestSuite() {
-    if (test::PrivateDesktop::Missing().empty())
-      editor = std::make_unique<EditorReader>(
-          std::vector<std::string>{"eutrophication", "fish_larvae", "lake_management", "faults"});
+    const std::vector<std::string> examples = {"eutrophication", "fish_larvae", "lake_management", "faults"};
+    if (test::PrivateDesktop::Missing().empty()) editor = std::make_unique<EditorReader>(examples);
   }
   static void TearDownTestSuite() { editor.reset(); }
 
