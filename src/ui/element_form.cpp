@@ -125,6 +125,7 @@ void CElementForm::ExplainField(const Control& control) {
   const QString meaning = Meaning(*control.field);
   if (meaning.isEmpty()) return;
   control.label->setToolTip(PlainTip(meaning));
+  control.label->setAccessibleDescription(meaning);
   // The tip of an editor would be read out with its markup.
   control.editor->setAccessibleDescription(meaning);
   // Where a field has text of its own to point at, the tip is for that.
@@ -194,7 +195,8 @@ QWidget* CElementForm::MakeDocumentation(const FormField& field, Control& contro
   browse->setToolTip(strings::kSelectDocumentation);
   auto* view = MakeChild<QPushButton>(strings::kView, cell);
   view->setObjectName(QString::number(control_id::kView));
-  view->setAccessibleName(strings::kOpenDocumentation);
+  view->setAccessibleName(strings::kView);
+  view->setToolTip(strings::kOpenDocumentation);
   parts->addWidget(line, 1);
   parts->addWidget(browse);
   parts->addWidget(view);
@@ -212,8 +214,9 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   keypad->setObjectName(QString::number(field.keypad));
   // In a form with several expressions each button has a name of its own.
   const bool isOnly = field.keypad == control_id::kKeypad;
-  keypad->setAccessibleName(isOnly ? strings::kExpressionEditor
-                                   : strings::kExpressionEditor + u' ' + QString::fromLatin1(field.label));
+  keypad->setAccessibleName(isOnly ? strings::kEdit
+                                   : strings::kEdit + u' ' + QString::fromLatin1(field.label));
+  keypad->setAccessibleDescription(strings::kExpressionEditor);
   cell->AddButton(*keypad);
   connect(edit, &CAutoRichEditCtrl::ContentChanged, this, [this, edit] {
     if (edit->IsEdited()) NoteTyped();

@@ -44,9 +44,16 @@ CExpressionEditorDlg::CExpressionEditorDlg(QWidget* parent) : QDialog(parent) {
   tree->setAccessibleName(QStringLiteral("Symbols"));
   auto* text = MakeChild<QTextEdit>(this);
   text->setAccessibleName(QStringLiteral("Expression"));
+  text->setTabChangesFocus(true);
   auto* keys = MakeChild<QGridLayout>();
+  QStringList texts;
   for (std::size_t place = 0; place < kKeys.size(); ++place) {
-    auto* key = MakeChild<QPushButton>(QString::fromUtf16(kKeys[place].text), this);
+    const QString keyText = QString::fromUtf16(kKeys[place].text);
+    auto* key = MakeChild<QPushButton>(keyText, this);
+    texts.append(keyText);
+    // Of two keys that look alike, who hears them knows which is which.
+    const auto times = texts.count(keyText);
+    if (times > 1) key->setAccessibleName(QStringLiteral("%1 (%2)").arg(keyText).arg(times));
     key->setObjectName(QString::number(kKeys[place].control));
     key->setAutoDefault(false);
     const int index = static_cast<int>(place);

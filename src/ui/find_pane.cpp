@@ -105,6 +105,8 @@ void CFindPane::BuildFindRow(QGridLayout& grid) {
   AddButton(grid, kFindRow, 2, strings::kFindAll, &CFindPane::Find);
   where = MakeChild<QComboBox>(this);
   where->setAccessibleName(strings::kFindWhere);
+  // A reader takes what is chosen for the name of a choice without a label.
+  where->setToolTip(strings::kFindWhere);
   for (const Place& place : kPlaces) where->addItem(place.text, static_cast<int>(place.in));
   connect(where, &QComboBox::currentIndexChanged, this, &CFindPane::DropPreview);
   grid.addWidget(where, kFindRow, 3);

@@ -68,6 +68,7 @@ CFindTools::CFindTools(FindSurroundings surroundings)
     action->setShortcutContext(Qt::WidgetWithChildrenShortcut);
     connect(action, &QAction::triggered, this, command.run);
     around.view.addAction(action);
+    commands.push_back({.menu = command.menu, .text = {}, .action = action});
   }
 }
 
@@ -87,14 +88,6 @@ std::vector<CFindTools::Command> CFindTools::CommandRows() {
       {strings::kGoMenu, strings::kCommandFormerMessage, QStringLiteral("Shift+F8"),
        [this] { around.messages.GoToMessage(-1); }},
   };
-}
-
-std::vector<ViewCommand> CFindTools::Commands() {
-  std::vector<ViewCommand> commands;
-  // A menu shows what follows a tab at its right edge, as a key that works elsewhere.
-  for (const Command& command : CommandRows())
-    commands.push_back({command.menu, (command.text + u'\t' + command.key).toStdString(), command.run});
-  return commands;
 }
 
 void CFindTools::FilterTree() {

@@ -44,8 +44,8 @@ class CFindTools final : public QObject {
   CTreeFilter& TreeFilter() const { return *filter; }
   CFindPane& Pane() const { return *pane; }
 
-  /// The commands for the menus, which have the keys of the view's own.
-  std::vector<ViewCommand> Commands();
+  /// The commands for the menus.
+  const std::vector<ViewCommand>& Commands() const { return commands; }
 
  private:
   struct Command {
@@ -72,6 +72,7 @@ class CFindTools final : public QObject {
   FindSurroundings around;
   CTreeFilter* filter;
   CFindPane* pane;
+  std::vector<ViewCommand> commands;
   bool walksPane = false;  ///< whether the next match is one of the pane's
 };
 

@@ -2,6 +2,7 @@
 
 #include <QAction>
 #include <QApplication>
+#include <QFocusEvent>
 #include <QFontInfo>
 #include <QKeyEvent>
 #include <QMenu>
@@ -132,8 +133,6 @@ void CMainView::OnInitialUpdate() {
   addAction(helpContents);
   // The first selection fills the list of messages too.
   tree->setCurrentItem(tree->RootItem());
-  // A host that gives the view the focus gives it to the tree.
-  setFocusProxy(tree);
   UpdateNavigation();
 }
 
@@ -188,7 +187,7 @@ void CMainView::BuildLayout() {
   topBottom->setChildrenCollapsible(false);
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
   KeepSplitter(*topBottom);
-  QWidget::setTabOrder(&findTools->TreeFilter(), tree);
+  QWidget::setTabOrder(findTools->TreeFilter().focusProxy(), tree);
   ChainAfter(ChainAfter(*tree, *messages), findTools->Pane());
 
   auto* layout = MakeChild<QVBoxLayout>(this);
@@ -436,6 +435,12 @@ std::string CMainView::StatusText() const {
   const int rows = errorList->topLevelItemCount();
   const QString messages = rows == 1 ? strings::kOneMessage : strings::kMessageCount.arg(rows);
   return (elements + strings::kStatusGap + messages + caretText).toStdString();
+}
+
+void CMainView::focusInEvent(QFocusEvent* focus) {
+  // A host that gives the view the focus gives it to the tree. As a proxy, the tree would be the first stop of
+  // the view, and Tab would pass over what lies before it.
+  tree->setFocus(focus->reason());
 }
 
 bool CMainView::eventFilter(QObject* watched, QEvent* happened) {

@@ -90,6 +90,7 @@ class CMainView final : public QWidget, public CView {
   void CommitAll();
 
  protected:
+  void focusInEvent(QFocusEvent* focus) override;
   bool eventFilter(QObject* watched, QEvent* happened) override;
 
  private:

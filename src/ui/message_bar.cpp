@@ -53,6 +53,8 @@ CMessageBar::CMessageBar(CErrorList& errorList, QWidget* parent)
   clear->setContext(Qt::WidgetShortcut);
   connect(clear, &QShortcut::activated, words, &QLineEdit::clear);
   layout->addWidget(words, 1);
+  // The list lies under its bar.
+  QWidget::setTabOrder(words, &list);
   connect(&list, &CErrorList::Refreshed, this, &CMessageBar::ShowCounts);
   ShowCounts();
 }
