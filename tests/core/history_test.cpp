@@ -120,7 +120,9 @@ TEST_F(Steps, GoBackAndForthToTheSameTexts) {
   std::vector<std::string> texts;
   const auto look = [this] {
     std::string reason;
-    return core.CopyText(reason).value_or(reason);
+    std::string numbers;
+    for (const auto& specie : core.Species()) numbers += std::to_string(specie->Index());
+    return numbers + core.CopyText(reason).value_or(reason);
   };
   const std::function<void()> acts[] = {
       [this] { core.AddConstant(); },
