@@ -44,12 +44,10 @@ template <class Element>
 void PutOrTakeElement(Sequence<Element>& elements, PresenceEdit& edit) {
   const auto position = elements.begin() + static_cast<std::ptrdiff_t>(std::min(edit.place, elements.size()));
   if (edit.away) {
-    edit.away->MarkModified();
     elements.insert(position, std::unique_ptr<Element>(static_cast<Element*>(edit.away.release())));
   } else if (position != elements.end()) {
     edit.away = std::move(*position);
     elements.erase(position);
-    edit.away->Withdraw();
   }
 }
 

@@ -97,6 +97,36 @@ TEST(ElementCopies, OfMembersGoToTheClassThatTakesThem) {
   EXPECT_EQ(empty.GetSpecie(0).stateVariables.size(), 2U);
 }
 
+TEST(ElementCopies, OfSearchesLookAtWhatTheirOriginalsDo) {
+  test::LoadedTemplate loaded(test::TemplateFromNotation(kModel));
+  TemplateCore& core = *loaded;
+  CEL_Lagrange_Spatial_Function& search = core.GetSpecie(0).AddSpatialFunction();
+  core.RebuildSymbolTable();
+  search.variableId.SetInt(core.GetConstant(1).id.IntValue());
+  search.lookFor.SetInt(2);
+  const std::string alone = TextOfElements(core, {search.GetUid()}).text;
+  const std::string withBoth =
+      TextOfElements(core, {search.GetUid(), UidOf(core, "k1"), core.GetSpecie(1).GetUid()}).text;
+  const auto pasted = [&core](const std::string& text) {
+    const Uid uid = PasteElements(core, text, {}).uids.back();
+    return static_cast<CEL_Lagrange_Spatial_Function*>(core.GetElement(uid));
+  };
+  const auto symbolOf = [&core](const CEL_Lagrange_Spatial_Function& function) {
+    return core.GetElementBySequence(static_cast<std::uint32_t>(function.variableId.IntValue()))
+        ->symbol.TextOf();
+  };
+  const auto* copy = pasted(alone);
+  EXPECT_EQ(symbolOf(*copy), "k1");
+  EXPECT_EQ(copy->lookFor.IntValue(), 2);
+  PasteElements(core, withBoth, {});
+  const auto& searches = core.GetSpecie(0).spatialFunctions;
+  EXPECT_EQ(symbolOf(*searches.back()), "k2") << "a copy of what they look at, where there is one";
+  EXPECT_EQ(searches.back()->lookFor.IntValue(), 3);
+  TemplateCore other;
+  PasteElements(other, TextOfElements(core, {core.GetSpecie(0).GetUid()}).text, {});
+  EXPECT_EQ(other.GetSpecie(0).spatialFunctions[0]->variableId.IntValue(), -1);
+}
+
 TEST(ElementCopies, OfNoTemplateAreRefused) {
   TemplateCore core;
   core.SetModified(false);
