@@ -439,8 +439,8 @@ std::string CMainView::StatusText() const {
 
 void CMainView::focusInEvent(QFocusEvent* focus) {
   // A host that gives the view the focus gives it to the tree. As a proxy, the tree would be the first stop of
-  // the view, and Tab would pass over what lies before it.
-  tree->setFocus(focus->reason());
+  // the view, and Tab would pass over what lies before it. A view may come to the front before it is filled.
+  if (tree != nullptr) tree->setFocus(focus->reason());
 }
 
 bool CMainView::eventFilter(QObject* watched, QEvent* happened) {
