@@ -15,6 +15,7 @@
 #include "ui/child.h"
 #include "ui/dialogs.h"
 #include "ui/element_tree.h"
+#include "ui/folder_elements.h"
 #include "ui/icons.h"
 #include "ui/main_view.h"
 #include "ui/node_kinds.h"
@@ -308,11 +309,8 @@ void CEditCommands::DeleteSelected() {
     kept = Core().DeleteElements(selected);
     return StepEffect();
   });
-  QStringList names;
-  for (const Uid uid : kept) {
-    if (const CEL_Element* element = Core().GetElement(uid)) names.append(ToScreen(element->FullSymbol()));
-  }
-  if (!names.isEmpty()) dialogs.Warn(&view, strings::kStillUsed.arg(names.join(QStringLiteral(", "))));
+  const QString names = SymbolsOf(Core(), kept);
+  if (!names.isEmpty()) dialogs.Warn(&view, strings::kStillUsed.arg(names));
 }
 
 }  // namespace tessal

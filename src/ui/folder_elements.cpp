@@ -1,7 +1,10 @@
 #include "ui/folder_elements.h"
 
+#include <QStringList>
+
 #include "core/template_core.h"
 #include "ui/node_kinds.h"
+#include "ui/text_bytes.h"
 
 namespace tessal {
 
@@ -35,6 +38,14 @@ std::vector<const CEL_Element*> ElementsOfFolder(const TemplateCore& core, const
   WithMemberList(kind,
                  [&elements, specie](const auto& list) { elements = PointersTo(specie->*list.members); });
   return elements;
+}
+
+QString SymbolsOf(const TemplateCore& core, const std::vector<Uid>& uids) {
+  QStringList symbols;
+  for (const Uid uid : uids) {
+    if (const CEL_Element* element = core.GetElement(uid)) symbols.append(ToScreen(element->FullSymbol()));
+  }
+  return symbols.join(QStringLiteral(", "));
 }
 
 }  // namespace tessal

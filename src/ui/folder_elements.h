@@ -1,6 +1,7 @@
 // The elements that a folder of the tree holds.
 #pragma once
 
+#include <QString>
 #include <vector>
 
 #include "ui/item_data.h"
@@ -15,5 +16,8 @@ ElementKind KindInFolder(const CItemData& folder);
 
 /// In the order of the template; none for a node that is no folder.
 std::vector<const CEL_Element*> ElementsOfFolder(const TemplateCore& core, const CItemData& folder);
+
+/// The symbols of elements in a line, for people; those that are gone are left out.
+QString SymbolsOf(const TemplateCore& core, const std::vector<Uid>& uids);
 
 }  // namespace tessal

@@ -80,14 +80,6 @@ CEL_Element* ElementOf(const TemplateCore& core, const CRowModel::Row& row) {
   return element != nullptr && element->GetUid() == row.uid ? element : core.GetElement(row.uid);
 }
 
-QString SymbolsOf(const TemplateCore& core, const std::vector<Uid>& uids) {
-  QStringList symbols;
-  for (const Uid uid : uids) {
-    if (const CEL_Element* element = core.GetElement(uid)) symbols.append(ToScreen(element->FullSymbol()));
-  }
-  return symbols.join(QStringLiteral(", "));
-}
-
 std::ptrdiff_t DistanceInFolder(const std::vector<const CEL_Element*>& elements, Uid first, Uid second) {
   const auto find = [&elements](Uid uid) {
     return std::find_if(elements.begin(), elements.end(),
