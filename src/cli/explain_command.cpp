@@ -15,9 +15,11 @@ ExitCode RunExplain(const std::string& code) {
 }
 
 ExitCode RunExplainAll() {
-  for (const MessageRow& row : AllMessages()) {
-    PrintLine(std::string(row.code) + '\t' + std::string(LevelWordOf(row)) + '\t' +
-              std::string(MessageText(row)));
+  for (const auto rows : {AllMessages(), AnalysisMessages()}) {
+    for (const MessageRow& row : rows) {
+      PrintLine(std::string(row.code) + '\t' + std::string(LevelWordOf(row)) + '\t' +
+                std::string(MessageText(row)));
+    }
   }
   return kFine;
 }

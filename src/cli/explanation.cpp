@@ -1,5 +1,6 @@
 #include "cli/explanation.h"
 
+#include <span>
 #include <string_view>
 
 #include "docgen/safe_text.h"
@@ -16,6 +17,18 @@ constexpr std::string_view kPageStart =
     "names\n"
     "the code of each message.\n";
 
+constexpr std::string_view kAnalysesStart =
+    "\n# Findings of analyses\n\n"
+    "What `tessal units`, `tessal balance` and `tessal lint` find in a template that is well formed.\n";
+
+void AppendRows(std::string& page, std::span<const MessageRow> rows) {
+  for (const MessageRow& row : rows) {
+    page += "\n## " + std::string(row.code) + "\n\n";
+    page += std::string(LevelWordOf(row)) + ": `" + std::string(MessageText(row)) + "`\n\n";
+    page += MarkdownText(row.meaning) + "\n\n" + HelpMarkdown(row) + "\n";
+  }
+}
+
 }  // namespace
 
 std::string HelpMarkdown(const MessageRow& row) {
@@ -24,11 +37,9 @@ std::string HelpMarkdown(const MessageRow& row) {
 
 std::string MessagesPage() {
   std::string page(kPageStart);
-  for (const MessageRow& row : AllMessages()) {
-    page += "\n## " + std::string(row.code) + "\n\n";
-    page += std::string(LevelWordOf(row)) + ": `" + std::string(MessageText(row)) + "`\n\n";
-    page += MarkdownText(row.meaning) + "\n\n" + HelpMarkdown(row) + "\n";
-  }
+  AppendRows(page, AllMessages());
+  page += kAnalysesStart;
+  AppendRows(page, AnalysisMessages());
   return page;
 }
 

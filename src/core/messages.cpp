@@ -32,10 +32,12 @@ Finding::Finding(Message row, std::initializer_list<std::string_view> values)
     : message(row), text(Filled(row->text, values)) {}
 
 const MessageRow* FindMessage(std::string_view code) {
-  const auto rows = AllMessages();
-  const auto hit =
-      std::find_if(rows.begin(), rows.end(), [code](const MessageRow& row) { return row.code == code; });
-  return hit == rows.end() ? nullptr : &*hit;
+  for (const auto rows : {AllMessages(), AnalysisMessages()}) {
+    const auto hit =
+        std::find_if(rows.begin(), rows.end(), [code](const MessageRow& row) { return row.code == code; });
+    if (hit != rows.end()) return &*hit;
+  }
+  return nullptr;
 }
 
 std::string_view LevelWord(std::uint32_t level) {

@@ -11,10 +11,11 @@
 #include <string_view>
 
 #include "core/message_table.h"
+#include "core/message_table_of_analyses.h"
 
 namespace tessal {
 
-/// A row of the table of messages.
+/// A row of one of the two tables of messages.
 class Message final {
  public:
   /// Looks the code up while compiling.
@@ -26,6 +27,9 @@ class Message final {
  private:
   static consteval const MessageRow* RowOf(std::string_view code) {
     for (const MessageRow& candidate : kMessages) {
+      if (candidate.code == code) return &candidate;
+    }
+    for (const MessageRow& candidate : kAnalysisMessages) {
       if (candidate.code == code) return &candidate;
     }
     throw "no message has this code";
@@ -43,12 +47,17 @@ struct Finding {
   std::string text;
 };
 
-/// The rows of the table, in its order.
+/// The rows of what loads, checks, changes and saves report, in the order of their table.
 inline std::span<const MessageRow> AllMessages() {
   return kMessages;
 }
 
-/// The row of a code; none for a code outside the table.
+/// The same of what analyses find.
+inline std::span<const MessageRow> AnalysisMessages() {
+  return kAnalysisMessages;
+}
+
+/// The row of a code in either table; none for any other.
 const MessageRow* FindMessage(std::string_view code);
 
 /// The word of a level ("Warning"); empty for a number outside 1 to 4.

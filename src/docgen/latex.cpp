@@ -7,7 +7,7 @@
 #include <optional>
 #include <vector>
 
-#include "docgen/expression_shape.h"
+#include "expr/expression_shape.h"
 #include "expr/expression_node.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"

@@ -6,7 +6,7 @@
 #include <string_view>
 #include <vector>
 
-#include "docgen/expression_shape.h"
+#include "expr/expression_shape.h"
 #include "expr/expression_node.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"

@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <array>
 
-#include "docgen/expression_shape.h"
+#include "expr/expression_shape.h"
 #include "platform/ascii.h"
 #include "ui/text_bytes.h"
 

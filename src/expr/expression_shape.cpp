@@ -1,4 +1,4 @@
-#include "docgen/expression_shape.h"
+#include "expr/expression_shape.h"
 
 #include <algorithm>
 #include <array>
