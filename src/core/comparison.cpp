@@ -146,8 +146,10 @@ class Listing final {
   }
 
   void AddFurtherSections() {
+    if (core.KeptText().empty()) return;
+    // A file of the format begins with a comment.
     CKvfItemTree sections;
-    if (core.KeptText().empty() || ParseKeyFileTree(core.KeptText(), sections) == 0) return;
+    if (ParseKeyFileTree("// \r\n\r\n" + core.KeptText() + "\r\n", sections) == 0) return;
     for (const CKvfBaseItem& child : sections.Children()) {
       if (child.ItemKind() != CKvfBaseItem::kSection) continue;
       std::string text;
