@@ -123,9 +123,10 @@ class Algebra::Expansion final {
       if (!product) return std::nullopt;
       Append(sum, *product, link.isInverse ? -1 : 1);
       if (sum.size() > kMostProducts * 2) Settle(sum);
-      if (sum.size() > kMostProducts) return algebra.Fail("an expression has too many terms");
+      if (sum.size() > kMostProducts * 2) break;
     }
     Settle(sum);
+    if (sum.size() > kMostProducts) return algebra.Fail("an expression has too many terms");
     return sum;
   }
 

@@ -19,6 +19,9 @@ constexpr double kNoValue = std::numeric_limits<double>::quiet_NaN();
 /// Arguments that differ by less, relative to their size, are the same.
 constexpr double kSameArgument = 1e-9;
 
+/// Values far from the defaults lie between these powers of two times the default.
+constexpr double kWideSpread = 16;
+
 /// The finishing steps of a 64-bit mix: Steele, G. L., Lea, D. and Flood, C. H. (2014), Fast splittable
 /// pseudorandom number generators, OOPSLA 2014.
 std::uint64_t Mixed(std::uint64_t bits) {
@@ -131,7 +134,9 @@ double PointValues::ValueOfRecord(const SymbolRecord& record) {
   const std::optional<DeclaredValue> declared = DeclaredValueOf(*record.element);
   if (!declared) return ValueOfBody(record);
   if (kind == PointKind::Defaults) return declared->value;
-  const double share = RandomFor(record.sequence) + 0.5;
+  // Every other point is far from the defaults, where other conditions hold.
+  const double random = RandomFor(record.sequence);
+  const double share = seed % 2 == 0 ? std::exp2(kWideSpread * (random - 0.5)) : random + 0.5;
   return declared->value == 0 ? share : declared->value * share;
 }
 

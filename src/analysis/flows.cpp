@@ -71,7 +71,10 @@ void Flows::Compose(AtomId first) {
     const ProductSum itself{{1, {{flow, 1}}}};
     const auto body = bodies.find(flow);
     if (body != bodies.end()) {
-      made[flow] = Replaced(body->second);
+      ProductSum parts = Replaced(body->second);
+      // One that is made of itself, too, is elementary.
+      const bool isCircle = FlowFormOf(algebra, parts).factors.contains(flow);
+      made[flow] = isCircle ? itself : std::move(parts);
       bodies.erase(body);
       open.pop_back();
     } else if (made.contains(flow)) {

@@ -17,7 +17,7 @@ namespace tessal {
 
 namespace {
 
-constexpr std::uint64_t kPoints = 8;
+constexpr std::uint64_t kPoints = 16;
 /// What is left of a sum, relative to its absolute terms, counts as nothing.
 constexpr double kTolerance = 1e-9;
 /// Auxiliaries within auxiliaries of a pool that are looked into.
