@@ -57,4 +57,8 @@ std::vector<UnitReading> ListUnits(const TemplateCore& core);
 /// expression. For a state variable, that of its equation.
 std::optional<std::string> InferredUnit(const TemplateCore& core, const CEL_Element& element);
 
+/// Whether the unit of an element's expression is another than the one that the element declares, or for a
+/// state variable another than that of its change in time. False where either is unknown.
+bool HasOtherUnit(const TemplateCore& core, const CEL_Element& element);
+
 }  // namespace tessal
