@@ -306,6 +306,15 @@ std::optional<ProductSum> Algebra::Expand(std::string_view text, const Expressio
   return Expansion(*this, text).Of(tree);
 }
 
+const std::optional<ProductSum>& Algebra::BodyOf(const SymbolRecord& record) {
+  const auto [place, isNew] = bodies.try_emplace(record.sequence);
+  if (isNew) {
+    const RecordExpression expression = ExpressionOf(record);
+    if (expression.tree != nullptr) place->second = Expand(expression.text, *expression.tree);
+  }
+  return place->second;
+}
+
 AtomId Algebra::SymbolAtom(const SymbolRecord& record) {
   const auto [place, isNew] = symbols.try_emplace(record.sequence, static_cast<AtomId>(atoms.size()));
   if (isNew) {
@@ -490,6 +499,11 @@ void Settle(ProductSum& sum) {
     first = next;
   }
   sum = std::move(settled);
+}
+
+bool HasProduct(const ProductSum& sum, const Product& likeThis) {
+  const auto place = std::lower_bound(sum.begin(), sum.end(), likeThis, ComesBefore);
+  return place != sum.end() && place->atoms == likeThis.atoms;
 }
 
 }  // namespace tessal

@@ -81,6 +81,8 @@ class Algebra final {
 
   /// The expression of a text as a sum; none, with `Failure`, when it is too large or divides by zero.
   std::optional<ProductSum> Expand(std::string_view text, const ExpressionNode& tree);
+  /// The same of a record's expression, which is expanded once; none, too, for one that does not parse.
+  const std::optional<ProductSum>& BodyOf(const SymbolRecord& record);
   /// Why the last expression or product was not made, in words.
   const std::string& Failure() const { return failure; }
 
@@ -109,8 +111,9 @@ class Algebra final {
   const SymbolIndex& index;
   Brackets brackets;
   std::vector<Atom> atoms;
-  std::unordered_map<std::uint32_t, AtomId> symbols;  ///< by the numbers of their records
-  std::unordered_map<std::string, AtomId> numbers;    ///< by keys that say what an atom is made of
+  std::unordered_map<std::uint32_t, std::optional<ProductSum>> bodies;  ///< by the numbers of their records
+  std::unordered_map<std::uint32_t, AtomId> symbols;                    ///< by the numbers of their records
+  std::unordered_map<std::string, AtomId> numbers;  ///< by keys that say what an atom is made of
   std::string failure;
 };
 
@@ -121,5 +124,7 @@ bool IsFlow(const TemplateCore& core, const SymbolRecord& record);
 /// Adds products to a sum that need not be in order; `Settle` puts it in order and unites equal ones.
 void Append(ProductSum& sum, const ProductSum& added, double factor = 1);
 void Settle(ProductSum& sum);
+/// Whether a sum in order has a product of these atoms.
+bool HasProduct(const ProductSum& sum, const Product& likeThis);
 
 }  // namespace tessal

@@ -141,10 +141,7 @@ double PointValues::ValueOfRecord(const SymbolRecord& record) {
 }
 
 double PointValues::ValueOfBody(const SymbolRecord& record) {
-  const RecordExpression expression = ExpressionOf(record);
-  if (expression.tree == nullptr)
-    return kind == PointKind::Defaults ? kNoValue : RandomFor(record.sequence) + 0.5;
-  const std::optional<ProductSum> body = algebra.Expand(expression.text, *expression.tree);
+  const std::optional<ProductSum>& body = algebra.BodyOf(record);
   return body ? ValueOf(*body) : kNoValue;
 }
 

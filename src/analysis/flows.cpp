@@ -1,5 +1,6 @@
 #include "analysis/flows.h"
 
+#include <algorithm>
 #include <utility>
 #include <vector>
 
@@ -44,22 +45,13 @@ FlowForm FlowFormOf(const Algebra& algebra, const ProductSum& sum) {
   return form;
 }
 
-std::optional<ProductSum> Flows::BodyOf(AtomId flow) {
-  const SymbolRecord& record = *algebra.At(flow).record;
-  if (isKept && isKept(record)) return std::nullopt;
-  const RecordExpression expression = ExpressionOf(record);
-  if (expression.tree == nullptr) return std::nullopt;
-  return algebra.Expand(expression.text, *expression.tree);
-}
-
 bool Flows::HasComposedBody(AtomId flow) {
-  std::optional<ProductSum> body = BodyOf(flow);
-  if (!body || body->empty()) return false;
-  for (const Product& product : *body) {
-    if (!PlaceOfFlow(algebra, product)) return false;
-  }
-  bodies[flow] = std::move(*body);
-  return true;
+  const SymbolRecord& record = *algebra.At(flow).record;
+  if (isKept && isKept(record)) return false;
+  const std::optional<ProductSum>& body = algebra.BodyOf(record);
+  return body && !body->empty() && std::all_of(body->begin(), body->end(), [this](const Product& product) {
+           return PlaceOfFlow(algebra, product).has_value();
+         });
 }
 
 /// Finds what a process is made of, after all that it is made of: a chain of processes may be as long as the
@@ -69,13 +61,11 @@ void Flows::Compose(AtomId first) {
   while (!open.empty()) {
     const AtomId flow = open.back();
     const ProductSum itself{{1, {{flow, 1}}}};
-    const auto body = bodies.find(flow);
-    if (body != bodies.end()) {
-      ProductSum parts = Replaced(body->second);
+    if (looked.erase(flow) > 0) {
+      ProductSum parts = Replaced(*algebra.BodyOf(*algebra.At(flow).record));
       // One that is made of itself, too, is elementary.
       const bool isCircle = FlowFormOf(algebra, parts).factors.contains(flow);
       made[flow] = isCircle ? itself : std::move(parts);
-      bodies.erase(body);
       open.pop_back();
     } else if (made.contains(flow)) {
       open.pop_back();
@@ -83,7 +73,8 @@ void Flows::Compose(AtomId first) {
       // Until it is known, and in a circle for good, it is elementary.
       made[flow] = itself;
       if (!HasComposedBody(flow)) continue;
-      for (const Product& product : bodies[flow]) {
+      looked.insert(flow);
+      for (const Product& product : *algebra.BodyOf(*algebra.At(flow).record)) {
         const AtomId part = product.atoms[*PlaceOfFlow(algebra, product)].atom;
         if (!made.contains(part)) open.push_back(part);
       }

@@ -6,6 +6,7 @@
 #include <map>
 #include <optional>
 #include <unordered_map>
+#include <unordered_set>
 
 #include "analysis/algebra.h"
 
@@ -34,7 +35,6 @@ class Flows final {
   ProductSum Elementary(const ProductSum& sum);
 
  private:
-  std::optional<ProductSum> BodyOf(AtomId flow);
   bool HasComposedBody(AtomId flow);
   void Compose(AtomId flow);
   ProductSum Replaced(const ProductSum& sum) const;
@@ -43,7 +43,7 @@ class Flows final {
   std::function<bool(const SymbolRecord&)> isKept;
   /// What each process that was looked at is made of; itself for an elementary one.
   std::unordered_map<AtomId, ProductSum> made;
-  std::unordered_map<AtomId, ProductSum> bodies;  ///< of composed processes, while they are looked at
+  std::unordered_set<AtomId> looked;  ///< composed processes whose parts are looked at
 };
 
 }  // namespace tessal

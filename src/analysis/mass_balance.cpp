@@ -163,10 +163,8 @@ class PoolJudging final {
   }
 
   std::optional<ProductSum> WrittenOut(const ProductSum& sum, AtomId auxiliary) {
-    const RecordExpression expression = ExpressionOf(*algebra.At(auxiliary).record);
-    if (expression.tree == nullptr) return std::nullopt;
-    const std::optional<ProductSum> body = algebra.Expand(expression.text, *expression.tree);
-    if (!body) return std::nullopt;
+    const std::optional<ProductSum>& body = algebra.BodyOf(*algebra.At(auxiliary).record);
+    if (!body) return CanNot(algebra.At(auxiliary).text + " can not be expanded");
     ProductSum written;
     for (Product product : sum) {
       const auto place = std::find_if(product.atoms.begin(), product.atoms.end(),
@@ -242,7 +240,7 @@ class PoolJudging final {
 
   struct Counts {
     std::uint64_t zero = 0;
-    std::uint64_t nonZero = 0;
+    std::uint64_t nonZero = 0;  ///< one is enough
   };
 
   Counts CountPoints(const ProductSum& sum, PointKind kind) {
@@ -252,7 +250,8 @@ class PoolJudging final {
       const double value = values.ValueOf(sum);
       const double size = values.SizeOf(sum);
       if (!std::isfinite(value) || !std::isfinite(size)) continue;
-      ++(std::abs(value) <= kTolerance * size ? counts.zero : counts.nonZero);
+      if (std::abs(value) > kTolerance * size) return {counts.zero, 1};
+      ++counts.zero;
     }
     return counts;
   }
@@ -284,9 +283,7 @@ class PoolJudging final {
     Settle(total);
     for (const auto& [flow, part] : parts) {
       const bool leaks = total.empty() || std::any_of(part.begin(), part.end(), [&total](const Product& one) {
-                           return std::any_of(total.begin(), total.end(), [&one](const Product& left) {
-                             return left.atoms == one.atoms;
-                           });
+                           return HasProduct(total, one);
                          });
       if (leaks) AddLeak(*algebra.At(flow).record, form.factors.at(flow));
     }
@@ -297,12 +294,9 @@ class PoolJudging final {
   }
 
   ProductSum WrittenOutRate(AtomId flow, const ProductSum& factor) {
-    const RecordExpression expression = ExpressionOf(*algebra.At(flow).record);
-    if (expression.tree != nullptr) {
-      const std::optional<ProductSum> body = algebra.Expand(expression.text, *expression.tree);
-      const std::optional<ProductSum> part = body ? algebra.Times(factor, *body) : std::nullopt;
-      if (part) return *part;
-    }
+    const std::optional<ProductSum>& body = algebra.BodyOf(*algebra.At(flow).record);
+    const std::optional<ProductSum> part = body ? algebra.Times(factor, *body) : std::nullopt;
+    if (part) return *part;
     return algebra.Times(factor, {{1, {{flow, 1}}}}).value_or(ProductSum());
   }
 
@@ -310,7 +304,6 @@ class PoolJudging final {
     AddLeak(&process, process.element->symbol.TextOf(), net);
   }
   void AddLeak(const SymbolRecord* process, std::string symbol, const ProductSum& net) {
-    PointValues defaults(algebra, PointKind::Defaults, 0);
     order.emplace_back(process == nullptr ? UINT32_MAX : process->sequence,
                        PoolLeak{process == nullptr ? Uid::None : process->uid, std::move(symbol),
                                 algebra.Text(net), defaults.ValueOf(net)});
@@ -321,6 +314,7 @@ class PoolJudging final {
   Flows flows;
   const Pool& pool;
   PoolBalance balance;
+  PointValues defaults{algebra, PointKind::Defaults, 0};
   std::map<std::uint32_t, bool> followers;
   std::vector<std::pair<std::uint32_t, PoolLeak>> order;  ///< leaks with the numbers of their records
 };

@@ -67,7 +67,7 @@ bool CollectPools(const TemplateCore& core, const BalanceCall& call, std::vector
     Complain(OnOneLine(call.poolsFile + ": " + read.faults.front()));
     return false;
   }
-  for (const std::string& ignored : read.notKept) {
+  for (const std::string& ignored : read.notPools) {
     if (!call.poolsFile.empty())
       Complain(OnOneLine(call.poolsFile + ": " + ignored + " is no part of a pool"));
   }

@@ -56,8 +56,10 @@ std::vector<std::string> TextsAt(KvfNode section, std::string_view keyword) {
 void ReadSection(KvfNode section, PoolsRead& read) {
   for (KvfNode each = kvfFirstSection(section); each != nullptr; each = kvfNextSection(each, section)) {
     const std::string name = kvfGetNameGlb(each);
-    if (!EqualIgnoringCase(std::string_view(name).substr(0, kPoolPrefix.size()), kPoolPrefix)) continue;
-    kvfGetNoSections(each);
+    if (!EqualIgnoringCase(std::string_view(name).substr(0, kPoolPrefix.size()), kPoolPrefix)) {
+      read.notPools.push_back("the section " + name);
+      continue;
+    }
     Pool pool{TextAt(each, kName), std::string(StripExpressionQuotes(TextAt(each, kExpression))),
               TextsAt(each, kBoundary), TextAt(each, kDescription)};
     read.pools.push_back(std::move(pool));
@@ -66,10 +68,10 @@ void ReadSection(KvfNode section, PoolsRead& read) {
 
 void NoteWhatIsNoPool(const KeyFile& file, KvfNode section, PoolsRead& read) {
   kvfForEachUnread(section, [&read](const KvfUnread& unread) {
-    read.notKept.push_back(kvfGetNameGlb(unread.node) + " in " + kvfGetNameGlb(unread.parent));
+    read.notPools.push_back(kvfGetNameGlb(unread.node) + " of " + kvfGetNameGlb(unread.parent));
   });
   kvfForEachRemark(file.Handle(), section, [&read](const KvfRemark& remark) {
-    read.notKept.push_back("the comment \"" + std::string(remark.text) + '"');
+    read.notPools.push_back("the comment \"" + std::string(remark.text) + '"');
   });
 }
 
@@ -142,8 +144,10 @@ PoolsRead ReadPools(const std::string& text) {
 }
 
 bool SetPools(TemplateCore& core, const std::vector<Pool>& pools, std::string& failure) {
-  if (const PoolsRead former = PoolsOf(core); !former.faults.empty()) {
-    failure = "The pools of the file can not be changed: " + former.faults.front();
+  const PoolsRead former = PoolsOf(core);
+  if (!former.faults.empty() || !former.notPools.empty()) {
+    failure = "The pools can not be changed here, since the file holds beside them what would be lost: " +
+              (former.faults.empty() ? former.notPools : former.faults).front();
     return false;
   }
   std::string text = TextWithoutPools(core.KeptText());

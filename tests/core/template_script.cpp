@@ -563,7 +563,7 @@ std::string PoolLines(const TemplateCore& core) {
     for (const std::string& process : pool.boundary) lines += ' ' + process;
     lines += pool.description.empty() ? "\n" : " (" + pool.description + ")\n";
   }
-  for (const std::string& part : read.notKept) lines += "not kept: " + part + '\n';
+  for (const std::string& part : read.notPools) lines += "no pool: " + part + '\n';
   return lines;
 }
 
