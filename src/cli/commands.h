@@ -64,6 +64,16 @@ struct HtmlCall {
 };
 ExitCode RunHtml(const HtmlCall& call);
 
+// Analyses.
+/// The clashes of units; or, as a list, how the unit texts were read.
+struct UnitsCall {
+  std::string file;
+  bool isStrict = false;  ///< substances are dimensions
+  bool isList = false;
+  Format format = Format::Text;
+};
+ExitCode RunUnits(const UnitsCall& call);
+
 // Key files.
 ExitCode RunTree(const std::string& file);
 ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,

@@ -40,12 +40,14 @@ struct CommandLine {
   RenameCall rename;
   FindCall find;
   HtmlCall html;
+  UnitsCall units;
   ExpressionCall expression;
   std::function<ExitCode()> run;
 };
 
 /// The parts of the tool, as its help lists them.
 constexpr const char* kTemplates = "Templates";
+constexpr const char* kAnalyses = "Analyses";
 constexpr const char* kKeyFiles = "Key files";
 constexpr const char* kExpressions = "Expressions";
 constexpr const char* kCatalogues = "Catalogues";
@@ -197,6 +199,15 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
 }
 
+void AddUnits(CLI::App& app, CommandLine& line) {
+  CLI::App* units = AddCommand(app, line, kAnalyses, "units", "finds units that do not go together",
+                               [&line] { return RunUnits(line.units); });
+  AddFile(*units, line.units.file);
+  units->add_flag("--strict", line.units.isStrict, "tells mmol N from mmol C and other substances apart");
+  units->add_flag("--list", line.units.isList, "lists how each unit text was read");
+  AddChoice(*units, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.units.format);
+}
+
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
   CLI::App* tree = AddCommand(app, line, kKeyFiles, "tree", "prints a key file as its item tree",
                               [&line] { return RunTree(line.file); });
@@ -292,10 +303,11 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 void ShowNumbers(CommandLine& line) {
-  for (std::string* text : {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output,
-                            &line.rename.file, &line.rename.oldSymbol, &line.rename.newSymbol,
-                            &line.rename.output, &line.find.file, &line.find.pattern, &line.html.file,
-                            &line.html.output, &line.expression.text, &line.expression.symbol}) {
+  for (std::string* text :
+       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
+        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.find.file,
+        &line.find.pattern, &line.html.file, &line.html.output, &line.units.file, &line.expression.text,
+        &line.expression.symbol}) {
     *text = ShownNumber(*text);
   }
   for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {
@@ -311,6 +323,7 @@ int RunTool(int count, char** arguments) {
   app.require_subcommand(1);
   CommandLine line;
   AddTemplateCommands(app, line);
+  AddUnits(app, line);
   AddKeyFileCommands(app, line);
   AddExpressionCommands(app, line);
   AddCatalogueCommands(app, line);
