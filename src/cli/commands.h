@@ -10,7 +10,7 @@
 
 namespace tessal::cli {
 
-enum class Format { Text, Json, Sarif, Markdown, Html };
+enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
