@@ -10,7 +10,7 @@
 
 namespace tessal::cli {
 
-enum class Format { Text, Json, Sarif, Markdown, Html, Csv, Latex };
+enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
@@ -80,6 +80,14 @@ struct BalanceCall {
   Format format = Format::Text;
 };
 ExitCode RunBalance(const BalanceCall& call);
+/// The clashes of units; or, as a list, how the unit texts were read.
+struct UnitsCall {
+  std::string file;
+  bool isStrict = false;  ///< substances are dimensions
+  bool isList = false;
+  Format format = Format::Text;
+};
+ExitCode RunUnits(const UnitsCall& call);
 
 // Key files.
 ExitCode RunTree(const std::string& file);
