@@ -75,9 +75,9 @@ CPoolsPage::CPoolsPage(CTessalDoc& analysedDocument, QWidget* parent)
 }
 
 CPoolsPage::~CPoolsPage() {
-  // A field that goes with the page loses the focus, and has nothing to write any more.
   isClosed = true;
-  hide();
+  // The fields go first: one that loses the focus on its way out still reports to its page.
+  qDeleteAll(findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly));
 }
 
 QWidget* CPoolsPage::MakeList() {
@@ -196,12 +196,12 @@ void CPoolsPage::ShowPools() {
   const auto levelOf = [this](const CRowModel::Row& row) {
     return static_cast<std::uint32_t>(LevelOf(balances[static_cast<std::size_t>(row.key)].verdict));
   };
-  const auto isClosed = [this](const CRowModel::Row& row) {
+  const auto isBalanced = [this](const CRowModel::Row& row) {
     return balances[static_cast<std::size_t>(row.key)].verdict == PoolVerdict::Closed;
   };
   constexpr int kVerdict = 1;
-  list->Model().ShowIcons(kVerdict, [levelOf, isClosed](const auto& row) {
-    return isClosed(row) ? QIcon() : IconOfLevel(levelOf(row));
+  list->Model().ShowIcons(kVerdict, [levelOf, isBalanced](const auto& row) {
+    return isBalanced(row) ? QIcon() : IconOfLevel(levelOf(row));
   });
   list->Fill({strings::kPoolColumn, strings::kVerdictColumn}, std::move(rows),
              [this](const CRowModel::Row& row, int column) {

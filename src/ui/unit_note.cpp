@@ -25,17 +25,17 @@ CUnitNote::CUnitNote(QWidget* parent)
 }
 
 void CUnitNote::Show(const TemplateCore& core, const CEL_Element& element) {
-  const std::optional<std::string> unit = InferredUnit(core, element);
+  const std::optional<UnitOfExpression> unit = InferredUnit(core, element);
   setVisible(unit.has_value());
   if (!unit) {
     text->clear();
     return;
   }
-  const bool isOther = HasOtherUnit(core, element);
   const int size = style()->pixelMetric(QStyle::PM_SmallIconSize);
-  icon->setVisible(isOther);
+  icon->setVisible(unit->isOther);
   icon->setPixmap(IconOfLevel(static_cast<std::uint32_t>(ErrorLevel::Warning)).pixmap(size, size));
-  text->setText((isOther ? strings::kUnitDiffers : strings::kUnitOfExpression).arg(ToScreen(*unit)));
+  text->setText(
+      (unit->isOther ? strings::kUnitDiffers : strings::kUnitOfExpression).arg(ToScreen(unit->text)));
 }
 
 QString CUnitNote::Text() const {

@@ -1,6 +1,7 @@
 #include "ui/analysis_actions.h"
 
 #include <QAbstractItemView>
+#include <QHeaderView>
 #include <QLabel>
 #include <QTabWidget>
 #include <QTableView>
@@ -47,7 +48,7 @@ std::string AnalysisText(Editor& editor) {
     lines.append(label->text() + (shown.isEmpty() ? QString() : u' ' + shown));
   }
   for (const auto* view : page.findChildren<QAbstractItemView*>()) {
-    if (view->isVisible()) AppendRows(*view, lines);
+    if (view->isVisible() && qobject_cast<const QHeaderView*>(view) == nullptr) AppendRows(*view, lines);
   }
   for (const auto* drawing : page.findChildren<CInfluenceView*>()) lines.append(drawing->DrawnText());
   return lines.join(u'\n').toStdString() + "\n";
