@@ -42,6 +42,8 @@ struct CommandLine {
   HtmlCall html;
   UnitsCall units;
   ExpressionCall expression;
+  MatrixCall matrix;
+  BalanceCall balance;
   std::function<ExitCode()> run;
 };
 
@@ -199,7 +201,30 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
 }
 
-void AddUnits(CLI::App& app, CommandLine& line) {
+void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
+  CLI::App* matrix = AddCommand(app, line, kAnalyses, "matrix", "prints the process matrix",
+                                [&line] { return RunMatrix(line.matrix); });
+  AddFile(*matrix, line.matrix.file);
+  matrix->add_option("--class", line.matrix.className, "the matrix of a particle class")->type_name("NAME");
+  matrix->add_flag("--elementary", line.matrix.isElementary,
+                   "replaces processes that are made of others by those");
+  AddChoice(*matrix, "--format", "FORMAT", Choices<Format>(kMatrixFormats), line.matrix.format);
+
+  CLI::App* balance = AddCommand(app, line, kAnalyses, "balance", "checks that pools keep their amount",
+                                 [&line] { return RunBalance(line.balance); });
+  AddFile(*balance, line.balance.file);
+  balance->add_option("--pools", line.balance.poolsFile, "takes the pools of this key file")
+      ->type_name("FILE");
+  balance->add_option("--pool", line.balance.pools, "a further pool; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=EXPR");
+  balance
+      ->add_option("--boundary", line.balance.boundaries,
+                   "processes through which a pool, or without a name all, come and go; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=P,P...");
+  AddChoice(*balance, "--format", "FORMAT", kTableFormats, line.balance.format);
+
   CLI::App* units = AddCommand(app, line, kAnalyses, "units", "finds units that do not go together",
                                [&line] { return RunUnits(line.units); });
   AddFile(*units, line.units.file);
@@ -303,14 +328,30 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 void ShowNumbers(CommandLine& line) {
-  for (std::string* text :
-       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
-        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.find.file,
-        &line.find.pattern, &line.html.file, &line.html.output, &line.units.file, &line.expression.text,
-        &line.expression.symbol}) {
+  for (std::string* text : {&line.file,
+                            &line.otherFile,
+                            &line.name,
+                            &line.save.file,
+                            &line.save.output,
+                            &line.rename.file,
+                            &line.rename.oldSymbol,
+                            &line.rename.newSymbol,
+                            &line.rename.output,
+                            &line.find.file,
+                            &line.find.pattern,
+                            &line.html.file,
+                            &line.html.output,
+                            &line.expression.text,
+                            &line.expression.symbol,
+                            &line.matrix.file,
+                            &line.matrix.className,
+                            &line.balance.file,
+                            &line.balance.poolsFile,
+                            &line.units.file}) {
     *text = ShownNumber(*text);
   }
-  for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {
+  for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored,
+                                          &line.balance.pools, &line.balance.boundaries}) {
     for (std::string& text : *texts) text = ShownNumber(text);
   }
 }
@@ -323,7 +364,7 @@ int RunTool(int count, char** arguments) {
   app.require_subcommand(1);
   CommandLine line;
   AddTemplateCommands(app, line);
-  AddUnits(app, line);
+  AddAnalysisCommands(app, line);
   AddKeyFileCommands(app, line);
   AddExpressionCommands(app, line);
   AddCatalogueCommands(app, line);
