@@ -3,7 +3,7 @@
 
 #include "cli/commands.h"
 #include "cli/explanation.h"
-#include "cli/sarif.h"
+#include "cli/finding_report.h"
 #include "cli/template_files.h"
 #include "cli/template_messages.h"
 
@@ -83,7 +83,9 @@ ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowe
     for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
     PrintLine(Json{{"files", list}}.dump());
   } else {
-    PrintSarif(all);
+    std::vector<FileReport> reports;
+    for (TemplateMessages& messages : all) reports.push_back(ReportOf(std::move(messages)));
+    PrintReport(format, reports, AllMessages());
   }
   return exitCode;
 }

@@ -20,10 +20,14 @@ struct Choice {
 template <class Value>
 using Choices = std::span<const Choice<Value>>;
 
-inline constexpr std::array<Choice<Format>, 3> kCheckFormats = {{
+inline constexpr std::array<Choice<Format>, 7> kCheckFormats = {{
     {"text", Format::Text},
     {"json", Format::Json},
     {"sarif", Format::Sarif},
+    {"github", Format::Github},
+    {"gitlab", Format::Gitlab},
+    {"junit", Format::Junit},
+    {"gcc", Format::Gcc},
 }};
 /// What a table is printed in.
 inline constexpr Choices<Format> kTableFormats = Choices<Format>(kCheckFormats).first<2>();

@@ -10,7 +10,7 @@
 
 namespace tessal::cli {
 
-enum class Format { Text, Json, Sarif, Markdown, Html, Csv, Latex };
+enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);

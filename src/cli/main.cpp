@@ -201,7 +201,18 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
 }
 
+void AddUnits(CLI::App& app, CommandLine& line) {
+  CLI::App* units = AddCommand(app, line, kAnalyses, "units", "finds units that do not go together",
+                               [&line] { return RunUnits(line.units); });
+  AddFile(*units, line.units.file);
+  units->add_flag("--strict", line.units.isStrict, "tells mmol N from mmol C and other substances apart");
+  units->add_flag("--list", line.units.isList, "lists how each unit text was read");
+  AddChoice(*units, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.units.format);
+}
+
 void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
+  AddUnits(app, line);
+
   CLI::App* matrix = AddCommand(app, line, kAnalyses, "matrix", "prints the process matrix",
                                 [&line] { return RunMatrix(line.matrix); });
   AddFile(*matrix, line.matrix.file);
@@ -224,13 +235,6 @@ void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
       ->allow_extra_args(false)
       ->type_name("NAME=P,P...");
   AddChoice(*balance, "--format", "FORMAT", kTableFormats, line.balance.format);
-
-  CLI::App* units = AddCommand(app, line, kAnalyses, "units", "finds units that do not go together",
-                               [&line] { return RunUnits(line.units); });
-  AddFile(*units, line.units.file);
-  units->add_flag("--strict", line.units.isStrict, "tells mmol N from mmol C and other substances apart");
-  units->add_flag("--list", line.units.isList, "lists how each unit text was read");
-  AddChoice(*units, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.units.format);
 }
 
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
@@ -341,13 +345,13 @@ void ShowNumbers(CommandLine& line) {
                             &line.find.pattern,
                             &line.html.file,
                             &line.html.output,
+                            &line.units.file,
                             &line.expression.text,
                             &line.expression.symbol,
                             &line.matrix.file,
                             &line.matrix.className,
                             &line.balance.file,
-                            &line.balance.poolsFile,
-                            &line.units.file}) {
+                            &line.balance.poolsFile}) {
     *text = ShownNumber(*text);
   }
   for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored,

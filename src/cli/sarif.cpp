@@ -2,11 +2,13 @@
 
 #include <algorithm>
 #include <array>
+#include <map>
 #include <nlohmann/json.hpp>
 #include <string_view>
 
 #include "cli/explanation.h"
 #include "cli/output.h"
+#include "cli/report_formats.h"
 
 namespace tessal::cli {
 
@@ -50,20 +52,22 @@ std::string UriOf(const std::string& path) {
   return uri;
 }
 
-Json ResultOf(std::string_view code, std::uint32_t level, const std::string& path, int line,
-              const std::string& text) {
-  const Json location = {
-      {"physicalLocation",
-       {{"artifactLocation", {{"uri", UriOf(path)}}}, {"region", {{"startLine", std::max(line, 1)}}}}}};
-  return {{"ruleId", code},
-          {"level", LevelOf(level)},
-          {"message", {{"text", JsonText(text)}}},
-          {"locations", Json::array({location})}};
+Json RegionOf(const FilePlace& place) {
+  Json region = {{"startLine", std::max(place.line, 1)}};
+  if (place.column > 0) region["startColumn"] = place.column;
+  if (place.endColumn > 0) region["endColumn"] = place.endColumn;
+  return region;
 }
 
-/// What a text begins with: the symbol that it is about.
-std::string Named(const std::string& symbol) {
-  return (symbol.empty() ? "generic" : symbol) + ": ";
+Json ResultOf(const ReportedFinding& finding, const std::string& path, const std::string& fingerprint) {
+  const Json location = {
+      {"physicalLocation",
+       {{"artifactLocation", {{"uri", UriOf(path)}}}, {"region", RegionOf(finding.place)}}}};
+  return {{"ruleId", finding.code},
+          {"level", LevelOf(finding.level)},
+          {"message", {{"text", JsonText(Named(finding))}}},
+          {"locations", Json::array({location})},
+          {"partialFingerprints", {{"primaryLocationLineHash", fingerprint}}}};
 }
 
 constexpr int kIndent = 2;
@@ -71,21 +75,12 @@ constexpr int kIndent = 2;
 /// Prints the results one after the other as the elements of a list whose brackets are there.
 class ResultPrinter final {
  public:
-  void PrintResults(const TemplateMessages& file) {
-    for (const TemplateMessage& message : file.errors) {
-      PrintResult(ResultOf(message.code, message.level, file.path, message.line,
-                           Named(message.symbol) + message.text));
-    }
-    for (const UndefinedName& undefined : file.undefined) {
-      const Finding finding("undefined-symbol", {undefined.symbol});
-      for (const UndefinedName::User& user : undefined.usedBy) {
-        PrintResult(ResultOf(finding.message->code, static_cast<std::uint32_t>(finding.message->level),
-                             file.path, user.line, Named(user.symbol) + finding.text));
-      }
-    }
-    for (const AccountEntry& entry : file.account) {
-      PrintResult(ResultOf(entry.code, static_cast<std::uint32_t>(ErrorLevel::Notice), file.path, entry.line,
-                           Named(entry.symbol) + entry.text));
+  void PrintResults(const FileReport& file) {
+    std::map<std::string, std::size_t> met;
+    for (const ReportedFinding& finding : file.findings) {
+      // Lines move when a file is edited; a finding is the same as long as its code and its symbol are.
+      const std::string identity = FingerprintOf(std::string(finding.code) + '\0' + finding.symbol);
+      PrintResult(ResultOf(finding, file.path, identity + ":" + std::to_string(++met[identity])));
     }
   }
 
@@ -117,11 +112,12 @@ class ResultPrinter final {
 
 }  // namespace
 
-void PrintSarif(const std::vector<TemplateMessages>& files) {
-  Json rules = Json::array();
-  for (const MessageRow& row : AllMessages()) rules.push_back(RuleOf(row));
-  const Json driver = {{"name", "tessal"}, {"version", TESSAL_VERSION}, {"rules", rules}};
-  const Json run = {{"tool", {{"driver", driver}}}, {"results", Json::array()}};
+void PrintSarif(std::span<const FileReport> files, std::span<const MessageRow> rules) {
+  Json listed = Json::array();
+  for (const MessageRow& row : rules) listed.push_back(RuleOf(row));
+  const Json driver = {{"name", "tessal"}, {"version", TESSAL_VERSION}, {"rules", listed}};
+  const Json run = {
+      {"tool", {{"driver", driver}}}, {"columnKind", "unicodeCodePoints"}, {"results", Json::array()}};
   const Json log = {{"$schema", "https://json.schemastore.org/sarif-2.1.0.json"},
                     {"version", "2.1.0"},
                     {"runs", Json::array({run})}};
@@ -130,7 +126,7 @@ void PrintSarif(const std::vector<TemplateMessages>& files) {
   const std::size_t place = text.rfind(kNoResults) + kNoResults.size() - 1;
   Print(std::string_view(text).substr(0, place));
   ResultPrinter printer;
-  for (const TemplateMessages& file : files) printer.PrintResults(file);
+  for (const FileReport& file : files) printer.PrintResults(file);
   printer.End();
   PrintLine(std::string_view(text).substr(place));
 }

@@ -2,13 +2,14 @@
 // and continuous integration show beside the file.
 #pragma once
 
-#include <vector>
+#include <span>
 
-#include "cli/template_messages.h"
+#include "cli/finding_report.h"
 
 namespace tessal::cli {
 
-/// Prints one log over all files, result by result: it may be much longer than the messages.
-void PrintSarif(const std::vector<TemplateMessages>& files);
+/// Prints one log over all files, result by result: it may be much longer than the messages. The rules are
+/// the rows that the codes of the findings may be of.
+void PrintSarif(std::span<const FileReport> files, std::span<const MessageRow> rules);
 
 }  // namespace tessal::cli

@@ -130,8 +130,8 @@ TEST(Json, IsValidWhateverTheBytes) {
     text.insert(text.find(place), bytes);
   }
   session.Write("odd \xE9 name.tessal", text);
-  for (const std::string command : {"check --format json", "check --format sarif", "symbols --format json",
-                                    "find [^a]+ --regex --format json"}) {
+  for (const std::string command : {"check --format json", "check --format sarif", "check --format gitlab",
+                                    "symbols --format json", "find [^a]+ --regex --format json"}) {
     const std::size_t verb = command.find(' ');
     const ShellRun run =
         session.Run("tessal " + command.substr(0, verb) + " *.tessal" + command.substr(verb));
