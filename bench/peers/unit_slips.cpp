@@ -36,6 +36,11 @@ std::vector<std::pair<std::size_t, std::size_t>> UnitPlaces(const std::string& t
   return places;
 }
 
+/// The text with another unit in a place.
+UnitSlip WithUnit(const std::string& text, std::size_t start, std::size_t length, const std::string& unit) {
+  return {text.substr(start, length).append(" -> ").append(unit), Replaced(text, start, length, unit)};
+}
+
 /// A word of a unit and one for the same quantity in another size.
 constexpr std::pair<std::string_view, std::string_view> kOtherSizes[] = {
     {"/d", "/s"},   {"1/d", "1/s"}, {"mg/l", "kg/l"},  {"g/m2", "kg/m2"},     {"mmol", "mol"},
@@ -92,7 +97,7 @@ std::vector<UnitSlip> UnitsOfOtherDimensions(const std::string& text) {
     const auto read = ReadUnitText(unit);
     if (!read) continue;
     const std::string other = HaveSameDimension(*read, *ReadUnitText("m")) ? "kg" : "m";
-    slips.push_back({unit + " -> " + other, Replaced(text, start, length, other)});
+    slips.push_back(WithUnit(text, start, length, other));
   }
   return slips;
 }
@@ -108,7 +113,7 @@ std::vector<UnitSlip> UnitsOfOtherSizes(const std::string& text) {
       const auto changedRead = ReadUnitText(changed);
       if (!changedRead || !HaveSameDimension(*read, *changedRead) || HaveSameFactor(*read, *changedRead))
         continue;
-      slips.push_back({unit + " -> " + changed, Replaced(text, start, length, changed)});
+      slips.push_back(WithUnit(text, start, length, changed));
       break;
     }
   }
