@@ -1,132 +1,192 @@
-// Unit texts as the project reads them beside what UDUNITS alone makes of the same text, for the units of the
-// examples, the catalogues and the cases of the tests: how many agree, and where they do not. Each reading is
-// in base units.
-#include <udunits2.h>
+// The check of units beside that of libSBML, on the same templates: how many slips in units each of the two
+// finds. With `--list`, the slips that only one of them finds.
+#include <sbml/SBMLTypes.h>
 
 #include <algorithm>
-#include <cmath>
-#include <filesystem>
+#include <cstdint>
 #include <fstream>
 #include <iostream>
+#include <iterator>
+#include <map>
 #include <memory>
-#include <optional>
+#include <set>
+#include <stdexcept>
 #include <string>
+#include <string_view>
+#include <utility>
 #include <vector>
 
 #include "analysis/unit_check.h"
-#include "analysis/unit_spelling.h"
-#include "analysis/unit_text.h"
 #include "core/template_core.h"
-#include "elements/choices.h"
-#include "expr/builtin_catalogue.h"
+#include "process_cost.h"
+#include "scratch_folder.h"
+#include "template_sbml.h"
 #include "text_table.h"
+#include "unit_slips.h"
 
 namespace {
 
 using namespace tessal;
+using namespace tessal::bench;
 
-struct FreeSystem {
-  void operator()(ut_system* system) const { ut_free_system(system); }
-};
-struct FreeUnit {
-  void operator()(ut_unit* unit) const { ut_free(unit); }
-};
-using System = std::unique_ptr<ut_system, FreeSystem>;
-using PeerUnit = std::unique_ptr<ut_unit, FreeUnit>;
+constexpr const char* kExamples[] = {"streeter_phelps", "fasham", "eutrophication", "asm1",
+                                     "lake_management"};
 
-/// Every text once.
-class Texts final {
- public:
-  void Add(const std::string& text) {
-    if (std::find(texts.begin(), texts.end(), text) == texts.end()) texts.push_back(text);
+/// What is wrong with which elements: the number of a record, and a code.
+using Findings = std::multiset<std::pair<std::uint32_t, std::string>>;
+
+struct Verdicts {
+  Findings ours;
+  Findings theirs;
+  std::size_t rules = 0;
+  std::vector<std::string> leftOut;
+};
+
+/// What libSBML says of rules whose units are not all declared is no finding.
+bool IsFinding(const SBMLError& error) {
+  return error.getCategory() == LIBSBML_CAT_UNITS_CONSISTENCY && error.getErrorId() != UndeclaredUnits &&
+         error.getErrorId() != UndeclaredTimeUnitsL3 && error.getErrorId() != UndeclaredExtentUnitsL3 &&
+         error.getErrorId() != UndeclaredObjectUnitsL3;
+}
+
+/// The numbers of the records by the lines at which their rules begin.
+std::map<unsigned, std::uint32_t> LinesOfRules(const Model& model, const TemplateSbml& sbml) {
+  std::map<unsigned, std::uint32_t> lines;
+  for (unsigned place = 0; place < model.getNumRules(); ++place) {
+    const Rule& rule = *model.getRule(place);
+    lines[rule.getLine()] = sbml.sequences.at(rule.getVariable());
   }
-  const std::vector<std::string>& All() const { return texts; }
+  return lines;
+}
+
+Findings TheirFindings(const TemplateSbml& sbml) {
+  const std::unique_ptr<SBMLDocument> document(readSBMLFromString(sbml.text.c_str()));
+  if (document->getNumErrors() > 0) {
+    document->printErrors(std::cerr);
+    throw std::runtime_error("libSBML does not read the template");
+  }
+  for (unsigned category = LIBSBML_CAT_GENERAL_CONSISTENCY; category <= LIBSBML_CAT_MODELING_PRACTICE;
+       ++category) {
+    document->setConsistencyChecks(static_cast<SBMLErrorCategory_t>(category),
+                                   category == LIBSBML_CAT_UNITS_CONSISTENCY);
+  }
+  document->checkConsistency();
+  const std::map<unsigned, std::uint32_t> elements = LinesOfRules(*document->getModel(), sbml);
+  Findings findings;
+  for (unsigned place = 0; place < document->getNumErrors(); ++place) {
+    const SBMLError& error = *document->getError(place);
+    if (!IsFinding(error)) continue;
+    // The rule that the line is in.
+    auto rule = elements.upper_bound(error.getLine());
+    if (rule != elements.begin()) --rule;
+    findings.emplace(rule->second, std::to_string(error.getErrorId()));
+  }
+  return findings;
+}
+
+Findings OurFindings(const TemplateCore& core) {
+  Findings findings;
+  for (const UnitFinding& each : CheckUnits(core, Substances::Ignored).findings) {
+    const SymbolRecord* record = core.FindRecordByUid(each.finding.element);
+    // Those of particle classes have no counterpart.
+    if (record != nullptr && record->specieIndex < 0) {
+      findings.emplace(record->sequence, each.finding.message->code);
+    }
+  }
+  return findings;
+}
+
+Verdicts Judge(const std::string& path) {
+  TemplateCore core;
+  if (!core.LoadWrapper(path)) throw std::runtime_error("a slip can not be loaded from " + path);
+  const TemplateSbml sbml = ToSbml(core);
+  return {OurFindings(core), TheirFindings(sbml), sbml.sequences.size(), sbml.leftOut};
+}
+
+std::string FileText(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  if (!file) throw std::runtime_error("can not read " + path);
+  return {std::istreambuf_iterator<char>(file), {}};
+}
+
+bool HasNew(const Findings& findings, const Findings& before) {
+  return !std::includes(before.begin(), before.end(), findings.begin(), findings.end());
+}
+
+struct Counts {
+  std::size_t slips = 0;
+  std::size_t ours = 0;
+  std::size_t theirs = 0;
+  std::size_t both = 0;
+};
+
+void PrintCounts(const TextTable& table, const std::string& what, const Counts& counts) {
+  table.PrintRow({what, std::to_string(counts.slips), std::to_string(counts.ours),
+                  std::to_string(counts.theirs), std::to_string(counts.both),
+                  std::to_string(counts.ours - counts.both), std::to_string(counts.theirs - counts.both)});
+}
+
+class Comparison final {
+ public:
+  explicit Comparison(bool listsAll)
+      : isListing(listsAll),
+        table(44, {"", "slips", "ours", "libSBML", "both", "only ours", "only libSBML"}) {}
+
+  void Compare(const std::string& name) {
+    const std::string path = std::string(TESSAL_EXAMPLES) + "/" + name + ".tessal";
+    const std::string text = FileText(path);
+    const Verdicts before = Judge(path);
+    notes.push_back(name + ": " + std::to_string(before.rules) + " expressions, " +
+                    std::to_string(before.leftOut.size()) + " left out; findings without a slip: ours " +
+                    std::to_string(before.ours.size()) + ", libSBML " + std::to_string(before.theirs.size()));
+    Count(name + ", unit of another dimension", UnitsOfOtherDimensions(text), before);
+    Count(name + ", unit of another size", UnitsOfOtherSizes(text), before);
+    Count(name + ", factor left out", FactorsLeftOut(path, text), before);
+  }
+
+  void PrintRest() const {
+    PrintCounts(table, "all", all);
+    std::cout << "\n";
+    for (const std::string& note : notes) std::cout << note << "\n";
+  }
 
  private:
-  std::vector<std::string> texts;
-};
-
-void AddExamples(Texts& texts) {
-  for (const auto& file : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/examples")) {
-    if (file.path().extension() != ".tessal") continue;
-    TemplateCore core;
-    core.LoadWrapper(file.path().string());
-    for (const UnitReading& reading : ListUnits(core)) texts.Add(reading.text);
+  std::string Written(const std::string& text) const {
+    std::ofstream(scratch.File("slip.tessal"), std::ios::binary) << text;
+    return scratch.File("slip.tessal");
   }
-}
 
-void AddCatalogues(Texts& texts) {
-  for (const CatalogueBuiltin& row : Builtins()) texts.Add(std::string(row.unit));
-  for (const UnitTypes* types :
-       {&kPlainUnitTypes, &kInputUnitTypes, &kStateVariableUnitTypes, &kParticleUnitTypes}) {
-    for (const UnitTypeRow& row : types->rows) texts.Add(std::string(row.unit));
-  }
-}
-
-/// The inputs of the file of cases; those with escaped bytes are left out.
-void AddCases(Texts& texts) {
-  std::ifstream file(TESSAL_SOURCE_DIR "/tests/analysis/cases/unit_texts.txt");
-  bool isInput = false;
-  for (std::string line; std::getline(file, line);) {
-    if (line.starts_with("==")) isInput = true;
-    if (line.starts_with(">")) isInput = false;
-    if (isInput && !line.empty() && !line.starts_with("==") && line.find('\\') == std::string::npos)
-      texts.Add(line);
-  }
-}
-
-std::string PeerText(const ut_unit* unit) {
-  if (unit == nullptr) return "not read";
-  constexpr std::size_t kLongest = 200;
-  std::string text(kLongest, '\0');
-  const int size = ut_format(unit, text.data(), text.size(), UT_ASCII | UT_DEFINITION);
-  text.resize(size < 0 ? 0 : static_cast<std::size_t>(size));
-  return text.empty() ? "1" : text;
-}
-
-/// Whether the peer reads the text as what we have read it as: ours goes to it in base units.
-bool Agrees(const System& system, const PeerUnit& peer, const std::optional<Unit>& ours) {
-  if (!ours || peer == nullptr) return !ours && peer == nullptr;
-  const PeerUnit written(ut_parse(system.get(), InBaseUnits(*ours).c_str(), UT_ASCII));
-  if (written == nullptr || ut_are_convertible(peer.get(), written.get()) == 0) return false;
-  cv_converter* converter = ut_get_converter(peer.get(), written.get());
-  // The zero of a temperature scale does not count.
-  const double factor = cv_convert_double(converter, 1) - cv_convert_double(converter, 0);
-  cv_free(converter);
-  constexpr double kTolerance = 1e-4;
-  return std::abs(factor - 1) < kTolerance;
-}
-
-int Run() {
-  ut_set_error_message_handler(ut_ignore);
-  const System system(ut_read_xml(nullptr));
-  if (system == nullptr) {
-    std::cerr << "peer_units: UDUNITS has no database\n";
-    return 1;
-  }
-  Texts texts;
-  AddExamples(texts);
-  AddCatalogues(texts);
-  AddCases(texts);
-  std::size_t agreed = 0;
-  constexpr std::size_t kTextWidth = 24;
-  const bench::TextTable table(kTextWidth, {"               ours", "            UDUNITS", "substance"});
-  for (const std::string& text : texts.All()) {
-    const PeerUnit peer(ut_parse(system.get(), text.c_str(), UT_UTF8));
-    const std::optional<Unit> ours = ReadUnitText(text);
-    if (Agrees(system, peer, ours)) {
-      ++agreed;
-      continue;
+  void Count(const std::string& what, const std::vector<UnitSlip>& slips, const Verdicts& before) {
+    Counts counts;
+    for (const UnitSlip& slip : slips) {
+      const Verdicts after = Judge(Written(slip.text));
+      const bool ours = HasNew(after.ours, before.ours);
+      const bool theirs = HasNew(after.theirs, before.theirs);
+      for (Counts* sum : {&counts, &all}) {
+        ++sum->slips;
+        sum->ours += ours ? 1 : 0;
+        sum->theirs += theirs ? 1 : 0;
+        sum->both += ours && theirs ? 1 : 0;
+      }
+      if (isListing && ours != theirs)
+        notes.push_back(what + ", " + slip.what + (ours ? ": only ours" : ": only libSBML"));
     }
-    table.PrintRow({text, ours ? InBaseUnits(*ours) : "not read", PeerText(peer.get()),
-                    ours ? SubstanceText(*ours) : ""});
+    PrintCounts(table, what, counts);
   }
-  std::cout << agreed << " of " << texts.All().size() << " texts are read alike\n";
-  return 0;
-}
+
+  bool isListing;
+  TextTable table;
+  ScratchFolder scratch;
+  Counts all;
+  std::vector<std::string> notes;
+};
 
 }  // namespace
 
-int main() {
-  return Run();
+int main(int count, char** arguments) {
+  return RunMain("peer_units", [&] {
+    Comparison comparison(count > 1 && std::string_view(arguments[1]) == "--list");
+    for (const char* name : kExamples) comparison.Compare(name);
+    comparison.PrintRest();
+  });
 }
