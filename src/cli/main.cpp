@@ -40,12 +40,15 @@ struct CommandLine {
   RenameCall rename;
   FindCall find;
   HtmlCall html;
+  LintCall lint;
+  GraphCall graph;
   ExpressionCall expression;
   std::function<ExitCode()> run;
 };
 
 /// The parts of the tool, as its help lists them.
 constexpr const char* kTemplates = "Templates";
+constexpr const char* kAnalyses = "Analyses";
 constexpr const char* kKeyFiles = "Key files";
 constexpr const char* kExpressions = "Expressions";
 constexpr const char* kCatalogues = "Catalogues";
@@ -121,7 +124,8 @@ void AddExplain(CLI::App& app, CommandLine& line) {
 void AddCheck(CLI::App& app, CommandLine& line) {
   CLI::App* check = AddCommand(app, line, kTemplates, "check", "lists the messages of templates",
                                [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
-  check->add_option("FILE", line.files, "template files")->required();
+  check->add_option("PATH", line.files, "template files, folders of them, or - for standard input")
+      ->required();
   AddFormat(*check, line, kCheckFormats);
   check
       ->add_option_function<std::string>(
@@ -195,6 +199,62 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--safe", line.html.isSafe, "writes texts so that no markup in them takes effect");
   AddOutput(*html, line.html.output, "the page to write; without it HTML_doc beside the template takes it");
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
+}
+
+/// A list of codes, with commas between them or in several options.
+CLI::Option* AddCodes(CLI::App& command, const char* name, std::vector<std::string>& codes,
+                      const char* description) {
+  return command.add_option(name, codes, description)
+      ->delimiter(',')
+      ->allow_extra_args(false)
+      ->type_name("CODES");
+}
+
+void AddLint(CLI::App& app, CommandLine& line) {
+  CLI::App* lint = AddCommand(app, line, kAnalyses, "lint", "lists likely slips in templates",
+                              [&line] { return RunLint(line.lint); });
+  lint->add_option("PATH", line.lint.paths, "template files, folders of them, or - for standard input")
+      ->required();
+  AddCodes(*lint, "--select", line.lint.select, "looks for these alone");
+  AddCodes(*lint, "--ignore", line.lint.ignore, "does not look for these");
+  CLI::Option* baseline =
+      lint->add_option("--baseline", line.lint.baseline, "leaves out the findings of that file");
+  baseline->type_name("FILE");
+  lint->add_option("--write-baseline", line.lint.newBaseline, "writes all findings to that file instead")
+      ->type_name("FILE")
+      ->excludes(baseline);
+  lint->add_flag("--exit-zero", line.lint.exitZero, "ends with 0 in spite of findings");
+  AddChoice(*lint, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.lint.format);
+}
+
+void AddGraph(CLI::App& app, CommandLine& line) {
+  CLI::App* graph = AddCommand(app, line, kAnalyses, "graph", "prints who depends on whom",
+                               [&line] { return RunGraph(line.graph); });
+  AddFile(*graph, line.graph.file);
+  CLI::Option* focus =
+      graph->add_option("--focus", line.graph.focus, "shows what lies around it")->type_name("SYMBOL");
+  const auto readDepth = [&line](const std::string& hidden) {
+    const std::string text = ShownNumber(hidden);
+    std::size_t depth = 0;
+    const auto read = std::from_chars(text.data(), text.data() + text.size(), depth);
+    if (read.ec != std::errc() || read.ptr != text.data() + text.size()) {
+      throw CLI::ValidationError("--depth", "'" + text + "' is no number of steps");
+    }
+    line.graph.depth = depth;
+  };
+  graph->add_option_function<std::string>("--depth", readDepth, "goes so many steps from the focus")
+      ->type_name("N")
+      ->needs(focus);
+  AddChoice(*graph, "--direction", "DIRECTION", Choices<GraphDirection>(kGraphDirections),
+            line.graph.direction)
+      ->needs(focus);
+  AddCodes(*graph, "--kinds", line.graph.kinds, "shows elements of these kinds, or all")->type_name("KINDS");
+  AddChoice(*graph, "--format", "FORMAT", Choices<GraphFormat>(kGraphFormats), line.graph.format);
+}
+
+void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
+  AddLint(app, line);
+  AddGraph(app, line);
 }
 
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
@@ -292,13 +352,16 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 void ShowNumbers(CommandLine& line) {
-  for (std::string* text : {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output,
-                            &line.rename.file, &line.rename.oldSymbol, &line.rename.newSymbol,
-                            &line.rename.output, &line.find.file, &line.find.pattern, &line.html.file,
-                            &line.html.output, &line.expression.text, &line.expression.symbol}) {
+  for (std::string* text :
+       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
+        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.find.file,
+        &line.find.pattern, &line.html.file, &line.html.output, &line.lint.baseline, &line.lint.newBaseline,
+        &line.graph.file, &line.graph.focus, &line.expression.text, &line.expression.symbol}) {
     *text = ShownNumber(*text);
   }
-  for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored}) {
+  for (std::vector<std::string>* texts :
+       {&line.files, &line.values, &line.settings, &line.ignored, &line.lint.paths, &line.lint.select,
+        &line.lint.ignore, &line.graph.kinds}) {
     for (std::string& text : *texts) text = ShownNumber(text);
   }
 }
@@ -311,6 +374,7 @@ int RunTool(int count, char** arguments) {
   app.require_subcommand(1);
   CommandLine line;
   AddTemplateCommands(app, line);
+  AddAnalysisCommands(app, line);
   AddKeyFileCommands(app, line);
   AddExpressionCommands(app, line);
   AddCatalogueCommands(app, line);
