@@ -7,6 +7,7 @@
 
 #include "analysis/mass_balance.h"
 #include "analysis/process_matrix.h"
+#include "analysis/unit_check.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "generated_template.h"
@@ -50,10 +51,15 @@ void Balance(benchmark::State& state) {
   });
 }
 
+void Units(benchmark::State& state) {
+  Run(state, [](const TemplateCore& core) { return CheckUnits(core, Substances::Ignored).findings.size(); });
+}
+
 // clang-format off
 BENCHMARK(Matrix)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 BENCHMARK(ElementaryMatrix)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 BENCHMARK(Balance)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
+BENCHMARK(Units)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 // clang-format on
 
 }  // namespace

@@ -21,10 +21,10 @@ enum class GraphDirection : std::uint8_t {
 };
 
 struct GraphQuery {
-  Uid focus = Uid::None;             ///< none for the whole template
-  std::optional<std::size_t> depth;  ///< steps from the focus; none for all
+  Uid focus = Uid::None;               ///< none for the whole template
+  std::optional<std::size_t> depth{};  ///< steps from the focus; none for all
   GraphDirection direction = GraphDirection::Both;
-  std::vector<ElementKind> kinds;  ///< the focus is shown in any case
+  std::vector<ElementKind> kinds{};  ///< the focus is shown in any case
 };
 
 struct GraphNode {
@@ -48,6 +48,9 @@ struct GraphEdge {
 struct DependencyGraph {
   std::vector<GraphNode> nodes;  ///< in the order of the template
   std::vector<GraphEdge> edges;  ///< by source, then target
+  /// False where so much is bridged that edges are left out: uses through elements that are not shown could
+  /// be as many as the square of the template.
+  bool isComplete = true;
 };
 
 /// State variables and processes, of the template and of particle classes: what is shown when nothing is

@@ -49,11 +49,10 @@ Database ReadDatabase() {
   Database database;
   database.system.reset(ut_read_xml(nullptr));
   if (database.system) return database;
-  const ut_status status = ut_get_status();
-  if (status == UT_OS) throw std::bad_alloc();
-  const char* path = ut_get_path_xml(nullptr, nullptr);
-  database.failure =
-      "the unit database " + std::string(path == nullptr ? "of UDUNITS" : path) + " can not be read";
+  if (ut_get_status() == UT_OS) throw std::bad_alloc();
+  ut_status status = UT_SUCCESS;
+  const char* path = ut_get_path_xml(nullptr, &status);
+  database.failure = "the unit database '" + std::string(path == nullptr ? "" : path) + "' can not be read";
   return database;
 }
 

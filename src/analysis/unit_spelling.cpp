@@ -41,8 +41,11 @@ constexpr DerivedUnit kDerived[] = {
 /// Units without a dimension that have names.
 constexpr UsedUnit kRatios[] = {{"-", 1}, {"percent", 1e-2}, {"degree", 0.017453292519943295}};
 
+/// "m2", "m^0.5"; nothing for the first power.
 std::string PowerText(double power) {
-  return IsNear(power, 1) ? std::string() : SixDigitNumberText(power);
+  if (IsNear(power, 1)) return {};
+  const bool isWhole = IsNear(power, std::round(power));
+  return (isWhole ? "" : "^") + SixDigitNumberText(isWhole ? std::round(power) : power);
 }
 
 /// Factors with powers, as one text.
@@ -184,7 +187,12 @@ std::string InBaseUnits(const Unit& unit) {
 std::string SubstanceText(const Unit& unit) {
   if (unit.substances.empty()) return {};
   ProductText text;
-  for (const SubstancePower& entry : unit.substances) text.Add(entry.substance, entry.power);
+  for (const SubstancePower& entry : unit.substances) {
+    // "N^2", as "N2" is a substance.
+    const double size = std::abs(entry.power);
+    const std::string power = IsNear(size, 1) ? "" : "^" + SixDigitNumberText(size);
+    text.Add(std::string(entry.substance) + power, entry.power > 0 ? 1 : -1);
+  }
   return text.Text();
 }
 

@@ -7,7 +7,7 @@
 
 namespace tessal {
 
-/// In base units, so that UDUNITS reads the same from it: "0.001 m-3 kg", "1".
+/// In base units, as UDUNITS reads it, with six digits: "0.001 m-3 kg", "1".
 std::string InBaseUnits(const Unit& unit);
 
 /// The substances with their powers, "N", "N/C"; empty without any.

@@ -194,7 +194,10 @@ class UnitProduct final {
     }
     if (!open.empty() || !hasFactor || isAfterSign) return std::nullopt;
     CloseAmount();
-    return std::isfinite(product.logFactor) ? std::optional<Unit>(product) : std::nullopt;
+    // No quantity has a factor that a number can not hold.
+    constexpr double kLargestLogFactor = 700;
+    if (std::abs(product.logFactor) > kLargestLogFactor) return std::nullopt;
+    return product;
   }
 
  private:

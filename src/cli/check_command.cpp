@@ -6,6 +6,7 @@
 #include "cli/finding_report.h"
 #include "cli/template_files.h"
 #include "cli/template_messages.h"
+#include "cli/template_paths.h"
 
 namespace tessal::cli {
 
@@ -61,10 +62,12 @@ Json ToJson(const TemplateMessages& messages) {
 
 }  // namespace
 
-ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel) {
+ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel) {
+  const std::optional<std::vector<std::string>> files = FilesOf(paths);
+  if (!files) return kCallFault;
   ExitCode exitCode = kFine;
   std::vector<TemplateMessages> all;
-  for (const std::string& file : files) {
+  for (const std::string& file : *files) {
     TemplateMessages messages = CollectMessages(file, lowestLevel);
     // The other files may be smaller.
     if (RanOutOfMemory()) ComplainOfMemory();

@@ -63,6 +63,20 @@ inline constexpr std::array<Choice<Format>, 4> kMatrixFormats = {{
     {"latex", Format::Latex},
 }};
 
+/// What a graph is printed in, and where it goes from its focus.
+inline constexpr std::array<Choice<GraphFormat>, 5> kGraphFormats = {{
+    {"dot", GraphFormat::Dot},
+    {"mermaid", GraphFormat::Mermaid},
+    {"graphml", GraphFormat::Graphml},
+    {"json", GraphFormat::Json},
+    {"svg", GraphFormat::Svg},
+}};
+inline constexpr std::array<Choice<GraphDirection>, 3> kGraphDirections = {{
+    {"up", GraphDirection::Up},
+    {"down", GraphDirection::Down},
+    {"both", GraphDirection::Both},
+}};
+
 /// What a word means; nothing for a word that is no choice.
 template <class Value>
 std::optional<Value> ValueOf(Choices<Value> choices, std::string_view word) {

@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "analysis/dependency_graph.h"
 #include "cli/output.h"
 #include "core/find.h"
 
@@ -13,7 +14,7 @@ namespace tessal::cli {
 enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
-ExitCode RunCheck(const std::vector<std::string>& files, Format format, int lowestLevel);
+ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel);
 /// What one message means, all messages as a list, and as a page.
 ExitCode RunExplain(const std::string& code);
 ExitCode RunExplainAll();
@@ -93,6 +94,28 @@ ExitCode RunUnits(const UnitsCall& call);
 ExitCode RunTree(const std::string& file);
 ExitCode RunDiff(const std::string& left, const std::string& right, const std::vector<std::string>& ignored,
                  bool onlyKeywords);
+
+// Analyses.
+struct LintCall {
+  std::vector<std::string> paths;
+  std::vector<std::string> select;
+  std::vector<std::string> ignore;
+  std::string baseline;     ///< a file of findings that are not listed
+  std::string newBaseline;  ///< where all findings go as a baseline, in the place of a report
+  bool exitZero = false;
+  Format format = Format::Text;
+};
+ExitCode RunLint(const LintCall& call);
+enum class GraphFormat { Dot, Mermaid, Graphml, Json, Svg };
+struct GraphCall {
+  std::string file;
+  std::string focus;  ///< a symbol; empty for the whole template
+  std::optional<std::size_t> depth;
+  GraphDirection direction = GraphDirection::Both;
+  std::vector<std::string> kinds;  ///< words; the usual ones when empty
+  GraphFormat format = GraphFormat::Dot;
+};
+ExitCode RunGraph(const GraphCall& call);
 
 // Expressions. The text "-" means standard input.
 struct ExpressionCall {

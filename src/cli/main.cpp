@@ -41,6 +41,8 @@ struct CommandLine {
   FindCall find;
   HtmlCall html;
   UnitsCall units;
+  LintCall lint;
+  GraphCall graph;
   ExpressionCall expression;
   MatrixCall matrix;
   BalanceCall balance;
@@ -125,7 +127,8 @@ void AddExplain(CLI::App& app, CommandLine& line) {
 void AddCheck(CLI::App& app, CommandLine& line) {
   CLI::App* check = AddCommand(app, line, kTemplates, "check", "lists the messages of templates",
                                [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
-  check->add_option("FILE", line.files, "template files")->required();
+  check->add_option("PATH", line.files, "template files, folders of them, or - for standard input")
+      ->required();
   AddFormat(*check, line, kCheckFormats);
   check
       ->add_option_function<std::string>(
@@ -210,9 +213,58 @@ void AddUnits(CLI::App& app, CommandLine& line) {
   AddChoice(*units, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.units.format);
 }
 
-void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
-  AddUnits(app, line);
+/// A list of codes, with commas between them or in several options.
+CLI::Option* AddCodes(CLI::App& command, const char* name, std::vector<std::string>& codes,
+                      const char* description) {
+  return command.add_option(name, codes, description)
+      ->delimiter(',')
+      ->allow_extra_args(false)
+      ->type_name("CODES");
+}
 
+void AddLint(CLI::App& app, CommandLine& line) {
+  CLI::App* lint = AddCommand(app, line, kAnalyses, "lint", "lists likely slips in templates",
+                              [&line] { return RunLint(line.lint); });
+  lint->add_option("PATH", line.lint.paths, "template files, folders of them, or - for standard input")
+      ->required();
+  AddCodes(*lint, "--select", line.lint.select, "looks for these alone");
+  AddCodes(*lint, "--ignore", line.lint.ignore, "does not look for these");
+  CLI::Option* baseline =
+      lint->add_option("--baseline", line.lint.baseline, "leaves out the findings of that file");
+  baseline->type_name("FILE");
+  lint->add_option("--write-baseline", line.lint.newBaseline, "writes all findings to that file instead")
+      ->type_name("FILE")
+      ->excludes(baseline);
+  lint->add_flag("--exit-zero", line.lint.exitZero, "ends with 0 in spite of findings");
+  AddChoice(*lint, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.lint.format);
+}
+
+void AddGraph(CLI::App& app, CommandLine& line) {
+  CLI::App* graph = AddCommand(app, line, kAnalyses, "graph", "prints who depends on whom",
+                               [&line] { return RunGraph(line.graph); });
+  AddFile(*graph, line.graph.file);
+  CLI::Option* focus =
+      graph->add_option("--focus", line.graph.focus, "shows what lies around it")->type_name("SYMBOL");
+  const auto readDepth = [&line](const std::string& hidden) {
+    const std::string text = ShownNumber(hidden);
+    std::size_t depth = 0;
+    const auto read = std::from_chars(text.data(), text.data() + text.size(), depth);
+    if (read.ec != std::errc() || read.ptr != text.data() + text.size()) {
+      throw CLI::ValidationError("--depth", "'" + text + "' is no number of steps");
+    }
+    line.graph.depth = depth;
+  };
+  graph->add_option_function<std::string>("--depth", readDepth, "goes so many steps from the focus")
+      ->type_name("N")
+      ->needs(focus);
+  AddChoice(*graph, "--direction", "DIRECTION", Choices<GraphDirection>(kGraphDirections),
+            line.graph.direction)
+      ->needs(focus);
+  AddCodes(*graph, "--kinds", line.graph.kinds, "shows elements of these kinds, or all")->type_name("KINDS");
+  AddChoice(*graph, "--format", "FORMAT", Choices<GraphFormat>(kGraphFormats), line.graph.format);
+}
+
+void AddMatrix(CLI::App& app, CommandLine& line) {
   CLI::App* matrix = AddCommand(app, line, kAnalyses, "matrix", "prints the process matrix",
                                 [&line] { return RunMatrix(line.matrix); });
   AddFile(*matrix, line.matrix.file);
@@ -220,7 +272,9 @@ void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
   matrix->add_flag("--elementary", line.matrix.isElementary,
                    "replaces processes that are made of others by those");
   AddChoice(*matrix, "--format", "FORMAT", Choices<Format>(kMatrixFormats), line.matrix.format);
+}
 
+void AddBalance(CLI::App& app, CommandLine& line) {
   CLI::App* balance = AddCommand(app, line, kAnalyses, "balance", "checks that pools keep their amount",
                                  [&line] { return RunBalance(line.balance); });
   AddFile(*balance, line.balance.file);
@@ -235,6 +289,14 @@ void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
       ->allow_extra_args(false)
       ->type_name("NAME=P,P...");
   AddChoice(*balance, "--format", "FORMAT", kTableFormats, line.balance.format);
+}
+
+void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
+  AddMatrix(app, line);
+  AddBalance(app, line);
+  AddUnits(app, line);
+  AddLint(app, line);
+  AddGraph(app, line);
 }
 
 void AddKeyFileCommands(CLI::App& app, CommandLine& line) {
@@ -346,6 +408,10 @@ void ShowNumbers(CommandLine& line) {
                             &line.html.file,
                             &line.html.output,
                             &line.units.file,
+                            &line.lint.baseline,
+                            &line.lint.newBaseline,
+                            &line.graph.file,
+                            &line.graph.focus,
                             &line.expression.text,
                             &line.expression.symbol,
                             &line.matrix.file,
@@ -355,7 +421,8 @@ void ShowNumbers(CommandLine& line) {
     *text = ShownNumber(*text);
   }
   for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored,
-                                          &line.balance.pools, &line.balance.boundaries}) {
+                                          &line.balance.pools, &line.balance.boundaries, &line.lint.paths,
+                                          &line.lint.select, &line.lint.ignore, &line.graph.kinds}) {
     for (std::string& text : *texts) text = ShownNumber(text);
   }
 }

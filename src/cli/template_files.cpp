@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "cli/output.h"
+#include "cli/template_paths.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "elements/load_account.h"
@@ -41,7 +42,7 @@ bool RanOutOfMemory() {
 }
 
 bool LoadOrComplain(TemplateCore& core, const std::string& file) {
-  const bool loaded = core.LoadWrapper(file);
+  const bool loaded = LoadPath(core, file);
   if (!loaded) ComplainWithMessages("failed to load file", file);
   // From here on changes reach what depends on them, as in an editor.
   SetNotifyChanges(true);

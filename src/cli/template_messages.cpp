@@ -6,6 +6,7 @@
 
 #include "cli/output.h"
 #include "cli/template_files.h"
+#include "cli/template_paths.h"
 #include "core/error_registry.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
@@ -93,7 +94,7 @@ TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   // A comment that a file leaves open must not swallow the expressions of the next one.
   ResetExpressionScanner();
   TemplateCore& core = TheTemplate();
-  messages.loaded = core.LoadWrapper(file);
+  messages.loaded = LoadPath(core, file);
   ElementIndex elements(core);
   std::set<std::tuple<std::uint32_t, std::string_view, std::string_view>> listed;
   for (const ErrorRecord& record : Errors().Records()) {

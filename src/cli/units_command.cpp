@@ -4,7 +4,7 @@
 #include "analysis/unit_check.h"
 #include "analysis/unit_database.h"
 #include "cli/commands.h"
-#include "cli/sarif.h"
+#include "cli/finding_report.h"
 #include "cli/template_files.h"
 #include "cli/template_messages.h"
 #include "core/template_core.h"
@@ -43,22 +43,12 @@ void PrintJson(const UnitReport& report) {
   PrintLine(Json{{"findings", std::move(findings)}, {"unknown", std::move(unknown)}}.dump());
 }
 
-void PrintLog(const std::string& path, const UnitReport& report) {
-  TemplateMessages file;
-  file.path = path;
-  file.loaded = true;
-  for (const UnitFinding& unit : report.findings) {
-    const AnalysisFinding& finding = unit.finding;
-    file.errors.push_back({.level = static_cast<std::uint32_t>(finding.message->level),
-                           .code = finding.message->code,
-                           .word = std::string(LevelWord(static_cast<std::uint32_t>(finding.message->level))),
-                           .symbol = finding.symbol,
-                           .uid = finding.element,
-                           .kind = finding.kind,
-                           .line = finding.line,
-                           .text = finding.text});
-  }
-  PrintSarif({file});
+void PrintForHosts(Format format, const std::string& path, const TemplateCore& core,
+                   const UnitReport& report) {
+  std::vector<AnalysisFinding> findings;
+  for (const UnitFinding& unit : report.findings) findings.push_back(unit.finding);
+  const FileReport file = ReportOf(path, core, findings);
+  PrintReport(format, {&file, 1}, AnalysisMessages());
 }
 
 void PrintList(const TemplateCore& core, Format format) {
@@ -84,7 +74,7 @@ void PrintList(const TemplateCore& core, Format format) {
 }  // namespace
 
 ExitCode RunUnits(const UnitsCall& call) {
-  if (call.isList && call.format == Format::Sarif) {
+  if (call.isList && call.format != Format::Text && call.format != Format::Json) {
     Complain("--list prints text or json");
     return kCallFault;
   }
@@ -103,10 +93,10 @@ ExitCode RunUnits(const UnitsCall& call) {
   const UnitReport report = CheckUnits(core, call.isStrict ? Substances::Dimensions : Substances::Ignored);
   if (call.format == Format::Json) {
     PrintJson(report);
-  } else if (call.format == Format::Sarif) {
-    PrintLog(call.file, report);
-  } else {
+  } else if (call.format == Format::Text) {
     PrintText(report);
+  } else {
+    PrintForHosts(call.format, call.file, core, report);
   }
   return report.findings.empty() ? kFine : kContentFault;
 }

@@ -125,7 +125,8 @@ class Mutants final {
 
 TEST(UnitMutants, AreFound) {
   std::string text;
-  for (const char* name : {"eutrophication", "fasham", "fish_larvae", "lake_management", "streeter_phelps"}) {
+  for (const char* name :
+       {"asm1", "eutrophication", "fasham", "fish_larvae", "lake_management", "streeter_phelps"}) {
     const std::filesystem::path folder(TESSAL_SOURCE_DIR);
     text += std::string(name) + "\n" + Mutants(folder / "examples" / (std::string(name) + ".tessal")).Text();
   }

@@ -1,5 +1,5 @@
-// The tool as people see it: shell sessions in files of cases, the blocks of the project's front page, and
-// the page of messages, which the tool writes.
+// The tool as people see it: shell sessions in files of cases, the blocks of the project's front page and of
+// its guide, and the page of messages, which the tool writes.
 //
 // The input of a case gives files: `--- NAME`, and what is in it. After a command comes what it printed;
 // lines of standard error begin with `2> `, and an exit code other than 0 ends it, as `[1]`.
@@ -144,9 +144,11 @@ TEST(MessagesPage, ShowsEveryRowOfTheTable) {
   ExpectPage("../docs/messages.md", ShellSession().Run("tessal explain --markdown").output);
 }
 
-TEST(FrontPage, ShowsWhatTheToolPrints) {
+class Pages : public testing::TestWithParam<const char*> {};
+
+TEST_P(Pages, ShowWhatTheToolPrints) {
   const ShellSession session;
-  const std::vector<CaseCall> calls = CallsOn(ReadFile(TESSAL_SOURCE_DIR "/README.md"));
+  const std::vector<CaseCall> calls = CallsOn(ReadFile(std::string(TESSAL_SOURCE_DIR "/") + GetParam()));
   EXPECT_GE(calls.size(), 5U);
   for (const CaseCall& call : calls) {
     const ShellRun run = session.Run(call.words);
@@ -161,6 +163,8 @@ TEST(FrontPage, ShowsWhatTheToolPrints) {
     EXPECT_EQ(given, expected) << call.words;
   }
 }
+
+INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::Values("README.md", "docs/guide/units_and_balance.md"));
 
 }  // namespace
 }  // namespace tessal::test
