@@ -87,6 +87,8 @@ class PoolJudging final {
 
   /// The pool's expression, with auxiliaries that are made of state variables written out.
   std::optional<ProductSum> Amount() {
+    if (pool.expression.find_first_not_of(" \t\n") == std::string::npos)
+      return CanNot("it has no expression");
     const ScannerRest rest;
     const auto parsed = ParseExpression(pool.expression);
     if (parsed->Tree() == nullptr) {
