@@ -225,7 +225,7 @@ std::vector<UnitReading> ListUnits(const TemplateCore& core) {
   return readings;
 }
 
-std::optional<std::string> InferredUnit(const TemplateCore& core, const CEL_Element& element) {
+std::optional<UnitOfExpression> InferredUnit(const TemplateCore& core, const CEL_Element& element) {
   const SymbolRecord* record = core.FindRecordByUid(element.GetUid());
   if (record == nullptr) return std::nullopt;
   UnitInference inference(core, Substances::Ignored);
@@ -233,12 +233,16 @@ std::optional<std::string> InferredUnit(const TemplateCore& core, const CEL_Elem
   const ExpressionUnit value = inference.Infer(ExpressionOf(*record), clashes);
   if (!value.IsCertain()) return std::nullopt;
   const std::optional<Unit> unit = inference.DeclaredOf(element);
-  if (!unit) return ShownUnit(value);
+  if (!unit) return UnitOfExpression{ShownUnit(value)};
   const std::string declared(DeclaredUnit(element).value_or(""));
-  if (!HasEquation(record->kind)) return AreSame(value.unit, *unit) ? declared : ShownUnit(value);
+  if (!HasEquation(record->kind)) {
+    if (AreSame(value.unit, *unit)) return UnitOfExpression{declared};
+    return UnitOfExpression{ShownUnit(value), true};
+  }
   const RateOf rate = RateIn(value.unit, *unit);
-  if (rate.time == nullptr || rate.time->name != "day") return ShownUnit(value);
-  return declared + "/d";
+  if (rate.time == nullptr || rate.time->name != "day")
+    return UnitOfExpression{ShownUnit(value), !rate.isRate};
+  return UnitOfExpression{declared + "/d"};
 }
 
 }  // namespace tessal

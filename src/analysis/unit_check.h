@@ -53,8 +53,16 @@ struct UnitReading {
 };
 std::vector<UnitReading> ListUnits(const TemplateCore& core);
 
-/// The unit of an element's expression as people write it; none where it is unknown or there is no
-/// expression. For a state variable, that of its equation.
-std::optional<std::string> InferredUnit(const TemplateCore& core, const CEL_Element& element);
+/// The unit of an expression, as people write it.
+struct UnitOfExpression {
+  std::string text;
+  /// Whether its element declares another or, for an equation, one of which it is no rate. False where the
+  /// declared one is unknown.
+  bool isOther = false;
+};
+
+/// The unit of an element's expression; none where it is unknown or there is no expression. For a state
+/// variable, that of its equation.
+std::optional<UnitOfExpression> InferredUnit(const TemplateCore& core, const CEL_Element& element);
 
 }  // namespace tessal

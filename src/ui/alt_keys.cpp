@@ -5,7 +5,7 @@ namespace tessal {
 namespace {
 
 /// What the menus of a host open with.
-const QString kMenuKeys = QStringLiteral("fegvh");
+const QString kMenuKeys = QStringLiteral("fegyvh");
 
 bool StartsWord(const QString& label, qsizetype place) {
   return place == 0 || !label[place - 1].isLetterOrNumber();

@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QTimer>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
@@ -27,10 +28,13 @@
 #include "ui/plain_tip.h"
 #include "ui/strings.h"
 #include "ui/text_bytes.h"
+#include "ui/unit_note.h"
 
 namespace tessal {
 
 namespace {
+
+constexpr std::string_view kUnitLabel = "Unit";
 
 /// The number at the start of a text by the rules of files, whatever the user's language; 0 without one.
 double ReadNumber(const QString& text) {
@@ -97,6 +101,13 @@ void ShowChoiceTip(QComboBox& combo, const FormField& field) {
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
   for (const FormField& field : fields) AddField(field);
+  const auto isUnit = [](const Control& control) { return control.field->label == kUnitLabel; };
+  const auto isExpression = [](const Control& control) {
+    return control.field->editor == FieldEditor::Expression;
+  };
+  const auto unit = std::find_if(controls.begin(), controls.end(), isUnit);
+  if (unit != controls.end() && std::any_of(controls.begin(), controls.end(), isExpression))
+    AddUnitNote(*unit);
   LabelFields();
   LayOut();
 }
@@ -228,6 +239,22 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   return cell;
 }
 
+void CElementForm::AddUnitNote(Control& control) {
+  auto* cell = MakeChild<QWidget>(this);
+  auto* parts = MakeChild<QHBoxLayout>(cell);
+  parts->setContentsMargins(0, 0, 0, 0);
+  unitNote = MakeChild<CUnitNote>(cell);
+  parts->addWidget(control.cell, 1);
+  parts->addWidget(unitNote, 1);
+  control.cell = cell;
+}
+
+void CElementForm::ShowUnitNote() {
+  if (unitNote == nullptr || IsClosed()) return;
+  const CEL_Element* element = Element();
+  if (element != nullptr) unitNote->Show(Core(), *element);
+}
+
 bool CElementForm::IsEnabled(const FormField& field, const CEL_Property& property) const {
   return field.isOpen != nullptr ? field.isOpen(Core()) : property.Editable();
 }
@@ -237,6 +264,8 @@ void CElementForm::ItemToForm() {
   if (element == nullptr) return;
   for (Control& control : controls) Show(control, *element);
   element->SetLoaded(true);
+  // The form is seen first.
+  QTimer::singleShot(0, this, &CElementForm::ShowUnitNote);
 }
 
 void CElementForm::Show(Control& control, CEL_Element& element) {

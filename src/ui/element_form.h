@@ -20,6 +20,7 @@ class QSplitter;
 namespace tessal {
 
 class CEL_Property;
+class CUnitNote;
 
 enum class FieldEditor {
   Symbol,         ///< one line; a change is a rename
@@ -136,6 +137,9 @@ class CElementForm : public CRightPaneBase {
   QWidget* MakeReferences();
   QWidget* MakeDocumentation(const FormField& field, Control& control);
   QWidget* MakeExpression(const FormField& field, Control& control);
+  /// Puts what the expression says of the unit beside the field of the unit.
+  void AddUnitNote(Control& control);
+  void ShowUnitNote();
 
   void Show(Control& control, CEL_Element& element);
   static void FillCombo(QComboBox& combo, const FormField& field, const CEL_Property& property, bool enabled);
@@ -153,6 +157,7 @@ class CElementForm : public CRightPaneBase {
   QGridLayout* layout;
   QSplitter* split = nullptr;     ///< of a form with more than one expression
   QGroupBox* overview = nullptr;  ///< of a form with counts
+  CUnitNote* unitNote = nullptr;  ///< of a form with a unit and an expression
   int columns = 0;
   int narrowWidth = 0;  ///< what one column needs
   int wideWidth = 0;    ///< what two columns need

@@ -8,7 +8,6 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QSplitter>
 #include <QStyle>
 #include <QToolButton>
 #include <algorithm>
@@ -16,6 +15,7 @@
 #include "core/document.h"
 #include "ui/child.h"
 #include "ui/found_list.h"
+#include "ui/kept_splitter.h"
 #include "ui/strings.h"
 
 namespace tessal {
@@ -228,16 +228,8 @@ void CFindPane::ChooseRow(int row) {
 }
 
 void CFindPane::OpenUp() {
-  if (isVisible()) return;
-  show();
-  auto* splitter = qobject_cast<QSplitter*>(parentWidget());
-  if (splitter == nullptr || height() >= kUsualHeight) return;
-  QList<int> sizes = splitter->sizes();
-  const int missing = kUsualHeight - height();
-  // What lies above gives the room that it has.
-  sizes[0] -= missing;
-  sizes[splitter->indexOf(this)] += missing;
-  splitter->setSizes(sizes);
+  emit Opening();
+  OpenInSplitter(*this, kUsualHeight);
 }
 
 void CFindPane::CloseUp() {

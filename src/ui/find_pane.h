@@ -39,6 +39,8 @@ class CFindPane final : public QFrame {
   void PlaceChosen(const FoundText& found, const TextMatch& match);
   /// Texts of the template have been replaced.
   void Replaced();
+  /// The pane is about to be seen.
+  void Opening();
   void Closed();
 
  protected:

@@ -47,6 +47,11 @@ class CFindTools final : public QObject {
   /// The commands for the menus.
   const std::vector<ViewCommand>& Commands() const { return commands; }
 
+  /// Selects the owner of a text, and marks a part of it in its form.
+  void GoTo(const FoundText& found, const TextMatch& match);
+  /// Shows what the message with a code means.
+  void Explain(const std::string& code);
+
  private:
   struct Command {
     const char* menu;
@@ -61,9 +66,7 @@ class CFindTools final : public QObject {
   void GoToMatch(int step);
   void GoToSymbol();
   void FindUsesOfSelected();
-  void GoTo(const FoundText& found, const TextMatch& match);
   void ShowReplaced();
-  void Explain(const std::string& code);
   /// The name that the caret is on in an expression; else the symbol of the selected node.
   QString SelectedName() const;
 

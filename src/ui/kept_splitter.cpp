@@ -12,4 +12,17 @@ void KeepSplitter(QSplitter& splitter) {
                    [&splitter, key] { QSettings().setValue(key, splitter.saveState()); });
 }
 
+void OpenInSplitter(QWidget& part, int usualHeight) {
+  if (part.isVisible()) return;
+  part.show();
+  auto* splitter = qobject_cast<QSplitter*>(part.parentWidget());
+  if (splitter == nullptr || part.height() >= usualHeight) return;
+  QList<int> sizes = splitter->sizes();
+  const int missing = usualHeight - part.height();
+  // What lies above gives the room that it has.
+  sizes[0] -= missing;
+  sizes[splitter->indexOf(&part)] += missing;
+  splitter->setSizes(sizes);
+}
+
 }  // namespace tessal

@@ -19,6 +19,8 @@
 
 #include "core/document.h"
 #include "ui/account_strip.h"
+#include "ui/analysis_pane.h"
+#include "ui/analysis_tools.h"
 #include "ui/child.h"
 #include "ui/control_ids.h"
 #include "ui/create_hint.h"
@@ -167,6 +169,8 @@ void CMainView::BuildLayout() {
   QWidget* messages = MakeMessages();
   findTools = MakeChild<CFindTools>(FindSurroundings{*this, document, dialogs, *tree, *errorList,
                                                      [this] { CommitAll(); }, [this] { return form.get(); }});
+  analyses = MakeChild<CAnalysisTools>(
+      AnalysisSurroundings{*this, document, *tree, *errorList, *findTools, [this] { CommitAll(); }});
 
   auto* treeDetail = MakeChild<QSplitter>(Qt::Horizontal, this);
   treeDetail->setObjectName(QStringLiteral("TreeDetail"));
@@ -183,12 +187,13 @@ void CMainView::BuildLayout() {
   topBottom->addWidget(treeDetail);
   topBottom->addWidget(messages);
   topBottom->addWidget(&findTools->Pane());
+  topBottom->addWidget(&analyses->Pane());
   topBottom->setStretchFactor(0, 1);
   topBottom->setChildrenCollapsible(false);
   topBottom->setSizes({4 * kUsualErrors, kUsualErrors});
   KeepSplitter(*topBottom);
   QWidget::setTabOrder(findTools->TreeFilter().focusProxy(), tree);
-  ChainAfter(ChainAfter(*tree, *messages), findTools->Pane());
+  ChainAfter(ChainAfter(ChainAfter(*tree, *messages), findTools->Pane()), analyses->Pane());
 
   auto* layout = MakeChild<QVBoxLayout>(this);
   layout->setContentsMargins(kMargin, 0, kMargin, kMargin);
@@ -396,12 +401,13 @@ void CMainView::Commit() {
 }
 
 void CMainView::CommitAll() {
+  analyses->CommitTyped();
   Commit();
   if (form && form->HasUnwritten()) Commit();
 }
 
 bool CMainView::HasUncommitted() const {
-  return form && !form->TypedValues().empty();
+  return (form && !form->TypedValues().empty()) || (analyses != nullptr && analyses->HasTyped());
 }
 
 void CMainView::WithUncommitted(const std::function<void()>& run) {
@@ -438,8 +444,9 @@ std::string CMainView::StatusText() const {
 }
 
 void CMainView::focusInEvent(QFocusEvent* focus) {
-  // A host that gives the view the focus gives it to the tree. As a proxy, the tree would be the first stop of
-  // the view, and Tab would pass over what lies before it. A view may come to the front before it is filled.
+  // A host that gives the view the focus gives it to the tree. As a proxy, the tree would be the first stop
+  // of the view, and Tab would pass over what lies before it. A view may come to the front before it is
+  // filled.
   if (tree != nullptr) tree->setFocus(focus->reason());
 }
 
@@ -466,6 +473,7 @@ std::vector<ViewCommand> CMainView::Commands() {
     commands.push_back({.menu = strings::kGoMenu, .text = {}, .action = action});
   commands.push_back({.menu = strings::kGoMenu, .text = {}});
   append(findTools->Commands());
+  append(analyses->Commands());
   commands.push_back({.menu = strings::kHelpMenu, .text = {}, .action = helpContents});
   commands.push_back(
       {.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] { OpenReference(this, {}); }});

@@ -26,6 +26,7 @@ class CEL_Element;
 class CEditCommands;
 class CElementTree;
 class CAccountStrip;
+class CAnalysisTools;
 class CErrorList;
 class CFindTools;
 class CLabel;
@@ -60,6 +61,7 @@ class CMainView final : public QWidget, public CView {
   CElementTree& Tree() const { return *tree; }
   CErrorList& ErrorList() const { return *errorList; }
   CFindTools& FindTools() const { return *findTools; }
+  CAnalysisTools& Analyses() const { return *analyses; }
   CAccountStrip& AccountStrip() const { return *accountStrip; }
   /// The form of the selected node; none before the first selection.
   CRightPaneBase* Form() const { return form.get(); }
@@ -148,6 +150,7 @@ class CMainView final : public QWidget, public CView {
   CElementTree* tree = nullptr;
   CErrorList* errorList = nullptr;
   CFindTools* findTools = nullptr;
+  CAnalysisTools* analyses = nullptr;
   CAccountStrip* accountStrip = nullptr;
   QWidget* holder = nullptr;
   QVBoxLayout* holderLayout = nullptr;

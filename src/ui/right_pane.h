@@ -70,6 +70,7 @@ class CRightPaneBase : public QWidget {
 
   /// From now on nothing that its controls report counts: its node may go before it does.
   void Close() { closed = true; }
+  bool IsClosed() const { return closed; }
 
  protected:
   virtual void ItemToForm() {}

@@ -21,9 +21,11 @@ void CRowModel::AllowEditing(std::vector<int> columns, StoreText store) {
   storeText = std::move(store);
 }
 
-void CRowModel::ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf) {
+void CRowModel::ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf,
+                          std::function<QString(const Row& row)> wordsOf) {
   iconColumn = column;
   icon = std::move(iconOf);
+  iconWords = std::move(wordsOf);
 }
 
 std::string CRowModel::TextAt(int row, int column) const {
@@ -62,6 +64,10 @@ QVariant CRowModel::data(const QModelIndex& index, int role) const {
   }
   if (role == Qt::DecorationRole && index.column() == iconColumn && icon) {
     return icon(rows[static_cast<std::size_t>(index.row())]);
+  }
+  if (role == Qt::AccessibleTextRole && index.column() == iconColumn && iconWords) {
+    const QString words = iconWords(rows[static_cast<std::size_t>(index.row())]);
+    return words.isEmpty() ? index.data() : words + u' ' + index.data().toString();
   }
   return {};
 }

@@ -34,8 +34,9 @@ class CRowModel final : public QAbstractTableModel {
   void AllowEditing(std::vector<int> columns, StoreText store);
   /// Rows can be dragged to another place among them, before the row of the number or to the end.
   void AllowMoving(std::function<void(int row)> moveTo) { moveRowsTo = std::move(moveTo); }
-  /// The column whose cells carry an icon, and which.
-  void ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf);
+  /// The column whose cells carry an icon, and which; and the words for those who do not see it.
+  void ShowIcons(int column, std::function<QIcon(const Row& row)> iconOf,
+                 std::function<QString(const Row& row)> wordsOf = {});
 
   const std::vector<Row>& Rows() const { return rows; }
   std::string TextAt(int row, int column) const;
@@ -63,6 +64,7 @@ class CRowModel final : public QAbstractTableModel {
   std::function<void(int row)> moveRowsTo;
   int iconColumn = -1;
   std::function<QIcon(const Row&)> icon;
+  std::function<QString(const Row&)> iconWords;
 };
 
 }  // namespace tessal

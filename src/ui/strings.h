@@ -19,6 +19,7 @@ inline const QString kNavigationHistory = QStringLiteral("Navigation history");
 inline constexpr const char* kEditMenu = "&Edit";
 inline constexpr const char* kViewMenu = "&View";
 inline constexpr const char* kGoMenu = "&Go";
+inline constexpr const char* kAnalysisMenu = "Anal&ysis";
 inline constexpr const char* kHelpMenu = "&Help";
 inline const QString kZoomIn = QStringLiteral("&Larger Texts");
 inline const QString kZoomOut = QStringLiteral("&Smaller Texts");
@@ -240,5 +241,87 @@ inline const QString kCopyRows = QStringLiteral("Co&py");
 inline const QString kSortByItem = QStringLiteral("Sort by &Item");
 inline const QString kSortByMessage = QStringLiteral("Sort by &Message");
 inline const QString kUsualOrder = QStringLiteral("Usual &Order");
+
+// The analyses.
+inline const QString kCommandAnalyse = QStringLiteral("&Analyse");
+inline const QString kCommandMatrix = QStringLiteral("Process &Matrix");
+inline const QString kCommandPools = QStringLiteral("&Pools");
+inline const QString kCommandInfluences = QStringLiteral("&Influences");
+inline const QString kCommandUp = QStringLiteral("&What Influences This");
+inline const QString kCommandDown = QStringLiteral("What &Does This Influence");
+inline const QString kAnalyses = QStringLiteral("Analyses");
+inline const QString kCloseAnalyses = QStringLiteral("Close the analyses");
+
+inline const QString kFindingsPage = QStringLiteral("Findings");
+inline const QString kFindingList = QStringLiteral("Findings of the analyses");
+inline const QString kAnalyse = QStringLiteral("Analyse");
+inline const QString kExplainFinding = QStringLiteral("Explain");
+inline const QString kSymbolColumn = QStringLiteral("Symbol");
+inline const QString kRuleColumn = QStringLiteral("Rule");
+inline const QString kOneFinding = QStringLiteral("1 finding");
+inline const QString kFindingCount = QStringLiteral("%1 findings");
+
+inline const QString kMatrixPage = QStringLiteral("Process Matrix");
+inline const QString kMatrixTable = QStringLiteral("Table of the process matrix");
+inline const QString kMatrixOf = QStringLiteral("Matrix of");
+inline const QString kWholeTemplate = QStringLiteral("the template");
+inline const QString kMatrixProcesses = QStringLiteral("Processes");
+inline const QString kAsWritten = QStringLiteral("as written");
+inline const QString kElementary = QStringLiteral("elementary");
+inline const QString kRateColumn = QStringLiteral("Rate");
+inline const QString kOtherRow = QStringLiteral("Other");
+inline const QString kEmptyCell = QStringLiteral("empty");
+inline const QString kMatrixSize = QStringLiteral("Processes: %1, state variables: %2");
+inline const QString kNotInMatrix = QStringLiteral("Not in the matrix: %1");
+inline const QString kGoToState = QStringLiteral("Go to State &Variable");
+inline const QString kGoToProcess = QStringLiteral("Go to &Process");
+
+inline const QString kPoolsPage = QStringLiteral("Pools");
+inline const QString kPoolList = QStringLiteral("Pools of the template");
+inline const QString kAddPool = QStringLiteral("Add Pool");
+inline const QString kRemovePool = QStringLiteral("Remove Pool");
+inline const QString kPoolName = QStringLiteral("Pool name");
+inline const QString kPoolExpression = QStringLiteral("Pool expression");
+inline const QString kPoolBoundary = QStringLiteral("Boundary processes");
+inline const QString kPoolDescription = QStringLiteral("Pool description");
+inline const QString kPoolColumn = QStringLiteral("Pool");
+inline const QString kVerdictColumn = QStringLiteral("Verdict");
+inline const QString kClosedPool = QStringLiteral("closed");
+inline const QString kOpenPool = QStringLiteral("open");
+inline const QString kUnknownPool = QStringLiteral("unknown: %1");
+inline const QString kLeakList = QStringLiteral("Leaks of the pool");
+inline const QString kProcessColumn = QStringLiteral("Process");
+inline const QString kNetColumn = QStringLiteral("Net yield");
+inline const QString kValueColumn = QStringLiteral("At default values");
+inline const QString kNoProcess = QStringLiteral("no process");
+inline const QString kNewPool = QStringLiteral("pool_%1");
+inline const QString kPoolsNotRead = QStringLiteral("Not read: %1");
+inline const QString kPoolsNotKept = QStringLiteral("Not changed: %1");
+inline constexpr const char* kStepAddPool = "Add pool ";
+inline constexpr const char* kStepRemovePool = "Remove pool ";
+inline constexpr const char* kStepChangePool = "Change pool ";
+
+inline const QString kInfluencesPage = QStringLiteral("Influences");
+inline const QString kInfluenceDrawing = QStringLiteral("Drawing of the influences");
+inline const QString kInfluenceList = QStringLiteral("List of the influences");
+inline const QString kInfluenceSteps = QStringLiteral("Steps");
+inline const QString kInfluenceDirection = QStringLiteral("Direction");
+inline const QString kBothDirections = QStringLiteral("both");
+inline const QString kUpwards = QStringLiteral("what influences this");
+inline const QString kDownwards = QStringLiteral("what this influences");
+inline const QString kMainKinds = QStringLiteral("State variables and processes only");
+inline const QString kRelationColumn = QStringLiteral("Relation");
+inline const QString kUnitColumn = QStringLiteral("Unit");
+inline const QString kThisElement = QStringLiteral("this element");
+inline const QString kInfluencesThis = QStringLiteral("influences this");
+inline const QString kInfluencesInSteps = QStringLiteral("influences this in %1 steps");
+inline const QString kInfluencedByThis = QStringLiteral("is influenced by this");
+inline const QString kInfluencedInSteps = QStringLiteral("is influenced by this in %1 steps");
+inline const QString kInfluencesOf = QStringLiteral("%1: influenced by %2, influences %3");
+inline const QString kNotDrawn = QStringLiteral("%1 more are in the list and not drawn");
+inline const QString kNoElement = QStringLiteral("Select an element with a symbol to see its influences.");
+
+inline const QString kUnitOfExpression = QStringLiteral("expression: %1");
+inline const QString kUnitDiffers = QStringLiteral("expression differs: %1");
 
 }  // namespace tessal::strings

@@ -207,6 +207,14 @@ TEST_F(ScreenReader, NamesEveryControlAndTabReachesEachOnce) {
   Visit("the window that goes to a symbol");
   ASSERT_TRUE(editor->CloseWindow());
 
+  for (const char* page : {"Findings", "Process Matrix", "Pools", "Influences"}) {
+    editor->Keys().Type(XK_F9);
+    ASSERT_TRUE(editor->Wait(ATSPI_ROLE_TREE, "Findings of the analyses"));
+    ASSERT_TRUE(editor->ShowTab(page));
+    Visit(std::string("the analyses: ") + page);
+  }
+  ASSERT_TRUE(editor->Press(ATSPI_ROLE_PUSH_BUTTON, "Close the analyses"));
+
   ASSERT_TRUE(editor->ShowDocument("fish_larvae"));
   ASSERT_TRUE(editor->GoToSymbol("production"));
   Visit("a process");

@@ -137,7 +137,9 @@ std::string Inferred(const TemplateCore& core) {
   std::string text;
   for (const SymbolRecord& record : core.SymbolTable()) {
     if (record.expression == nullptr) continue;
-    text += RecordSymbol(record) + ": " + InferredUnit(core, *record.element).value_or("none") + "\n";
+    const auto unit = InferredUnit(core, *record.element);
+    text += RecordSymbol(record) + ": " + (unit ? unit->text + (unit->isOther ? ", differs" : "") : "none") +
+            "\n";
   }
   return text;
 }

@@ -18,7 +18,8 @@ TEST_P(Cases, GiveWhatTheFileSays) {
 INSTANTIATE_TEST_SUITE_P(Editor, Cases,
                          testing::Values("commits", "names", "choices", "expressions", "completion",
                                          "expression_help", "messages", "finding", "nodes", "undo", "visits",
-                                         "groups", "lists", "root", "visibility", "particles", "exports"),
+                                         "groups", "lists", "root", "visibility", "particles", "exports",
+                                         "analysis"),
                          [](const auto& file) { return file.param; });
 
 }  // namespace

@@ -19,6 +19,7 @@
 #include <algorithm>
 #include <set>
 
+#include "ui/analysis_actions.h"
 #include "ui/create_hint.h"
 #include "ui/expression_actions.h"
 #include "ui/find_pane.h"
@@ -442,6 +443,13 @@ const std::map<std::string, void (*)(Editor& editor, const Words& words)> kActio
        words.second.isEmpty() ? line.clear() : QTest::keyClicks(&line, words.second);
        QCoreApplication::processEvents();
      }},
+    {"choose-in",
+     [](Editor& editor, auto& words) {
+       auto& combo = dynamic_cast<QComboBox&>(Control(editor, words.first));
+       combo.setCurrentIndex(combo.findText(words.second));
+     }},
+    {"enter-cell",
+     [](Editor& editor, auto& words) { EnterCell(Control(editor, words.first), words.second); }},
     {"tick-row",
      [](Editor& editor, auto& words) {
        auto& list = *editor.View().FindTools().Pane().template findChild<CFoundList*>();
@@ -481,6 +489,8 @@ const std::map<std::string, std::string (*)(Editor& editor, const Words& words)>
     {"hover", [](Editor& editor, auto& words) { return TipIn(editor, words.first, words.second.toInt()); }},
     {"press-keys", [](Editor& editor, auto& words) { return PressKeys(editor, words.first, words.second); }},
     {"marks", Marks},
+    {"analysis", [](Editor& editor, auto& /*words*/) { return AnalysisText(editor); }},
+    {"unit-note", [](Editor& editor, auto& /*words*/) { return UnitNoteText(editor); }},
     {"found", Found},
     {"shown-messages", ShownMessages},
     {"focused", Focus},
