@@ -18,7 +18,7 @@ struct AnalysisFinding {
   Message message;          ///< its code, severity and remedy
   std::string text;         ///< the row's, filled in
   Uid element = Uid::None;  ///< none for a finding about the whole template
-  std::string symbol;       ///< of the element, as messages show it
+  std::string symbol{};     ///< of the element, as messages show it
   ElementKind kind = ElementKind::None;
   int line = 0;              ///< of the element's section in the file, from 1; 0 for none
   std::string_view field{};  ///< the label of the property that it is about; empty for the element itself

@@ -47,7 +47,7 @@ UnitReport CheckUnits(const TemplateCore& core, Substances substances);
 /// How the unit texts of a template were read, each text once, in the order of first use.
 struct UnitReading {
   std::string text;
-  std::string read;  ///< in base units, as UDUNITS writes it; empty when it was not read
+  std::string read;  ///< in base units, in the spelling of UDUNITS; empty when it was not read
   std::string substance;
   std::size_t uses;
 };

@@ -69,6 +69,14 @@ inline constexpr std::array<Choice<GraphDirection>, 3> kGraphDirections = {{
     {"both", GraphDirection::Both},
 }};
 
+/// What the process matrix is printed in.
+inline constexpr std::array<Choice<Format>, 4> kMatrixFormats = {{
+    {"text", Format::Text},
+    {"csv", Format::Csv},
+    {"json", Format::Json},
+    {"latex", Format::Latex},
+}};
+
 /// What a word means; nothing for a word that is no choice.
 template <class Value>
 std::optional<Value> ValueOf(Choices<Value> choices, std::string_view word) {

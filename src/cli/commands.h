@@ -11,7 +11,7 @@
 
 namespace tessal::cli {
 
-enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html };
+enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
 ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel);
@@ -64,6 +64,31 @@ struct HtmlCall {
   bool force = false;
 };
 ExitCode RunHtml(const HtmlCall& call);
+
+// Analyses. Each ends with a fault of the content where it finds something.
+struct MatrixCall {
+  std::string file;
+  std::string className;  ///< of a particle class; empty for the template's own state variables
+  bool isElementary = false;
+  Format format = Format::Text;
+};
+ExitCode RunMatrix(const MatrixCall& call);
+struct BalanceCall {
+  std::string file;
+  std::string poolsFile;                ///< a key file with pools, in the place of those of the template
+  std::vector<std::string> pools;       ///< NAME=EXPR
+  std::vector<std::string> boundaries;  ///< NAME=P,P or, for all pools, P,P
+  Format format = Format::Text;
+};
+ExitCode RunBalance(const BalanceCall& call);
+/// The clashes of units; or, as a list, how the unit texts were read.
+struct UnitsCall {
+  std::string file;
+  bool isStrict = false;  ///< substances are dimensions
+  bool isList = false;
+  Format format = Format::Text;
+};
+ExitCode RunUnits(const UnitsCall& call);
 
 // Key files.
 ExitCode RunTree(const std::string& file);

@@ -42,7 +42,10 @@ struct CommandLine {
   HtmlCall html;
   LintCall lint;
   GraphCall graph;
+  UnitsCall units;
   ExpressionCall expression;
+  MatrixCall matrix;
+  BalanceCall balance;
   std::function<ExitCode()> run;
 };
 
@@ -252,7 +255,41 @@ void AddGraph(CLI::App& app, CommandLine& line) {
   AddChoice(*graph, "--format", "FORMAT", Choices<GraphFormat>(kGraphFormats), line.graph.format);
 }
 
+void AddUnits(CLI::App& app, CommandLine& line) {
+  CLI::App* units = AddCommand(app, line, kAnalyses, "units", "finds units that do not go together",
+                               [&line] { return RunUnits(line.units); });
+  AddFile(*units, line.units.file);
+  units->add_flag("--strict", line.units.isStrict, "tells mmol N from mmol C and other substances apart");
+  units->add_flag("--list", line.units.isList, "lists how each unit text was read");
+  AddChoice(*units, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.units.format);
+}
+
 void AddAnalysisCommands(CLI::App& app, CommandLine& line) {
+  AddUnits(app, line);
+
+  CLI::App* matrix = AddCommand(app, line, kAnalyses, "matrix", "prints the process matrix",
+                                [&line] { return RunMatrix(line.matrix); });
+  AddFile(*matrix, line.matrix.file);
+  matrix->add_option("--class", line.matrix.className, "the matrix of a particle class")->type_name("NAME");
+  matrix->add_flag("--elementary", line.matrix.isElementary,
+                   "replaces processes that are made of others by those");
+  AddChoice(*matrix, "--format", "FORMAT", Choices<Format>(kMatrixFormats), line.matrix.format);
+
+  CLI::App* balance = AddCommand(app, line, kAnalyses, "balance", "checks that pools keep their amount",
+                                 [&line] { return RunBalance(line.balance); });
+  AddFile(*balance, line.balance.file);
+  balance->add_option("--pools", line.balance.poolsFile, "takes the pools of this key file")
+      ->type_name("FILE");
+  balance->add_option("--pool", line.balance.pools, "a further pool; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=EXPR");
+  balance
+      ->add_option("--boundary", line.balance.boundaries,
+                   "processes through which a pool, or without a name all, come and go; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=P,P...");
+  AddChoice(*balance, "--format", "FORMAT", kTableFormats, line.balance.format);
+
   AddLint(app, line);
   AddGraph(app, line);
 }
@@ -352,16 +389,35 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 void ShowNumbers(CommandLine& line) {
-  for (std::string* text :
-       {&line.file, &line.otherFile, &line.name, &line.save.file, &line.save.output, &line.rename.file,
-        &line.rename.oldSymbol, &line.rename.newSymbol, &line.rename.output, &line.find.file,
-        &line.find.pattern, &line.html.file, &line.html.output, &line.lint.baseline, &line.lint.newBaseline,
-        &line.graph.file, &line.graph.focus, &line.expression.text, &line.expression.symbol}) {
+  for (std::string* text : {&line.file,
+                            &line.otherFile,
+                            &line.name,
+                            &line.save.file,
+                            &line.save.output,
+                            &line.rename.file,
+                            &line.rename.oldSymbol,
+                            &line.rename.newSymbol,
+                            &line.rename.output,
+                            &line.find.file,
+                            &line.find.pattern,
+                            &line.html.file,
+                            &line.html.output,
+                            &line.units.file,
+                            &line.lint.baseline,
+                            &line.lint.newBaseline,
+                            &line.graph.file,
+                            &line.graph.focus,
+                            &line.expression.text,
+                            &line.expression.symbol,
+                            &line.matrix.file,
+                            &line.matrix.className,
+                            &line.balance.file,
+                            &line.balance.poolsFile}) {
     *text = ShownNumber(*text);
   }
-  for (std::vector<std::string>* texts :
-       {&line.files, &line.values, &line.settings, &line.ignored, &line.lint.paths, &line.lint.select,
-        &line.lint.ignore, &line.graph.kinds}) {
+  for (std::vector<std::string>* texts : {&line.files, &line.values, &line.settings, &line.ignored,
+                                          &line.balance.pools, &line.balance.boundaries, &line.lint.paths,
+                                          &line.lint.select, &line.lint.ignore, &line.graph.kinds}) {
     for (std::string& text : *texts) text = ShownNumber(text);
   }
 }

@@ -10,7 +10,8 @@
 
 #include "core/template_core.h"
 #include "elements/element_field.h"
-#include "keyfile/keywords.h"
+#include "keyfile/item_tree.h"
+#include "keyfile/reader.h"
 #include "platform/ascii.h"
 #include "platform/text_stream.h"
 
@@ -146,12 +147,11 @@ class Listing final {
 
   void AddFurtherSections() {
     if (core.KeptText().empty()) return;
-    bool targetSeen = false;
-    for (const CKvfBaseItem& child : core.KeptTree().Children()) {
+    // A file of the format begins with a comment.
+    CKvfItemTree sections;
+    if (ParseKeyFileTree("// \r\n\r\n" + core.KeptText() + "\r\n", sections) == 0) return;
+    for (const CKvfBaseItem& child : sections.Children()) {
       if (child.ItemKind() != CKvfBaseItem::kSection) continue;
-      const bool isTarget = !targetSeen && EqualIgnoringCase(child.Name(), section::kTarget);
-      targetSeen = targetSeen || isTarget;
-      if (isTarget) continue;
       std::string text;
       child.AppendTo(text);
       Add("Further section", std::string(child.Name())).fields = {{"Text", std::move(text)}};

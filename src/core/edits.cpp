@@ -108,6 +108,8 @@ class Exchanging final {
 
   void operator()(BuiltInsEdit& edit) const { std::swap(state.flags.showAllBuiltIns, edit.other); }
 
+  void operator()(KeptTextEdit& edit) const { std::swap(state.keptText, edit.other); }
+
  private:
   std::vector<VisibilityGroup>& Groups() const { return state.misc.Visibilities().groups; }
   VisibilityGroup& Group(std::int32_t number) const { return Groups()[static_cast<std::size_t>(number - 1)]; }
@@ -150,6 +152,7 @@ struct Summary {
   std::size_t memberships = 0;
   bool takesOver = false;
   const BuiltInsEdit* builtIns = nullptr;
+  bool changesPools = false;
 };
 
 Summary SummaryOf(const std::vector<TemplateEdit>& edits) {
@@ -174,6 +177,7 @@ Summary SummaryOf(const std::vector<TemplateEdit>& edits) {
                           },
                           [&summary](const TakeOverEdit&) { summary.takesOver = true; },
                           [&summary](const BuiltInsEdit& switched) { summary.builtIns = &switched; },
+                          [&summary](const KeptTextEdit&) { summary.changesPools = true; },
                           [&summary, &edit](const auto& ofGroups) {
                             using Kind = std::decay_t<decltype(ofGroups)>;
                             if (summary.firstOfGroups == nullptr) summary.firstOfGroups = &edit;
@@ -280,7 +284,7 @@ std::size_t SizeOf(const TemplateEdit& edit) {
       return text == nullptr ? 0 : text->size();
     } else if constexpr (std::is_same_v<Kind, PresenceEdit>) {
       return each.away ? SizeOfElement(*each.away) : 0;
-    } else if constexpr (std::is_same_v<Kind, GroupTextEdit>) {
+    } else if constexpr (std::is_same_v<Kind, GroupTextEdit> || std::is_same_v<Kind, KeptTextEdit>) {
       return each.other.size();
     } else if constexpr (std::is_same_v<Kind, GroupEdit>) {
       return each.away ? SizeOfGroup(*each.away) : 0;
@@ -309,7 +313,8 @@ std::string NameOfStep(const TemplateState& state, const std::vector<TemplateEdi
   }
   if (summary.firstOfGroups != nullptr)
     return std::visit(GroupNaming(state, summary.memberships), *summary.firstOfGroups);
-  return summary.firstValue == nullptr ? std::string() : NameOfValues(summary);
+  if (summary.firstValue != nullptr) return NameOfValues(summary);
+  return summary.changesPools ? "Change the pools" : "";
 }
 
 Uid SubjectOfStep(const std::vector<TemplateEdit>& edits) {

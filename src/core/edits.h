@@ -84,8 +84,13 @@ struct BuiltInsEdit {
   bool other;
 };
 
+/// What the file holds beside the template is another text.
+struct KeptTextEdit {
+  std::string other;
+};
+
 using TemplateEdit = std::variant<ValueEdit, PresenceEdit, PlaceEdit, GroupTextEdit, GroupEdit, LevelEdit,
-                                  MembershipEdit, TakeOverEdit, BuiltInsEdit>;
+                                  MembershipEdit, TakeOverEdit, BuiltInsEdit, KeptTextEdit>;
 
 /// Takes the template from the present one of the edit's states to the other. Nobody hears of it, and what
 /// follows from the change is the caller's to bring up to date.

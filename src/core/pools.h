@@ -33,6 +33,8 @@ struct Pool {
 struct PoolsRead {
   std::vector<Pool> pools;
   std::vector<std::string> faults;  ///< what could not be read, in words
+  /// What the section holds beside pools, such as comments. While there is any, `SetPools` changes nothing.
+  std::vector<std::string> notPools;
 };
 
 /// The pools that a template's file holds beside it.

@@ -1,9 +1,11 @@
 #include "core/rename.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <unordered_set>
 #include <utility>
 
+#include "core/pools.h"
 #include "core/template_core.h"
 #include "expr/scanner.h"
 #include "expr/semantic_checks.h"
@@ -114,6 +116,21 @@ void ForEachUsingExpression(const TemplateCore& core, const SymbolRecord& used, 
   }
 }
 
+using Replacement = std::string (*)(std::string_view, std::string_view, std::string_view);
+
+/// The pools name symbols too. Those that can not be read stay as they are.
+void RenameInPools(TemplateCore& core, const std::string& oldName, const std::string& newName,
+                   Replacement replace) {
+  PoolsRead read = PoolsOf(core);
+  const std::vector<Pool> former = read.pools;
+  for (Pool& pool : read.pools) {
+    pool.expression = replace(pool.expression, oldName, newName);
+    std::replace(pool.boundary.begin(), pool.boundary.end(), oldName, newName);
+  }
+  std::string failure;
+  if (read.pools != former) SetPools(core, read.pools, failure);
+}
+
 }  // namespace
 
 std::string ReplaceWord(std::string_view text, std::string_view oldWord, std::string_view newWord) {
@@ -201,10 +218,11 @@ bool TemplateCore::Rename(std::string_view oldSymbol, std::string_view newSymbol
     }
     state.flags.modified = true;
     if (rewriting != Rewriting::None) {
-      const auto replace = rewriting == Rewriting::ByLetters ? ReplaceInExpression : ReplaceName;
+      const Replacement replace = rewriting == Rewriting::ByLetters ? ReplaceInExpression : ReplaceName;
       ForEachUsingExpression(*this, *renamed, [replace, &oldName, &newName](CEL_Property& expression) {
         expression.SetText(replace(expression.Text(), oldName, newName));
       });
+      RenameInPools(*this, oldName, newName, replace);
     }
   }
   RebuildSymbolTable();

@@ -82,6 +82,12 @@ const CKvfSectionItem& TemplateCore::KeptTree() const {
   return *state.keptTree;
 }
 
+void TemplateCore::SetKeptText(std::string text) {
+  if (text == state.keptText) return;
+  history.Note(KeptTextEdit{std::exchange(state.keptText, std::move(text))});
+  state.flags.modified = true;
+}
+
 std::size_t TemplateCore::GetExternalFunctionCount() const {
   return state.hasMisc ? state.misc.ExternalFunctions().size() : 0;
 }

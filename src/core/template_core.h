@@ -253,6 +253,9 @@ class TemplateCore final : public ElementOwner {
   bool LoadCopy(const std::string& source, const std::string& path);
   /// What the file of the load holds beside the template, as text; each save writes it after the template.
   const std::string& KeptText() const { return state.keptText; }
+  /// Puts another text in its place, as an edit. The text is that of whole sections, with CRLF line ends and
+  /// no blank lines at its ends.
+  void SetKeptText(std::string text);
   /// What the file of the load holds that the load did not take over; empty after a save.
   const LoadAccount& Account() const { return state.account; }
   /// Counts what another load did not take over from the file that a save will replace.

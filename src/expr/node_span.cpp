@@ -3,8 +3,10 @@
 #include <algorithm>
 #include <cstddef>
 #include <functional>
+#include <optional>
 #include <vector>
 
+#include "expr/expression_shape.h"
 #include "expr/token_spans.h"
 
 namespace tessal {
@@ -47,12 +49,21 @@ struct TokenRange {
     }
   }
 
-  bool TakeInBefore(TokenCode code) {
+  /// Takes in the token before the first one and the brackets that open before it, where it is of this kind.
+  void TakeInBefore(TokenCode code) {
     std::size_t place = first;
     while (place > 0 && Code(place - 1) == TokenCode::LeftBracket) --place;
-    if (place == 0 || Code(place - 1) != code) return false;
-    first = place - 1;
-    return true;
+    if (place > 0 && Code(place - 1) == code) first = place - 1;
+  }
+
+  /// Takes in what comes after the text of the last leaf.
+  void TakeInAfter() {
+    const auto hasNext = [this](TokenCode code) {
+      return last + 1 < tokens.size() && Code(last + 1) == code;
+    };
+    if (hasNext(TokenCode::RightSquare)) ++last;
+    // A call without arguments.
+    if (Code(last) == TokenCode::Identifier && hasNext(TokenCode::LeftBracket)) ++last;
   }
 };
 
@@ -61,6 +72,55 @@ bool IsPartOf(std::string_view part, std::string_view text) {
   const std::less_equal<const char*> isNotAfter;
   return !part.empty() && isNotAfter(text.data(), part.data()) &&
          isNotAfter(part.data() + part.size(), text.data() + text.size());
+}
+
+/// The token with which a node begins, where that is no part of its text.
+TokenCode OwnStart(const ExpressionNode& node, std::string_view text) {
+  switch (node.Kind()) {
+    case NodeKind::Negate:
+      return TokenCode::AddOpMinus;
+    case NodeKind::Conditional:
+      return TokenCode::If;
+    case NodeKind::Property:
+      return TokenCode::LeftSquare;
+    case NodeKind::Exceedance:
+      return TokenCode::ExceedanceFrequency;
+    case NodeKind::Call:
+      return IsPartOf(node.Text(), text) ? TokenCode::End : TokenCode::RvalId;
+    default:
+      return TokenCode::End;
+  }
+}
+
+/// Whether the text of a node comes before its children.
+bool BeginsWithItsText(const ExpressionNode& node, std::string_view text) {
+  switch (node.Kind()) {
+    case NodeKind::Arithmetic:
+    case NodeKind::Comparison:
+      return false;
+    default:
+      return IsPartOf(node.Text(), text);
+  }
+}
+
+/// The starts of a node and of those in it that begin at the same place, from the innermost out.
+std::vector<TokenCode> StartsOf(const ExpressionNode& node, std::string_view text) {
+  std::vector<TokenCode> starts;
+  for (const ExpressionNode* part = &node; part != nullptr;) {
+    // What the grammar has made of AND, OR and NOT has no words of its own.
+    const std::optional<Logic> logic =
+        part->Kind() == NodeKind::Comparison ? LogicOf(*part) : std::optional<Logic>();
+    if (logic) {
+      if (logic->which == Logic::Operator::Not) starts.push_back(TokenCode::NotOp);
+      part = &logic->left;
+      continue;
+    }
+    if (const TokenCode start = OwnStart(*part, text); start != TokenCode::End) starts.push_back(start);
+    if (BeginsWithItsText(*part, text)) break;
+    part = part->Child(1);
+  }
+  std::reverse(starts.begin(), starts.end());
+  return starts;
 }
 
 }  // namespace
@@ -86,12 +146,8 @@ LexemeSpan SpanOf(const ExpressionNode& node, std::string_view text) {
       std::find_if(first, tokens.end(), [end](const TokenSpan& token) { return token.span.start >= end; });
   TokenRange range{tokens, static_cast<std::size_t>(first - tokens.begin()),
                    static_cast<std::size_t>(after - tokens.begin()) - 1};
-  if (node.Kind() == NodeKind::Negate) range.TakeInBefore(TokenCode::AddOpMinus);
-  if (node.Kind() == NodeKind::Conditional) range.TakeInBefore(TokenCode::If);
-  if (node.Kind() == NodeKind::Call && node.ChildCount() == 0 && range.last + 1 < tokens.size() &&
-      tokens[range.last + 1].code == TokenCode::LeftBracket) {
-    ++range.last;
-  }
+  for (const TokenCode start : StartsOf(node, text)) range.TakeInBefore(start);
+  range.TakeInAfter();
   range.Balance();
   const std::uint32_t start = tokens[range.first].span.start;
   return {start, tokens[range.last].End() - start};

@@ -69,8 +69,8 @@ TEST_P(CompletionOfExample, OffersExactlyWhatTheChecksAllow) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Examples, CompletionOfExample,
-                         ::testing::Values("eutrophication", "fasham", "fish_larvae", "lake_management",
-                                           "streeter_phelps"),
+                         ::testing::Values("asm1", "eutrophication", "fasham", "fish_larvae",
+                                           "lake_management", "streeter_phelps"),
                          [](const auto& file) { return std::string(file.param); });
 
 }  // namespace

@@ -19,7 +19,7 @@ TEST_P(Scripts, GiveWhatTheirFileSays) {
 INSTANTIATE_TEST_SUITE_P(Core, Scripts,
                          ::testing::Values("load", "save", "table", "rules", "validation", "editing",
                                            "classes", "rename", "creation", "visibility", "account",
-                                           "comparison", "find", "completion", "examples"),
+                                           "comparison", "pools", "find", "completion", "examples"),
                          [](const auto& file) { return std::string(file.param); });
 
 }  // namespace

@@ -1,4 +1,5 @@
 #include "core/template_script.h"
+#include "core/pools.h"
 
 #include <algorithm>
 #include <charconv>
@@ -552,6 +553,30 @@ std::string TemplateScript::MoveBeforeFirstUser(const std::string& name) {
 }
 
 /// Calls that only ask.
+namespace {
+
+std::string PoolLines(const TemplateCore& core) {
+  const PoolsRead read = PoolsOf(core);
+  std::string lines;
+  for (const Pool& pool : read.pools) {
+    lines += pool.name + " = " + pool.expression + ';';
+    for (const std::string& process : pool.boundary) lines += ' ' + process;
+    lines += pool.description.empty() ? "\n" : " (" + pool.description + ")\n";
+  }
+  for (const std::string& part : read.notPools) lines += "no pool: " + part + '\n';
+  return lines;
+}
+
+/// A name, an expression, and the processes of the boundary.
+std::string AddPool(TemplateCore& core, const std::vector<std::string>& words) {
+  std::vector<Pool> pools = PoolsOf(core).pools;
+  pools.push_back({words.at(0), words.at(1), {words.begin() + 2, words.end()}, {}});
+  std::string failure;
+  return SetPools(core, pools, failure) ? "yes" : failure;
+}
+
+}  // namespace
+
 const std::map<std::string, TemplateScript::Operation>& TemplateScript::Questions() {
   using S = TemplateScript&;
   using W = const Words&;
@@ -600,6 +625,8 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Question
       {"find", [](S s, W w) { return FoundLines(FindTexts(s.core, QueryOf(w, 1)).found); }},
       {"uses", [](S s, W w) { return FoundLines(FindUses(s.core, w.at(0))); }},
       {"preview", [](S s, W w) { return s.Preview(w); }},
+      {"pools", [](S s, W) { return PoolLines(s.core); }},
+      {"beside", [](S s, W) { return s.core.KeptText(); }},
       {"rank", [](S s, W w) { return Ranked(s.core, w.empty() ? "" : w[0]); }},
       {"replace", [](S, W w) { return ReplaceWord(w.at(0), w.at(1), w.at(2)); }},
   };
@@ -632,6 +659,7 @@ const std::map<std::string, TemplateScript::Operation>& TemplateScript::Changes(
       {"apply", [](S s, W w) { return s.Apply(w); }},
       {"set", [](S s, W w) { return s.Set(w.at(0), w.at(1), w.at(2)); }},
       {"reset", [](S s, W w) { return s.Element(w.at(0)).Reset(), ""; }},
+      {"add-pool", [](S s, W w) { return AddPool(s.core, w); }},
       {"refresh-searches", [](S s, W) { return s.core.RefreshSearchFunctionChoices(), ""; }},
       {"add-group", [](S s, W) { return std::to_string(s.core.AddVisibilityGroup()); }},
       {"remove-group", [](S s, W w) { return s.core.RemoveVisibilityGroup(Number(w.at(0))), ""; }},

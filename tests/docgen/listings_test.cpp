@@ -60,7 +60,7 @@ TEST_P(Documentation, IsOneOverview) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Examples, Documentation,
-                         testing::Values("streeter_phelps", "fasham", "eutrophication", "fish_larvae",
+                         testing::Values("streeter_phelps", "fasham", "eutrophication", "asm1", "fish_larvae",
                                          "lake_management", "faults"),
                          [](const auto& example) { return example.param; });
 

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "core/error_registry.h"
+#include "core/pools.h"
 #include "platform/file_replacement.h"
 #include "support/template_content.h"
 
@@ -130,6 +131,15 @@ void ChangeGroups(TemplateCore& core, Choices& choices) {
 }
 
 /// A user's answers to every name that nobody has defined, among them none and one that was not offered.
+void ChangePools(TemplateCore& core, Choices& choices) {
+  std::vector<Pool> pools = PoolsOf(core).pools;
+  if (pools.size() > 2) pools.erase(pools.begin());
+  const std::string name = choices.AnyOf(kNames);
+  pools.push_back({name, name + " + 2*" + name, {choices.AnyOf(kNames)}, "of " + name});
+  std::string failure;
+  SetPools(core, pools, failure);
+}
+
 void AnswerOffers(TemplateCore& core, Choices& choices) {
   while (const auto offer = core.NextOffer()) {
     const int choice = static_cast<int>(choices.Pick(CreationOffer::kChoiceCount + 1)) - 1;
@@ -142,7 +152,7 @@ void AnswerOffers(TemplateCore& core, Choices& choices) {
 }  // namespace
 
 void EditAtRandom(TemplateCore& core, fuzz::Choices& choices) {
-  switch (choices.Pick(11)) {
+  switch (choices.Pick(12)) {
     case 0:
     case 1:
       Add(core, choices);
@@ -179,6 +189,9 @@ void EditAtRandom(TemplateCore& core, fuzz::Choices& choices) {
       AnswerOffers(core, choices);
       break;
     case 9:
+      ChangePools(core, choices);
+      break;
+    case 10:
       core.SetShowAllBuiltIns(choices.Pick(2) == 0);
       break;
     default:

@@ -84,7 +84,7 @@ TEST(Examples, ShowTheirNodesAndFormsAndAreNotChangedByALook) {
   std::string forms;
   std::map<std::string, std::string> controlsSeen;
   for (const std::string name :
-       {"eutrophication", "fasham", "faults", "fish_larvae", "lake_management", "streeter_phelps"}) {
+       {"eutrophication", "fasham", "faults", "fish_larvae", "lake_management", "streeter_phelps", "asm1"}) {
     Editor editor(test::ReadFile(TESSAL_SOURCE_DIR "/examples/" + name + ".tessal"));
     // The names that a template leaves undefined are asked about once, and here with No.
     editor.User().answers = QList<Answer>(std::ssize(editor.Core().UndefinedSymbols()), Answer::No);

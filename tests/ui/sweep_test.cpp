@@ -181,7 +181,7 @@ TEST_P(Sweep, EveryFieldOfEveryFormIsStoredAndComesBackFromTheFile) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Editor, Sweep,
-                         testing::Values("eutrophication", "fasham", "faults", "fish_larvae",
+                         testing::Values("asm1", "eutrophication", "fasham", "faults", "fish_larvae",
                                          "lake_management", "streeter_phelps", "all_kinds"),
                          [](const auto& file) { return file.param; });
 
