@@ -16,9 +16,11 @@
 #include "analysis/unit_check.h"
 #include "analysis/unit_spelling.h"
 #include "analysis/unit_text.h"
+#include "analysis/unit_words.h"
 #include "core/template_core.h"
 #include "elements/choices.h"
 #include "expr/builtin_catalogue.h"
+#include "platform/ascii.h"
 #include "text_table.h"
 
 namespace {
@@ -97,6 +99,21 @@ bool Agrees(const System& system, const PeerUnit& peer, const std::optional<Unit
   return std::abs(factor - 1) < kTolerance;
 }
 
+/// Where our tables or our arithmetic make the difference.
+std::string ReasonOf(const std::string& text, const std::optional<Unit>& ours, bool peerReads) {
+  if (ours && !ours->substances.empty()) return "a substance, " + SubstanceText(*ours);
+  for (std::size_t start = 0; start < text.size();) {
+    std::size_t end = start;
+    while (end < text.size() && IsAsciiLetter(text[end])) ++end;
+    const UnitWord* row = UnitWordOf(std::string_view(text).substr(start, end - start));
+    if (row != nullptr && !row->reason.empty()) return std::string(row->reason);
+    if (row != nullptr) return "a spelling of the table";
+    start = end + 1;
+  }
+  if (!ours) return "no unit to us";
+  return peerReads ? "arithmetic, or words that belong together" : "a way of writing";
+}
+
 int Run() {
   ut_set_error_message_handler(ut_ignore);
   const System system(ut_read_xml(nullptr));
@@ -109,8 +126,10 @@ int Run() {
   AddCatalogues(texts);
   AddCases(texts);
   std::size_t agreed = 0;
-  constexpr std::size_t kTextWidth = 24;
-  const bench::TextTable table(kTextWidth, {"               ours", "            UDUNITS", "substance"});
+  constexpr std::size_t kTextWidth = 22;
+  constexpr std::size_t kReadingWidth = 26;
+  const bench::TextTable table(kTextWidth, {std::string(kReadingWidth, ' ') + "ours",
+                                            std::string(kReadingWidth, ' ') + "UDUNITS", "why"});
   for (const std::string& text : texts.All()) {
     const PeerUnit peer(ut_parse(system.get(), text.c_str(), UT_UTF8));
     const std::optional<Unit> ours = ReadUnitText(text);
@@ -119,7 +138,7 @@ int Run() {
       continue;
     }
     table.PrintRow({text, ours ? InBaseUnits(*ours) : "not read", PeerText(peer.get()),
-                    ours ? SubstanceText(*ours) : ""});
+                    ReasonOf(text, ours, peer != nullptr)});
   }
   std::cout << agreed << " of " << texts.All().size() << " texts are read alike\n";
   return 0;

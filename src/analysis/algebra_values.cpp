@@ -149,9 +149,10 @@ double PointValues::ValueOfCall(const Atom& call) {
   std::vector<double> arguments;
   for (const ProductSum& part : call.parts) arguments.push_back(ValueOf(part));
   const std::string name = call.text.substr(0, call.text.find('('));
-  if (kind == PointKind::Defaults) {
+  if (kind == PointKind::Defaults || kind == PointKind::Random) {
     double value = kNoValue;
-    return EvaluateFunction(name, arguments, value) == 1 ? value : kNoValue;
+    if (EvaluateFunction(name, arguments, value) == 1) return value;
+    if (kind == PointKind::Defaults) return kNoValue;
   }
   std::uint64_t subject = std::hash<std::string>()(UpperCase(name));
   for (const double argument : arguments) {

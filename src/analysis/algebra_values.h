@@ -1,6 +1,6 @@
 // Values of sums at a point: every symbol that declares a value has one, auxiliaries and processes have that
-// of their expressions. At a random point a function that is not evaluated is an unknown with one value for
-// each list of arguments, and so is, if asked for, the outcome of a comparison.
+// of their expressions. At a random point a function that can not be computed is an unknown with one value
+// for each list of arguments; so are, if asked for, all functions, and the outcome of each comparison.
 #pragma once
 
 #include <cstdint>
@@ -14,9 +14,10 @@ namespace tessal {
 
 /// Where values are taken.
 enum class PointKind : std::uint8_t {
-  Defaults,     ///< the declared values; functions are computed
-  Random,       ///< values about the declared ones; comparisons hold or not as the values say
-  RandomTruths  ///< the same, and each comparison holds or not at random
+  Defaults,         ///< the declared values; what can not be computed has none
+  Random,           ///< values about the declared ones
+  RandomFunctions,  ///< the same, and all functions are unknowns
+  RandomTruths      ///< the same, and each comparison holds or not at random
 };
 
 class PointValues final {

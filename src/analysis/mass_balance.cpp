@@ -24,7 +24,13 @@ constexpr double kTolerance = 1e-9;
 constexpr int kMostLevels = 20;
 
 /// Whether a sum is zero whatever the values of its symbols.
-enum class Vanishes : std::uint8_t { Always, Never, Sometimes, Unknown };
+enum class Vanishes : std::uint8_t {
+  Always,
+  Never,
+  ByFunctions,   ///< only as its functions are computed
+  ByConditions,  ///< only as its comparisons come out
+  Unknown
+};
 
 /// Judges one pool.
 class PoolJudging final {
@@ -87,8 +93,9 @@ class PoolJudging final {
 
   /// The pool's expression, with auxiliaries that are made of state variables written out.
   std::optional<ProductSum> Amount() {
-    if (pool.expression.find_first_not_of(" \t\n") == std::string::npos)
+    if (pool.expression.find_first_not_of(" \t\r\n") == std::string::npos) {
       return CanNot("it has no expression");
+    }
     const ScannerRest rest;
     const auto parsed = ParseExpression(pool.expression);
     if (parsed->Tree() == nullptr) {
@@ -222,8 +229,11 @@ class PoolJudging final {
         balance.verdict = PoolVerdict::Open;
         FindLeaks(rate);
         return;
-      case Vanishes::Sometimes:
-        CanNot("it is closed or not as conditions hold: " + FirstConditional(rate));
+      case Vanishes::ByFunctions:
+        CanNot("it is closed at the values that were tried, but not by algebra: " + FirstText(rate, "("));
+        return;
+      case Vanishes::ByConditions:
+        CanNot("it is closed or not as conditions hold: " + FirstText(rate, "IF"));
         return;
       case Vanishes::Unknown:
         CanNot("a value is not finite: a division by zero, or an expression that can not be expanded");
@@ -231,13 +241,16 @@ class PoolJudging final {
   }
 
   /// Judges by values. A counter-example by the values themselves makes a pool open; one that supposes
-  /// outcomes of comparisons that may exclude each other does not.
+  /// functions that are other than they are, or outcomes of comparisons that may exclude each other, does
+  /// not.
   Vanishes AtPoints(const ProductSum& sum) {
     const Counts byValues = CountPoints(sum, PointKind::Random);
     if (byValues.nonZero > 0) return Vanishes::Never;
+    const Counts byFunctions = CountPoints(sum, PointKind::RandomFunctions);
+    if (byFunctions.nonZero > 0) return Vanishes::ByFunctions;
     const Counts byTruths = CountPoints(sum, PointKind::RandomTruths);
-    if (byTruths.nonZero > 0) return Vanishes::Sometimes;
-    return byValues.zero + byTruths.zero > 0 ? Vanishes::Always : Vanishes::Unknown;
+    if (byTruths.nonZero > 0) return Vanishes::ByConditions;
+    return byFunctions.zero + byTruths.zero > 0 ? Vanishes::Always : Vanishes::Unknown;
   }
 
   struct Counts {
@@ -258,17 +271,18 @@ class PoolJudging final {
     return counts;
   }
 
-  std::string FirstConditional(const ProductSum& rate) {
+  /// The first part of a sum whose text holds a mark, with the expression behind its name.
+  std::string FirstText(const ProductSum& rate, std::string_view mark) {
     for (const Product& product : rate) {
       for (const AtomPower& each : product.atoms) {
         const Atom& atom = algebra.At(each.atom);
-        if (atom.kind == Atom::Kind::Conditional) return atom.text;
+        if (atom.text.find(mark) != std::string::npos) return atom.text;
         if (atom.record == nullptr || atom.record->expression == nullptr) continue;
         const std::string_view text = ExpressionOf(*atom.record).text;
-        if (text.find("IF") != std::string_view::npos) return atom.text + " = " + std::string(text);
+        if (text.find(mark) != std::string_view::npos) return atom.text + " = " + std::string(text);
       }
     }
-    return "IF";
+    return algebra.Text(rate);
   }
 
   /// The processes whose own contributions do not cancel: each is written out, and what is left of the sum

@@ -43,7 +43,16 @@ struct Database {
   std::string failure;
 };
 
+/// UDUNITS does not survive an allocation that fails while it reads its database, so what it takes, about
+/// half a megabyte, is asked for beforehand. Raises `std::bad_alloc`.
+void RequireMemory() {
+  constexpr std::size_t kAmple = std::size_t{2} << 20U;
+  const auto reserve = std::make_unique<volatile char[]>(kAmple);
+  reserve[0] = 0;
+}
+
 Database ReadDatabase() {
+  RequireMemory();
   ut_set_error_message_handler(ut_ignore);
   const PlainLocale plain;
   Database database;

@@ -148,11 +148,11 @@ class UnitInference::Walk final {
       const bool isFirst = parent->Child(1) == node;
       node = isFirst && parent->ChildCount() > 1 ? FirstLeaf(parent->Child(2)) : parent;
     }
-    return items.empty() ? ExpressionUnit() : std::move(items.back().front());
+    return stack.empty() ? ExpressionUnit() : std::move(stack.front());
   }
 
  private:
-  using Values = std::vector<ExpressionUnit>;
+  using Values = std::span<const ExpressionUnit>;
 
   static const ExpressionNode* FirstLeaf(const ExpressionNode* node) {
     while (node->ChildCount() > 0) node = node->Child(1);
@@ -160,16 +160,20 @@ class UnitInference::Walk final {
   }
 
   void Visit(const ExpressionNode& node) {
-    Values values = TakeChildren(node);
+    std::size_t count = 0;
+    for (std::int32_t child = 0; child < node.ChildCount(); ++child) {
+      count += counts.back();
+      counts.pop_back();
+    }
     if (LeavesItems(node)) {
-      items.push_back(std::move(values));
+      counts.push_back(count);
       return;
     }
-    ExpressionUnit value = ValueOf(node, values);
+    ExpressionUnit value = ValueOf(node, Values(stack).last(count));
     value.node = &node;
-    Values one;
-    one.push_back(std::move(value));
-    items.push_back(std::move(one));
+    stack.resize(stack.size() - count);
+    stack.push_back(std::move(value));
+    counts.push_back(1);
   }
 
   /// Whether the node above wants the items, not what becomes of them.
@@ -181,20 +185,7 @@ class UnitInference::Walk final {
 
   static bool IsIfNode(const ExpressionNode& node) { return node.Text() == "IF"; }
 
-  /// The items of the children, in their order; appended to those of the first, so that a long chain is
-  /// copied once.
-  Values TakeChildren(const ExpressionNode& node) {
-    if (node.ChildCount() == 0) return {};
-    Values last = std::move(items.back());
-    items.pop_back();
-    if (node.ChildCount() == 1) return last;
-    Values values = std::move(items.back());
-    items.pop_back();
-    std::move(last.begin(), last.end(), std::back_inserter(values));
-    return values;
-  }
-
-  ExpressionUnit ValueOf(const ExpressionNode& node, Values& values) {
+  ExpressionUnit ValueOf(const ExpressionNode& node, Values values) {
     switch (node.Kind()) {
       case NodeKind::Identifier:
         return OfName(node.Text());
@@ -258,7 +249,7 @@ class UnitInference::Walk final {
     std::size_t size = 1;
   };
 
-  static std::vector<Group> GroupsOf(const Values& terms) {
+  static std::vector<Group> GroupsOf(Values terms) {
     std::vector<Group> groups;
     for (const ExpressionUnit& term : terms) {
       if (!term.IsCertain()) continue;
@@ -276,7 +267,7 @@ class UnitInference::Walk final {
   }
 
   /// The unit that most terms have. Where no unit has more than the others, it is unknown which is meant.
-  ExpressionUnit OfSum(const ExpressionNode& node, const Values& terms) {
+  ExpressionUnit OfSum(const ExpressionNode& node, Values terms) {
     const std::vector<Group> groups = GroupsOf(terms);
     if (groups.empty()) return OfGuesses(node, terms);
     const auto most =
@@ -301,8 +292,7 @@ class UnitInference::Walk final {
   }
 
   /// The term of a group that is the last before another term, or the first after it.
-  static const ExpressionUnit& NearestOf(const Group& group, const ExpressionUnit& other,
-                                         const Values& terms) {
+  static const ExpressionUnit& NearestOf(const Group& group, const ExpressionUnit& other, Values terms) {
     const ExpressionUnit* nearest = nullptr;
     for (const ExpressionUnit& term : terms) {
       if (&term == &other && nearest != nullptr) break;
@@ -315,7 +305,7 @@ class UnitInference::Walk final {
   }
 
   /// The unit of a sum none of whose terms has a certain one.
-  static ExpressionUnit OfGuesses(const ExpressionNode& node, const Values& terms) {
+  static ExpressionUnit OfGuesses(const ExpressionNode& node, Values terms) {
     const ExpressionUnit* guess = nullptr;
     for (const ExpressionUnit& term : terms) {
       if (IsUnknown(term)) return {};
@@ -333,12 +323,12 @@ class UnitInference::Walk final {
     return left.IsCertain() && right.IsCertain() && !AreSame(left.unit, right.unit);
   }
 
-  void Compare(const ExpressionNode& node, const Values& sides) {
+  void Compare(const ExpressionNode& node, Values sides) {
     if (sides.size() != 2 || !Clash(sides[0], sides[1])) return;
     Add({UnitClash::Kind::Comparison, SpanOf(node, text), ShownUnit(sides[0]), ShownUnit(sides[1])});
   }
 
-  ExpressionUnit OfBranches(const ExpressionNode& node, const Values& parts) {
+  ExpressionUnit OfBranches(const ExpressionNode& node, Values parts) {
     const ExpressionUnit& then = parts[1];
     const ExpressionUnit& otherwise = parts[2];
     if (Clash(then, otherwise)) {
@@ -369,7 +359,7 @@ class UnitInference::Walk final {
     return KnownValue(std::move(*unit));
   }
 
-  ExpressionUnit OfCall(const ExpressionNode& node, const Values& arguments) {
+  ExpressionUnit OfCall(const ExpressionNode& node, Values arguments) {
     const FunctionReference* function = inference.Function(node.Text());
     if (function == nullptr || function->arguments.size() != arguments.size()) return {};
     for (std::size_t place = 0; place < arguments.size(); ++place) {
@@ -387,7 +377,7 @@ class UnitInference::Walk final {
 
   /// The unit that an argument stands for: its own, or that of another one that has the same.
   static const ExpressionUnit& Standing(const FunctionReference& function, std::size_t place,
-                                        const Values& arguments) {
+                                        Values arguments) {
     if (!IsNumberValue(arguments[place])) return arguments[place];
     for (std::size_t other = 0; other < arguments.size(); ++other) {
       const std::optional<UnitRule> rule = RuleOfUnit(function, function.arguments[other].unit);
@@ -401,7 +391,7 @@ class UnitInference::Walk final {
 
   /// The unit of an argument to the power that a rule says.
   static ExpressionUnit RaisedArgument(const FunctionReference& function, const UnitRule& rule,
-                                       const Values& arguments) {
+                                       Values arguments) {
     const ExpressionUnit& base = Standing(function, rule.argument, arguments);
     if (IsUnknown(base)) return {};
     std::optional<double> power = rule.power;
@@ -430,7 +420,7 @@ class UnitInference::Walk final {
   }
 
   /// "POW(1.08, temp - 20)" is a plain number; what "POW(10, 2.3 - 0.1*x)" is, the fit alone says.
-  static ExpressionUnit OfNumberToPower(const Values& arguments, const UnitRule& rule) {
+  static ExpressionUnit OfNumberToPower(Values arguments, const UnitRule& rule) {
     if (!rule.powerArgument) return NumberValue(std::nullopt);
     const ExpressionUnit& exponent = arguments[*rule.powerArgument];
     if (exponent.kind != ExpressionUnit::Kind::Known) return NumberValue(std::nullopt);
@@ -439,7 +429,7 @@ class UnitInference::Walk final {
     return value;
   }
 
-  void CheckArgument(const FunctionReference& function, std::size_t place, const Values& arguments) {
+  void CheckArgument(const FunctionReference& function, std::size_t place, Values arguments) {
     const ExpressionUnit& value = arguments[place];
     const ArgumentReference& argument = function.arguments[place];
     if (!value.IsCertain()) return;
@@ -486,7 +476,8 @@ class UnitInference::Walk final {
   UnitInference& inference;
   std::string_view text;
   std::vector<UnitClash>& clashes;
-  std::vector<Values> items;
+  std::vector<ExpressionUnit> stack;
+  std::vector<std::size_t> counts;  ///< of the items that each node has left
 };
 
 UnitInference::UnitInference(const TemplateCore& core, Substances meaning)

@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "platform/ascii.h"
 #include "platform/number_text.h"
 
 namespace tessal {
@@ -79,7 +80,10 @@ void AddAmount(ProductText& text, std::string_view symbol, const Unit& unit, dou
   for (const SubstancePower& entry : unit.substances) {
     const std::string exponent = PowerText(std::abs(entry.power));
     // The power is at both words: "mmol2 N2".
-    const std::string name = std::string(symbol) + exponent + " " + std::string(entry.substance) + exponent;
+    const bool endsInDigit =
+        IsAsciiDigit(entry.substance.back()) && !exponent.empty() && exponent.front() != '^';
+    const std::string name = std::string(symbol) + exponent + " " + std::string(entry.substance) +
+                             (endsInDigit ? "^" : "") + exponent;
     text.Add(name, entry.power > 0 ? 1 : -1);
   }
 }
@@ -204,6 +208,9 @@ std::string AsModellersWrite(const Unit& unit) {
   const bool isExact = FindChoice(rest, choice);
   ProductText text;
   if (derived != nullptr) text.Add(derived->symbol, derivedPower);
+  // Before the amounts, as "Chl A" is a substance.
+  text.Add("A", rest.Power(BaseUnit::Ampere));
+  text.Add("cd", rest.Power(BaseUnit::Candela));
   const double mass = rest.Power(BaseUnit::Kilogram);
   const double moles = rest.Power(BaseUnit::Mole);
   if (!IsNear(moles, 0)) AddAmount(text, choice.moles->symbol, rest, moles);
@@ -211,8 +218,6 @@ std::string AsModellersWrite(const Unit& unit) {
   if (IsNear(moles, 0) || !IsNear(mass, 0)) {
     AddAmount(text, IsNear(mass, 0) ? "g" : choice.mass->symbol, rest, mass);
   }
-  text.Add("A", rest.Power(BaseUnit::Ampere));
-  text.Add("cd", rest.Power(BaseUnit::Candela));
   text.Add(choice.length->symbol, rest.Power(BaseUnit::Metre));
   text.Add("degC", rest.Power(BaseUnit::Kelvin));
   text.Add(choice.time->symbol, rest.Power(BaseUnit::Second));

@@ -149,7 +149,7 @@ class UnitScanner final {
     if (At(at) == '/' && IsDigitAt(at + 1)) {
       ++at;
       const std::optional<double> divisor = NumberIn(Digits(at));
-      if (!divisor || *divisor == 0) return false;
+      if (!divisor || *divisor <= 0 || *divisor > kLargestPower) return false;
       *power /= *divisor;
     }
     if (inBrackets && At(at++) != ')') return false;
@@ -194,8 +194,8 @@ class UnitProduct final {
     }
     if (!open.empty() || !hasFactor || isAfterSign) return std::nullopt;
     CloseAmount();
-    // No quantity has a factor that a number can not hold.
-    constexpr double kLargestLogFactor = 700;
+    // No quantity has such a factor, and a number holds what is written of it.
+    constexpr double kLargestLogFactor = 150;
     if (std::abs(product.logFactor) > kLargestLogFactor) return std::nullopt;
     return product;
   }

@@ -29,7 +29,8 @@ Unit RaisedTo(const Unit& unit, double power) {
 }
 
 bool IsNear(double left, double right) {
-  constexpr double kTolerance = 1e-6;
+  // Texts of units have six digits.
+  constexpr double kTolerance = 1e-4;
   return std::abs(left - right) < kTolerance;
 }
 

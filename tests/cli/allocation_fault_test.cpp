@@ -71,6 +71,8 @@ constexpr Row kRows[] = {
     {"Html", "html FILE", kOpen, false, 11},
     {"Json", "check FILE --format json", kOpen, true, 11, 1},
     {"Tree", "tree FILE", kOpen, true, 1},
+    {"Lint", "lint FILE --format gitlab", kOpen, true, 31, 1},
+    {"Graph", "graph FILE --kinds all --format json", kOpen, false, 31},
     {"Describe", "functions --describe --format json", kMain, false, 101},
     {"Help", "--help", kMain, true, 11},
 };
