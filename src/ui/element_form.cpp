@@ -242,7 +242,7 @@ QWidget* CElementForm::MakeUnit(const FormField& field, Control& control) {
   QLineEdit* line = MakeLine(field, cell);
   unitNote = MakeChild<CUnitNote>(cell);
   parts->addWidget(line, 1);
-  parts->addWidget(unitNote, 1);
+  parts->addWidget(unitNote);
   control.editor = line;
   return cell;
 }

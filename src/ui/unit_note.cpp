@@ -19,8 +19,8 @@ CUnitNote::CUnitNote(QWidget* parent)
   parts->setContentsMargins(0, 0, 0, 0);
   parts->addWidget(icon);
   parts->addWidget(text, 1);
-  // As wide as there is room: the field keeps its own.
-  text->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+  // As wide as its text where there is room, and shorter in a narrow form.
+  text->setMinimumWidth(1);
   hide();
 }
 
