@@ -100,14 +100,9 @@ void ShowChoiceTip(QComboBox& combo, const FormField& field) {
 
 CElementForm::CElementForm(FormTable fields, const FormContext& context, QWidget* parent)
     : CRightPaneBase(context, parent), layout(MakeChild<QGridLayout>(this)) {
+  hasExpression = std::any_of(fields.begin(), fields.end(),
+                              [](const FormField& field) { return field.editor == FieldEditor::Expression; });
   for (const FormField& field : fields) AddField(field);
-  const auto isUnit = [](const Control& control) { return control.field->label == kUnitLabel; };
-  const auto isExpression = [](const Control& control) {
-    return control.field->editor == FieldEditor::Expression;
-  };
-  const auto unit = std::find_if(controls.begin(), controls.end(), isUnit);
-  if (unit != controls.end() && std::any_of(controls.begin(), controls.end(), isExpression))
-    AddUnitNote(*unit);
   LabelFields();
   LayOut();
 }
@@ -158,6 +153,7 @@ QWidget* CElementForm::MakeEditor(const FormField& field, Control& control) {
     case FieldEditor::ReferencedIn:
       return control.editor = MakeReferences();
     default:
+      if (hasExpression && field.label == kUnitLabel) return MakeUnit(field, control);
       return control.editor = MakeLine(field, this);
   }
 }
@@ -239,14 +235,16 @@ QWidget* CElementForm::MakeExpression(const FormField& field, Control& control) 
   return cell;
 }
 
-void CElementForm::AddUnitNote(Control& control) {
+QWidget* CElementForm::MakeUnit(const FormField& field, Control& control) {
   auto* cell = MakeChild<QWidget>(this);
   auto* parts = MakeChild<QHBoxLayout>(cell);
   parts->setContentsMargins(0, 0, 0, 0);
+  QLineEdit* line = MakeLine(field, cell);
   unitNote = MakeChild<CUnitNote>(cell);
-  parts->addWidget(control.cell, 1);
+  parts->addWidget(line, 1);
   parts->addWidget(unitNote, 1);
-  control.cell = cell;
+  control.editor = line;
+  return cell;
 }
 
 void CElementForm::ShowUnitNote() {

@@ -137,8 +137,8 @@ class CElementForm : public CRightPaneBase {
   QWidget* MakeReferences();
   QWidget* MakeDocumentation(const FormField& field, Control& control);
   QWidget* MakeExpression(const FormField& field, Control& control);
-  /// Puts what the expression says of the unit beside the field of the unit.
-  void AddUnitNote(Control& control);
+  /// The field of a unit, with what the expression says of it beside it.
+  QWidget* MakeUnit(const FormField& field, Control& control);
   void ShowUnitNote();
 
   void Show(Control& control, CEL_Element& element);
@@ -157,6 +157,7 @@ class CElementForm : public CRightPaneBase {
   QGridLayout* layout;
   QSplitter* split = nullptr;     ///< of a form with more than one expression
   QGroupBox* overview = nullptr;  ///< of a form with counts
+  bool hasExpression = false;
   CUnitNote* unitNote = nullptr;  ///< of a form with a unit and an expression
   int columns = 0;
   int narrowWidth = 0;  ///< what one column needs

@@ -51,7 +51,6 @@ std::vector<ElementKind> AllGraphKinds() {
 }
 
 QString RelationText(int level) {
-  if (level == 0) return strings::kThisElement;
   const int count = std::abs(level);
   const QString& one = level < 0 ? strings::kInfluencesThis : strings::kInfluencedByThis;
   const QString& several = level < 0 ? strings::kInfluencesInSteps : strings::kInfluencedInSteps;
@@ -131,33 +130,47 @@ void CInfluencePage::Refresh() {
   const GraphQuery query = Query();
   // Without an element it would be the graph of the whole template, which nobody has asked for.
   graph = IsElement(query.focus) ? BuildGraph(document.Core(), query) : DependencyGraph();
+  FindMutual();
   ShowState(drawing->Draw(graph));
   ShowList();
 }
 
+void CInfluencePage::FindMutual() {
+  mutual.assign(graph.nodes.size(), false);
+  for (const GraphEdge& edge : graph.edges) {
+    if (graph.nodes[edge.source].level == 0 && graph.nodes[edge.target].level == -1)
+      mutual[edge.target] = true;
+  }
+}
+
 void CInfluencePage::ShowState(std::size_t leftOut) {
-  const auto count = [this](auto isCounted) {
-    return std::count_if(graph.nodes.begin(), graph.nodes.end(),
-                         [&isCounted](const GraphNode& node) { return isCounted(node.level); });
-  };
-  const auto focus = std::find_if(graph.nodes.begin(), graph.nodes.end(),
-                                  [](const GraphNode& node) { return node.level == 0; });
-  if (focus == graph.nodes.end()) {
+  const GraphNode* focus = nullptr;
+  int above = 0;
+  int below = 0;
+  for (std::size_t place = 0; place < graph.nodes.size(); ++place) {
+    const GraphNode& node = graph.nodes[place];
+    if (node.level == 0) focus = &node;
+    if (node.level < 0) ++above;
+    if (node.level > 0 || mutual[place]) ++below;
+  }
+  if (focus == nullptr) {
     state->setText(strings::kNoElement);
     return;
   }
-  const QString text = strings::kInfluencesOf.arg(
-      ToScreen(focus->symbol), QString::number(count([](int level) { return level < 0; })),
-      QString::number(count([](int level) { return level > 0; })));
+  const QString text =
+      strings::kInfluencesOf.arg(ToScreen(focus->symbol), QString::number(above), QString::number(below));
   state->setText(leftOut == 0 ? text : text + QStringLiteral(". ") + strings::kNotDrawn.arg(leftOut));
 }
 
-std::string CInfluencePage::ListText(const GraphNode& node, int column) const {
+std::string CInfluencePage::ListText(std::size_t place, int column) const {
+  const GraphNode& node = graph.nodes[place];
   switch (column) {
     case Element:
       return node.symbol;
     case Relation:
-      return RelationText(node.level).toStdString();
+      if (node.level == 0) return strings::kThisElement.toStdString();
+      return (RelationText(node.level) + (mutual[place] ? QStringLiteral(", ") + RelationText(1) : QString()))
+          .toStdString();
     case Unit:
       return node.unit;
     default:
@@ -179,7 +192,7 @@ void CInfluencePage::ShowList() {
   list->Fill(
       {strings::kElementColumn, strings::kRelationColumn, strings::kUnitColumn, strings::kDescriptionColumn},
       std::move(rows), [this](const CRowModel::Row& row, int column) {
-        return ListText(graph.nodes[static_cast<std::size_t>(row.key)], column);
+        return ListText(static_cast<std::size_t>(row.key), column);
       });
 }
 

@@ -4,6 +4,7 @@
 
 #include <functional>
 #include <string>
+#include <vector>
 
 #include "analysis/dependency_graph.h"
 #include "ui/analysis_page.h"
@@ -33,9 +34,10 @@ class CInfluencePage final : public CAnalysisPage {
 
  private:
   GraphQuery Query() const;
+  void FindMutual();
   void ShowList();
   void ShowState(std::size_t leftOut);
-  std::string ListText(const GraphNode& node, int column) const;
+  std::string ListText(std::size_t place, int column) const;
 
   const CTessalDoc& document;
   std::function<Uid()> selected;
@@ -46,6 +48,9 @@ class CInfluencePage final : public CAnalysisPage {
   CInfluenceView* drawing;
   CRowTable* list;
   DependencyGraph graph;
+  /// By node: it influences the element in one step and is influenced by it in turn. Such a node has one
+  /// place in the drawing, that of what influences.
+  std::vector<bool> mutual;
 };
 
 }  // namespace tessal
