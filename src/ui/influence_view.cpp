@@ -47,6 +47,8 @@ QColor LineColour(const QPalette& palette) {
 CInfluenceView::CInfluenceView(QWidget* parent) : QGraphicsView(parent) {
   setScene(MakeChild<QGraphicsScene>(this));
   setAccessibleName(strings::kInfluenceDrawing);
+  // A reader meets the part within the frame.
+  viewport()->setAccessibleName(strings::kInfluenceDrawing);
   setRenderHint(QPainter::Antialiasing);
   setFocusPolicy(Qt::StrongFocus);
   setBackgroundRole(QPalette::Base);
@@ -180,7 +182,7 @@ void CInfluenceView::Redraw() {
 void CInfluenceView::SetCurrent(std::size_t box) {
   current = box;
   ensureVisible(boxes[current].place);
-  setAccessibleDescription(ToScreen(boxes[current].node.symbol));
+  viewport()->setAccessibleDescription(ToScreen(boxes[current].node.symbol));
   viewport()->update();
 }
 
