@@ -5,6 +5,8 @@
 #include <string>
 #include <vector>
 
+#include "analysis/dependency_graph.h"
+#include "analysis/lint.h"
 #include "analysis/mass_balance.h"
 #include "analysis/process_matrix.h"
 #include "analysis/unit_check.h"
@@ -55,11 +57,30 @@ void Units(benchmark::State& state) {
   Run(state, [](const TemplateCore& core) { return CheckUnits(core, Substances::Ignored).findings.size(); });
 }
 
+void LintAll(benchmark::State& state) {
+  Run(state, [](const TemplateCore& core) { return Lint(core).size(); });
+}
+
+void UsualGraph(benchmark::State& state) {
+  Run(state,
+      [](const TemplateCore& core) { return BuildGraph(core, {.kinds = UsualGraphKinds()}).edges.size(); });
+}
+
+/// Everything between state variables is bridged.
+void GraphOfStates(benchmark::State& state) {
+  Run(state, [](const TemplateCore& core) {
+    return BuildGraph(core, {.kinds = {ElementKind::StateVariable}}).edges.size();
+  });
+}
+
 // clang-format off
 BENCHMARK(Matrix)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 BENCHMARK(ElementaryMatrix)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 BENCHMARK(Balance)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
 BENCHMARK(Units)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
+BENCHMARK(LintAll)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
+BENCHMARK(UsualGraph)->RangeMultiplier(10)->Range(100, 100'000)->Unit(benchmark::kMillisecond)->Complexity();
+BENCHMARK(GraphOfStates)->RangeMultiplier(10)->Range(100, 10'000)->Unit(benchmark::kMillisecond)->Complexity();
 // clang-format on
 
 }  // namespace

@@ -271,7 +271,7 @@ class PoolJudging final {
     return counts;
   }
 
-  /// The first part of a sum whose text holds a mark, with the expression behind its name.
+  /// The first part of a sum whose text holds a mark, with the expression after its name.
   std::string FirstText(const ProductSum& rate, std::string_view mark) {
     for (const Product& product : rate) {
       for (const AtomPower& each : product.atoms) {
@@ -286,7 +286,7 @@ class PoolJudging final {
   }
 
   /// The processes whose own contributions do not cancel: each is written out, and what is left of the sum
-  /// tells which of them it comes from.
+  /// says which of them it comes from.
   void FindLeaks(const ProductSum& rate) {
     const FlowForm form = FlowFormOf(algebra, rate);
     std::map<AtomId, ProductSum> parts;

@@ -22,7 +22,7 @@ enum class PoolVerdict : std::uint8_t { Closed, Open, Unknown };
 /// A process whose gains and losses of a pool do not cancel.
 struct PoolLeak {
   Uid uid = Uid::None;
-  std::string process;  ///< its symbol; empty for what no process stands for
+  std::string process;  ///< its symbol; empty for what is of no process
   std::string net;      ///< what one unit of the process adds to the pool, as an expression
   double value;         ///< the same at the default values
 };

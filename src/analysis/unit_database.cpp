@@ -1,6 +1,5 @@
 #include "analysis/unit_database.h"
 
-#include <locale.h>
 #include <udunits2.h>
 #include <clocale>
 #include <cmath>

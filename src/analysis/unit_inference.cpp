@@ -375,7 +375,7 @@ class UnitInference::Walk final {
     return value;
   }
 
-  /// The unit that an argument stands for: its own, or that of another one that has the same.
+  /// The unit that an argument has: its own, or that of another one that has the same.
   static const ExpressionUnit& Standing(const FunctionReference& function, std::size_t place,
                                         Values arguments) {
     if (!IsNumberValue(arguments[place])) return arguments[place];

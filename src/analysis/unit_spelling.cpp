@@ -82,8 +82,8 @@ void AddAmount(ProductText& text, std::string_view symbol, const Unit& unit, dou
     // The power is at both words: "mmol2 N2".
     const bool endsInDigit =
         IsAsciiDigit(entry.substance.back()) && !exponent.empty() && exponent.front() != '^';
-    const std::string name = std::string(symbol) + exponent + " " + std::string(entry.substance) +
-                             (endsInDigit ? "^" : "") + exponent;
+    std::string name(symbol);
+    name.append(exponent).append(" ").append(entry.substance).append(endsInDigit ? "^" : "").append(exponent);
     text.Add(name, entry.power > 0 ? 1 : -1);
   }
 }
