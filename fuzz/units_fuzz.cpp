@@ -33,9 +33,9 @@ bool HasLargePower(const Unit& unit) {
   return false;
 }
 
-/// Texts have six digits.
+/// Texts have six digits, in the powers of days too.
 bool IsAbout(double left, double right) {
-  constexpr double kTolerance = 1e-4;
+  constexpr double kTolerance = 2e-3;
   return std::abs(left - right) < kTolerance;
 }
 
