@@ -21,7 +21,7 @@ using fuzz::Require;
 
 std::string TakeLine(std::string_view& rest) {
   const std::size_t end = rest.find('\n');
-  const std::string line(rest.substr(0, end));
+  std::string line(rest.substr(0, end));
   rest = end == std::string_view::npos ? std::string_view() : rest.substr(end + 1);
   return line;
 }

@@ -1,5 +1,6 @@
 #include "analysis/default_values.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <limits>
@@ -102,8 +103,9 @@ NodeValues DefaultValues::Evaluate(const ExpressionNode& tree) const {
     if (distance >= values.values.size()) values.values.resize(distance + 1, kUnknown);
     return true;
   });
-  for (auto node = downwards.rbegin(); node != downwards.rend(); ++node) {
-    values.values[static_cast<std::size_t>(&tree - *node)] = Known(Compute(**node, values));
+  std::reverse(downwards.begin(), downwards.end());
+  for (const ExpressionNode* node : downwards) {
+    values.values[static_cast<std::size_t>(&tree - node)] = Known(Compute(*node, values));
   }
   return values;
 }

@@ -33,8 +33,9 @@ class UseGraph final {
       const SymbolRecord& record = *elements[place];
       const bool isFocus = query.focus != Uid::None && record.uid == query.focus;
       if (isFocus) focus = place;
-      isShown[place] =
-          isFocus || std::find(query.kinds.begin(), query.kinds.end(), record.kind) != query.kinds.end();
+      const bool isWanted =
+          std::find(query.kinds.begin(), query.kinds.end(), record.kind) != query.kinds.end();
+      isShown[place] = isFocus || isWanted ? 1 : 0;
     }
   }
 

@@ -60,18 +60,16 @@ void Flows::Compose(AtomId first) {
   std::vector<AtomId> open{first};
   while (!open.empty()) {
     const AtomId flow = open.back();
-    const ProductSum itself{{1, {{flow, 1}}}};
     if (looked.erase(flow) > 0) {
       ProductSum parts = Replaced(*algebra.BodyOf(*algebra.At(flow).record));
       // One that is made of itself, too, is elementary.
-      const bool isCircle = FlowFormOf(algebra, parts).factors.contains(flow);
-      made[flow] = isCircle ? itself : std::move(parts);
+      if (!FlowFormOf(algebra, parts).factors.contains(flow)) made[flow] = std::move(parts);
       open.pop_back();
     } else if (made.contains(flow)) {
       open.pop_back();
     } else {
       // Until it is known, and in a circle for good, it is elementary.
-      made[flow] = itself;
+      made[flow] = {{1, {{flow, 1}}}};
       if (!HasComposedBody(flow)) continue;
       looked.insert(flow);
       for (const Product& product : *algebra.BodyOf(*algebra.At(flow).record)) {

@@ -7,8 +7,8 @@
 #include <optional>
 #include <vector>
 
-#include "expr/expression_shape.h"
 #include "expr/expression_node.h"
+#include "expr/expression_shape.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"
 

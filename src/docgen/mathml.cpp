@@ -6,8 +6,8 @@
 #include <string_view>
 #include <vector>
 
-#include "expr/expression_shape.h"
 #include "expr/expression_node.h"
+#include "expr/expression_shape.h"
 #include "expr/parser.h"
 #include "platform/ascii.h"
 

@@ -14,8 +14,6 @@
 
 #include "platform/descriptor.h"
 
-extern char** environ;
-
 namespace tessal {
 
 namespace {

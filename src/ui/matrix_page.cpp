@@ -143,7 +143,8 @@ void CMatrixPage::ShowState() {
   QStringList faults;
   for (const MatrixFault& fault : matrix.faults)
     faults.append(ToScreen(matrix.states[fault.column].symbol + " (" + fault.reason + ")"));
-  if (!faults.isEmpty()) text += QStringLiteral(". ") + strings::kNotInMatrix.arg(faults.join(QStringLiteral(", ")));
+  if (!faults.isEmpty())
+    text += QStringLiteral(". ") + strings::kNotInMatrix.arg(faults.join(QStringLiteral(", ")));
   state->setText(text);
 }
 

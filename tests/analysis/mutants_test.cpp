@@ -125,7 +125,7 @@ class Mutants final {
     bool isNext = false;
     for (const auto& process : core.Processes()) {
       if (!core.IsReferenced(process->GetUid())) continue;
-      const std::string symbol = process->symbol.TextOf();
+      std::string symbol = process->symbol.TextOf();
       if (first.empty()) first = symbol;
       if (isNext) return symbol;
       isNext = symbol == name;
