@@ -18,13 +18,7 @@ namespace {
 
 using namespace tessal;
 using fuzz::Require;
-
-std::string TakeLine(std::string_view& rest) {
-  const std::size_t end = rest.find('\n');
-  std::string line(rest.substr(0, end));
-  rest = end == std::string_view::npos ? std::string_view() : rest.substr(end + 1);
-  return line;
-}
+using fuzz::TakeLine;
 
 std::vector<std::string> WordsOf(const std::string& line) {
   std::vector<std::string> words(1);

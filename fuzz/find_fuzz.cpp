@@ -11,19 +11,9 @@
 #include "platform/text_encoding.h"
 #include "template_file.h"
 
-namespace {
-
 using namespace tessal;
 using fuzz::Require;
-
-std::string TakeLine(std::string_view& rest) {
-  const std::size_t end = rest.find('\n');
-  const std::string line = ToUtf8(rest.substr(0, end));
-  rest = end == std::string_view::npos ? std::string_view() : rest.substr(end + 1);
-  return line;
-}
-
-}  // namespace
+using fuzz::TakeLine;
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   constexpr std::size_t kLongest = 4096;
@@ -33,8 +23,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   given.isRegex = (data[0] & 1U) != 0;
   given.wholeSymbols = (data[0] & 2U) != 0;
   given.ignoreCase = (data[0] & 4U) != 0;
-  given.text = TakeLine(rest);
-  const std::string replacement = TakeLine(rest);
+  given.text = ToUtf8(TakeLine(rest));
+  const std::string replacement = ToUtf8(TakeLine(rest));
   const std::string text = ToUtf8(rest);
 
   const TextPattern pattern(given);

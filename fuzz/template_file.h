@@ -20,6 +20,14 @@ inline std::string ScratchFile(std::string_view name) {
   return kFolder + "/" + std::string(name);
 }
 
+/// Takes the first line off a text.
+inline std::string TakeLine(std::string_view& rest) {
+  const std::size_t end = rest.find('\n');
+  std::string line(rest.substr(0, end));
+  rest = end == std::string_view::npos ? std::string_view() : rest.substr(end + 1);
+  return line;
+}
+
 inline void Require(bool holds, const char* what) {
   if (holds) return;
   std::fprintf(stderr, "does not hold: %s\n", what);

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <array>
-#include <charconv>
 #include <cmath>
 #include <utility>
 
@@ -62,21 +61,11 @@ ProductSum NumberSum(double value) {
   return value == 0 ? ProductSum() : ProductSum{{value, {}}};
 }
 
-double ValueOfLiteral(std::string_view text) {
-  double value = 0;
-  std::from_chars(text.data(), text.data() + text.size(), value);
-  return value;
-}
-
 /// A part of a chain of sums or of products: a sum's with its sign, a product's as factor or divisor.
 struct Link {
   const ExpressionNode* node;
   bool isInverse;
 };
-
-bool IsSum(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && (node.Text() == "+" || node.Text() == "-");
-}
 
 bool IsTerm(const ExpressionNode& node) {
   return node.Kind() == NodeKind::Arithmetic && !IsSum(node);
@@ -173,7 +162,7 @@ class Algebra::Expansion final {
   std::optional<ProductSum> OfFactor(const ExpressionNode& node) {
     switch (node.Kind()) {
       case NodeKind::Number:
-        return NumberSum(ValueOfLiteral(node.Text()));
+        return OfNumber(node);
       case NodeKind::Identifier: {
         const SymbolRecord* record = algebra.index.Find(node.Text());
         if (record != nullptr) return Single(algebra.SymbolAtom(*record));
@@ -191,6 +180,12 @@ class Algebra::Expansion final {
         return Single(algebra.Intern("other " + written, {.text = written}));
       }
     }
+  }
+
+  std::optional<ProductSum> OfNumber(const ExpressionNode& node) {
+    const std::optional<double> value = ValueOfNumber(node);
+    if (!value) return algebra.Fail("a number is too large or too small");
+    return NumberSum(*value);
   }
 
   static ProductSum Single(AtomId atom) { return {{1, {{atom, 1}}}}; }

@@ -1,7 +1,6 @@
 #include "analysis/default_values.h"
 
 #include <algorithm>
-#include <charconv>
 #include <cmath>
 #include <limits>
 #include <string>
@@ -18,12 +17,6 @@ namespace tessal {
 namespace {
 
 constexpr double kUnknown = std::numeric_limits<double>::quiet_NaN();
-
-double NumberIn(std::string_view text) {
-  double number = kUnknown;
-  std::from_chars(text.data(), text.data() + text.size(), number);
-  return number;
-}
 
 double Known(double number) {
   return std::isfinite(number) ? number : kUnknown;
@@ -113,7 +106,7 @@ NodeValues DefaultValues::Evaluate(const ExpressionNode& tree) const {
 double DefaultValues::Compute(const ExpressionNode& node, const NodeValues& values) const {
   switch (node.Kind()) {
     case NodeKind::Number:
-      return NumberIn(node.Text());
+      return ValueOfNumber(node).value_or(kUnknown);
     case NodeKind::Identifier: {
       const SymbolRecord* record = symbols.Find(node.Text());
       return record == nullptr ? kUnknown : records[record->sequence - 1];

@@ -1,7 +1,6 @@
 #include "analysis/unit_inference.h"
 
 #include <algorithm>
-#include <charconv>
 #include <cmath>
 #include <span>
 
@@ -65,10 +64,6 @@ bool IsNeutral(const std::optional<double>& number) {
   return number && (*number == 0 || *number == 1);
 }
 
-bool IsSum(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && (node.Text() == "+" || node.Text() == "-");
-}
-
 /// A known unit with a number as a factor.
 void TakeFactor(ExpressionUnit& value, const std::optional<double>& number) {
   if (number && std::abs(*number) == 1) return;
@@ -116,13 +111,6 @@ LexemeSpan SpanOfTwo(const ExpressionNode& one, const ExpressionNode& other, std
     if (sign == ')' && --open < 0) return second;
   }
   return open == 0 ? LexemeSpan{start, end - start} : second;
-}
-
-std::optional<double> NumberIn(std::string_view text) {
-  double number = 0;
-  const auto read = std::from_chars(text.data(), text.data() + text.size(), number);
-  if (read.ec != std::errc()) return std::nullopt;
-  return number;
 }
 
 }  // namespace
@@ -190,7 +178,7 @@ class UnitInference::Walk final {
       case NodeKind::Identifier:
         return OfName(node.Text());
       case NodeKind::Number:
-        return NumberValue(NumberIn(node.Text()));
+        return NumberValue(ValueOfNumber(node));
       case NodeKind::Property:
         return OfProperty(node.Text());
       case NodeKind::Negate:

@@ -7,7 +7,7 @@
 
 namespace tessal {
 
-/// A byte sequence of UTF-8 or Windows-1252 at the start of a text, and what it stands for in ASCII.
+/// A byte sequence of UTF-8 or Windows-1252 at the start of a text, and what it means in ASCII.
 struct SignSpelling {
   std::string_view bytes;
   std::string_view ascii;

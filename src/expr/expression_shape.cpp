@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <array>
+#include <charconv>
+#include <system_error>
 
 namespace tessal {
 
@@ -71,6 +73,17 @@ std::optional<Logic> LogicOf(const ExpressionNode& comparison) {
     return Logic{Logic::Operator::And, condition, BranchesOf(then).condition};
   }
   return std::nullopt;
+}
+
+bool IsSum(const ExpressionNode& node) {
+  return node.Kind() == NodeKind::Arithmetic && (node.Text() == "+" || node.Text() == "-");
+}
+
+std::optional<double> ValueOfNumber(const ExpressionNode& number) {
+  const std::string_view text = number.Text();
+  double value = 0;
+  const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
+  return read.ec == std::errc() ? std::optional(value) : std::nullopt;
 }
 
 bool IsProduct(const ExpressionNode& node) {

@@ -55,7 +55,11 @@ enum class Bond : std::uint8_t {
   Atom
 };
 
+/// Whether it is a sum or a difference.
+bool IsSum(const ExpressionNode& node);
 bool IsProduct(const ExpressionNode& node);
+/// The value of a number; none where it is beyond the range of 64 bits.
+std::optional<double> ValueOfNumber(const ExpressionNode& number);
 /// Whether what may be a product begins with a sign, which needs no brackets where nothing is to the left of
 /// it.
 bool BeginsWithSign(const ExpressionNode& node);

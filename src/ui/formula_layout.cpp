@@ -32,10 +32,6 @@ constexpr std::array<Relation, 6> kRelations = {{
     {"<=", u'\u2264'},
 }};
 
-bool IsSum(const ExpressionNode& node) {
-  return node.Kind() == NodeKind::Arithmetic && (node.Text() == "+" || node.Text() == "-");
-}
-
 }  // namespace
 
 /// One layout under way. `level` counts how small the text is: exponents are one level smaller than their
