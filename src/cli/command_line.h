@@ -31,6 +31,7 @@ struct CommandLine {
   RenameCall rename;
   FindCall find;
   HtmlCall html;
+  TableCall table;
   UnitsCall units;
   LintCall lint;
   GraphCall graph;

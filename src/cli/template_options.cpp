@@ -60,6 +60,27 @@ void AddFind(CLI::App& app, CommandLine& line) {
   AddChoice(*find, "--format", "FORMAT", kTableFormats, line.find.format);
 }
 
+void AddTables(CLI::App& app, CommandLine& line) {
+  const auto addOnly = [&line](CLI::App& command) {
+    command.add_option("--only", line.table.only, "prints one table: states, parameters, processes...")
+        ->type_name("NAME");
+  };
+  CLI::App* latex =
+      AddCommand(app, line, kTemplates, "latex", "prints the tables of a model for a paper", [&line] {
+        line.table.format = Format::Latex;
+        return RunTable(line.table);
+      });
+  AddFile(*latex, line.table.file);
+  addOnly(*latex);
+  latex->add_flag("--body", line.table.isBody, "prints no document around them");
+
+  CLI::App* table = AddCommand(app, line, kTemplates, "table", "prints the tables of a model",
+                               [&line] { return RunTable(line.table); });
+  AddFile(*table, line.table.file);
+  addOnly(*table);
+  AddChoice(*table, "--format", "FORMAT", Choices<Format>(kModelTableFormats), line.table.format);
+}
+
 }  // namespace
 
 void AddTemplateCommands(CLI::App& app, CommandLine& line) {
@@ -115,6 +136,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--safe", line.html.isSafe, "writes texts so that no markup in them takes effect");
   AddOutput(*html, line.html.output, "the page to write; without it HTML_doc beside the template takes it");
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
+
+  AddTables(app, line);
 }
 
 }  // namespace tessal::cli
