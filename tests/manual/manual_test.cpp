@@ -18,6 +18,7 @@
 #include "expr/scanner.h"
 #include "expr/sign_reference.h"
 #include "manual/option_tree.h"
+#include "manual/roff.h"
 #include "support/case_file.h"
 #include "support/temporary_folder.h"
 
@@ -86,6 +87,25 @@ TEST(Pages, AreReadWithoutAWarning) {
       EXPECT_EQ(OutputOf("mandoc -Tlint '" + kManual + "/" + page + "'"), "") << page;
     }
   }
+}
+
+TEST(Pages, ShowSignsOfRoffAsTheyAre) {
+  SKIP_WITHOUT("groff");
+  const TemporaryFolder folder;
+  const std::string text = R"(.TH 'a' \fB \n ^~`"-x" -- a-b 2-1 µ °)";
+  ManualPage page({"x", 1, "y", "z"}, "1", "2");
+  page.Section("s");
+  page.Paragraph(Prose(text));
+  page.Item(Typed(text), Prose(text));
+  page.Lines(text);
+  const std::string shown =
+      OutputOf("groff -man -ww -Tutf8 -P-cbou -rLL=200n '" + folder.Write("x.1", page.Text()) + "'");
+  // Where a system shows hyphens as they are in print, they are not the sign that was typed.
+  const std::string plain = std::regex_replace(shown, std::regex("\u2010"), "-");
+  std::size_t count = 0;
+  for (std::size_t place = plain.find(text); place != std::string::npos; place = plain.find(text, place + 1))
+    ++count;
+  EXPECT_EQ(count, 4U) << shown;
 }
 
 TEST(Pages, NameAllThatThereIs) {
