@@ -40,11 +40,11 @@ void AddCheck(CLI::App& app, CommandLine& line) {
   check->add_option("PATH", line.check.paths, "template files, folders of them, or - for standard input")
       ->required();
   AddChoice(*check, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.check.format);
-  check
-      ->add_option_function<std::string>(
-          "--level", [&line](const std::string& text) { line.check.lowestLevel = LevelIn(text); },
-          "hides messages below it: " + WordsOf(Choices<int>(kLevels)) + ", or 1 to 4")
-      ->type_name("LEVEL");
+  const std::string levels = WordsOf(Choices<int>(kLevels));
+  CLI::Option* level = check->add_option_function<std::string>(
+      "--level", [&line](const std::string& text) { line.check.lowestLevel = LevelIn(text); },
+      "hides messages below it: " + levels + ", or 1 to 4");
+  OfferWords(level->type_name("LEVEL"), levels);
   check->add_flag("--quiet", line.check.isQuiet, "prints nothing: the exit code says whether there are any");
 }
 
