@@ -1,5 +1,6 @@
 // The manual pages, the completions and the syntax definitions, as the programs that read them take them.
 // What is not installed is passed over, and says so.
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <array>
@@ -227,6 +228,43 @@ TEST(Syntax, OfTextMateIsMadeOfGoodPatterns) {
     ++patterns;
   }
   EXPECT_GT(patterns, 10);
+}
+
+const std::string kPackaging = TESSAL_SOURCE_DIR "/packaging/";
+
+TEST(Desktop, TakesTheEntryAndTheDescription) {
+  SKIP_WITHOUT("desktop-file-validate");
+  EXPECT_EQ(OutputOf("desktop-file-validate '" + kPackaging + "tessal-editor.desktop'"), "");
+  SKIP_WITHOUT("appstreamcli");
+  // As the build fills it in.
+  const TemporaryFolder folder;
+  const std::string description = folder.Write(
+      "org.tessal.editor.metainfo.xml",
+      std::regex_replace(std::regex_replace(ReadFile(kPackaging + "org.tessal.editor.metainfo.xml"),
+                                            std::regex("@PROJECT_VERSION@"), "1.0.0"),
+                         std::regex("@TESSAL_DATE@"), "2026-01-01"));
+  const std::string said =
+      OutputOf("appstreamcli validate --no-net --pedantic --no-color '" + description + "'");
+  EXPECT_NE(said.find("successful"), std::string::npos) << said;
+  EXPECT_EQ(said.find(": "), std::string::npos) << said;
+}
+
+TEST(Desktop, KnowsATemplateByItsContent) {
+  SKIP_WITHOUT("update-mime-database");
+  SKIP_WITHOUT("gio");
+  const TemporaryFolder folder;
+  std::filesystem::create_directories(folder.Path() / "mime/packages");
+  std::filesystem::copy(kPackaging + "tessal-mime.xml", folder.Path() / "mime/packages/tessal.xml");
+  const std::string home = "XDG_DATA_HOME='" + folder.Path().string() + "' ";
+  EXPECT_EQ(OutputOf(home + "update-mime-database '" + folder.File("mime") + "'"), "");
+  const auto typeOf = [&folder, &home](const std::string& name, const std::string& content) {
+    return OutputOf(home + "gio info -a standard::content-type '" + folder.Write(name, content) + "'");
+  };
+  const auto isTemplate = testing::HasSubstr("application/x-tessal\n");
+  EXPECT_THAT(typeOf("by_name.tessal", "anything\n"), isTemplate);
+  EXPECT_THAT(typeOf("saved", ReadFile(TESSAL_SOURCE_DIR "/examples/asm1.tessal")), isTemplate);
+  EXPECT_THAT(typeOf("without_head", "// of mine\n\n[TESSAL_SETUP]\n"), isTemplate);
+  EXPECT_THAT(typeOf("other", "[OTHER]\nEndSect\n"), testing::Not(isTemplate));
 }
 
 }  // namespace
