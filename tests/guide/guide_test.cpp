@@ -81,7 +81,7 @@ TEST(Guide, MarksHeadingsAndFollowsDocumentsToTheirPages) {
   EXPECT_EQ(page.title, "A B, and C_d");
   EXPECT_EQ(ValuesOf("id", page.body), std::set<std::string>{"a-b-and-c_d"});
   const std::set<std::string> expected{"scopes.html#the-table",
-                                       "../Functions.html",
+                                       "../Functions.html#ABS",
                                        "../TessalOnline.html#131180",
                                        "#here",
                                        "https://example.org/x.md",
