@@ -14,7 +14,13 @@ namespace tessal::cli {
 enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
-ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel);
+struct CheckCall {
+  std::vector<std::string> paths;
+  Format format = Format::Text;
+  int lowestLevel = 0;
+  bool isQuiet = false;  ///< the exit code says it all; only files that could not be loaded are named
+};
+ExitCode RunCheck(const CheckCall& call);
 /// What one message means, all messages as a list, and as a page.
 ExitCode RunExplain(const std::string& code);
 ExitCode RunExplainAll();
@@ -65,6 +71,15 @@ struct HtmlCall {
 };
 ExitCode RunHtml(const HtmlCall& call);
 
+/// The tables of a model: as Markdown, as comma-separated values, as JSON, or as LaTeX.
+struct TableCall {
+  std::string file;
+  std::string only;     ///< the name of one table; empty for all
+  bool isBody = false;  ///< LaTeX for a document of one's own
+  Format format = Format::Markdown;
+};
+ExitCode RunTable(const TableCall& call);
+
 // Analyses. Each ends with a fault of the content where it finds something.
 struct MatrixCall {
   std::string file;
@@ -103,6 +118,7 @@ struct LintCall {
   std::string baseline;     ///< a file of findings that are not listed
   std::string newBaseline;  ///< where all findings go as a baseline, in the place of a report
   bool exitZero = false;
+  bool isQuiet = false;  ///< the exit code says it all
   Format format = Format::Text;
 };
 ExitCode RunLint(const LintCall& call);
