@@ -49,8 +49,8 @@ std::string MarkdownCell(const ModelTable& table, const std::vector<std::string>
   return kind == CellKind::Symbol || kind == CellKind::Expression ? CodeSpan(text) : MarkdownText(text);
 }
 
-void AppendMarkdown(std::string& page, const ModelTable& table) {
-  page += (page.empty() ? "## " : "\n## ") + MarkdownText(table.title) + "\n\n|";
+void AppendMarkdownTable(std::string& page, const ModelTable& table) {
+  page += "\n|";
   const Columns columns = ColumnsInUse(table);
   for (const std::size_t column : columns) {
     const TableColumn& head = table.columns[column];
@@ -66,6 +66,11 @@ void AppendMarkdown(std::string& page, const ModelTable& table) {
     for (const std::size_t column : columns) page += " " + MarkdownCell(table, row, column) + " |";
     page += "\n";
   }
+}
+
+void AppendMarkdown(std::string& page, const ModelTable& table) {
+  page += (page.empty() ? "## " : "\n## ") + MarkdownText(table.title) + "\n";
+  if (!table.rows.empty()) AppendMarkdownTable(page, table);
   for (const std::string& note : table.notes) page += "\n" + MarkdownText(note) + "\n";
 }
 
@@ -126,6 +131,7 @@ std::string LatexColumns(const ModelTable& table, const Columns& columns) {
 
 /// One table of the columns, with the rows that have a value in one of them beside the first.
 void AppendLatexTable(std::string& text, const ModelTable& table, const Columns& columns) {
+  if (table.rows.empty()) return;
   text += "\\begin{longtable}[l]{@{}" + LatexColumns(table, columns) + "@{}}\n\\toprule\n";
   for (const std::size_t column : columns) {
     const TableColumn& head = table.columns[column];
