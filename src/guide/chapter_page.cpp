@@ -126,7 +126,9 @@ void MarkHeadings(Page& page) {
     const std::string text = page.body.substr(start, page.body.find("</h", start) - start);
     if (page.title.empty()) page.title = WithoutTags(text);
     const std::string anchor = AnchorOf(text);
-    page.body.insert(start, "<a name=\"" + anchor + "\" id=\"" + anchor + "\"></a>");
+    std::string mark = "<a name=\"" + anchor;
+    mark += "\" id=\"" + anchor;
+    page.body.insert(start, mark + "\"></a>");
   }
 }
 
