@@ -28,6 +28,7 @@ struct CommandLine {
   CheckCall check;
   SaveCall save;
   RenameCall rename;
+  MergeCall merge;
   FindCall find;
   HtmlCall html;
   UnitsCall units;
