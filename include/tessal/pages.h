@@ -17,8 +17,8 @@ TESSAL_API std::string HtmlPage(const Template& model);
 /// The table of all elements as aligned text.
 TESSAL_API std::string OverviewTable(const Template& model);
 
-/// An expression as LaTeX, and as a MathML block; the right side of an equation where a symbol is given. Empty
-/// when it does not parse.
+/// An expression as LaTeX, and as a MathML block; the right side of an equation where a symbol is given.
+/// Empty when it does not parse.
 TESSAL_API std::string ExpressionAsLatex(std::string_view expression, std::string_view symbol = {});
 TESSAL_API std::string ExpressionAsMathml(std::string_view expression, std::string_view symbol = {});
 

@@ -45,8 +45,8 @@ class TESSAL_API Template final {
 
   // Files.
 
-  /// Loads a file in the place of what the template holds. Refused when it can not be read as a template; this
-  /// one is empty then. One with faults loads, and `LoadMessages` lists them.
+  /// Loads a file in the place of what the template holds. Refused when it can not be read as a template;
+  /// this one is empty then. One with faults loads, and `LoadMessages` lists them.
   Outcome Load(const std::string& path);
   /// The same with the text of a file. It has no name: `Save` is refused until `SaveAs` gives it one.
   Outcome LoadText(std::string text);
@@ -58,14 +58,16 @@ class TESSAL_API Template final {
   /// Saves under another name, which the template has from then on, with fresh version stamps. The file does
   /// not hold what is in `Losses`.
   Outcome SaveAs(const std::string& path);
-  /// The text that `Save` would write, but for the revision. Nothing when the format can not hold the template.
+  /// The text that `Save` would write, but for the revision. Nothing when the format can not hold the
+  /// template.
   std::optional<std::string> Text();
   /// Whether something has changed since the load or the last save.
   bool IsModified() const;
 
   // What is in it.
 
-  /// All elements, in the order of the file; a particle class before its members.
+  /// All elements, in the order of the symbol table: a particle class, with its movements, after its other
+  /// members.
   std::vector<Element> Elements() const;
   /// The first element with a symbol.
   std::optional<Element> Find(std::string_view symbol) const;

@@ -6,6 +6,7 @@
 #include <system_error>
 
 #include "core/edit_history.h"
+#include "core/rebuild_off.h"
 #include "elements/element.h"
 #include "elements/property_io.h"
 #include "elements/specie.h"
@@ -79,18 +80,6 @@ std::string Quoted(std::string_view text) {
   return "'" + std::string(text) + "'";
 }
 
-/// No rebuild for its lifetime: one comes with the next question, in the place of one for each value.
-class NoRebuild final {
- public:
-  explicit NoRebuild(TemplateCore& changed) : core(changed) { core.SetRebuildEnabled(false); }
-  NoRebuild(const NoRebuild&) = delete;
-  NoRebuild& operator=(const NoRebuild&) = delete;
-  ~NoRebuild() { core.SetRebuildEnabled(true); }
-
- private:
-  TemplateCore& core;
-};
-
 /// Why a field can not be set, whatever the value; empty when it can.
 std::string Obstacle(const CEL_Element& element, std::string_view label) {
   const PropertyPlace place = element.PlaceWithLabel(label);
@@ -154,7 +143,7 @@ Outcome Element::Set(std::string_view label, std::string_view value) {
   CEL_Property& property = element->*element->PlaceWithLabel(label);
   TemplateCore& core = data->Core();
   const EditStep step(core.History());
-  const NoRebuild withTheNextQuestion(core);
+  const RebuildOff untilTheNextQuestion(core);
   const std::string_view clean = CleanText(value);
   const bool isSet = property.HasChoices() ? Choose(property, clean) : SetValue(property, clean);
   if (!isSet) return {false, Quoted(label) + " can not be " + Quoted(value)};

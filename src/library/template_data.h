@@ -24,7 +24,8 @@ class TemplateData final {
   CEL_Element* Find(const Element& element);
   Element HandleOf(const CEL_Element& element) { return {*this, NumberOf(element.GetUid())}; }
 
-  /// A value has changed. The symbol table follows at the next question: one rebuild for any number of values.
+  /// A value has changed. The symbol table follows at the next question: one rebuild for any number of
+  /// values.
   void MarkStale() { isStale = true; }
   /// Elements may come or go.
   void ForgetIndex() { index.clear(); }
@@ -37,7 +38,8 @@ class TemplateData final {
   std::unordered_map<Uid, CEL_Element*> index;
 };
 
-/// Of a template that was not moved from. A question may bring the symbol table up to date, so it is not const.
+/// Of a template that was not moved from. A question may bring the symbol table up to date, so it is not
+/// const.
 TemplateData& DataOf(const Template& model);
 
 }  // namespace v1
