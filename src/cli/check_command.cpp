@@ -4,6 +4,7 @@
 #include "cli/commands.h"
 #include "cli/explanation.h"
 #include "cli/finding_report.h"
+#include "cli/message_places.h"
 #include "cli/template_files.h"
 #include "cli/template_messages.h"
 #include "cli/template_paths.h"
@@ -38,7 +39,9 @@ Json ToJson(const TemplateMessages& messages) {
                       {"symbol", JsonText(message.symbol)},
                       {"uid", NumberOf(message.uid)},
                       {"kind", NumberOf(message.kind)},
-                      {"text", JsonText(message.text)}});
+                      {"text", JsonText(message.text)},
+                      {"line", message.place.line},
+                      {"column", message.place.column}});
   }
   Json undefined = Json::array();
   for (const UndefinedName& name : messages.undefined) {
@@ -76,6 +79,7 @@ ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowe
     if (format == Format::Text) {
       PrintText(messages);
     } else {
+      FindPlaces(TheTemplate(), messages);
       all.push_back(std::move(messages));
     }
   }

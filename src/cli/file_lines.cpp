@@ -7,8 +7,39 @@
 
 namespace tessal::cli {
 
-FileLines::FileLines(std::string_view fileText) : text(fileText), isUtf8(IsUtf8(fileText)), starts{0} {
+namespace {
+
+constexpr std::size_t kBlock = 256;
+
+bool ContinuesCharacter(char byte) {
+  constexpr unsigned kMask = 0xC0;
+  constexpr unsigned kContinuation = 0x80;
+  return (static_cast<unsigned char>(byte) & kMask) == kContinuation;
+}
+
+std::size_t ContinuationsIn(std::string_view bytes) {
+  return static_cast<std::size_t>(std::count_if(bytes.begin(), bytes.end(), ContinuesCharacter));
+}
+
+std::string_view WithoutMargins(std::string_view text) {
+  constexpr std::string_view kBlanks = " \t\r";
+  const std::size_t first = text.find_first_not_of(kBlanks);
+  if (first == std::string_view::npos) return text.substr(text.size());
+  return text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
+}
+
+}  // namespace
+
+FileLines::FileLines(std::string_view fileText) : text(fileText), starts{0} {
   for (std::size_t end = 0; (end = text.find('\n', end)) != std::string_view::npos;) starts.push_back(++end);
+  // In any other encoding a byte is a character.
+  if (!IsUtf8(text)) return;
+  std::size_t count = 0;
+  for (std::size_t start = 0; start <= text.size(); start += kBlock) {
+    continuations.push_back(count);
+    count += ContinuationsIn(text.substr(start, kBlock));
+  }
+  if (count == 0) continuations.clear();
 }
 
 FilePlace FileLines::PlaceOf(std::string_view part) const {
@@ -29,15 +60,25 @@ FilePlace FileLines::PlaceOf(std::string_view part) const {
   return place;
 }
 
+FilePlace FileLines::PlaceOfLine(int line) const {
+  const std::string_view rest = From(line);
+  return PlaceOf(WithoutMargins(rest.substr(0, rest.find('\n'))));
+}
+
+std::string_view FileLines::From(int line) const {
+  const auto number = static_cast<std::size_t>(line);
+  return line < 1 || number > starts.size() ? std::string_view() : text.substr(starts[number - 1]);
+}
+
 int FileLines::ColumnOf(std::size_t lineStart, std::size_t place) const {
-  const std::string_view before = text.substr(lineStart, place - lineStart);
-  const auto continuesCharacter = [this](char byte) {
-    constexpr unsigned kMask = 0xC0;
-    constexpr unsigned kContinuation = 0x80;
-    return isUtf8 && (static_cast<unsigned char>(byte) & kMask) == kContinuation;
-  };
-  const auto continuing = std::count_if(before.begin(), before.end(), continuesCharacter);
-  return static_cast<int>(static_cast<std::ptrdiff_t>(before.size()) - continuing) + 1;
+  const std::size_t bytes = place - lineStart;
+  return static_cast<int>(bytes + ContinuationsBefore(lineStart) - ContinuationsBefore(place)) + 1;
+}
+
+std::size_t FileLines::ContinuationsBefore(std::size_t place) const {
+  if (continuations.empty()) return 0;
+  const std::size_t block = place / kBlock;
+  return continuations[block] + ContinuationsIn(text.substr(block * kBlock, place % kBlock));
 }
 
 }  // namespace tessal::cli

@@ -2,8 +2,8 @@
 
 #include <nlohmann/json.hpp>
 #include <optional>
-#include <unordered_map>
 
+#include "cli/element_index.h"
 #include "cli/file_lines.h"
 #include "cli/report_formats.h"
 #include "cli/sarif.h"
@@ -20,23 +20,20 @@ constexpr auto kNotice = static_cast<std::uint32_t>(ErrorLevel::Notice);
 /// Finds the places of findings, and reads the lines of the file only when one asks for them.
 class Places final {
  public:
-  explicit Places(const TemplateCore& placed) : core(placed) {}
+  explicit Places(const TemplateCore& placed) : core(placed), elements(placed) {}
 
   FilePlace Of(const AnalysisFinding& finding) {
+    if (!lines) lines.emplace(core.SourceText());
     const std::string_view part = PartOf(finding);
-    if (!part.empty()) {
-      if (!lines) lines.emplace(core.SourceText());
-      const FilePlace place = lines->PlaceOf(part);
-      if (place.line > 0) return place;
-    }
-    return {finding.line, 0, 0};
+    const FilePlace place = part.empty() ? FilePlace{} : lines->PlaceOf(part);
+    return place.line > 0 ? place : lines->PlaceOfLine(finding.line);
   }
 
  private:
   /// The part of the field's text that the finding is about.
   std::string_view PartOf(const AnalysisFinding& finding) {
     if (finding.field.empty()) return {};
-    const CEL_Element* element = ElementOf(finding.element);
+    const CEL_Element* element = elements.Find(finding.element);
     const PropertyPlace place = element == nullptr ? nullptr : element->PlaceWithLabel(finding.field);
     if (place == nullptr) return {};
     const CEL_Property& property = element->*place;
@@ -46,17 +43,9 @@ class Places final {
     return text.substr(finding.place.start, finding.place.length);
   }
 
-  const CEL_Element* ElementOf(Uid uid) {
-    if (elements.empty()) {
-      for (const SymbolRecord& record : core.SymbolTable()) elements.emplace(record.uid, record.element);
-    }
-    const auto hit = elements.find(uid);
-    return hit == elements.end() ? nullptr : hit->second;
-  }
-
   const TemplateCore& core;
   std::optional<FileLines> lines;
-  std::unordered_map<Uid, const CEL_Element*> elements;
+  ElementIndex elements;
 };
 
 void PrintText(const FileReport& file) {
@@ -99,7 +88,7 @@ FileReport ReportOf(TemplateMessages messages) {
                                .text = std::move(message.text),
                                .uid = message.uid,
                                .kind = message.kind,
-                               .place = {message.line, 0, 0}});
+                               .place = message.place});
   }
   for (const UndefinedName& undefined : messages.undefined) {
     const Finding finding("undefined-symbol", {undefined.symbol});
@@ -108,15 +97,17 @@ FileReport ReportOf(TemplateMessages messages) {
                                  .level = static_cast<std::uint32_t>(finding.message->level),
                                  .symbol = user.symbol,
                                  .text = finding.text,
-                                 .place = {user.line, 0, 0}});
+                                 .place = user.place});
     }
   }
-  for (AccountEntry& entry : messages.account) {
+  for (std::size_t index = 0; index < messages.account.size(); ++index) {
+    AccountEntry& entry = messages.account[index];
+    const bool isPlaced = index < messages.accountPlaces.size();
     report.findings.push_back({.code = entry.code,
                                .level = kNotice,
                                .symbol = std::move(entry.symbol),
                                .text = std::move(entry.text),
-                               .place = {entry.line, 0, 0},
+                               .place = isPlaced ? messages.accountPlaces[index] : FilePlace{entry.line},
                                .isFault = false});
   }
   return report;

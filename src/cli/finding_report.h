@@ -10,6 +10,7 @@
 
 #include "analysis/analysis_finding.h"
 #include "cli/commands.h"
+#include "cli/file_place.h"
 #include "cli/template_messages.h"
 #include "core/error_registry.h"
 #include "core/messages.h"
@@ -19,14 +20,6 @@ class TemplateCore;
 }
 
 namespace tessal::cli {
-
-/// Where something is in a file: line and columns from 1, 0 where they are not known. Columns count
-/// characters; the end column is that after the last one.
-struct FilePlace {
-  int line = 0;
-  int column = 0;
-  int endColumn = 0;
-};
 
 struct ReportedFinding {
   std::string_view code;
@@ -45,7 +38,7 @@ struct FileReport {
   std::vector<ReportedFinding> findings;
 };
 
-/// What a check found.
+/// What a check found, where it was placed (see message_places.h).
 FileReport ReportOf(TemplateMessages messages);
 
 /// What an analysis found in a template that was loaded from that path. A finding about a part of an

@@ -6,9 +6,14 @@
 #include <string_view>
 #include <vector>
 
+#include "cli/file_place.h"
 #include "elements/element_kind.h"
 #include "elements/load_account.h"
 #include "platform/uid.h"
+
+namespace tessal {
+class TemplateCore;
+}
 
 namespace tessal::cli {
 
@@ -19,14 +24,17 @@ struct TemplateMessage {
   std::string symbol;
   Uid uid;
   ElementKind kind;  ///< the element's
-  int line;          ///< of the element's sub-section or of the place in the file, from 1; 0 for none
+  FilePlace place;   ///< the line alone before `FindPlaces` (message_places.h): that of the element's section
   std::string text;
+  std::string name;  ///< in an expression that it is about; empty for none
 };
 
 struct UndefinedName {
   struct User {
     std::string symbol;
-    int line;  ///< of its sub-section, from 1; 0 for none
+    Uid uid;
+    FilePlace place;              ///< of the first use; the line alone before `FindPlaces`, as above
+    std::vector<FilePlace> uses;  ///< in its expressions; none before `FindPlaces`
   };
 
   std::string symbol;
@@ -39,6 +47,7 @@ struct TemplateMessages {
   std::vector<TemplateMessage> errors;
   std::vector<UndefinedName> undefined;
   std::vector<AccountEntry> account;
+  std::vector<FilePlace> accountPlaces;  ///< of its entries; none before `FindPlaces`
 
   /// Whether the template has no message; what is in the account alone is no fault of it.
   bool IsClean() const { return errors.empty() && undefined.empty(); }
@@ -47,6 +56,9 @@ struct TemplateMessages {
 /// Loads a file as the editor does, and lists its messages from a level up. One that repeats another to the
 /// letter is left out.
 TemplateMessages CollectMessages(const std::string& file, int lowestLevel);
+
+/// The same for a template that was just loaded from a path: the registry has its messages.
+TemplateMessages CollectMessages(const TemplateCore& core, const std::string& file, int lowestLevel);
 
 /// Bytes as JSON can hold them.
 std::string JsonText(const std::string& bytes);

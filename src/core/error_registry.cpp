@@ -6,12 +6,12 @@ namespace tessal {
 
 void ErrorRegistry::Report(std::string_view symbol, Uid uid, const Finding& finding) {
   Append({static_cast<std::uint32_t>(finding.message->level), std::string(symbol), uid, finding.text, 0,
-          finding.message->code});
+          finding.message->code, finding.name});
 }
 
 void ErrorRegistry::ReportInFile(std::string_view symbol, int line, const Finding& finding) {
   Append({static_cast<std::uint32_t>(finding.message->level), std::string(symbol), kNoElement, finding.text,
-          line, finding.message->code});
+          line, finding.message->code, finding.name});
 }
 
 void ErrorRegistry::ReportCheck(std::string_view symbol, Uid uid, const Finding& finding) {

@@ -28,6 +28,7 @@ struct ErrorRecord {
   std::string text;
   int line;
   std::string_view code;  ///< of its row in the table of messages
+  std::string name{};     ///< that it is about; empty for a message that is about none
 };
 
 /// The code of a record whose text was given from outside the table of messages.

@@ -17,6 +17,32 @@ enum class ErrorLevel : std::uint32_t {
   Fatal = 4
 };
 
+/// What of an element a message is about, so that its place in the file can be found.
+enum class MessageTopic : std::uint8_t {
+  Element,  ///< all of it
+  Syntax,   ///< where one of its expressions stops parsing
+  Call,     ///< a call or a property in one of its expressions
+  Name,     ///< a name that one of its expressions uses
+  Text,     ///< the character that one of its descriptive texts may not have
+  Field     ///< the value of a keyword
+};
+
+struct MessageSubject {
+  MessageTopic topic = MessageTopic::Element;
+  std::uint8_t value = 0;      ///< which of the message's values is the name, from 1
+  std::string_view keyword{};  ///< of the field
+};
+
+constexpr MessageSubject AboutName(std::uint8_t value) {
+  return {MessageTopic::Name, value};
+}
+constexpr MessageSubject AboutField(std::string_view keyword) {
+  return {MessageTopic::Field, 0, keyword};
+}
+inline constexpr MessageSubject kAboutSyntax{MessageTopic::Syntax};
+inline constexpr MessageSubject kAboutCall{MessageTopic::Call};
+inline constexpr MessageSubject kAboutText{MessageTopic::Text};
+
 struct MessageRow {
   std::string_view code;  ///< for machines: stays the same in all versions
   ErrorLevel level;
@@ -24,6 +50,7 @@ struct MessageRow {
   std::string_view meaning;  ///< one line
   std::string_view example;  ///< one line
   std::string_view remedy;   ///< one line
+  MessageSubject about{};
 };
 
 inline constexpr MessageRow kMessages[] = {
@@ -294,6 +321,7 @@ inline constexpr MessageRow kMessages[] = {
         "The value of an element lies below its own minimum.",
         "A constant with the value -1 and the minimum 0.",
         "Raise the value or lower the minimum.",
+        AboutField("DEFAULT_VALUE"),
     },
     {
         "value-above-maximum",
@@ -302,6 +330,7 @@ inline constexpr MessageRow kMessages[] = {
         "The value of an element lies above its own maximum.",
         "A forcing with the value 20 and the maximum 10.",
         "Lower the value or raise the maximum.",
+        AboutField("DEFAULT_VALUE"),
     },
     {
         "range-reversed",
@@ -310,6 +339,7 @@ inline constexpr MessageRow kMessages[] = {
         "The minimum of an element is higher than its maximum, so that no value is right.",
         "A constant with the minimum 10 and the maximum 1.",
         "Exchange the two, or correct the one that is wrong.",
+        AboutField("MIN_VALUE"),
     },
     {
         "value-outside-range",
@@ -326,6 +356,7 @@ inline constexpr MessageRow kMessages[] = {
         "A symbol is a letter followed by letters, digits and underscores, and no word of the language.",
         "A constant with the symbol SIN or 2nd_rate.",
         "Give the element another symbol; a rename changes its uses, too.",
+        AboutField("SYMBOL"),
     },
     {
         "symbol-taken",
@@ -334,6 +365,7 @@ inline constexpr MessageRow kMessages[] = {
         "Another element has this symbol already; the change was taken back.",
         "A particle class is to be called Fish, and there is a class of that name.",
         "Choose a symbol that no other element has.",
+        AboutField("SYMBOL"),
     },
     {
         "illegal-text",
@@ -342,6 +374,7 @@ inline constexpr MessageRow kMessages[] = {
         "The files of the simulation engine cannot carry an exclamation mark in these texts.",
         "A process with the description: Check this!",
         "Write the text without exclamation marks.",
+        kAboutText,
     },
     {
         "deprecated-builtin",
@@ -350,6 +383,7 @@ inline constexpr MessageRow kMessages[] = {
         "The input takes its value from a built-in variable that is kept for old templates only.",
         "A constant with the built-in ID of an older release.",
         "Choose a built-in variable that the list offers without the deprecated ones.",
+        AboutField("BUILT_IN_ID"),
     },
 
     // Expressions.
@@ -361,6 +395,7 @@ inline constexpr MessageRow kMessages[] = {
         "be.",
         "a * (b + c",
         "Correct the expression at that position: often a bracket, an operator or a comma is missing.",
+        kAboutSyntax,
     },
     {
         "nesting-too-deep",
@@ -369,6 +404,7 @@ inline constexpr MessageRow kMessages[] = {
         "The expression nests deeper than the parser's 10000 states allow.",
         "An expression that begins with twenty thousand opening brackets.",
         "Split the expression into several auxiliaries.",
+        kAboutSyntax,
     },
     {
         "expression-too-long",
@@ -377,6 +413,7 @@ inline constexpr MessageRow kMessages[] = {
         "An expression of that length is not parsed: its names are not looked up, and no rename reaches it.",
         "a sum of 600,000 names",
         "Divide the expression among auxiliaries.",
+        kAboutSyntax,
     },
     {
         "token-too-long",
@@ -385,6 +422,7 @@ inline constexpr MessageRow kMessages[] = {
         "A name or number in the expression has 1000 characters or more.",
         "A symbol of 1200 letters.",
         "Shorten the name or the number.",
+        kAboutSyntax,
     },
     {
         "unknown-function",
@@ -393,6 +431,7 @@ inline constexpr MessageRow kMessages[] = {
         "The expression calls what is neither in the function catalogue nor a user function of the template.",
         "SINUS(x)",
         "Correct the name, or declare the user function; the command 'tessal functions' lists the catalogue.",
+        kAboutCall,
     },
     {
         "argument-count",
@@ -401,6 +440,7 @@ inline constexpr MessageRow kMessages[] = {
         "A function is called with more or fewer arguments than it has; its arguments are shown.",
         "SIN(1, 2)",
         "Give the function exactly the arguments that are shown.",
+        kAboutCall,
     },
     {
         "deprecated-function",
@@ -409,6 +449,7 @@ inline constexpr MessageRow kMessages[] = {
         "The function is kept for old templates only.",
         "F1(x)",
         "Write what the function computes as an expression of its own.",
+        kAboutCall,
     },
     {
         "call-incomplete",
@@ -418,6 +459,7 @@ inline constexpr MessageRow kMessages[] = {
         "it.",
         "None is known.",
         "Write the call that is named again.",
+        kAboutCall,
     },
     {
         "unknown-property",
@@ -426,6 +468,7 @@ inline constexpr MessageRow kMessages[] = {
         "The name in square brackets is no property of a particle; capitals matter.",
         "[xpos] in place of [XPOS]",
         "Correct the name: XPOS, YPOS, ZPOS, AGE, HSPEED and the others are written in capitals.",
+        kAboutCall,
     },
 
     // What expressions use.
@@ -436,6 +479,7 @@ inline constexpr MessageRow kMessages[] = {
         "An expression uses a name that no element of the template has.",
         "k * Algae in a template without an element Algae.",
         "Correct the name, or create the element; the editor offers to create it.",
+        AboutName(1),
     },
     {
         "unknown-symbol",
@@ -452,6 +496,7 @@ inline constexpr MessageRow kMessages[] = {
         "An expression may use only what is declared before it.",
         "The auxiliary growth uses the auxiliary limit, which follows it in the list.",
         "Move the element that is used before its user.",
+        AboutName(1),
     },
     {
         "not-a-process",
@@ -460,6 +505,7 @@ inline constexpr MessageRow kMessages[] = {
         "The equation of a state variable may use only processes.",
         "The equation growth - k, where k is a constant.",
         "Put what the equation uses into a process, and use that process.",
+        AboutName(1),
     },
     {
         "scope-violated",
@@ -468,6 +514,7 @@ inline constexpr MessageRow kMessages[] = {
         "An element varies less in space than what it uses, so that it has no single value to use.",
         "An auxiliary without spatial variation uses a forcing that varies horizontally.",
         "Let the user vary in space as what it uses does, or use something that varies less.",
+        AboutName(1),
     },
     {
         "no-process-by-rule",
@@ -476,6 +523,7 @@ inline constexpr MessageRow kMessages[] = {
         "Under the process rule, which no template selects, an equation uses what is not a process.",
         "The equation growth - k, where k is a constant.",
         "Put what the equation uses into a process, and use that process.",
+        AboutName(1),
     },
     {
         "scope-violated-by-rule",
@@ -484,6 +532,7 @@ inline constexpr MessageRow kMessages[] = {
         "Under the process rule, which no template selects, an element uses what varies more in space.",
         "A process without spatial variation uses a constant that varies horizontally.",
         "Let the user vary in space as what it uses does, or use something that varies less.",
+        AboutName(1),
     },
 
     // Particle classes.
@@ -494,6 +543,7 @@ inline constexpr MessageRow kMessages[] = {
         "The equation of a particle state variable may use only the arithmetic expressions of its class.",
         "The equation of Fish_mass uses a constant of the template.",
         "Put what the equation uses into an arithmetic expression of the class, and use that.",
+        AboutName(1),
     },
     {
         "foreign-member",
@@ -503,6 +553,7 @@ inline constexpr MessageRow kMessages[] = {
         "An expression of Fish uses a constant of Algae, or an auxiliary of the template.",
         "Declare what is used in the class itself; of the template, classes use only state variables and "
         "inputs.",
+        AboutName(2),
     },
     {
         "foreign-state-variable",
@@ -512,6 +563,7 @@ inline constexpr MessageRow kMessages[] = {
         "interaction.",
         "An expression of Fish uses Algae_mass outside an interaction.",
         "Use it in an interaction, or use a state variable of the own class.",
+        AboutName(1),
     },
     {
         "search-without-class",
@@ -520,6 +572,7 @@ inline constexpr MessageRow kMessages[] = {
         "A search for particles names no particle class of the template.",
         "A search function looks for the third class of a template that has two.",
         "Choose the own class, any particle, or one of the classes.",
+        AboutField("LOOKFOR"),
     },
     {
         "search-without-variable",
@@ -528,6 +581,7 @@ inline constexpr MessageRow kMessages[] = {
         "A search function names neither a variable nor a property that it is to look for.",
         "A new search function whose variable was not chosen yet.",
         "Choose a variable, or for particles a property.",
+        AboutField("VARIABLE_ID"),
     },
     {
         "search-without-function",
@@ -536,6 +590,7 @@ inline constexpr MessageRow kMessages[] = {
         "A search function does not say how the values that it finds become one.",
         "A search function with the math function NONE.",
         "Choose one of the math functions that its purpose offers, such as MIN or AVERAGE.",
+        AboutField("MATH"),
     },
     {
         "search-without-radius",
@@ -544,6 +599,7 @@ inline constexpr MessageRow kMessages[] = {
         "The search radius of a search function is zero, negative or not a number.",
         "A new search function, whose radius is 0.",
         "Enter a radius above zero.",
+        AboutField("RADIUS"),
     },
 };
 

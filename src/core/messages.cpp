@@ -29,7 +29,12 @@ std::string Filled(std::string_view text, std::span<const std::string_view> valu
 }  // namespace
 
 Finding::Finding(Message row, std::initializer_list<std::string_view> values)
-    : message(row), text(Filled(row->text, values)) {}
+    : message(row), text(Filled(row->text, values)) {
+  if (const std::size_t number = row->about.value; number > 0) {
+    assert(number <= values.size());
+    name = values.begin()[number - 1];
+  }
+}
 
 const MessageRow* FindMessage(std::string_view code) {
   for (const auto rows : {AllMessages(), AnalysisMessages()}) {

@@ -45,6 +45,7 @@ struct Finding {
 
   Message message;
   std::string text;
+  std::string name;  ///< that it is about; empty for a message that is about none
 };
 
 /// The rows of what loads, checks, changes and saves report, in the order of their table.

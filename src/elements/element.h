@@ -159,6 +159,8 @@ class CEL_Element : public PropertyHolder {
   void ForEachExpression(Visitor visit) {
     for (const PropertyRow& row : ExpressionRows()) visit(row, this->*row.place);
   }
+  /// The class's table, in the order of the file; empty for a list head.
+  std::span<const PropertyRow> Rows() const { return rows; }
   /// The rows of the expressions, in the order of the class's table, where they are side by side.
   std::span<const PropertyRow> ExpressionRows() const { return rows.subspan(firstExpression, expressions); }
 

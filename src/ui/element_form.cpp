@@ -14,6 +14,7 @@
 
 #include "core/document.h"
 #include "core/rename.h"
+#include "elements/format_words.h"
 #include "elements/property_io.h"
 #include "ui/alt_keys.h"
 #include "ui/child.h"
@@ -23,7 +24,6 @@
 #include "ui/expression_field.h"
 #include "ui/expression_panel.h"
 #include "ui/focus_watch.h"
-#include "ui/format_words.h"
 #include "ui/label.h"
 #include "ui/plain_tip.h"
 #include "ui/strings.h"
