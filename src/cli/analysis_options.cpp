@@ -39,6 +39,7 @@ void AddLint(CLI::App& app, CommandLine& line) {
       ->type_name("FILE")
       ->excludes(baseline);
   lint->add_flag("--exit-zero", line.lint.exitZero, "ends with 0 in spite of findings");
+  lint->add_flag("--quiet", line.lint.isQuiet, "prints no finding: the exit code says whether there are any");
   AddChoice(*lint, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.lint.format);
 }
 

@@ -3,6 +3,7 @@
 
 #include "cli/commands.h"
 #include "cli/explanation.h"
+#include "cli/file_progress.h"
 #include "cli/finding_report.h"
 #include "cli/message_places.h"
 #include "cli/template_files.h"
@@ -63,37 +64,56 @@ Json ToJson(const TemplateMessages& messages) {
           {"account", account}};
 }
 
+/// Why a file could not be loaded.
+void ComplainOfLoad(const TemplateMessages& messages) {
+  for (const TemplateMessage& message : messages.errors) {
+    Complain(OnOneLine(messages.path) + ": " + OnOneLine(message.text));
+  }
+}
+
+void PrintAll(Format format, std::vector<TemplateMessages>& all) {
+  if (format != Format::Json) {
+    std::vector<FileReport> reports;
+    for (TemplateMessages& messages : all) reports.push_back(ReportOf(std::move(messages)));
+    return PrintReport(format, reports, {"check", AllMessages()});
+  }
+  Json list = Json::array();
+  for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
+  PrintLine(Json{{"files", list}}.dump());
+}
+
 }  // namespace
 
-ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel) {
-  const std::optional<std::vector<std::string>> files = FilesOf(paths);
+ExitCode RunCheck(const CheckCall& call) {
+  const std::optional<std::vector<std::string>> files = FilesOf(call.paths);
   if (!files) return kCallFault;
   ExitCode exitCode = kFine;
   std::vector<TemplateMessages> all;
+  MessageCount count;
+  FileProgress progress(call.isQuiet ? 0 : files->size());
   for (const std::string& file : *files) {
-    TemplateMessages messages = CollectMessages(file, lowestLevel);
+    progress.Next();
+    TemplateMessages messages = CollectMessages(file, call.lowestLevel);
     // The other files may be smaller.
     if (RanOutOfMemory()) ComplainOfMemory();
     if (!messages.loaded) exitCode = Worse(exitCode, kCallFault);
     if (!messages.IsClean()) exitCode = Worse(exitCode, kContentFault);
-    if (format == Format::Text) {
+    count.AddFile(messages.Count());
+    if (call.isQuiet) {
+      if (!messages.loaded) ComplainOfLoad(messages);
+    } else if (call.format == Format::Text) {
+      if (messages.Count() + messages.account.size() > 0) progress.Hide();
       PrintText(messages);
     } else {
       FindPlaces(TheTemplate(), messages);
       all.push_back(std::move(messages));
     }
   }
-  if (format == Format::Text) return exitCode;
+  progress.Hide();
+  if (call.isQuiet) return exitCode;
   const EndsWithoutMemory end;
-  if (format == Format::Json) {
-    Json list = Json::array();
-    for (const TemplateMessages& messages : all) list.push_back(ToJson(messages));
-    PrintLine(Json{{"files", list}}.dump());
-  } else {
-    std::vector<FileReport> reports;
-    for (TemplateMessages& messages : all) reports.push_back(ReportOf(std::move(messages)));
-    PrintReport(format, reports, AllMessages());
-  }
+  if (call.format != Format::Text) PrintAll(call.format, all);
+  ShowCount(count);
   return exitCode;
 }
 

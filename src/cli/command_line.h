@@ -15,7 +15,6 @@ namespace tessal::cli {
 
 /// What the options of all commands are read into, and the command that was called.
 struct CommandLine {
-  std::vector<std::string> files;
   std::string file;
   std::string otherFile;
   std::string name;
@@ -26,7 +25,7 @@ struct CommandLine {
   bool force = false;
   bool asPage = false;
   Format format = Format::Text;
-  int lowestLevel = 0;
+  CheckCall check;
   SaveCall save;
   RenameCall rename;
   FindCall find;

@@ -14,7 +14,13 @@ namespace tessal::cli {
 enum class Format { Text, Json, Sarif, Github, Gitlab, Junit, Gcc, Markdown, Html, Csv, Latex };
 
 // Templates.
-ExitCode RunCheck(const std::vector<std::string>& paths, Format format, int lowestLevel);
+struct CheckCall {
+  std::vector<std::string> paths;
+  Format format = Format::Text;
+  int lowestLevel = 0;
+  bool isQuiet = false;  ///< the exit code says it all; only files that could not be loaded are named
+};
+ExitCode RunCheck(const CheckCall& call);
 /// What one message means, all messages as a list, and as a page.
 ExitCode RunExplain(const std::string& code);
 ExitCode RunExplainAll();
@@ -103,6 +109,7 @@ struct LintCall {
   std::string baseline;     ///< a file of findings that are not listed
   std::string newBaseline;  ///< where all findings go as a baseline, in the place of a report
   bool exitZero = false;
+  bool isQuiet = false;  ///< the exit code says it all
   Format format = Format::Text;
 };
 ExitCode RunLint(const LintCall& call);

@@ -137,12 +137,12 @@ std::string Named(const ReportedFinding& finding) {
   return SymbolOf(finding) + ": " + finding.text;
 }
 
-void PrintReport(Format format, std::span<const FileReport> files, std::span<const MessageRow> rules) {
+void PrintReport(Format format, std::span<const FileReport> files, const ReportSource& source) {
   switch (format) {
     case Format::Json:
       return PrintJson(files);
     case Format::Sarif:
-      return PrintSarif(files, rules);
+      return PrintSarif(files, source);
     case Format::Github:
       return PrintWorkflowCommands(files);
     case Format::Gitlab:

@@ -50,8 +50,14 @@ std::string SymbolOf(const ReportedFinding& finding);
 /// The text after the symbol.
 std::string Named(const ReportedFinding& finding);
 
-/// Prints the findings of all files in a format of checks. The rules are the rows that the codes may be of:
-/// `AllMessages()` or `AnalysisMessages()`.
-void PrintReport(Format format, std::span<const FileReport> files, std::span<const MessageRow> rules);
+/// The command that findings are of, and the rows that their codes may be of: `AllMessages()` or
+/// `AnalysisMessages()`.
+struct ReportSource {
+  std::string_view command;
+  std::span<const MessageRow> rules;
+};
+
+/// Prints the findings of all files in a format of checks.
+void PrintReport(Format format, std::span<const FileReport> files, const ReportSource& source);
 
 }  // namespace tessal::cli

@@ -3,6 +3,7 @@
 
 #include "analysis/lint.h"
 #include "cli/commands.h"
+#include "cli/file_progress.h"
 #include "cli/finding_report.h"
 #include "cli/lint_baseline.h"
 #include "cli/template_files.h"
@@ -64,20 +65,28 @@ ExitCode RunLint(const LintCall& call) {
   std::optional<LintBaseline> baseline;
   if (!call.baseline.empty() && !(baseline = LintBaseline::Read(call.baseline))) return kCallFault;
   std::vector<FileReport> reports;
-  for (const std::string& file : *files) reports.push_back(LintFile(file, {call.select, call.ignore}));
+  FileProgress progress(call.isQuiet ? 0 : files->size());
+  for (const std::string& file : *files) {
+    progress.Next();
+    reports.push_back(LintFile(file, {call.select, call.ignore}));
+  }
+  progress.Hide();
   if (!call.newBaseline.empty()) return WriteBaseline(reports, call.newBaseline);
   ExitCode exitCode = kFine;
+  MessageCount count;
   for (FileReport& report : reports) {
     if (baseline) baseline->Filter(report);
+    count.AddFile(report.findings.size());
     if (!report.findings.empty() && !call.exitZero) exitCode = Worse(exitCode, kContentFault);
     if (!report.loaded) exitCode = Worse(exitCode, kCallFault);
   }
-  PrintReport(call.format, reports, AnalysisMessages());
+  if (!call.isQuiet) PrintReport(call.format, reports, {"lint", AnalysisMessages()});
   if (baseline) {
     for (const std::string& entry : baseline->StaleEntries(RulesOf(call))) {
       Complain(OnOneLine("the baseline has " + entry + ", which is found no more"));
     }
   }
+  if (!call.isQuiet) ShowCount(count);
   return exitCode;
 }
 

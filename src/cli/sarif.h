@@ -8,8 +8,7 @@
 
 namespace tessal::cli {
 
-/// Prints one log over all files, result by result: it may be much longer than the messages. The rules are
-/// the rows that the codes of the findings may be of.
-void PrintSarif(std::span<const FileReport> files, std::span<const MessageRow> rules);
+/// Prints one log over all files, result by result: it may be much longer than the messages.
+void PrintSarif(std::span<const FileReport> files, const ReportSource& source);
 
 }  // namespace tessal::cli

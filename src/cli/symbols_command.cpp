@@ -1,3 +1,4 @@
+#include <cmath>
 #include <nlohmann/json.hpp>
 #include <span>
 #include <vector>
@@ -17,6 +18,25 @@ Json ListOf(std::span<const std::uint32_t> sequences) {
   return std::vector<std::uint32_t>(sequences.begin(), sequences.end());
 }
 
+/// The value of a field; null for an element that has none of that label.
+Json ValueOf(const CEL_Element& element, std::string_view label) {
+  const PropertyPlace place = element.PlaceWithLabel(label);
+  if (place == nullptr) return nullptr;
+  const CEL_Property& property = element.*place;
+  if (property.Type() != ValueType::Real) return JsonText(std::string(property.Text()));
+  // JSON has no number for those that are not finite.
+  return std::isfinite(property.RealValue()) ? Json(property.RealValue()) : Json(nullptr);
+}
+
+Json ClassOf(const SymbolRecord& record, const TemplateCore& core) {
+  if (record.specieIndex < 0) return nullptr;
+  return JsonText(std::string(core.GetSpecie(static_cast<std::size_t>(record.specieIndex)).symbol.Text()));
+}
+
+Json LineOf(const CEL_Element& element) {
+  return element.SourceLine() > 0 ? Json(element.SourceLine()) : Json(nullptr);
+}
+
 Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
   return {{"sequence", record.sequence},
           {"symbol", JsonText(core.RecordSymbol(record))},
@@ -27,6 +47,13 @@ Json ToJson(const SymbolRecord& record, const TemplateCore& core) {
           {"index", record.index},
           {"specie", record.specieIndex},
           {"text", JsonText(RecordText(record))},
+          {"unit", ValueOf(*record.element, "Unit")},
+          {"default", ValueOf(*record.element, "Default Value")},
+          {"minimum", ValueOf(*record.element, "Min Value")},
+          {"maximum", ValueOf(*record.element, "Max Value")},
+          {"description", ValueOf(*record.element, "Description")},
+          {"class", ClassOf(record, core)},
+          {"line", LineOf(*record.element)},
           {"references", ListOf(record.references)},
           {"referencedBy", ListOf(record.referencedBy)}};
 }

@@ -49,6 +49,12 @@ UndefinedName Describe(const UndefinedSymbol& undefined, ElementIndex& elements,
 
 }  // namespace
 
+std::size_t TemplateMessages::Count() const {
+  std::size_t count = errors.size();
+  for (const UndefinedName& name : undefined) count += name.usedBy.size();
+  return count;
+}
+
 TemplateMessages CollectMessages(const std::string& file, int lowestLevel) {
   // A comment that a file leaves open must not swallow the expressions of the next one.
   ResetExpressionScanner();

@@ -51,6 +51,8 @@ struct TemplateMessages {
 
   /// Whether the template has no message; what is in the account alone is no fault of it.
   bool IsClean() const { return errors.empty() && undefined.empty(); }
+  /// How many messages are shown: one for each user of an undefined symbol.
+  std::size_t Count() const;
 };
 
 /// Loads a file as the editor does, and lists its messages from a level up. One that repeats another to the

@@ -36,15 +36,16 @@ void AddExplain(CLI::App& app, CommandLine& line) {
 
 void AddCheck(CLI::App& app, CommandLine& line) {
   CLI::App* check = AddCommand(app, line, kTemplates, "check", "lists the messages of templates",
-                               [&line] { return RunCheck(line.files, line.format, line.lowestLevel); });
-  check->add_option("PATH", line.files, "template files, folders of them, or - for standard input")
+                               [&line] { return RunCheck(line.check); });
+  check->add_option("PATH", line.check.paths, "template files, folders of them, or - for standard input")
       ->required();
-  AddFormat(*check, line, kCheckFormats);
+  AddChoice(*check, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.check.format);
   check
       ->add_option_function<std::string>(
-          "--level", [&line](const std::string& text) { line.lowestLevel = LevelIn(text); },
+          "--level", [&line](const std::string& text) { line.check.lowestLevel = LevelIn(text); },
           "hides messages below it: " + WordsOf(Choices<int>(kLevels)) + ", or 1 to 4")
       ->type_name("LEVEL");
+  check->add_flag("--quiet", line.check.isQuiet, "prints nothing: the exit code says whether there are any");
 }
 
 void AddFind(CLI::App& app, CommandLine& line) {

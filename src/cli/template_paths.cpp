@@ -19,8 +19,9 @@ std::error_code AppendTemplates(const std::string& folder, std::vector<std::stri
   const auto first = static_cast<std::ptrdiff_t>(files.size());
   std::filesystem::recursive_directory_iterator entry(folder, failure);
   for (; !failure && entry != std::filesystem::recursive_directory_iterator(); entry.increment(failure)) {
-    std::error_code noFile;
-    if (entry->path().extension() == kExtension && entry->is_regular_file(noFile)) {
+    // What is no file at all, such as a link to nothing, is a fault of the load, and not passed over.
+    std::error_code noFolder;
+    if (entry->path().extension() == kExtension && !entry->is_directory(noFolder)) {
       files.push_back(entry->path().string());
     }
   }

@@ -48,7 +48,7 @@ void PrintForHosts(Format format, const std::string& path, const TemplateCore& c
   std::vector<AnalysisFinding> findings;
   for (const UnitFinding& unit : report.findings) findings.push_back(unit.finding);
   const FileReport file = ReportOf(path, core, findings);
-  PrintReport(format, {&file, 1}, AnalysisMessages());
+  PrintReport(format, {&file, 1}, {"units", AnalysisMessages()});
 }
 
 void PrintList(const TemplateCore& core, Format format) {

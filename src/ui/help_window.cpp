@@ -19,7 +19,8 @@ namespace tessal {
 namespace {
 
 const QString kWindowName = QStringLiteral("help");
-const QString kGuide = QStringLiteral("TessalOnline.html");
+const QString kTopics = QStringLiteral("TessalOnline.html");
+const QString kGuide = QStringLiteral("guide/index.html");
 const QString kFunctions = QStringLiteral("Functions.html");
 const QString kBuiltins = QStringLiteral("Builtins.html");
 constexpr QSize kUsualSize(720, 560);
@@ -72,11 +73,15 @@ void ShowPage(QWidget* parent, const QString& page, const QString& anchor) {
 }  // namespace
 
 QString FindHelpPage(const QString& programFolder) {
-  return FindPage(programFolder, kGuide);
+  return FindPage(programFolder, kTopics);
 }
 
 void OpenHelp(QWidget* parent, int topic) {
-  ShowPage(parent, kGuide, QString::number(topic));
+  ShowPage(parent, kTopics, QString::number(topic));
+}
+
+void OpenGuide(QWidget* parent) {
+  ShowPage(parent, kGuide, {});
 }
 
 void OpenReference(QWidget* parent, const QString& name) {

@@ -476,6 +476,8 @@ std::vector<ViewCommand> CMainView::Commands() {
   append(analyses->Commands());
   commands.push_back({.menu = strings::kHelpMenu, .text = {}, .action = helpContents});
   commands.push_back(
+      {.menu = strings::kHelpMenu, .text = strings::kGuide, .run = [this] { OpenGuide(this); }});
+  commands.push_back(
       {.menu = strings::kHelpMenu, .text = strings::kFunctions, .run = [this] { OpenReference(this, {}); }});
   commands.push_back(StrongColoursCommand());
   commands.push_back(FormulasCommand());

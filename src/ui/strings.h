@@ -25,6 +25,7 @@ inline const QString kZoomIn = QStringLiteral("&Larger Texts");
 inline const QString kZoomOut = QStringLiteral("&Smaller Texts");
 inline const QString kZoomUsual = QStringLiteral("&Usual Size of Texts");
 inline const QString kContents = QStringLiteral("&Contents");
+inline constexpr const char* kGuide = "&Guide";
 inline constexpr const char* kFunctions = "&Functions";
 inline const QString kUndo = QStringLiteral("&Undo");
 inline const QString kRedo = QStringLiteral("&Redo");

@@ -98,24 +98,42 @@ TEST_P(Transcripts, AreWhatTheToolPrints) {
 INSTANTIATE_TEST_SUITE_P(Tool, Transcripts, testing::ValuesIn(TranscriptFiles()),
                          [](const auto& file) { return file.param; });
 
-/// The sessions of a page: indented blocks that begin with a prompt.
-std::vector<CaseCall> CallsOn(const std::string& page) {
+/// What a page has its reader do: a command, or a file to write.
+struct PageStep {
+  std::string command;  ///< empty where a file is written
+  std::string file;
+  std::string text;  ///< what the command prints, or what is in the file
+};
+
+/// The steps of a page: indented or fenced blocks that begin with a prompt, and whole templates, fenced as
+/// ```tessal NAME.
+std::vector<PageStep> StepsOn(const std::string& page) {
   const std::string indent = "    ";
-  std::vector<CaseCall> calls;
+  const std::string fence = "```";
+  const std::string prompt = "$ ";
+  const std::string templateFence = fence + "tessal ";
+  std::vector<PageStep> steps;
+  bool isFenced = false;
+  bool isStep = false;
   std::istringstream lines(page);
-  bool isSession = false;
   for (std::string line; std::getline(lines, line);) {
-    const bool isBlock = line.starts_with(indent);
-    const std::string text = isBlock ? line.substr(indent.size()) : "";
-    const bool isCall = text.starts_with("$ ");
-    isSession = isBlock && (isSession || isCall);
-    if (isCall) {
-      calls.push_back({"$ ", text.substr(2), "", 0});
-    } else if (isSession) {
-      calls.back().expected += text + "\n";
+    if (line.starts_with(fence)) {
+      isFenced = !isFenced;
+      isStep = isFenced && line.starts_with(templateFence);
+      if (isStep) steps.push_back({"", line.substr(templateFence.size()), ""});
+      continue;
+    }
+    const bool isBlock = isFenced || line.starts_with(indent);
+    const std::string text = isFenced || !isBlock ? line : line.substr(indent.size());
+    isStep = isStep && isBlock;
+    if (isBlock && text.starts_with(prompt) && (!isStep || steps.back().file.empty())) {
+      steps.push_back({text.substr(prompt.size()), "", ""});
+      isStep = true;
+    } else if (isStep) {
+      steps.back().text += text + "\n";
     }
   }
-  return calls;
+  return steps;
 }
 
 TEST(Json, IsValidWhateverTheBytes) {
@@ -144,27 +162,61 @@ TEST(MessagesPage, ShowsEveryRowOfTheTable) {
   ExpectPage("../docs/messages.md", ShellSession().Run("tessal explain --markdown").output);
 }
 
-class Pages : public testing::TestWithParam<const char*> {};
+/// The front page and the chapters of the guide, below the project's folder.
+std::vector<std::string> PagesOfProject() {
+  std::vector<std::string> pages{"README.md"};
+  for (const auto& entry : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/docs/guide"))
+    if (entry.path().extension() == ".md") pages.push_back("docs/guide/" + entry.path().filename().string());
+  return pages;
+}
 
-TEST_P(Pages, ShowWhatTheToolPrints) {
+/// What a page says, as it reads here: where a package puts the examples, there is the session's copy.
+std::string ReadPage(const std::string& name) {
+  const std::string installed = "/usr/share/tessal/examples";
+  std::string page = ReadFile(std::string(TESSAL_SOURCE_DIR "/") + name);
+  for (std::size_t at = page.find(installed); at != std::string::npos; at = page.find(installed, at))
+    page.replace(at, installed.size(), "examples");
+  return page;
+}
+
+void ExpectOutput(const ShellRun& run, const PageStep& step) {
+  std::string given = run.output + run.errors;
+  std::erase(given, '\r');
+  std::string expected = step.text;
+  // Three points at the end mean the rest.
+  if (expected.ends_with("\n...\n")) {
+    expected.erase(expected.size() - 4);
+    given.resize(std::min(given.size(), expected.size()));
+  }
+  EXPECT_EQ(given, expected) << step.command;
+}
+
+class Pages : public testing::TestWithParam<std::string> {};
+
+TEST_P(Pages, ShowWhatTheToolPrintsAndTemplatesThatLoad) {
   const ShellSession session;
-  const std::vector<CaseCall> calls = CallsOn(ReadFile(std::string(TESSAL_SOURCE_DIR "/") + GetParam()));
-  EXPECT_GE(calls.size(), 5U);
-  for (const CaseCall& call : calls) {
-    const ShellRun run = session.Run(call.words);
-    std::string given = run.output + run.errors;
-    std::erase(given, '\r');
-    std::string expected = call.expected;
-    // Three points at the end mean the rest.
-    if (expected.ends_with("\n...\n")) {
-      expected.erase(expected.size() - 4);
-      given.resize(std::min(given.size(), expected.size()));
+  for (const PageStep& step : StepsOn(ReadPage(GetParam()))) {
+    if (!step.file.empty()) {
+      session.Write(step.file, step.text);
+      const ShellRun run = session.Run("tessal check '" + step.file + "'");
+      EXPECT_NE(run.exitCode, 2) << step.file << "\n" << run.errors;
+    } else {
+      ExpectOutput(session.Run(step.command), step);
     }
-    EXPECT_EQ(given, expected) << call.words;
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::Values("README.md", "docs/guide/units_and_balance.md"));
+INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::ValuesIn(PagesOfProject()),
+                         [](const auto& page) { return std::filesystem::path(page.param).stem().string(); });
+
+TEST(Pages, AreReadStepByStep) {
+  const std::vector<PageStep> steps = StepsOn(
+      "text\n\n    $ one\n    printed\n      more\n    $ two\n\n    not of it\n"
+      "```tessal a.tessal\n[A]\n$ no command\nEndSect\n```\n```\n$ three\n```\n");
+  std::string text;
+  for (const PageStep& step : steps) text += step.command + "|" + step.file + "|" + step.text + ";";
+  EXPECT_EQ(text, "one||printed\n  more\n;two||;|a.tessal|[A]\n$ no command\nEndSect\n;three||;");
+}
 
 }  // namespace
 }  // namespace tessal::test
