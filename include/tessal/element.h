@@ -33,7 +33,7 @@ enum class Kind : int {
   VerticalMovement = 14
 };
 
-/// A named value of an element.
+/// A named value of an element. The expression of a state variable is its "Equation".
 struct Field {
   std::string label{};                 ///< "Unit", "Expression": the editor shows the same
   std::string value{};                 ///< numbers in decimal, truths as "YES" or "NO"

@@ -30,7 +30,7 @@ CEL_Element* TemplateData::Find(Uid uid) {
 }
 
 CEL_Element* TemplateData::Find(const Element& element) {
-  return element.data == this ? Find(Uid{element.uid}) : nullptr;
+  return Find(Uid{element.uid});
 }
 
 TemplateData& DataOf(const Template& model) {

@@ -20,7 +20,8 @@ class TemplateData final {
 
   /// The element with a record that has this identity; none once it is removed.
   CEL_Element* Find(Uid uid);
-  /// The same for a handle; none for one of another template.
+  /// The same for a handle; none for one of another template, as no two elements of a process have one
+  /// identity.
   CEL_Element* Find(const Element& element);
   Element HandleOf(const CEL_Element& element) { return {*this, NumberOf(element.GetUid())}; }
 
