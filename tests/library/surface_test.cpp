@@ -235,8 +235,8 @@ TEST(Surface, AnalysesSayWhatTheToolSays) {
   tessal::Template broken = Loaded("streeter_phelps");
   EXPECT_TRUE(broken.Find("deoxygenation")->Set("Expression", "k1_20*BOD*BOD"));
   EXPECT_FALSE(tessal::UnitMessages(broken).empty());
-  tessal::Template mixed = Loaded("eutrophication");
-  EXPECT_TRUE(mixed.Find("NH4")->Set("Equation", "hydN + upP"));
+  tessal::Template mixed = Loaded("asm1");
+  EXPECT_TRUE(mixed.Find("S_S")->Set("Equation", "ammonification"));
   EXPECT_TRUE(tessal::UnitMessages(mixed).empty());
   EXPECT_FALSE(tessal::StrictUnitMessages(mixed).empty());
   const tessal::MatrixOfProcesses matrix = tessal::ProcessesOf(Loaded("streeter_phelps"));
