@@ -82,6 +82,15 @@ struct HtmlCall {
 };
 ExitCode RunHtml(const HtmlCall& call);
 
+/// The tables of a model: as Markdown, as comma-separated values, as JSON, or as LaTeX.
+struct TableCall {
+  std::string file;
+  std::string only;     ///< the name of one table; empty for all
+  bool isBody = false;  ///< LaTeX for a document of one's own
+  Format format = Format::Markdown;
+};
+ExitCode RunTable(const TableCall& call);
+
 // Analyses. Each ends with a fault of the content where it finds something.
 struct MatrixCall {
   std::string file;

@@ -1,5 +1,6 @@
 // The host with the editor's module in it: documents that come and go, and work that must not be lost.
 #include <gtest/gtest.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <QAbstractButton>
@@ -27,6 +28,8 @@
 #include <fstream>
 #include <map>
 #include <memory>
+#include <numeric>
+#include <set>
 #include <sstream>
 #include <stdexcept>
 #include <utility>
@@ -453,6 +456,42 @@ long ResidentPages() {
   long resident = 0;
   sizes >> resident >> resident;
   return resident;
+}
+
+TEST(Host, HasTheKeysOfTheManual) {
+  HostWindow window(Module().MakeDocTemplate(), Module().EditorName());
+  window.NewDocument();
+  std::set<std::string> lines;
+  for (const QAction* action : window.findChildren<QAction*>()) {
+    const QString text = QString(action->text()).remove(u'&').remove("...");
+    const QString keys = QKeySequence::listToString(action->shortcuts(), QKeySequence::PortableText);
+    if (!keys.isEmpty()) lines.insert((text + "\t" + keys + "\n").toStdString());
+  }
+  test::ExpectPage("../src/manual/editor_keys.txt",
+                   std::accumulate(lines.begin(), lines.end(), std::string()));
+}
+
+/// The program itself, where there is no display.
+std::string CallEditor(const std::string& arguments) {
+  const TemporaryFolder folder;
+  const std::string output = folder.File("output");
+  const int status =
+      std::system(("env -u DISPLAY -u WAYLAND_DISPLAY -u QT_QPA_PLATFORM '" TESSAL_EDITOR "' " + arguments +
+                   " >'" + output + "' 2>&1")
+                      .c_str());
+  return test::ReadFile(output) + "[" + std::to_string(WEXITSTATUS(status)) + "]";
+}
+
+TEST(Editor, AnswersQuestionsAboutItsCallWithoutADisplay) {
+  const std::string help = CallEditor("--help");
+  EXPECT_TRUE(help.starts_with("Edits templates") && help.ends_with("[0]")) << help;
+  for (const char* option : {"-h,--help ", "-v,--version ", "--module FILE ", "--platform NAME "}) {
+    EXPECT_NE(help.find(option), std::string::npos) << option;
+  }
+  const std::string version = CallEditor("-v");
+  EXPECT_TRUE(version.starts_with("tessal-editor 1") && version.ends_with("revision 1\n[0]")) << version;
+  EXPECT_EQ(CallEditor("--frob x.tessal"), "tessal-editor: Unknown option 'frob'.\n[2]");
+  EXPECT_EQ(CallEditor("--module"), "tessal-editor: Missing value after '--module'.\n[2]");
 }
 
 TEST(Host, FiftyDocumentsLeaveNoMemoryInUse) {
