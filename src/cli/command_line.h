@@ -29,6 +29,7 @@ struct CommandLine {
   CheckCall check;
   SaveCall save;
   RenameCall rename;
+  MergeCall merge;
   FindCall find;
   HtmlCall html;
   TableCall table;

@@ -48,6 +48,17 @@ struct RenameCall {
   bool force = false;
 };
 ExitCode RunRename(const RenameCall& call);
+/// What differs; ends with a fault of the content where something does.
+ExitCode RunChanges(const std::string& former, const std::string& later, Format format);
+/// With an empty output the merged template replaces ours. Ends with a fault of the content with a conflict.
+struct MergeCall {
+  std::string base;
+  std::string ours;
+  std::string theirs;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunMerge(const MergeCall& call);
 /// Ends as a search does: with a fault of the content where nothing is found.
 struct FindCall {
   std::string file;

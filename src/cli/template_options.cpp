@@ -60,6 +60,26 @@ void AddFind(CLI::App& app, CommandLine& line) {
   AddChoice(*find, "--format", "FORMAT", kTableFormats, line.find.format);
 }
 
+void AddChanges(CLI::App& app, CommandLine& line) {
+  CLI::App* changes = AddCommand(app, line, kTemplates, "changes", "lists what differs between two templates",
+                                 [&line] { return RunChanges(line.file, line.otherFile, line.format); });
+  changes->add_option("A", line.file, "the former template")->required();
+  changes->add_option("B", line.otherFile, "the later one")->required();
+  AddFormat(*changes, line, kDescriptionFormats);
+}
+
+void AddMerge(CLI::App& app, CommandLine& line) {
+  CLI::App* merge =
+      AddCommand(app, line, kTemplates, "merge", "brings two changed states of a template together",
+                 [&line] { return RunMerge(line.merge); });
+  merge->add_option("BASE", line.merge.base, "the template that both come from")->required();
+  merge->add_option("OURS", line.merge.ours, "the state that is kept in a conflict, and replaced")
+      ->required();
+  merge->add_option("THEIRS", line.merge.theirs, "the other state")->required();
+  AddOutput(*merge, line.merge.output, "saves under this name, not in the place of OURS");
+  AddForce(*merge, line.merge.force);
+}
+
 void AddTables(CLI::App& app, CommandLine& line) {
   const auto addOnly = [&line](CLI::App& command) {
     command.add_option("--only", line.table.only, "prints one table: states, parameters, processes...")
@@ -123,6 +143,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddForce(*rename, line.rename.force);
 
   AddFind(app, line);
+  AddChanges(app, line);
+  AddMerge(app, line);
 
   CLI::App* overview = AddCommand(app, line, kTemplates, "overview", "prints the overview table",
                                   [&line] { return RunOverview(line.file); });

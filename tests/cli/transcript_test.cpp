@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <nlohmann/json.hpp>
@@ -165,9 +166,9 @@ TEST(MessagesPage, ShowsEveryRowOfTheTable) {
   ExpectPage("../docs/messages.md", ShellSession().Run("tessal explain --markdown").output);
 }
 
-/// The front page and the chapters of the guide, below the project's folder.
+/// The front page, those on repositories, and the chapters of the guide, below the project's folder.
 std::vector<std::string> PagesOfProject() {
-  std::vector<std::string> pages{"README.md", "docs/ci.md"};
+  std::vector<std::string> pages{"README.md", "docs/ci.md", "docs/teams.md"};
   for (const auto& entry : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/docs/guide"))
     if (entry.path().extension() == ".md") pages.push_back("docs/guide/" + entry.path().filename().string());
   return pages;
@@ -224,8 +225,12 @@ TEST_P(Pages, ShowWhatTheToolPrintsAndTemplatesThatLoad) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::ValuesIn(PagesOfProject()),
-                         [](const auto& page) { return std::filesystem::path(page.param).stem().string(); });
+INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::ValuesIn(PagesOfProject()), [](const auto& page) {
+  std::string name = page.param;
+  std::replace_if(
+      name.begin(), name.end(), [](char each) { return each == '/' || each == '.'; }, '_');
+  return name;
+});
 
 TEST(Pages, AreReadStepByStep) {
   const std::vector<PageStep> steps = StepsOn(
