@@ -451,6 +451,31 @@ TEST(Module, IsNotTakenFromTheCurrentFolder) {
   QDir::setCurrent(former);
 }
 
+/// The commands of all menus, as the guide lists them.
+std::string MenuTable(const HostWindow& window, const std::string& head) {
+  QStringList rows;
+  for (const QAction* menu : window.menuBar()->actions()) {
+    for (const QAction* command : menu->menu()->actions()) {
+      if (command->isSeparator() || !command->isVisible()) continue;
+      QStringList keys;
+      for (const QKeySequence& key : command->shortcuts()) keys.append(key.toString());
+      rows.append(QStringLiteral("| %1 | %2 | %3 |").arg(menu->text(), command->text(), keys.join(" or ")));
+    }
+  }
+  return head + rows.join(u'\n').remove(u'&').remove("...").append(u'\n').toStdString();
+}
+
+TEST(Host, HasTheMenusThatTheGuideLists) {
+  HostWindow window(Module().MakeDocTemplate(), Module().EditorName());
+  window.NewDocument();
+  std::string page = test::ReadFile(TESSAL_SOURCE_DIR "/docs/guide/keyboard.md");
+  const std::string head = "| Menu | Command | Keys |\n|---|---|---|\n";
+  const std::size_t start = page.find(head);
+  ASSERT_NE(start, std::string::npos);
+  page.replace(start, page.find("\n\n", start) + 1 - start, MenuTable(window, head));
+  test::ExpectPage("../docs/guide/keyboard.md", page);
+}
+
 long ResidentPages() {
   std::ifstream sizes("/proc/self/statm");
   long resident = 0;

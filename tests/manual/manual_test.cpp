@@ -1,5 +1,6 @@
 // The manual pages, the completions and the syntax definitions, as the programs that read them take them.
 // What is not installed is passed over, and says so.
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <array>
@@ -18,6 +19,7 @@
 #include "expr/scanner.h"
 #include "expr/sign_reference.h"
 #include "manual/option_tree.h"
+#include "manual/roff.h"
 #include "support/case_file.h"
 #include "support/temporary_folder.h"
 
@@ -86,6 +88,25 @@ TEST(Pages, AreReadWithoutAWarning) {
       EXPECT_EQ(OutputOf("mandoc -Tlint '" + kManual + "/" + page + "'"), "") << page;
     }
   }
+}
+
+TEST(Pages, ShowSignsOfRoffAsTheyAre) {
+  SKIP_WITHOUT("groff");
+  const TemporaryFolder folder;
+  const std::string text = R"(.TH 'a' \fB \n ^~`"-x" -- a-b 2-1 µ °)";
+  ManualPage page({"x", 1, "y", "z"}, "1", "2");
+  page.Section("s");
+  page.Paragraph(Prose(text));
+  page.Item(Typed(text), Prose(text));
+  page.Lines(text);
+  const std::string shown =
+      OutputOf("groff -man -ww -Tutf8 -P-cbou -rLL=200n '" + folder.Write("x.1", page.Text()) + "'");
+  // Where a system shows hyphens as they are in print, they are not the sign that was typed.
+  const std::string plain = std::regex_replace(shown, std::regex("\u2010"), "-");
+  std::size_t count = 0;
+  for (std::size_t place = plain.find(text); place != std::string::npos; place = plain.find(text, place + 1))
+    ++count;
+  EXPECT_EQ(count, 4U) << shown;
 }
 
 TEST(Pages, NameAllThatThereIs) {
@@ -207,6 +228,43 @@ TEST(Syntax, OfTextMateIsMadeOfGoodPatterns) {
     ++patterns;
   }
   EXPECT_GT(patterns, 10);
+}
+
+const std::string kPackaging = TESSAL_SOURCE_DIR "/packaging/";
+
+TEST(Desktop, TakesTheEntryAndTheDescription) {
+  SKIP_WITHOUT("desktop-file-validate");
+  EXPECT_EQ(OutputOf("desktop-file-validate '" + kPackaging + "tessal-editor.desktop'"), "");
+  SKIP_WITHOUT("appstreamcli");
+  // As the build fills it in.
+  const TemporaryFolder folder;
+  const std::string description = folder.Write(
+      "org.tessal.editor.metainfo.xml",
+      std::regex_replace(std::regex_replace(ReadFile(kPackaging + "org.tessal.editor.metainfo.xml"),
+                                            std::regex("@PROJECT_VERSION@"), "1.0.0"),
+                         std::regex("@TESSAL_DATE@"), "2026-01-01"));
+  const std::string said =
+      OutputOf("appstreamcli validate --no-net --pedantic --no-color '" + description + "'");
+  EXPECT_NE(said.find("successful"), std::string::npos) << said;
+  EXPECT_EQ(said.find(": "), std::string::npos) << said;
+}
+
+TEST(Desktop, KnowsATemplateByItsContent) {
+  SKIP_WITHOUT("update-mime-database");
+  SKIP_WITHOUT("gio");
+  const TemporaryFolder folder;
+  std::filesystem::create_directories(folder.Path() / "mime/packages");
+  std::filesystem::copy(kPackaging + "tessal-mime.xml", folder.Path() / "mime/packages/tessal.xml");
+  const std::string home = "XDG_DATA_HOME='" + folder.Path().string() + "' ";
+  EXPECT_EQ(OutputOf(home + "update-mime-database '" + folder.File("mime") + "'"), "");
+  const auto typeOf = [&folder, &home](const std::string& name, const std::string& content) {
+    return OutputOf(home + "gio info -a standard::content-type '" + folder.Write(name, content) + "'");
+  };
+  const auto isTemplate = testing::HasSubstr("application/x-tessal\n");
+  EXPECT_THAT(typeOf("by_name.tessal", "anything\n"), isTemplate);
+  EXPECT_THAT(typeOf("saved", ReadFile(TESSAL_SOURCE_DIR "/examples/asm1.tessal")), isTemplate);
+  EXPECT_THAT(typeOf("without_head", "// of mine\n\n[TESSAL_SETUP]\n"), isTemplate);
+  EXPECT_THAT(typeOf("other", "[OTHER]\nEndSect\n"), testing::Not(isTemplate));
 }
 
 }  // namespace
