@@ -60,7 +60,6 @@ void AddFind(CLI::App& app, CommandLine& line) {
   AddChoice(*find, "--format", "FORMAT", kTableFormats, line.find.format);
 }
 
-<<<<<<< HEAD
 void AddChanges(CLI::App& app, CommandLine& line) {
   CLI::App* changes = AddCommand(app, line, kTemplates, "changes", "lists what differs between two templates",
                                  [&line] { return RunChanges(line.file, line.otherFile, line.format); });
@@ -79,7 +78,8 @@ void AddMerge(CLI::App& app, CommandLine& line) {
   merge->add_option("THEIRS", line.merge.theirs, "the other state")->required();
   AddOutput(*merge, line.merge.output, "saves under this name, not in the place of OURS");
   AddForce(*merge, line.merge.force);
-=======
+}
+
 void AddTables(CLI::App& app, CommandLine& line) {
   const auto addOnly = [&line](CLI::App& command) {
     command.add_option("--only", line.table.only, "prints one table: states, parameters, processes...")
@@ -99,7 +99,6 @@ void AddTables(CLI::App& app, CommandLine& line) {
   AddFile(*table, line.table.file);
   addOnly(*table);
   AddChoice(*table, "--format", "FORMAT", Choices<Format>(kModelTableFormats), line.table.format);
->>>>>>> main
 }
 
 }  // namespace
