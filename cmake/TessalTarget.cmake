@@ -3,7 +3,9 @@
 add_library(tessal_options INTERFACE)
 target_include_directories(tessal_options INTERFACE "${CMAKE_SOURCE_DIR}/src")
 target_compile_options(tessal_options INTERFACE
-  -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wnon-virtual-dtor -Woverloaded-virtual -Werror)
+  -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wnon-virtual-dtor -Woverloaded-virtual -Werror
+  # What a library shows, it says so.
+  -fvisibility=hidden -fvisibility-inlines-hidden)
 
 if(TESSAL_SANITIZERS)
   target_compile_options(tessal_options INTERFACE

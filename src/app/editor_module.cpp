@@ -15,7 +15,7 @@ namespace {
 const QString kModuleFile = QStringLiteral("libtessal_editor.so");
 
 /// Beside the program where it was built, and where an installation puts it.
-constexpr std::array<const char*, 3> kFolders = {"../lib", "../lib/tessal", "."};
+constexpr std::array<const char*, 3> kFolders = {"../lib", TESSAL_MODULE_FOLDER, "."};
 
 using CountTemplates = int (*)();
 using GetTemplate = CMultiDocTemplate* (*)(int);

@@ -149,7 +149,9 @@ void HostWindow::MakeMenus() {
   documentActions.append(
       file->addAction(tr("Save &As..."), QKeySequence(tr("Ctrl+Shift+S")), this, &HostWindow::SaveCurrentAs));
   file->addSeparator();
-  QAction* close = file->addAction(tr("&Close"), QKeySequence::Close, this, &HostWindow::CloseCurrent);
+  QAction* close = file->addAction(tr("&Close"), this, &HostWindow::CloseCurrent);
+  // The same on every desktop, as the guide says.
+  close->setShortcuts({QKeySequence(tr("Ctrl+W")), QKeySequence(tr("Ctrl+F4"))});
   documentActions.append(close);
   file->addAction(tr("&Quit"), QKeySequence(tr("Ctrl+Q")), this, &QWidget::close);
   QMenu* help = menuBar()->addMenu(tr("&Help"));

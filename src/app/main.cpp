@@ -5,31 +5,48 @@
 #include <QMessageBox>
 #include <clocale>
 #include <cstdio>
+#include <span>
 
 #include "app/editor_module.h"
+#include "app/editor_options.h"
 #include "app/host_window.h"
 #include "app/session.h"
+#include "platform/build_info.h"
 #include "platform/docview.h"
 
 namespace {
 
 constexpr int kNoModule = 2;
+constexpr int kCallFault = 2;
 
-int RunHost(QApplication& application) {
-  QCommandLineParser line;
-  line.setApplicationDescription(QStringLiteral("Edits templates of aquatic process models."));
-  line.addHelpOption();
-  line.addVersionOption();
-  const QCommandLineOption moduleOption(
-      QStringLiteral("module"), QStringLiteral("The file of the editor's module."), QStringLiteral("file"));
-  line.addOption(moduleOption);
-  line.addPositionalArgument(QStringLiteral("files"), QStringLiteral("Templates to open."),
-                             QStringLiteral("[files...]"));
-  line.process(application);
+QString Words(std::string_view words) {
+  return QString::fromUtf8(words.data(), static_cast<qsizetype>(words.size()));
+}
 
+void AddOptions(QCommandLineParser& line, std::span<const tessal::EditorOption> options) {
+  for (const tessal::EditorOption& option : options) {
+    QStringList names(Words(option.name));
+    if (!option.letter.empty()) names += Words(option.letter);
+    line.addOption(QCommandLineOption(names, Words(option.meaning), Words(option.value)));
+  }
+}
+
+/// Reads the call. There is no application yet, which would need a screen.
+bool ReadCall(QCommandLineParser& line, int count, char** arguments) {
+  // The toolkit's own options are known with one hyphen.
+  line.setSingleDashWordOptionMode(QCommandLineParser::ParseAsLongOptions);
+  AddOptions(line, tessal::kEditorOptions);
+  AddOptions(line, tessal::kToolkitOptions);
+  QStringList call;
+  for (int place = 0; place < count; ++place) call += QString::fromLocal8Bit(arguments[place]);
+  return line.parse(call);
+}
+
+int RunHost(const QCommandLineParser& line) {
   tessal::EditorModule module;
-  const QStringList places = line.isSet(moduleOption)
-                                 ? QStringList{line.value(moduleOption)}
+  const QString option = Words(tessal::kModuleOption);
+  const QStringList places = line.isSet(option)
+                                 ? QStringList{line.value(option)}
                                  : tessal::EditorModule::UsualPlaces(QApplication::applicationDirPath());
   if (!module.Load(places)) {
     std::fprintf(stderr, "%s\n", qPrintable(module.Failure()));
@@ -45,16 +62,32 @@ int RunHost(QApplication& application) {
   return QApplication::exec();
 }
 
+/// Prints a text that was asked for, and returns how the program ends.
+int Print(const std::string& text) {
+  const bool isPrinted = std::fputs(text.c_str(), stdout) >= 0 && std::fflush(stdout) == 0;
+  return isPrinted ? 0 : kCallFault;
+}
+
 }  // namespace
 
 int main(int count, char** arguments) {
+  QCommandLineParser line;
+  const bool isRead = ReadCall(line, count, arguments);
+  if (isRead && line.isSet(Words(tessal::kHelpOption))) return Print(tessal::EditorHelp());
+  if (isRead && line.isSet(Words(tessal::kVersionOption))) {
+    return Print(tessal::BuildText("tessal-editor") + "\n");
+  }
+  if (!isRead) {
+    std::fprintf(stderr, "tessal-editor: %s\n", qPrintable(line.errorText()));
+    return kCallFault;
+  }
   QApplication application(count, arguments);
   // The application sets the user's locale; the numbers of templates are read and written without it.
   std::setlocale(LC_NUMERIC, "C");
   QApplication::setOrganizationName(QStringLiteral("Tessal"));
   QApplication::setApplicationName(QStringLiteral("tessal-editor"));
-  QApplication::setApplicationVersion(QStringLiteral(TESSAL_VERSION));
+  QApplication::setApplicationVersion(Words(tessal::ProgramVersion()));
   QGuiApplication::setDesktopFileName(QStringLiteral("tessal-editor"));
   QApplication::setWindowIcon(QIcon(QStringLiteral(":/tessal.png")));
-  return RunHost(application);
+  return RunHost(line);
 }

@@ -63,6 +63,13 @@ inline constexpr std::array<Choice<Format>, 4> kMatrixFormats = {{
     {"latex", Format::Latex},
 }};
 
+/// What the tables of a model are printed in.
+inline constexpr std::array<Choice<Format>, 3> kModelTableFormats = {{
+    {"md", Format::Markdown},
+    {"csv", Format::Csv},
+    {"json", Format::Json},
+}};
+
 /// What a graph is printed in, and where it goes from its focus.
 inline constexpr std::array<Choice<GraphFormat>, 5> kGraphFormats = {{
     {"dot", GraphFormat::Dot},

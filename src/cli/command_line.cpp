@@ -49,6 +49,25 @@ CLI::Option* AddForce(CLI::App& command, bool& force) {
   return command.add_flag("--force", force, "replaces an existing file");
 }
 
+CLI::Option* OfferWords(CLI::Option* option, const std::string& words) {
+  // A check that refuses nothing: what the option does with a word is its own. Its name is what it is for.
+  return option->check(CLI::Validator([](std::string& /*text*/) { return std::string(); }, "", words));
+}
+
+std::vector<std::string> OfferedWords(CLI::Option& option) {
+  try {
+    for (int place = 0;; ++place) {
+      const std::string words = option.get_validator(place)->get_name();
+      if (words.empty()) continue;
+      std::vector<std::string> list = CLI::detail::split(words, ',');
+      for (std::string& word : list) CLI::detail::trim(word);
+      return list;
+    }
+  } catch (const CLI::OptionNotFound&) {
+    return {};
+  }
+}
+
 CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats) {
   return AddChoice(command, "--format", "FORMAT", formats, line.format);
 }
@@ -56,6 +75,8 @@ CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> for
 void BuildCommandTree(CLI::App& app, CommandLine& line) {
   app.formatter(std::make_shared<HelpText>());
   app.set_help_flag("-h,--help", "prints this help");
+  app.set_version_flag(
+      "--version", [&line] { return line.version; }, "prints the version and the build");
   app.require_subcommand(1);
   AddTemplateCommands(app, line);
   AddAnalysisCommands(app, line);

@@ -15,6 +15,7 @@ namespace tessal::cli {
 
 /// What the options of all commands are read into, and the command that was called.
 struct CommandLine {
+  std::string version;  ///< what `--version` prints
   std::string file;
   std::string otherFile;
   std::string name;
@@ -28,8 +29,10 @@ struct CommandLine {
   CheckCall check;
   SaveCall save;
   RenameCall rename;
+  MergeCall merge;
   FindCall find;
   HtmlCall html;
+  TableCall table;
   UnitsCall units;
   LintCall lint;
   GraphCall graph;
@@ -38,6 +41,9 @@ struct CommandLine {
   BalanceCall balance;
   std::function<ExitCode()> run;
 };
+
+inline constexpr const char* kToolSummary =
+    "Reads, checks, documents and saves templates of aquatic process models.";
 
 /// Makes the whole tree. The line outlives it.
 void BuildCommandTree(CLI::App& app, CommandLine& line);
@@ -66,6 +72,11 @@ CLI::Option* AddFile(CLI::App& command, std::string& file);
 CLI::Option* AddOutput(CLI::App& command, std::string& output, const char* description);
 CLI::Option* AddForce(CLI::App& command, bool& force);
 
+/// Notes the words that an option takes, as `WordsOf` gives them, for completions.
+CLI::Option* OfferWords(CLI::Option* option, const std::string& words);
+/// The words that were noted; empty for an option that takes any.
+std::vector<std::string> OfferedWords(CLI::Option& option);
+
 /// An option that takes one of a few words.
 template <class Value>
 CLI::Option* AddChoice(CLI::App& command, const char* name, const char* typeName, Choices<Value> choices,
@@ -75,7 +86,8 @@ CLI::Option* AddChoice(CLI::App& command, const char* name, const char* typeName
     if (!value) throw CLI::ValidationError(name, "'" + word + "' is none of " + WordsOf(choices));
     chosen = *value;
   };
-  return command.add_option_function<std::string>(name, read, WordsOf(choices))->type_name(typeName);
+  CLI::Option* option = command.add_option_function<std::string>(name, read, WordsOf(choices));
+  return OfferWords(option->type_name(typeName), WordsOf(choices));
 }
 
 CLI::Option* AddFormat(CLI::App& command, CommandLine& line, Choices<Format> formats);

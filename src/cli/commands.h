@@ -48,6 +48,17 @@ struct RenameCall {
   bool force = false;
 };
 ExitCode RunRename(const RenameCall& call);
+/// What differs; ends with a fault of the content where something does.
+ExitCode RunChanges(const std::string& former, const std::string& later, Format format);
+/// With an empty output the merged template replaces ours. Ends with a fault of the content with a conflict.
+struct MergeCall {
+  std::string base;
+  std::string ours;
+  std::string theirs;
+  std::string output;
+  bool force = false;
+};
+ExitCode RunMerge(const MergeCall& call);
 /// Ends as a search does: with a fault of the content where nothing is found.
 struct FindCall {
   std::string file;
@@ -70,6 +81,15 @@ struct HtmlCall {
   bool force = false;
 };
 ExitCode RunHtml(const HtmlCall& call);
+
+/// The tables of a model: as Markdown, as comma-separated values, as JSON, or as LaTeX.
+struct TableCall {
+  std::string file;
+  std::string only;     ///< the name of one table; empty for all
+  bool isBody = false;  ///< LaTeX for a document of one's own
+  Format format = Format::Markdown;
+};
+ExitCode RunTable(const TableCall& call);
 
 // Analyses. Each ends with a fault of the content where it finds something.
 struct MatrixCall {

@@ -10,6 +10,7 @@
 #include "cli/numbers.h"
 #include "cli/output.h"
 #include "expr/carbonate/options.h"
+#include "platform/build_info.h"
 
 namespace tessal::cli {
 
@@ -23,10 +24,10 @@ std::vector<std::string> ArgumentsForParser(int count, char** arguments) {
 }
 
 int RunTool(int count, char** arguments) {
-  CLI::App app{"Reads, checks, documents and saves templates of aquatic process models.", "tessal"};
+  CLI::App app{kToolSummary, "tessal"};
   CommandLine line;
+  line.version = BuildText("tessal");
   BuildCommandTree(app, line);
-  app.set_version_flag("--version", std::string("tessal ") + TESSAL_VERSION, "prints the version");
   try {
     app.parse(ArgumentsForParser(count, arguments));
   } catch (const CLI::ParseError& stop) {

@@ -40,11 +40,11 @@ void AddCheck(CLI::App& app, CommandLine& line) {
   check->add_option("PATH", line.check.paths, "template files, folders of them, or - for standard input")
       ->required();
   AddChoice(*check, "--format", "FORMAT", Choices<Format>(kCheckFormats), line.check.format);
-  check
-      ->add_option_function<std::string>(
-          "--level", [&line](const std::string& text) { line.check.lowestLevel = LevelIn(text); },
-          "hides messages below it: " + WordsOf(Choices<int>(kLevels)) + ", or 1 to 4")
-      ->type_name("LEVEL");
+  const std::string levels = WordsOf(Choices<int>(kLevels));
+  CLI::Option* level = check->add_option_function<std::string>(
+      "--level", [&line](const std::string& text) { line.check.lowestLevel = LevelIn(text); },
+      "hides messages below it: " + levels + ", or 1 to 4");
+  OfferWords(level->type_name("LEVEL"), levels);
   check->add_flag("--quiet", line.check.isQuiet, "prints nothing: the exit code says whether there are any");
 }
 
@@ -58,6 +58,47 @@ void AddFind(CLI::App& app, CommandLine& line) {
   find->add_flag("--whole", line.find.wholeSymbols, "finds whole symbols only");
   find->add_flag("--ignore-case", line.find.ignoreCase, "takes capitals and small letters as the same");
   AddChoice(*find, "--format", "FORMAT", kTableFormats, line.find.format);
+}
+
+void AddChanges(CLI::App& app, CommandLine& line) {
+  CLI::App* changes = AddCommand(app, line, kTemplates, "changes", "lists what differs between two templates",
+                                 [&line] { return RunChanges(line.file, line.otherFile, line.format); });
+  changes->add_option("A", line.file, "the former template")->required();
+  changes->add_option("B", line.otherFile, "the later one")->required();
+  AddFormat(*changes, line, kDescriptionFormats);
+}
+
+void AddMerge(CLI::App& app, CommandLine& line) {
+  CLI::App* merge =
+      AddCommand(app, line, kTemplates, "merge", "brings two changed states of a template together",
+                 [&line] { return RunMerge(line.merge); });
+  merge->add_option("BASE", line.merge.base, "the template that both come from")->required();
+  merge->add_option("OURS", line.merge.ours, "the state that is kept in a conflict, and replaced")
+      ->required();
+  merge->add_option("THEIRS", line.merge.theirs, "the other state")->required();
+  AddOutput(*merge, line.merge.output, "saves under this name, not in the place of OURS");
+  AddForce(*merge, line.merge.force);
+}
+
+void AddTables(CLI::App& app, CommandLine& line) {
+  const auto addOnly = [&line](CLI::App& command) {
+    command.add_option("--only", line.table.only, "prints one table: states, parameters, processes...")
+        ->type_name("NAME");
+  };
+  CLI::App* latex =
+      AddCommand(app, line, kTemplates, "latex", "prints the tables of a model for a paper", [&line] {
+        line.table.format = Format::Latex;
+        return RunTable(line.table);
+      });
+  AddFile(*latex, line.table.file);
+  addOnly(*latex);
+  latex->add_flag("--body", line.table.isBody, "prints no document around them");
+
+  CLI::App* table = AddCommand(app, line, kTemplates, "table", "prints the tables of a model",
+                               [&line] { return RunTable(line.table); });
+  AddFile(*table, line.table.file);
+  addOnly(*table);
+  AddChoice(*table, "--format", "FORMAT", Choices<Format>(kModelTableFormats), line.table.format);
 }
 
 }  // namespace
@@ -102,6 +143,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   AddForce(*rename, line.rename.force);
 
   AddFind(app, line);
+  AddChanges(app, line);
+  AddMerge(app, line);
 
   CLI::App* overview = AddCommand(app, line, kTemplates, "overview", "prints the overview table",
                                   [&line] { return RunOverview(line.file); });
@@ -115,6 +158,8 @@ void AddTemplateCommands(CLI::App& app, CommandLine& line) {
   html->add_flag("--safe", line.html.isSafe, "writes texts so that no markup in them takes effect");
   AddOutput(*html, line.html.output, "the page to write; without it HTML_doc beside the template takes it");
   html->add_flag("--force", line.html.force, "lets OUT replace a file that is no page");
+
+  AddTables(app, line);
 }
 
 }  // namespace tessal::cli

@@ -8,6 +8,9 @@
 #include <unordered_map>
 #include <utility>
 
+#include "core/list_order.h"
+#include "core/matching.h"
+#include "core/rename.h"
 #include "core/template_core.h"
 #include "elements/element_field.h"
 #include "keyfile/item_tree.h"
@@ -26,13 +29,21 @@ constexpr std::array<std::string_view, 4> kFieldsLeftOut = {"Symbol", "ID", "Spe
 /// The list that an element is in: its kind, and its particle class from 0 or -1.
 using ListOfItem = std::pair<ElementKind, std::int32_t>;
 
+struct ItemField {
+  std::string label;
+  std::string value;
+  bool isExpression = false;
+};
+
 /// What is compared as one thing.
 struct Item {
   std::string kind;
   std::string symbol;
-  std::vector<std::pair<std::string, std::string>> fields;  ///< labels and values
-  ListOfItem list{ElementKind::None, -1};                   ///< none for what has no place in a list
-  std::string predecessor;                                  ///< in the list, by its symbol
+  std::vector<ItemField> fields;
+  const CEL_Element* element = nullptr;    ///< none for what has no record
+  std::string specie;                      ///< the class that it belongs to
+  ListOfItem list{ElementKind::None, -1};  ///< none for what has no place in a list
+  std::string predecessor;                 ///< in the list, by its symbol
 };
 
 using Items = std::vector<Item>;
@@ -41,10 +52,15 @@ std::string Label(const std::string& field) {
   return field == "Caption" ? "Kind" : field;
 }
 
-/// All items of a template, in its order.
+std::string NewNameOf(const NewNames& newNames, std::string_view name) {
+  const auto hit = newNames.find(name);
+  return hit == newNames.end() ? std::string(name) : hit->second;
+}
+
+/// All items of a template, in its order. What names others has their new names.
 class Listing final {
  public:
-  explicit Listing(const TemplateCore& listed) : core(listed) {
+  Listing(const TemplateCore& listed, const NewNames& renamed) : core(listed), newNames(renamed) {
     AddTexts(core.Root(), core.Root().symbol.TextOf());
     AddSettings();
     ForEachHeadedCollection([this](const auto& row) {
@@ -75,17 +91,18 @@ class Listing final {
     for (const ElementField& field : fields) {
       if (std::find(kFieldsLeftOut.begin(), kFieldsLeftOut.end(), field.name) != kFieldsLeftOut.end())
         continue;
-      item.fields.emplace_back(prefix + Label(field.name), FieldText(field));
+      item.fields.push_back(
+          {prefix + Label(field.name), FieldText(field), field.kind == FieldKind::Expression});
     }
   }
 
   /// A search refers to others by numbers, which change with every element before them.
   void NameReferences(const CEL_Lagrange_Spatial_Function& search, Item& item) const {
     const auto classPlace = static_cast<std::size_t>(search.lookFor.IntValue() - 1);
-    for (auto& [label, value] : item.fields) {
-      if (label == "Variable ID") value = search.VariableName();
+    for (auto& [label, value, isExpression] : item.fields) {
+      if (label == "Variable ID") value = NewNameOf(newNames, search.VariableName());
       if (label == "Lookfor" && search.lookFor.IntValue() > 0 && classPlace < core.Species().size())
-        value = core.Species()[classPlace]->symbol.Text();
+        value = NewNameOf(newNames, core.Species()[classPlace]->symbol.Text());
     }
   }
 
@@ -102,9 +119,12 @@ class Listing final {
         NameReferences(static_cast<const CEL_Lagrange_Spatial_Function&>(element), item);
       if (element.Kind() == ElementKind::Specie)
         AppendListTexts(static_cast<const CEL_Lagrange_Specie&>(element), item);
+      item.element = &element;
       item.list = {element.Kind(), record.specieIndex};
+      if (record.specieIndex >= 0 && element.Kind() != ElementKind::Specie)
+        item.specie = ClassOf(core.Elements(), record).symbol.TextOf();
       const bool isFirst = items.size() < 2 || items[items.size() - 2].list != item.list;
-      if (!isFirst) item.predecessor = items[items.size() - 2].symbol;
+      if (!isFirst) item.predecessor = NewNameOf(newNames, items[items.size() - 2].symbol);
     };
     const CEL_Element* previous = nullptr;
     // The two records of a movement are side by side.
@@ -133,7 +153,7 @@ class Listing final {
   std::string IncludedItems(const VisibilityLevel& level) {
     if (symbols.empty()) {
       for (const SymbolRecord& record : core.SymbolTable())
-        symbols.emplace(record.uid, record.element->FullSymbol());
+        symbols.emplace(record.uid, NewNameOf(newNames, record.element->FullSymbol()));
     }
     std::set<std::string_view> names;
     for (const Uid uid : level.items) {
@@ -159,56 +179,46 @@ class Listing final {
   }
 
   const TemplateCore& core;
+  const NewNames& newNames;
   Items items;
   std::unordered_map<Uid, std::string> symbols;  ///< of all elements, when a level first asks
 };
 
-std::vector<FieldChange> CompareFields(const Item& former, const Item& later) {
+std::vector<FieldChange> CompareFields(const Item& former, const Item& later, const NewNames& newNames) {
   std::vector<FieldChange> changes;
-  const auto valueIn = [](const Item& item, const std::string& label) {
+  const auto fieldIn = [](const Item& item, const std::string& label) {
     const auto hit = std::find_if(item.fields.begin(), item.fields.end(),
-                                  [&label](const auto& field) { return field.first == label; });
-    return hit == item.fields.end() ? nullptr : &hit->second;
+                                  [&label](const ItemField& field) { return field.label == label; });
+    return hit == item.fields.end() ? nullptr : &*hit;
   };
-  for (const auto& [label, value] : later.fields) {
-    const std::string* before = valueIn(former, label);
-    if (before == nullptr ? !value.empty() : *before != value)
-      changes.push_back({label, before == nullptr ? std::string() : *before, value});
+  const auto isSame = [&newNames](const ItemField& before, const ItemField& after) {
+    if (before.value == after.value) return true;
+    return after.isExpression && !newNames.empty() && ReplaceNames(before.value, newNames) == after.value;
+  };
+  for (const ItemField& field : later.fields) {
+    const ItemField* before = fieldIn(former, field.label);
+    if (before == nullptr ? !field.value.empty() : !isSame(*before, field))
+      changes.push_back(
+          {field.label, before == nullptr ? std::string() : before->value, field.value, field.isExpression});
   }
-  for (const auto& [label, value] : former.fields) {
-    if (valueIn(later, label) == nullptr && !value.empty()) changes.push_back({label, value, ""});
+  for (const ItemField& field : former.fields) {
+    if (fieldIn(later, field.label) == nullptr && !field.value.empty())
+      changes.push_back({field.label, field.value, "", field.isExpression});
   }
   return changes;
-}
-
-/// Which of the numbers are outside a longest rising row of them: with those moved, all are in order.
-std::vector<bool> OutOfOrder(const std::vector<std::size_t>& numbers) {
-  constexpr auto kNone = static_cast<std::size_t>(-1);
-  std::vector<std::size_t> ends;  // of the rows of each length, the place of the least last number
-  std::vector<std::size_t> before(numbers.size(), kNone);
-  for (std::size_t place = 0; place < numbers.size(); ++place) {
-    const auto row = std::lower_bound(
-        ends.begin(), ends.end(), place,
-        [&numbers](std::size_t left, std::size_t right) { return numbers[left] < numbers[right]; });
-    if (row != ends.begin()) before[place] = *(row - 1);
-    if (row == ends.end()) {
-      ends.push_back(place);
-    } else {
-      *row = place;
-    }
-  }
-  std::vector<bool> outside(numbers.size(), true);
-  for (std::size_t place = ends.empty() ? kNone : ends.back(); place != kNone; place = before[place])
-    outside[place] = false;
-  return outside;
 }
 
 /// The matching of the items of two templates.
 class Comparison final {
  public:
-  Comparison(Items formerItems, Items laterItems)
-      : former(std::move(formerItems)), later(std::move(laterItems)), partners(later.size(), kNone) {
-    Match();
+  Comparison(Items formerItems, Items laterItems, const ElementMatch& elementMatch)
+      : match(elementMatch),
+        former(std::move(formerItems)),
+        later(std::move(laterItems)),
+        partners(later.size(), kNone),
+        isMatched(former.size(), false) {
+    MatchByName();
+    MatchElements();
     FindMoves();
   }
 
@@ -217,23 +227,37 @@ class Comparison final {
  private:
   static constexpr auto kNone = static_cast<std::size_t>(-1);
 
-  /// What is the same for an item in both templates. An element may change its kind.
-  static std::string KeyOf(const Item& item) {
-    const bool isElement = item.list.first != ElementKind::None;
-    return (isElement ? std::string() : item.kind) + '\n' + item.symbol;
+  void Pair(std::size_t formerPlace, std::size_t laterPlace) {
+    partners[laterPlace] = formerPlace;
+    isMatched[formerPlace] = true;
   }
 
-  void Match() {
+  /// Items that are no elements with a record: by kind and name.
+  void MatchByName() {
+    const auto keyOf = [](const Item& item) { return item.kind + '\n' + item.symbol; };
     std::unordered_map<std::string, std::vector<std::size_t>> places;
     // From the end, so that the first of a name is taken first.
-    for (std::size_t place = former.size(); place-- > 0;) places[KeyOf(former[place])].push_back(place);
-    isMatched.assign(former.size(), false);
+    for (std::size_t place = former.size(); place-- > 0;) {
+      if (former[place].element == nullptr) places[keyOf(former[place])].push_back(place);
+    }
     for (std::size_t place = 0; place < later.size(); ++place) {
-      const auto hit = places.find(KeyOf(later[place]));
+      if (later[place].element != nullptr) continue;
+      const auto hit = places.find(keyOf(later[place]));
       if (hit == places.end() || hit->second.empty()) continue;
-      partners[place] = hit->second.back();
-      isMatched[hit->second.back()] = true;
+      Pair(hit->second.back(), place);
       hit->second.pop_back();
+    }
+  }
+
+  void MatchElements() {
+    std::unordered_map<const CEL_Element*, std::size_t> places;
+    for (std::size_t place = 0; place < former.size(); ++place) {
+      if (former[place].element != nullptr) places.emplace(former[place].element, place);
+    }
+    for (std::size_t place = 0; place < later.size(); ++place) {
+      const auto partner = match.former.find(later[place].element);
+      if (later[place].element != nullptr && partner != match.former.end())
+        Pair(places.at(partner->second), place);
     }
   }
 
@@ -256,13 +280,21 @@ class Comparison final {
   std::vector<FieldChange> FieldChanges(std::size_t place) const {
     const Item& before = former[partners[place]];
     const Item& after = later[place];
-    std::vector<FieldChange> changes = CompareFields(before, after);
+    std::vector<FieldChange> changes = CompareFields(before, after, match.renamed);
     if (isMoved[place] && before.predecessor != after.predecessor) {
-      changes.push_back({"Comes after", before.predecessor, after.predecessor});
+      changes.push_back({"Comes after", before.predecessor, after.predecessor, false});
     }
     return changes;
   }
 
+  /// Whether the partners have symbols, and different ones.
+  bool IsRenamed(std::size_t place) const {
+    const CEL_Element* element = later[place].element;
+    return element != nullptr && !HasCaption(*element) &&
+           former[partners[place]].element->symbol.Text() != element->symbol.Text();
+  }
+
+  const ElementMatch& match;
   Items former;
   Items later;
   std::vector<std::size_t> partners;  ///< for each later item its place among the former ones, or none
@@ -274,17 +306,24 @@ std::vector<SymbolChange> Comparison::Changes() const {
   std::vector<SymbolChange> changes;
   for (std::size_t place = 0; place < former.size(); ++place) {
     const Item& item = former[place];
-    if (!isMatched[place]) changes.push_back({ChangeKind::Removed, item.kind, item.symbol, {}});
+    if (!isMatched[place])
+      changes.push_back({ChangeKind::Removed, item.kind, item.symbol, {}, {}, item.specie});
   }
   for (std::size_t place = 0; place < later.size(); ++place) {
     const Item& item = later[place];
-    if (partners[place] == kNone) changes.push_back({ChangeKind::Added, item.kind, item.symbol, {}});
+    if (partners[place] == kNone)
+      changes.push_back({ChangeKind::Added, item.kind, item.symbol, {}, {}, item.specie});
   }
   for (std::size_t place = 0; place < later.size(); ++place) {
     if (partners[place] == kNone) continue;
     std::vector<FieldChange> fields = FieldChanges(place);
     const Item& item = later[place];
-    if (!fields.empty()) changes.push_back({ChangeKind::Changed, item.kind, item.symbol, std::move(fields)});
+    if (IsRenamed(place)) {
+      changes.push_back({ChangeKind::Renamed, item.kind, item.symbol, std::move(fields),
+                         former[partners[place]].symbol, item.specie});
+    } else if (!fields.empty()) {
+      changes.push_back({ChangeKind::Changed, item.kind, item.symbol, std::move(fields), {}, item.specie});
+    }
   }
   return changes;
 }
@@ -292,7 +331,10 @@ std::vector<SymbolChange> Comparison::Changes() const {
 }  // namespace
 
 std::vector<SymbolChange> CompareBySymbol(const TemplateCore& former, const TemplateCore& later) {
-  return Comparison(Listing(former).Take(), Listing(later).Take()).Changes();
+  static const NewNames kAsTheyAre;
+  const ElementMatch match = MatchElements(former, later);
+  return Comparison(Listing(former, match.renamed).Take(), Listing(later, kAsTheyAre).Take(), match)
+      .Changes();
 }
 
 }  // namespace tessal

@@ -25,16 +25,25 @@ std::string WordOf(ChangeKind change) {
       return "Removed";
     case ChangeKind::Added:
       return "Added";
+    case ChangeKind::Renamed:
+      return "Renamed";
     case ChangeKind::Changed:
       break;
   }
   return "Changed";
 }
 
-/// A row for each field of a changed item; one for an item that was added or removed.
+/// A row for each field of a changed item; one for an item that was added, removed or renamed.
 void AppendRows(const SymbolChange& change, std::vector<DocumentDifference>& rows) {
   const DocumentDifference item{WordOf(change.change), change.kind, ToUtf8(change.symbol), "", "", ""};
-  if (change.change != ChangeKind::Changed) rows.push_back(item);
+  if (change.change == ChangeKind::Renamed) {
+    rows.push_back(item);
+    rows.back().field = "Symbol";
+    rows.back().before = ToUtf8(change.formerSymbol);
+    rows.back().after = ToUtf8(change.symbol);
+  } else if (change.change != ChangeKind::Changed) {
+    rows.push_back(item);
+  }
   for (const FieldChange& field : change.fields) {
     DocumentDifference row = item;
     row.field = field.field;

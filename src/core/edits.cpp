@@ -20,14 +20,6 @@ struct Overloaded : Visitors... {
 template <class... Visitors>
 Overloaded(Visitors...) -> Overloaded<Visitors...>;
 
-void SetValue(CEL_Property& property, const PropertyValue& value) {
-  std::visit(Overloaded{[&property](double number) { property.SetReal(number); },
-                        [&property](std::int32_t number) { property.SetInt(number); },
-                        [&property](bool truth) { property.SetBool(truth); },
-                        [&property](const std::string& text) { property.SetText(text); }},
-             value);
-}
-
 /// Puts what is away at its place, or takes what is there away.
 template <class Away, class Items>
 void PutOrTake(Items& items, std::size_t place, std::unique_ptr<Away>& away) {
@@ -270,6 +262,14 @@ PropertyValue ValueOf(const CEL_Property& property) {
     default:
       return std::string(property.Text());
   }
+}
+
+void SetValue(CEL_Property& property, const PropertyValue& value) {
+  std::visit(Overloaded{[&property](double number) { property.SetReal(number); },
+                        [&property](std::int32_t number) { property.SetInt(number); },
+                        [&property](bool truth) { property.SetBool(truth); },
+                        [&property](const std::string& text) { property.SetText(text); }},
+             value);
 }
 
 void Exchange(TemplateState& state, TemplateEdit& edit) {

@@ -18,6 +18,8 @@ namespace tessal {
 using PropertyValue = std::variant<double, std::int32_t, bool, std::string>;
 
 PropertyValue ValueOf(const CEL_Property& property);
+/// Gives a property a value of its own type.
+void SetValue(CEL_Property& property, const PropertyValue& value);
 
 /// A property has another value.
 struct ValueEdit {

@@ -3,24 +3,13 @@
 #include <algorithm>
 #include <utility>
 
+#include "core/rebuild_off.h"
 #include "core/template_core.h"
 #include "core/text_pattern.h"
 
 namespace tessal {
 
 namespace {
-
-/// One rebuild, at the end, in the place of one for each change.
-class OneRebuild final {
- public:
-  explicit OneRebuild(TemplateCore& changed) : core(changed) { core.SetRebuildEnabled(false); }
-  OneRebuild(const OneRebuild&) = delete;
-  OneRebuild& operator=(const OneRebuild&) = delete;
-  ~OneRebuild() { core.SetRebuildEnabled(true); }
-
- private:
-  TemplateCore& core;
-};
 
 ReplaceObstacle ObstacleOf(const FoundText& found) {
   if (found.role == TextRole::Symbol) return ReplaceObstacle::Symbol;
@@ -63,7 +52,7 @@ ReplaceOutcome ApplyReplacements(TemplateCore& core, std::span<const Replacement
   ReplaceOutcome outcome;
   const EditStep step(core.History(), "Replace in texts and expressions");
   {
-    const OneRebuild oneRebuild(core);
+    const RebuildOff oneAtTheEnd(core);
     TextsByPlace texts(core);
     for (std::size_t place = 0; place < replacements.size(); ++place) {
       if (!replacements[place].isChosen) continue;

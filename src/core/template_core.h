@@ -23,6 +23,7 @@
 namespace tessal {
 
 enum class Rewriting : std::uint8_t;
+struct MergeConflict;
 
 /// The symbol of the message that a load leaves when it could not keep the file's further top-level sections.
 inline constexpr std::string_view kNotKeptSymbol = "could not read template: ";
@@ -263,6 +264,12 @@ class TemplateCore final : public ElementOwner {
   /// Takes over what the load passed over, and forgets it. False when there is more that is to be set by
   /// hand.
   bool TakeOverPassedOver();
+  /// Brings what changed from a base to another state of it into this one, which came from the base too.
+  /// What the sides changed differently (`core/merge.h`) stays as it is here. Elements go by their symbols,
+  /// renamed ones by their content (`core/matching.h`), and uses follow a rename of either side. The revision
+  /// becomes the higher one. What the loads of the others did not take over is not merged. Nothing is
+  /// recorded, so the history must not have been started.
+  std::vector<MergeConflict> Merge(const TemplateCore& base, const TemplateCore& theirs);
   /// Saves: under its own name plainly, under another with fresh version stamps and a restarted revision.
   /// False when it failed; the registry then holds the reason, and the file on disk is as it was.
   bool SaveWrapper(const std::string& path);

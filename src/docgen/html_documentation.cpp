@@ -431,6 +431,13 @@ std::string PageRefusal(const std::string& path) {
              : "'" + path + "' exists already and is no page of this program";
 }
 
+std::string HtmlDocumentation(const TemplateCore& core, const PageOptions& options) {
+  const std::time_t now = std::time(nullptr);
+  std::tm local = {};
+  localtime_r(&now, &local);
+  return HtmlDocumentation(core, options, local);
+}
+
 bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, const PageOptions& options,
                              std::string& failure) {
   std::error_code notThere;
@@ -438,10 +445,7 @@ bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, 
     failure = "can not write the page over its template '" + path + "'";
     return false;
   }
-  const std::time_t now = std::time(nullptr);
-  std::tm local = {};
-  localtime_r(&now, &local);
-  failure = WriteOutputFile(path, HtmlDocumentation(core, options, local));
+  failure = WriteOutputFile(path, HtmlDocumentation(core, options));
   return failure.empty();
 }
 

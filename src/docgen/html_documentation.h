@@ -43,5 +43,7 @@ bool ExportHtmlDocumentation(const TemplateCore& core, const std::string& path, 
 /// The page as text, created at the given local time. A page in UTF-8 with more than ASCII begins with a byte
 /// order mark, which browsers believe before what a server says.
 std::string HtmlDocumentation(const TemplateCore& core, const PageOptions& options, const std::tm& created);
+/// The same, created now.
+std::string HtmlDocumentation(const TemplateCore& core, const PageOptions& options);
 
 }  // namespace tessal

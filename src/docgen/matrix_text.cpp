@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "analysis/process_matrix.h"
+#include "docgen/csv_text.h"
 #include "docgen/latex.h"
 
 namespace tessal {
@@ -35,16 +36,6 @@ std::vector<Cells> Table(const ProcessMatrix& matrix) {
     table.back().insert(table.back().end(), matrix.other.begin(), matrix.other.end());
   }
   return table;
-}
-
-std::string Quoted(std::string_view text) {
-  if (text.find_first_of(",\"\r\n") == std::string_view::npos) return std::string(text);
-  std::string quoted = "\"";
-  for (const char character : text) {
-    if (character == '"') quoted += '"';
-    quoted += character;
-  }
-  return quoted + '"';
 }
 
 /// A factor as a formula; a text that is no expression of the language as it is.
@@ -85,10 +76,7 @@ std::string MatrixAsCsv(const ProcessMatrix& matrix) {
   std::string text;
   for (Cells& row : table) {
     row.resize(matrix.states.size() + 2);
-    for (std::size_t column = 0; column < row.size(); ++column) {
-      text += (column == 0 ? "" : ",") + Quoted(row[column]);
-    }
-    text += "\r\n";
+    text += CsvLine(row);
   }
   return text;
 }

@@ -64,6 +64,19 @@ std::string Element(std::string_view tag, std::string_view content) {
   return "<" + std::string(tag) + ">" + std::string(content) + "</" + std::string(tag) + ">";
 }
 
+/// A section's anchor is in capitals, as those of the names are.
+std::string SectionAnchor(std::string_view title) {
+  std::string anchor = MarkdownAnchor(title);
+  std::transform(anchor.begin(), anchor.end(), anchor.begin(), [](char character) {
+    return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
+  });
+  return anchor;
+}
+
+std::string Heading(std::string_view tag, const std::string& anchor, std::string_view text) {
+  return Element(tag, "<a name=\"" + anchor + "\" id=\"" + anchor + "\"></a>" + SafeText(text)) + "\n";
+}
+
 /// A link to a place on the same page.
 std::string LinkTo(std::string_view anchor, std::string_view text) {
   return "<a href=\"#" + std::string(anchor) + "\">" + SafeText(text) + "</a>";
@@ -157,9 +170,8 @@ std::string EntryMarkdown(const ReferenceEntry& entry) {
 }
 
 std::string EntryHtml(const ReferenceEntry& entry) {
-  const std::string anchor = AnchorText(entry.name);
-  std::string html = "<h3><a name=\"" + anchor + "\" id=\"" + anchor + "\"></a>" + SafeText(entry.heading) +
-                     "</h3>\n" + Element("p", SafeText(entry.purpose)) + "\n";
+  std::string html =
+      Heading("h3", AnchorText(entry.name), entry.heading) + Element("p", SafeText(entry.purpose)) + "\n";
   if (!entry.quantities.empty()) {
     html += "<table border=\"1\" cellspacing=\"0\" cellpadding=\"4\">\n";
     for (const ReferenceEntry::Quantity& quantity : entry.quantities) {
@@ -239,7 +251,7 @@ std::string PageHtml(const ReferencePage& page) {
   }
   html += "</ul>\n";
   for (const ReferenceSection& section : page.sections) {
-    html += Element("h2", SafeText(section.title)) + "\n";
+    html += Heading("h2", SectionAnchor(section.title), section.title);
     for (const ReferenceEntry& entry : section.entries) html += EntryHtml(entry);
   }
   return html + "</body>\n</html>\n";

@@ -179,10 +179,7 @@ void CEL_Element::TakeValuesOf(const CEL_Element& other) {
     to.SetBool(from.BoolValue());
     to.SetText(from.Text());
   };
-  for (const BaseRow& row : kBaseRows) {
-    if (row.property != &CEL_Element::symbol && row.property != &CEL_Element::id) take(row.property);
-  }
-  for (const PropertyRow& row : rows) take(row.place);
+  for (const ElementValue& value : Values()) take(value.place);
   FollowValues();
 }
 
@@ -384,6 +381,16 @@ PropertyPlace CEL_Element::PlaceWithLabel(std::string_view label) const {
     if (row.label == label) return row.place;
   }
   return nullptr;
+}
+
+std::vector<ElementValue> CEL_Element::Values() const {
+  std::vector<ElementValue> values;
+  for (const BaseRow& row : kBaseRows) {
+    if (row.property != &CEL_Element::symbol && row.property != &CEL_Element::id)
+      values.push_back({row.label, row.property});
+  }
+  for (const PropertyRow& row : rows) values.push_back({row.label, row.place});
+  return values;
 }
 
 void CEL_Element::AppendTexts(std::vector<ElementText>& texts) const {

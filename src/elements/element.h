@@ -73,6 +73,12 @@ constexpr PropertyRow Captioned(std::string_view caption, PropertyRow row) {
   return row;
 }
 
+/// A value of an element: the label of its field, and where its property is.
+struct ElementValue {
+  std::string_view label;
+  PropertyPlace place;
+};
+
 /// A text that people write into an element: the label of its field, and its property.
 struct ElementText {
   std::string_view label;
@@ -168,6 +174,8 @@ class CEL_Element : public PropertyHolder {
   std::string_view LabelOf(const CEL_Property& property) const;
   /// Where the property with a label is; none for any other text.
   PropertyPlace PlaceWithLabel(std::string_view label) const;
+  /// All properties of the class but the symbol and the number.
+  std::vector<ElementValue> Values() const;
   /// Appends the texts and expressions, in the order of field lists. What is chosen from a list is none.
   void AppendTexts(std::vector<ElementText>& texts) const;
 

@@ -37,6 +37,7 @@ class CEL_Miscanellous final : public CEL_Element {
   /// For who puts functions back where they were.
   Sequence<CEL_ExternalFunction>& ExternalFunctionList() { return functions; }
   CEL_ListHead& ExternalFunctionHead() { return functionHead; }
+  const CEL_ListHead& ExternalFunctionHead() const { return functionHead; }
 
   CEL_Visibility& Visibilities() { return visibilities; }
   const CEL_Visibility& Visibilities() const { return visibilities; }

@@ -74,6 +74,10 @@ std::string AnchorOf(std::string_view heading) {
   return anchor;
 }
 
+char ToUpper(char character) {
+  return static_cast<char>(std::toupper(static_cast<unsigned char>(character)));
+}
+
 /// The target of a link, as seen from where the file is published.
 std::string PublishedTarget(const std::string& target, const std::string& file) {
   const std::size_t fragment = std::min(target.find('#'), target.size());
@@ -85,10 +89,12 @@ std::string PublishedTarget(const std::string& target, const std::string& file) 
   const std::filesystem::path from = std::filesystem::path(PublishedPath(file)).parent_path();
   const std::string path =
       std::filesystem::path("/" + published).lexically_relative("/" + from.string()).generic_string();
-  const bool hasOtherAnchors =
-      std::any_of(std::begin(kPages), std::end(kPages),
-                  [&linked](const Publication& page) { return page.from == linked; });
-  return hasOtherAnchors ? path : path + target.substr(fragment);
+  const bool isReference = std::any_of(std::begin(kPages), std::end(kPages),
+                                       [&linked](const Publication& page) { return page.from == linked; });
+  std::string anchor = target.substr(fragment);
+  // The reference names its anchors as the catalogue does.
+  if (isReference) std::transform(anchor.begin(), anchor.end(), anchor.begin(), ToUpper);
+  return path + anchor;
 }
 
 /// Replaces the targets of all links.
@@ -120,7 +126,9 @@ void MarkHeadings(Page& page) {
     const std::string text = page.body.substr(start, page.body.find("</h", start) - start);
     if (page.title.empty()) page.title = WithoutTags(text);
     const std::string anchor = AnchorOf(text);
-    page.body.insert(start, "<a name=\"" + anchor + "\" id=\"" + anchor + "\"></a>");
+    std::string mark = "<a name=\"" + anchor;
+    mark += "\" id=\"" + anchor;
+    page.body.insert(start, mark + "\"></a>");
   }
 }
 

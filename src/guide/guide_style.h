@@ -10,6 +10,7 @@ inline constexpr std::string_view kGuideStyle =
     R"css(<style>
 body { font-family: sans-serif; margin: 1.5em; }
 h2 { margin-top: 1.5em; }
+table { margin-top: 8px; margin-bottom: 8px; }
 </style>
 <style>
 @supports (display: block) {

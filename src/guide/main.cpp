@@ -66,6 +66,7 @@ void WriteChapters(const fs::path& project, const fs::path& output) {
   WritePage(output, ChapterFile(kIndex), index, Way({help}));
   const std::vector<std::string> chapters = ChaptersIn(index);
   std::vector<Page> pages;
+  pages.reserve(chapters.size());
   for (const std::string& chapter : chapters) pages.push_back(ReadPage(project, ChapterFile(chapter)));
   for (std::size_t place = 0; place < chapters.size(); ++place) {
     std::vector<std::string> links{Link("index.html", index.title)};

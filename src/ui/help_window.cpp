@@ -23,7 +23,8 @@ const QString kTopics = QStringLiteral("TessalOnline.html");
 const QString kGuide = QStringLiteral("guide/index.html");
 const QString kFunctions = QStringLiteral("Functions.html");
 const QString kBuiltins = QStringLiteral("Builtins.html");
-constexpr QSize kUsualSize(720, 560);
+/// Wide enough for the pictures of the guide.
+constexpr QSize kUsualSize(920, 700);
 
 /// Where the page may lie, seen from the executable.
 constexpr std::array<const char*, 2> kFolders = {".", "../share/tessal"};

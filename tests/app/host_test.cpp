@@ -1,5 +1,6 @@
 // The host with the editor's module in it: documents that come and go, and work that must not be lost.
 #include <gtest/gtest.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <QAbstractButton>
@@ -27,6 +28,8 @@
 #include <fstream>
 #include <map>
 #include <memory>
+#include <numeric>
+#include <set>
 #include <sstream>
 #include <stdexcept>
 #include <utility>
@@ -448,11 +451,72 @@ TEST(Module, IsNotTakenFromTheCurrentFolder) {
   QDir::setCurrent(former);
 }
 
+/// The commands of all menus, as the guide lists them.
+std::string MenuTable(const HostWindow& window, const std::string& head) {
+  QStringList rows;
+  for (const QAction* menu : window.menuBar()->actions()) {
+    for (const QAction* command : menu->menu()->actions()) {
+      if (command->isSeparator() || !command->isVisible()) continue;
+      QStringList keys;
+      for (const QKeySequence& key : command->shortcuts()) keys.append(key.toString());
+      rows.append(QStringLiteral("| %1 | %2 | %3 |").arg(menu->text(), command->text(), keys.join(" or ")));
+    }
+  }
+  return head + rows.join(u'\n').remove(u'&').remove("...").append(u'\n').toStdString();
+}
+
+TEST(Host, HasTheMenusThatTheGuideLists) {
+  HostWindow window(Module().MakeDocTemplate(), Module().EditorName());
+  window.NewDocument();
+  std::string page = test::ReadFile(TESSAL_SOURCE_DIR "/docs/guide/keyboard.md");
+  const std::string head = "| Menu | Command | Keys |\n|---|---|---|\n";
+  const std::size_t start = page.find(head);
+  ASSERT_NE(start, std::string::npos);
+  page.replace(start, page.find("\n\n", start) + 1 - start, MenuTable(window, head));
+  test::ExpectPage("../docs/guide/keyboard.md", page);
+}
+
 long ResidentPages() {
   std::ifstream sizes("/proc/self/statm");
   long resident = 0;
   sizes >> resident >> resident;
   return resident;
+}
+
+TEST(Host, HasTheKeysOfTheManual) {
+  HostWindow window(Module().MakeDocTemplate(), Module().EditorName());
+  window.NewDocument();
+  std::set<std::string> lines;
+  for (const QAction* action : window.findChildren<QAction*>()) {
+    const QString text = QString(action->text()).remove(u'&').remove("...");
+    const QString keys = QKeySequence::listToString(action->shortcuts(), QKeySequence::PortableText);
+    if (!keys.isEmpty()) lines.insert((text + "\t" + keys + "\n").toStdString());
+  }
+  test::ExpectPage("../src/manual/editor_keys.txt",
+                   std::accumulate(lines.begin(), lines.end(), std::string()));
+}
+
+/// The program itself, where there is no display.
+std::string CallEditor(const std::string& arguments) {
+  const TemporaryFolder folder;
+  const std::string output = folder.File("output");
+  const int status =
+      std::system(("env -u DISPLAY -u WAYLAND_DISPLAY -u QT_QPA_PLATFORM '" TESSAL_EDITOR "' " + arguments +
+                   " >'" + output + "' 2>&1")
+                      .c_str());
+  return test::ReadFile(output) + "[" + std::to_string(WEXITSTATUS(status)) + "]";
+}
+
+TEST(Editor, AnswersQuestionsAboutItsCallWithoutADisplay) {
+  const std::string help = CallEditor("--help");
+  EXPECT_TRUE(help.starts_with("Edits templates") && help.ends_with("[0]")) << help;
+  for (const char* option : {"-h,--help ", "-v,--version ", "--module FILE ", "--platform NAME "}) {
+    EXPECT_NE(help.find(option), std::string::npos) << option;
+  }
+  const std::string version = CallEditor("-v");
+  EXPECT_TRUE(version.starts_with("tessal-editor 1") && version.ends_with("revision 1\n[0]")) << version;
+  EXPECT_EQ(CallEditor("--frob x.tessal"), "tessal-editor: Unknown option 'frob'.\n[2]");
+  EXPECT_EQ(CallEditor("--module"), "tessal-editor: Missing value after '--module'.\n[2]");
 }
 
 TEST(Host, FiftyDocumentsLeaveNoMemoryInUse) {

@@ -70,6 +70,7 @@ constexpr Row kRows[] = {
     {"Find", "find FILE k.*f|x --regex --ignore-case", kOpen, false, 11},
     {"Html", "html FILE", kOpen, false, 11},
     {"Json", "check FILE --format json", kOpen, true, 11, 1},
+    {"Latex", "latex FILE", kOpen, false, 31},
     {"Tree", "tree FILE", kOpen, true, 1},
     {"Lint", "lint FILE --format gitlab", kOpen, true, 31, 1},
     {"Graph", "graph FILE --kinds all --format json", kOpen, false, 31},

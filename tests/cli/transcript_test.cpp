@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <nlohmann/json.hpp>
@@ -34,7 +35,10 @@ class ShellSession final {
   }
 
   /// Makes a file in the session's folder.
-  void Write(const std::string& name, const std::string& content) const { folder.Write(name, content); }
+  void Write(const std::string& name, const std::string& content) const {
+    std::filesystem::create_directories((folder.Path() / name).parent_path());
+    folder.Write(name, content);
+  }
 
   /// Runs a command, pipes and redirections among it, with an empty standard input.
   ShellRun Run(const std::string& command) const {
@@ -105,13 +109,12 @@ struct PageStep {
   std::string text;  ///< what the command prints, or what is in the file
 };
 
-/// The steps of a page: indented or fenced blocks that begin with a prompt, and whole templates, fenced as
-/// ```tessal NAME.
+/// The steps of a page: indented or fenced blocks that begin with a prompt, and whole files, fenced as
+/// ```tessal NAME or as another kind.
 std::vector<PageStep> StepsOn(const std::string& page) {
   const std::string indent = "    ";
   const std::string fence = "```";
   const std::string prompt = "$ ";
-  const std::string templateFence = fence + "tessal ";
   std::vector<PageStep> steps;
   bool isFenced = false;
   bool isStep = false;
@@ -119,8 +122,9 @@ std::vector<PageStep> StepsOn(const std::string& page) {
   for (std::string line; std::getline(lines, line);) {
     if (line.starts_with(fence)) {
       isFenced = !isFenced;
-      isStep = isFenced && line.starts_with(templateFence);
-      if (isStep) steps.push_back({"", line.substr(templateFence.size()), ""});
+      const std::size_t name = line.find(' ');
+      isStep = isFenced && name != std::string::npos;
+      if (isStep) steps.push_back({"", line.substr(name + 1), ""});
       continue;
     }
     const bool isBlock = isFenced || line.starts_with(indent);
@@ -162,9 +166,9 @@ TEST(MessagesPage, ShowsEveryRowOfTheTable) {
   ExpectPage("../docs/messages.md", ShellSession().Run("tessal explain --markdown").output);
 }
 
-/// The front page and the chapters of the guide, below the project's folder.
+/// The front page, those on repositories, and the chapters of the guide, below the project's folder.
 std::vector<std::string> PagesOfProject() {
-  std::vector<std::string> pages{"README.md"};
+  std::vector<std::string> pages{"README.md", "docs/ci.md", "docs/teams.md"};
   for (const auto& entry : std::filesystem::directory_iterator(TESSAL_SOURCE_DIR "/docs/guide"))
     if (entry.path().extension() == ".md") pages.push_back("docs/guide/" + entry.path().filename().string());
   return pages;
@@ -191,6 +195,17 @@ void ExpectOutput(const ShellRun& run, const PageStep& step) {
   EXPECT_EQ(given, expected) << step.command;
 }
 
+/// Runs what a file of another program calls the tool with. A build server's file has one call a line.
+void ExpectCallsToRun(const ShellSession& session, const PageStep& step) {
+  std::istringstream lines(step.text);
+  for (std::string line; std::getline(lines, line);) {
+    const std::size_t call = line.find(" tessal ");
+    if (call == std::string::npos || call == 0 || (line[call - 1] != '-' && line[call - 1] != ':')) continue;
+    const ShellRun run = session.Run(line.substr(call));
+    EXPECT_EQ(run.exitCode, 0) << step.file << ": " << line << "\n" << run.output << run.errors;
+  }
+}
+
 class Pages : public testing::TestWithParam<std::string> {};
 
 TEST_P(Pages, ShowWhatTheToolPrintsAndTemplatesThatLoad) {
@@ -198,6 +213,10 @@ TEST_P(Pages, ShowWhatTheToolPrintsAndTemplatesThatLoad) {
   for (const PageStep& step : StepsOn(ReadPage(GetParam()))) {
     if (!step.file.empty()) {
       session.Write(step.file, step.text);
+      if (!step.file.ends_with(".tessal")) {
+        ExpectCallsToRun(session, step);
+        continue;
+      }
       const ShellRun run = session.Run("tessal check '" + step.file + "'");
       EXPECT_NE(run.exitCode, 2) << step.file << "\n" << run.errors;
     } else {
@@ -206,8 +225,12 @@ TEST_P(Pages, ShowWhatTheToolPrintsAndTemplatesThatLoad) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::ValuesIn(PagesOfProject()),
-                         [](const auto& page) { return std::filesystem::path(page.param).stem().string(); });
+INSTANTIATE_TEST_SUITE_P(Project, Pages, testing::ValuesIn(PagesOfProject()), [](const auto& page) {
+  std::string name = page.param;
+  std::replace_if(
+      name.begin(), name.end(), [](char each) { return each == '/' || each == '.'; }, '_');
+  return name;
+});
 
 TEST(Pages, AreReadStepByStep) {
   const std::vector<PageStep> steps = StepsOn(

@@ -313,8 +313,9 @@ std::string TemplateScript::Compare() const {
   file.LoadWrapper(folder.File(kModel));
   std::string text;
   for (const SymbolChange& change : CompareBySymbol(file, core)) {
-    text += "-+*"[static_cast<std::size_t>(change.change)];
-    text += " " + change.kind + " '" + change.symbol + "'\n";
+    text += "-+*~"[static_cast<std::size_t>(change.change)];
+    text += " " + change.kind + " '" + change.symbol + "'";
+    text += (change.formerSymbol.empty() ? "" : " was '" + change.formerSymbol + "'") + "\n";
     for (const FieldChange& field : change.fields)
       text += "    " + field.field + ": '" + field.before + "' -> '" + field.after + "'\n";
   }

@@ -72,6 +72,18 @@ TEST(Guide, HasEachChapterInItsIndex) {
   EXPECT_EQ(listed, present);
 }
 
+TEST(Guide, ShowsNoPictureThatTheScriptDoesNotMake) {
+  const std::string script = ReadFile((kProject / "docs/pictures.txt").string());
+  for (const std::string folder : {"docs/pictures", "docs/help/pictures", "docs/guide/pictures"}) {
+    const std::vector<fs::path> pictures = FilesIn(kProject / folder, ".png");
+    EXPECT_FALSE(pictures.empty()) << folder;
+    for (const fs::path& picture : pictures) {
+      const std::string name = folder + "/" + picture.filename().string();
+      EXPECT_NE(script.find(" " + name), std::string::npos) << name;
+    }
+  }
+}
+
 TEST(Guide, MarksHeadingsAndFollowsDocumentsToTheirPages) {
   const auto page = guide::PageFromMarkdown(
       "# A `B`, and *C*_d\n[1](scopes.md#the-table) [2](../functions.md#abs) "
@@ -81,7 +93,7 @@ TEST(Guide, MarksHeadingsAndFollowsDocumentsToTheirPages) {
   EXPECT_EQ(page.title, "A B, and C_d");
   EXPECT_EQ(ValuesOf("id", page.body), std::set<std::string>{"a-b-and-c_d"});
   const std::set<std::string> expected{"scopes.html#the-table",
-                                       "../Functions.html",
+                                       "../Functions.html#ABS",
                                        "../TessalOnline.html#131180",
                                        "#here",
                                        "https://example.org/x.md",
