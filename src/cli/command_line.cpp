@@ -83,6 +83,7 @@ void BuildCommandTree(CLI::App& app, CommandLine& line) {
   AddKeyFileCommands(app, line);
   AddExpressionCommands(app, line);
   AddCatalogueCommands(app, line);
+  AddEditorCommands(app, line);
   ShowNumbers(app);
 }
 

@@ -54,6 +54,7 @@ void AddAnalysisCommands(CLI::App& app, CommandLine& line);
 void AddKeyFileCommands(CLI::App& app, CommandLine& line);
 void AddExpressionCommands(CLI::App& app, CommandLine& line);
 void AddCatalogueCommands(CLI::App& app, CommandLine& line);
+void AddEditorCommands(CLI::App& app, CommandLine& line);
 
 // The parts of the tool, as its help lists them.
 inline constexpr const char* kTemplates = "Templates";
@@ -61,6 +62,7 @@ inline constexpr const char* kAnalyses = "Analyses";
 inline constexpr const char* kKeyFiles = "Key files";
 inline constexpr const char* kExpressions = "Expressions";
 inline constexpr const char* kCatalogues = "Catalogues";
+inline constexpr const char* kEditors = "Editors";
 
 // What commands are made of.
 CLI::App* AddCommand(CLI::App& parent, CommandLine& line, const char* group, const char* name,

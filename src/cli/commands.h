@@ -172,4 +172,8 @@ ExitCode RunEval(const std::string& name, const std::vector<std::string>& values
 ExitCode RunCall(const std::string& name, const std::vector<std::string>& values,
                  const std::vector<std::string>& settings);
 
+/// The language server protocol over standard input and output, until the client ends it. 0 when it was shut
+/// down before, 1 when not, 2 for input that is none of the protocol's.
+ExitCode RunLanguageServer();
+
 }  // namespace tessal::cli

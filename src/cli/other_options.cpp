@@ -92,4 +92,9 @@ void AddCatalogueCommands(CLI::App& app, CommandLine& line) {
       ->type_name("NAME=VALUE,VALUE...");
 }
 
+void AddEditorCommands(CLI::App& app, CommandLine& line) {
+  AddCommand(app, line, kEditors, "lsp", "serves text editors by the language server protocol",
+             [] { return RunLanguageServer(); });
+}
+
 }  // namespace tessal::cli
