@@ -148,6 +148,7 @@ std::vector<std::string> ValuedOptions(const Command& program) {
 
 std::vector<std::string> NamesOf(const std::vector<Command>& commands) {
   std::vector<std::string> names;
+  names.reserve(commands.size());
   for (const Command& command : commands) names.push_back(command.name);
   return names;
 }
@@ -254,10 +255,12 @@ void AddFishCommand(std::string& text, const std::string& program, const std::st
                   (isRepeated ? " more" : ""));
   };
   for (const Command& each : command.commands) {
-    text += start + at(1, false) + " -a " + each.name + " -d " + Quoted(each.meaning) + "\n";
+    text += start;
+    text += at(1, false) + " -a " + each.name + " -d " + Quoted(each.meaning) + "\n";
   }
   for (const CallPart& option : command.options) {
-    text += start + Quoted(function + "_at \"" + command.path + "\"") + FishOption(option) + "\n";
+    text += start;
+    text += Quoted(function + "_at \"" + command.path + "\"") + FishOption(option) + "\n";
   }
   for (std::size_t place = 0; place < command.arguments.size(); ++place) {
     const CallPart& argument = command.arguments[place];

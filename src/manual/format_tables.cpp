@@ -103,8 +103,11 @@ class Reading final {
       if (isKnown) continue;
       tables.sections.push_back({std::string(word->name), path, word->meaning, {}});
       ReadKeywords(static_cast<const CKvfSectionItem&>(item));
-      const std::string shown = std::string(word->name) + (word->IsNumbered() ? "N" : "");
-      ReadSections(static_cast<const CKvfSectionItem&>(item), path.empty() ? shown : path + " / " + shown);
+      std::string within = path;
+      if (!within.empty()) within += " / ";
+      within += word->name;
+      if (word->IsNumbered()) within += 'N';
+      ReadSections(static_cast<const CKvfSectionItem&>(item), within);
     }
   }
 
@@ -150,8 +153,9 @@ class Reading final {
                                        [&value](const KeywordChoice& each) { return each.value == value; });
       if (isKnown) continue;
       std::string meaning = MeaningOfChoice(field, choice.display);
-      const bool saysMore = value != choice.display && value != "'" + choice.display + "'";
-      if (saysMore) meaning = choice.display + ". " + meaning;
+      const bool saysMore =
+          value.find(choice.display) == std::string::npos || value.size() > choice.display.size() + 2;
+      if (saysMore) meaning.insert(0, choice.display + ". ");
       entry->choices.push_back({value, meaning});
     }
   }

@@ -121,18 +121,9 @@ std::string KateTexts(std::string_view name, char quote) {
          "\"/>\n        <IncludeRules context=\"Expression\"/>\n      </context>\n";
 }
 
-}  // namespace
-
-std::string KateSyntax() {
-  const Language language = ReadLanguage();
-  std::string text =
-      "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<!DOCTYPE language>\n"
-      "<language name=\"Tessal Template\" version=\"1\" kateversion=\"5.0\" section=\"Scientific\" "
-      "extensions=\"*.tessal\" mimetype=\"application/x-tessal\" casesensitive=\"1\">\n  <highlighting>\n";
-  text += KateList("keywords", language.keywords) + KateList("functions", language.functions) +
-          KateList("properties", language.properties) + KateList("verbs", language.verbs) +
-          KateList("any case", language.anyCase) + KateList("capitals", language.capitals);
-  text += "    <contexts>\n      <context name=\"Template\" attribute=\"Normal\" lineEndContext=\"#stay\">\n";
+/// What lies outside quotes, comments among it, and the quoted texts.
+std::string KateTemplate(const Language& language) {
+  std::string text = "      <context name=\"Template\" attribute=\"Normal\" lineEndContext=\"#stay\">\n";
   text += KatePattern("Section",
                       R"(^\s*\[()" + Alternatives(language.sections) + "|(" +
                           Alternatives(language.numbered) + R"()[0-9]+)\])",
@@ -149,7 +140,11 @@ std::string KateSyntax() {
       "      </context>\n"
       "      <context name=\"Comment\" attribute=\"Comment\" lineEndContext=\"#pop\"/>\n";
   text += KateTexts("Text", '\'') + KateTexts("Path", '|');
-  text +=
+  return text;
+}
+
+std::string KateExpression(const Language& language) {
+  std::string text =
       "      <context name=\"Remark\" attribute=\"Comment\" lineEndContext=\"#stay\">\n"
       "        <Detect2Chars attribute=\"Comment\" context=\"#pop\" char=\"*\" char1=\"/\"/>\n"
       "      </context>\n"
@@ -164,7 +159,11 @@ std::string KateSyntax() {
   text += KatePattern("Number", std::string(kNumber));
   text += KatePattern("Symbol", R"(\b[A-Za-z_][A-Za-z0-9_]*)");
   text += KatePattern("Operator", Alternatives(language.signs));
-  text += "      </context>\n    </contexts>\n    <itemDatas>\n";
+  return text + "      </context>\n";
+}
+
+std::string KateLooks() {
+  std::string text = "    <itemDatas>\n";
   struct Look {
     std::string_view name;
     std::string_view style;
@@ -180,8 +179,24 @@ std::string KateSyntax() {
             std::string(look.style) + "\" spellChecking=\"" +
             (look.name == "String" || look.name == "Comment" ? "1" : "0") + "\"/>\n";
   }
+  return text + "    </itemDatas>\n";
+}
+
+}  // namespace
+
+std::string KateSyntax() {
+  const Language language = ReadLanguage();
+  std::string text =
+      "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<!DOCTYPE language>\n"
+      "<language name=\"Tessal Template\" version=\"1\" kateversion=\"5.0\" section=\"Scientific\" "
+      "extensions=\"*.tessal\" mimetype=\"application/x-tessal\" casesensitive=\"1\">\n  <highlighting>\n";
+  text += KateList("keywords", language.keywords) + KateList("functions", language.functions) +
+          KateList("properties", language.properties) + KateList("verbs", language.verbs) +
+          KateList("any case", language.anyCase) + KateList("capitals", language.capitals);
+  text += "    <contexts>\n" + KateTemplate(language) + KateExpression(language) + "    </contexts>\n";
+  text += KateLooks();
   return text +
-         "    </itemDatas>\n  </highlighting>\n  <general>\n    <comments>\n"
+         "  </highlighting>\n  <general>\n    <comments>\n"
          "      <comment name=\"singleLine\" start=\"//\"/>\n    </comments>\n"
          "    <keywords casesensitive=\"1\"/>\n  </general>\n</language>\n";
 }
