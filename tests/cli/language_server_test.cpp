@@ -303,6 +303,9 @@ TEST(MessageFrames, AreReadInPiecesOrFailWithTheReason) {
 TEST(MessageFrames, GiveBackWhatWasFramed) {
   const std::string body("\0a\r\n\r\n\xFF", 7);
   EXPECT_EQ(Frames(cli::Framed(body) + cli::Framed(""), 3), "(" + body + ")()");
+  // Each frame in one piece, as clients send them.
+  const std::string frame = cli::Framed(body);
+  EXPECT_EQ(Frames(frame + frame, frame.size()), "(" + body + ")(" + body + ")");
 }
 
 TEST(LanguageServer, AnswersCancelledRequestsAtOnce) {
