@@ -17,6 +17,7 @@
 #include "core/template_core.h"
 #include "core/visibility_groups.h"
 #include "expr/scanner.h"
+#include "platform/kvf_number.h"
 
 namespace tessal {
 
@@ -227,6 +228,8 @@ void Merging::MergeElement(MergeNode& node) {
     const bool isRenamed = !HasCaption(*node.base) && node.base->symbol.Text() != node.theirs->symbol.Text();
     if (isRenamed || values.TheyChanged(*node.base, *node.theirs))
       values.NoteTheirs(node.base, *node.theirs, node.name, kRemovedValue);
+  } else if (node.theirs != nullptr && node.isRefused) {
+    values.NoteTheirs(nullptr, *node.theirs, node.name, kRemovedValue);
   } else if (node.theirs != nullptr) {
     Make(node);
   }
@@ -407,13 +410,13 @@ void Merging::SetLinks() {
       std::int32_t id = -1;
       ElementKind kind = ElementKind::None;
       if (isNumber(link.variable))
-        id = std::stoi(link.variable);
+        id = KvfInteger(link.variable);
       else
         ours.FindElementBySymbol(link.variable, id, kind);
       search.variableId.SetInt(id);
     }
     if (present.specie == link.specie) continue;
-    std::int32_t number = isNumber(link.specie) ? std::stoi(link.specie) : 0;
+    std::int32_t number = isNumber(link.specie) ? KvfInteger(link.specie) : 0;
     for (const auto& specie : state.collections.species) {
       if (specie->symbol.Text() == link.specie) number = specie->Index();
     }
