@@ -4,18 +4,13 @@
 #include <functional>
 
 #include "platform/text_encoding.h"
+#include "platform/utf8_bytes.h"
 
 namespace tessal::cli {
 
 namespace {
 
 constexpr std::size_t kBlock = 256;
-
-bool ContinuesCharacter(char byte) {
-  constexpr unsigned kMask = 0xC0;
-  constexpr unsigned kContinuation = 0x80;
-  return (static_cast<unsigned char>(byte) & kMask) == kContinuation;
-}
 
 std::size_t ContinuationsIn(std::string_view bytes) {
   return static_cast<std::size_t>(std::count_if(bytes.begin(), bytes.end(), ContinuesCharacter));

@@ -5,6 +5,7 @@
 #include <array>
 
 #include "platform/ascii.h"
+#include "platform/utf8_bytes.h"
 
 namespace tessal {
 
@@ -24,12 +25,8 @@ std::string BoundBySymbols(const PatternText& pattern, const std::string& expres
 
 /// The place of the character after the one at a place.
 std::size_t AfterCharacter(std::string_view text, std::size_t place) {
-  constexpr unsigned kContinuationMask = 0xC0;
-  constexpr unsigned kContinuation = 0x80;
   ++place;
-  while (place < text.size() &&
-         (static_cast<unsigned char>(text[place]) & kContinuationMask) == kContinuation)
-    ++place;
+  while (place < text.size() && ContinuesCharacter(text[place])) ++place;
   return place;
 }
 

@@ -12,6 +12,7 @@
 #include "expr/token_spans.h"
 #include "expr/user_function_names.h"
 #include "platform/ascii.h"
+#include "platform/utf8_bytes.h"
 
 namespace tessal {
 
@@ -204,7 +205,7 @@ class SyntaxFault final {
   /// The whole of a character in UTF-8 of which a token is the first byte.
   static LexemeSpan CharacterAt(std::string_view text, LexemeSpan token) {
     const auto isContinued = [text](std::size_t at) {
-      return at < text.size() && (static_cast<unsigned char>(text[at]) & 0xC0U) == 0x80U;
+      return at < text.size() && ContinuesCharacter(text[at]);
     };
     if (token.length == 1 && (static_cast<unsigned char>(text[token.start]) & 0x80U) != 0) {
       while (isContinued(token.start + token.length)) ++token.length;

@@ -176,7 +176,7 @@ std::string BashValueRow(const Command& command, const CallPart& option) {
   return "    " + patterns + ") offer=" + Quoted(offer) + " ;;\n";
 }
 
-/// A description within a specification of zsh.
+/// A description within the description of an argument of zsh.
 std::string ZshText(std::string_view text) {
   return Replaced(Replaced(Replaced(text, "[", "("), "]", ")"), ":", " -");
 }

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "platform/utf8_bytes.h"
 #include "ui/icons.h"
 #include "ui/item_data.h"
 #include "ui/plain_tip.h"
@@ -27,10 +28,7 @@ QString OnOneLine(QString text) {
 
 /// Whether a character of a UTF-8 text begins at a place.
 bool BeginsCharacter(const std::string& text, std::size_t place) {
-  constexpr unsigned kContinuationMask = 0xC0;
-  constexpr unsigned kContinuation = 0x80;
-  return place >= text.size() ||
-         (static_cast<unsigned char>(text[place]) & kContinuationMask) != kContinuation;
+  return place >= text.size() || !ContinuesCharacter(text[place]);
 }
 
 /// The part of a text around the first of the marks, with those that lie in it.

@@ -2,17 +2,13 @@
 
 #include <algorithm>
 
+#include "platform/utf8_bytes.h"
+
 namespace tessal::cli {
 
 namespace {
 
 constexpr std::size_t kBlock = 256;
-
-bool ContinuesCharacter(char byte) {
-  constexpr unsigned kMask = 0xC0;
-  constexpr unsigned kContinuation = 0x80;
-  return (static_cast<unsigned char>(byte) & kMask) == kContinuation;
-}
 
 /// Whether the byte begins a character that UTF-16 has two units for.
 bool BeginsPair(char byte) {
