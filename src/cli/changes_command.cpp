@@ -110,8 +110,7 @@ void PrintJson(const std::vector<SymbolChange>& changes) {
 
 ExitCode RunChanges(const std::string& former, const std::string& later, Format format) {
   TemplateCore& laterCore = TheTemplate();
-  // Like the template of the tool, it goes with the process.
-  TemplateCore& formerCore = *std::make_unique<TemplateCore>().release();
+  TemplateCore& formerCore = AnotherTemplate();
   if (!LoadOrComplain(formerCore, former) || !LoadOrComplain(laterCore, later)) return kCallFault;
   const std::vector<SymbolChange> changes = CompareBySymbol(formerCore, laterCore);
   switch (format) {

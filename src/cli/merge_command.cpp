@@ -1,6 +1,4 @@
 // The merge of templates, for people and as a driver of version control.
-#include <memory>
-
 #include "cli/commands.h"
 #include "cli/template_files.h"
 #include "core/merge.h"
@@ -26,9 +24,8 @@ std::string ConflictLine(const MergeConflict& conflict) {
 
 ExitCode RunMerge(const MergeCall& call) {
   TemplateCore& ours = TheTemplate();
-  // Like the template of the tool, they go with the process.
-  TemplateCore& base = *std::make_unique<TemplateCore>().release();
-  TemplateCore& theirs = *std::make_unique<TemplateCore>().release();
+  TemplateCore& base = AnotherTemplate();
+  TemplateCore& theirs = AnotherTemplate();
   if (!call.output.empty() && !call.force && !IsFreeOrComplain(call.output)) return kCallFault;
   if (!LoadOrComplain(base, call.base) || !LoadOrComplain(theirs, call.theirs) ||
       !LoadOrComplain(ours, call.ours))

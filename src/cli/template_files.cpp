@@ -34,6 +34,12 @@ TemplateCore& TheTemplate() {
   return core;
 }
 
+TemplateCore& AnotherTemplate() {
+  using Templates = std::vector<std::unique_ptr<TemplateCore>>;
+  static Templates& others = *std::make_unique<Templates>().release();
+  return *others.emplace_back(std::make_unique<TemplateCore>());
+}
+
 bool RanOutOfMemory() {
   static constexpr Message kOutOfMemory("out-of-memory");
   const std::vector<ErrorRecord>& records = Errors().Records();

@@ -13,6 +13,9 @@ namespace tessal::cli {
 /// The template that a command works on. Nobody takes it apart: the process ends with it.
 TemplateCore& TheTemplate();
 
+/// A further one, which goes with the process too.
+TemplateCore& AnotherTemplate();
+
 /// Whether the last load or save ended for want of memory, which is no fault of the file.
 bool RanOutOfMemory();
 
