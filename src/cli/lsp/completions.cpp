@@ -1,10 +1,12 @@
 // What may be typed at a place: in an expression what the rules of the template allow there, elsewhere the
 // keywords of the section, the words of a value and the names of sections.
 #include <algorithm>
+#include <optional>
 #include <string>
 
 #include "cli/lsp/features.h"
 #include "cli/lsp/field_words.h"
+#include "cli/lsp/unfinished_text.h"
 #include "core/completion.h"
 #include "elements/format_words.h"
 #include "expr/function_reference.h"
@@ -75,7 +77,7 @@ void AddElement(ItemList& list, const Completion& completion) {
 Json InExpression(const LoadedDocument& document, const ExpressionPlace& place) {
   const CaretContext context = ContextAt(place.text, place.caret);
   const std::string_view typed = place.text.substr(context.word.start, place.caret - context.word.start);
-  ItemList list(document.RangeOf(typed));
+  ItemList list(document.RangeOf(place.start + context.word.start, place.start + place.caret));
   const std::vector<Completion> offered =
       Matching(CompletionsFor(document.Core(), *place.element, context.place), typed);
   const std::size_t count = std::min(offered.size(), kMostRows);
@@ -115,15 +117,13 @@ void AddKeywords(const LoadedDocument& document, const CEL_Element& element, std
 }
 
 Json InLine(const LoadedDocument& document, std::size_t offset) {
-  const std::string_view source = document.Core().SourceText();
-  const std::size_t lineStart = offset == 0 ? 0 : source.rfind('\n', offset - 1) + 1;
-  const std::string_view before = source.substr(lineStart, offset - lineStart);
+  const std::string_view before = LineBefore(document, offset);
   std::size_t start = before.size();
   while (start > 0 && IsWordCharacter(before[start - 1])) --start;
   const std::string_view typed = before.substr(start);
   const std::string_view prefix = before.substr(0, start);
   const std::size_t last = prefix.find_last_not_of(" \t");
-  ItemList list(document.RangeOf(typed));
+  ItemList list(document.RangeOf(offset - typed.size(), offset));
   const CEL_Element* element = document.ElementAt(offset);
   const auto section = document.Outline().SectionAt(offset);
   if (last == std::string_view::npos) {
@@ -135,11 +135,17 @@ Json InLine(const LoadedDocument& document, std::size_t offset) {
       if (Begins(word.name, typed)) list.Add(word.name, kModuleItem, "section", word.meaning);
     }
   } else if (element != nullptr && prefix[last] == '\'') {
-    for (const ValueWord& word : WordsOfValue(*element, document.Outline().KeywordBefore(offset))) {
+    for (const ValueWord& word : WordsOfValue(*element, KeywordOfLine(before))) {
       if (Begins(word.word, typed)) list.Add(word.word, kEnumMember, "", word.meaning);
     }
   }
   return list.Take(true);
+}
+
+/// The expression at a place, whether it is whole or not.
+std::optional<ExpressionPlace> ExpressionOf(const LoadedDocument& document, std::size_t offset) {
+  const auto whole = document.ExpressionAt(offset);
+  return whole ? whole : UnfinishedExpression(document, offset);
 }
 
 Json ParametersOf(const FunctionReference& function) {
@@ -157,12 +163,12 @@ Json ParametersOf(const FunctionReference& function) {
 
 Json Completions(const LoadedDocument& document, const Json& params) {
   const std::size_t offset = PositionIn(document, params);
-  const auto expression = document.ExpressionAt(offset);
+  const auto expression = ExpressionOf(document, offset);
   return expression ? InExpression(document, *expression) : InLine(document, offset);
 }
 
 Json SignatureHelp(const LoadedDocument& document, const Json& params) {
-  const auto place = document.ExpressionAt(PositionIn(document, params));
+  const auto place = ExpressionOf(document, PositionIn(document, params));
   if (!place) return nullptr;
   const auto call = ContextAt(place->text, place->caret).call;
   const FunctionReference* function =

@@ -14,11 +14,11 @@ namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-TemplateMessages Load(TemplateCore& core, const OpenDocument& document) {
+TemplateMessages Load(TemplateCore& core, const std::string& uri, std::string_view text) {
   // A comment that a text leaves open must not swallow the expressions of the next one.
   ResetExpressionScanner();
-  const bool isLoaded = core.LoadText(document.text);
-  TemplateMessages messages = CollectMessages(core, document.uri, 0);
+  const bool isLoaded = core.LoadText(std::string(text));
+  TemplateMessages messages = CollectMessages(core, uri, 0);
   messages.loaded = isLoaded;
   FindPlaces(core, messages);
   return messages;
@@ -32,15 +32,16 @@ std::string_view ReadPart(std::string_view document, std::size_t skipped) {
 
 }  // namespace
 
-LoadedDocument::LoadedDocument(const OpenDocument& loaded, ColumnUnit columnUnit)
+LoadedDocument::LoadedDocument(const OpenDocument& loaded, ColumnUnit columnUnit,
+                               std::string_view readInstead)
     : document(loaded),
       skipped(loaded.text.starts_with(kByteOrderMark) ? kByteOrderMark.size() : 0),
-      text(ReadPart(loaded.text, skipped)),
+      text(ReadPart(readInstead, skipped)),
       positions(loaded.text, columnUnit, LineEnds::AllKinds),
       filePositions(text, ColumnUnit::Characters, LineEnds::FeedsOnly),
       outline(text),
       core(TheTemplate()),
-      messages(Load(core, loaded)) {
+      messages(Load(core, loaded.uri, readInstead)) {
   const auto& sections = outline.Sections();
   for (std::size_t index = 0; index < sections.size(); ++index) {
     sectionsByLine.try_emplace(static_cast<int>(filePositions.PositionOf(sections[index].start).line) + 1,
@@ -115,7 +116,7 @@ std::optional<ExpressionPlace> LoadedDocument::ExpressionAt(std::size_t offset) 
     const std::string_view inside = StripExpressionQuotes(expression.Text());
     const auto start = OffsetOf(inside);
     if (start && offset >= *start && offset <= *start + inside.size())
-      found = ExpressionPlace{element, inside, offset - *start};
+      found = ExpressionPlace{element, inside, *start, offset - *start};
   });
   return found;
 }

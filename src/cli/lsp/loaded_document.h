@@ -20,14 +20,18 @@ namespace tessal::cli {
 /// A place in an expression.
 struct ExpressionPlace {
   const CEL_Element* element;
-  std::string_view text;  ///< of the expression, its quotes stripped; a part of the file's text
+  std::string_view text;  ///< of the expression, its quotes stripped
+  std::size_t start;      ///< where it begins in the text
   std::size_t caret;      ///< in it, from 0 to its size
 };
 
 class LoadedDocument final {
  public:
   /// Loads the document, which outlives it.
-  LoadedDocument(const OpenDocument& loaded, ColumnUnit columnUnit);
+  LoadedDocument(const OpenDocument& loaded, ColumnUnit columnUnit)
+      : LoadedDocument(loaded, columnUnit, loaded.text) {}
+  /// The same, but what is read is another text (unfinished_text.h), which outlives it too.
+  LoadedDocument(const OpenDocument& loaded, ColumnUnit columnUnit, std::string_view readInstead);
 
   const OpenDocument& Document() const { return document; }
   const TemplateCore& Core() const { return core; }
@@ -38,6 +42,8 @@ class LoadedDocument final {
   const FileOutline& Outline() const { return outline; }
   /// The text as the template was read from it.
   std::string_view Text() const { return text; }
+  /// The same as the client has it: here is what was left out of what is read.
+  std::string_view TypedText() const { return std::string_view(document.text).substr(skipped); }
 
   /// Where a part of the text begins; none for a view that is none.
   std::optional<std::size_t> OffsetOf(std::string_view part) const;

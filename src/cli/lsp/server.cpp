@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "cli/lsp/features.h"
+#include "cli/lsp/unfinished_text.h"
 
 namespace tessal::cli {
 
@@ -59,11 +60,19 @@ struct LanguageServer::NotificationRow {
   void (LanguageServer::*take)(const Json& params);
 };
 
-/// A request about a document. Those that need a template have nothing to say about a file that is none.
+/// What a request needs of a document that can not be read as a template.
+enum class LanguageServer::Need : std::uint8_t {
+  Text,          ///< its text will do
+  Whole,         ///< nothing can be said: a part of the answer would be missing
+  AtTypedPlace,  ///< the template without the line that is typed
+  AtAnyPlace,    ///< the template without the lines at the fault
+};
+
+/// A request about a document.
 struct LanguageServer::FeatureRow {
   std::string_view method;
   Json (*answer)(const LoadedDocument& document, const Json& params);
-  bool needsTemplate = true;
+  Need need;
 };
 
 const LanguageServer::RequestRow LanguageServer::kRequests[] = {
@@ -79,16 +88,16 @@ const LanguageServer::NotificationRow LanguageServer::kNotifications[] = {
 };
 
 const LanguageServer::FeatureRow LanguageServer::kFeatures[] = {
-    {"textDocument/hover", Hover},
-    {"textDocument/completion", Completions},
-    {"textDocument/signatureHelp", SignatureHelp},
-    {"textDocument/definition", Definition},
-    {"textDocument/references", References},
-    {"textDocument/documentHighlight", Highlights},
-    {"textDocument/prepareRename", PrepareRename},
-    {"textDocument/rename", Rename},
-    {"textDocument/documentSymbol", DocumentSymbols, false},
-    {"textDocument/foldingRange", FoldingRanges, false},
+    {"textDocument/hover", Hover, Need::AtAnyPlace},
+    {"textDocument/completion", Completions, Need::AtTypedPlace},
+    {"textDocument/signatureHelp", SignatureHelp, Need::AtTypedPlace},
+    {"textDocument/definition", Definition, Need::AtAnyPlace},
+    {"textDocument/references", References, Need::Whole},
+    {"textDocument/documentHighlight", Highlights, Need::Whole},
+    {"textDocument/prepareRename", PrepareRename, Need::Whole},
+    {"textDocument/rename", Rename, Need::Whole},
+    {"textDocument/documentSymbol", DocumentSymbols, Need::Text},
+    {"textDocument/foldingRange", FoldingRanges, Need::Text},
 };
 
 LanguageServer::LanguageServer(Send send) : sendBody(std::move(send)) {}
@@ -165,9 +174,8 @@ Json LanguageServer::ResultOf(const std::string& method, const Json& params) {
   const auto feature = std::find_if(std::begin(kFeatures), std::end(kFeatures), isOfMethod);
   if (feature == std::end(kFeatures))
     throw RequestFailure(kMethodNotFound, "there is no method '" + method + "'");
-  const LoadedDocument& document = Loaded(DocumentOf(params));
-  if (feature->needsTemplate && !document.IsLoaded()) return nullptr;
-  return feature->answer(document, params);
+  const LoadedDocument* document = LoadedFor(DocumentOf(params), feature->need, params);
+  return document == nullptr ? Json(nullptr) : feature->answer(*document, params);
 }
 
 void LanguageServer::Notice(const std::string& method, const Json& params) {
@@ -265,6 +273,25 @@ const LoadedDocument& LanguageServer::Loaded(const OpenDocument& document) {
     loadedChange = document.change;
   }
   return *loaded;
+}
+
+const LoadedDocument* LanguageServer::LoadedFor(const OpenDocument& document, Need need, const Json& params) {
+  const LoadedDocument& asItIs = Loaded(document);
+  if (asItIs.IsLoaded() || need == Need::Text) return &asItIs;
+  if (need == Need::Whole) return nullptr;
+  const std::vector<LeftOut> tries =
+      need == Need::AtTypedPlace ? LeftOutAt(asItIs, PositionIn(asItIs, params)) : LeftOutAtFault(asItIs);
+  std::vector<std::string> texts;
+  for (const LeftOut& leftOut : tries) texts.push_back(WithLeftOut(asItIs, leftOut));
+  for (std::string& text : texts) {
+    loaded.reset();
+    readInstead = std::move(text);
+    loaded = std::make_unique<LoadedDocument>(document, unit, readInstead);
+    // It answers this request alone.
+    loadedChange = kNoChange;
+    if (loaded->IsLoaded()) return loaded.get();
+  }
+  return nullptr;
 }
 
 void LanguageServer::Publish() {

@@ -36,6 +36,7 @@ class LanguageServer final {
   struct RequestRow;
   struct NotificationRow;
   struct FeatureRow;
+  enum class Need : std::uint8_t;
   static const RequestRow kRequests[];
   static const NotificationRow kNotifications[];
   static const FeatureRow kFeatures[];
@@ -58,6 +59,8 @@ class LanguageServer final {
 
   OpenDocument& DocumentOf(const Json& params);
   const LoadedDocument& Loaded(const OpenDocument& document);
+  /// The document, or where it is no template what of it will do for a request; none where nothing will.
+  const LoadedDocument* LoadedFor(const OpenDocument& document, Need need, const Json& params);
   void Publish();
 
   void SendJson(const Json& message);
@@ -66,6 +69,8 @@ class LanguageServer final {
   void SendNotice(std::string_view method, Json params);
 
   enum class Phase : std::uint8_t { Started, Running, ShutDown };
+
+  static constexpr std::uint64_t kNoChange = 0;
 
   Send sendBody;
   std::deque<Json> queue;
@@ -76,7 +81,8 @@ class LanguageServer final {
   std::set<std::string> unpublished;
   std::uint64_t changes = 0;
   std::unique_ptr<LoadedDocument> loaded;
-  std::uint64_t loadedChange = 0;
+  std::uint64_t loadedChange = kNoChange;
+  std::string readInstead;  ///< what `loaded` was read from, where it is not the text of the document
   std::optional<int> exitCode;
 };
 

@@ -20,11 +20,11 @@ bool Holds(std::string_view part, std::string_view text, std::size_t offset) {
 }
 
 /// The identifier of an expression at a place. Between two tokens the one that begins there counts.
-std::string_view IdentifierAt(const ExpressionPlace& place) {
+std::string_view IdentifierAt(std::string_view expression, std::size_t caret) {
   std::string_view found;
-  for (const TokenSpan& token : TokenSpans(place.text)) {
+  for (const TokenSpan& token : TokenSpans(expression)) {
     if (token.code != TokenCode::Identifier) continue;
-    if (place.caret >= token.span.start && place.caret <= token.End()) found = TextOf(place.text, token);
+    if (caret >= token.span.start && caret <= token.End()) found = TextOf(expression, token);
   }
   return found;
 }
@@ -59,6 +59,40 @@ void ForEachQuoted(std::string_view text, std::string_view keyword, Visitor visi
     visit(text.substr(quote + 1, end - quote - 1));
     place = end;
   }
+}
+
+enum class PoolText : std::uint8_t { Expression, Process };
+
+/// Calls the visitor with each expression and each process of the pools, as parts of the text that was read.
+template <class Visitor>
+void ForEachPoolText(const LoadedDocument& document, Visitor visit) {
+  const auto& sections = document.Outline().Sections();
+  for (const OutlineKeyword& keyword : document.Outline().Keywords()) {
+    if (!keyword.section || !sections[*keyword.section].parent) continue;
+    const OutlineSection& around = sections[*sections[*keyword.section].parent];
+    if (around.parent || !EqualIgnoringCase(around.name, kPools)) continue;
+    const bool isExpression = EqualIgnoringCase(keyword.word, key::kExpression);
+    if (!isExpression && !EqualIgnoringCase(keyword.word, kBoundary)) continue;
+    ForEachQuoted(document.Text(), keyword.word, [&](std::string_view value) {
+      const std::string_view part = InSource(document, value);
+      if (isExpression) {
+        visit(StripExpressionQuotes(part), PoolText::Expression);
+      } else {
+        visit(part, PoolText::Process);
+      }
+    });
+  }
+}
+
+/// The name at a place in the pools; empty where there is none.
+std::string_view NameInPools(const LoadedDocument& document, std::size_t offset) {
+  std::string_view found;
+  ForEachPoolText(document, [&](std::string_view part, PoolText kind) {
+    const std::size_t start = *document.OffsetOf(part);
+    if (offset < start || offset > start + part.size()) return;
+    found = kind == PoolText::Process ? part : IdentifierAt(part, offset - start);
+  });
+  return found;
 }
 
 class PlaceSearch final {
@@ -109,23 +143,14 @@ class PlaceSearch final {
   }
 
   void AddPools() {
-    const auto& sections = document.Outline().Sections();
-    for (const OutlineKeyword& keyword : document.Outline().Keywords()) {
-      if (!keyword.section || !sections[*keyword.section].parent) continue;
-      const OutlineSection& around = sections[*sections[*keyword.section].parent];
-      if (around.parent || !EqualIgnoringCase(around.name, kPools)) continue;
-      if (EqualIgnoringCase(keyword.word, key::kExpression)) {
-        ForEachQuoted(document.Text(), keyword.word,
-                      [this](std::string_view value) { AddUses(StripExpressionQuotes(InSource(value))); });
-      } else if (EqualIgnoringCase(keyword.word, kBoundary)) {
-        ForEachQuoted(document.Text(), keyword.word, [this](std::string_view value) {
-          if (value == name) places.push_back({InSource(value), SymbolPlace::Role::Use});
-        });
+    ForEachPoolText(document, [this](std::string_view part, PoolText kind) {
+      if (kind == PoolText::Expression) {
+        AddUses(part);
+      } else if (part == name) {
+        places.push_back({part, SymbolPlace::Role::Use});
       }
-    }
+    });
   }
-
-  std::string_view InSource(std::string_view part) const { return tessal::cli::InSource(document, part); }
 
   const LoadedDocument& document;
   std::string_view name;
@@ -141,16 +166,19 @@ const SymbolRecord* RecordOf(const TemplateCore& core, std::string_view name) {
 }
 
 std::optional<NameAtPlace> NameAt(const LoadedDocument& document, std::size_t offset) {
-  const CEL_Element* element = document.ElementAt(offset);
-  if (element == nullptr) return std::nullopt;
   const auto named = [&document](std::string_view name) {
     return NameAtPlace{name, RecordOf(document.Core(), name)};
   };
+  const CEL_Element* element = document.ElementAt(offset);
+  if (element == nullptr) {
+    const std::string_view name = NameInPools(document, offset);
+    return name.empty() ? std::nullopt : std::optional(named(name));
+  }
   const std::string_view symbol = element->symbol.Text();
   const std::string_view source = document.Core().SourceText();
   if (document.OffsetOf(symbol) && Holds(symbol, source, offset)) return named(symbol);
   if (const auto expression = document.ExpressionAt(offset)) {
-    const std::string_view identifier = IdentifierAt(*expression);
+    const std::string_view identifier = IdentifierAt(expression->text, expression->caret);
     if (!identifier.empty()) return named(identifier);
     return std::nullopt;
   }

@@ -16,7 +16,8 @@ struct NameAtPlace {
   const SymbolRecord* record;  ///< of the element of that name; none for one that means something else
 };
 
-/// The symbol, keyword of an equation or identifier of an expression at a place, its ends included.
+/// The symbol, keyword of an equation, identifier of an expression or process of a pool at a place, its ends
+/// included.
 std::optional<NameAtPlace> NameAt(const LoadedDocument& document, std::size_t offset);
 
 struct SymbolPlace {
