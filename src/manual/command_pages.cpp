@@ -1,4 +1,5 @@
 // The pages of the two programs: what they are called with, and what goes with every call.
+#include <algorithm>
 #include <span>
 
 #include "manual/option_tree.h"
@@ -102,6 +103,8 @@ void AddCommand(ManualPage& page, const Command& command) {
     return;
   }
   page.Item(CallOf(command), Sentence(command.meaning));
+  if (command.arguments.empty() && std::all_of(command.options.begin(), command.options.end(), IsHelp))
+    return;
   page.Indent();
   AddParts(page, command.arguments, false);
   AddParts(page, command.options, false);

@@ -8,8 +8,9 @@
 
 // Settings of the sanitizers, under the names that they look for: what the font library keeps for the life of
 // the process is no leak, and little freed memory is held back, so that a test may watch the process's size.
-extern "C" const char* __lsan_default_suppressions();  // NOLINT(bugprone-reserved-identifier)
-extern "C" const char* __asan_default_options();       // NOLINT(bugprone-reserved-identifier)
+#define SHOWN_TO_SANITIZERS extern "C" __attribute__((visibility("default"))) const char*
+SHOWN_TO_SANITIZERS __lsan_default_suppressions();  // NOLINT(bugprone-reserved-identifier)
+SHOWN_TO_SANITIZERS __asan_default_options();       // NOLINT(bugprone-reserved-identifier)
 
 extern "C" const char* __lsan_default_suppressions() {  // NOLINT(bugprone-reserved-identifier)
   return "leak:libfontconfig\n";
