@@ -197,9 +197,10 @@ std::vector<FieldChange> CompareFields(const Item& former, const Item& later, co
   };
   for (const ItemField& field : later.fields) {
     const ItemField* before = fieldIn(former, field.label);
-    if (before == nullptr ? !field.value.empty() : !isSame(*before, field))
+    if (before == nullptr ? !field.value.empty() : !isSame(*before, field)) {
       changes.push_back(
           {field.label, before == nullptr ? std::string() : before->value, field.value, field.isExpression});
+    }
   }
   for (const ItemField& field : former.fields) {
     if (fieldIn(later, field.label) == nullptr && !field.value.empty())

@@ -29,7 +29,7 @@ bool Uses(const TemplateCore& core, const CEL_Element& user, std::uint32_t used)
   return false;
 }
 
-std::string NewNameOf(std::string name, const NewNames& newNames) {
+std::string NewNameOf(const std::string& name, const NewNames& newNames) {
   const auto found = newNames.find(name);
   return found == newNames.end() ? name : found->second;
 }
@@ -72,6 +72,8 @@ class Matching final {
     const auto takesPart = [this, withCaptions](const CEL_Element& element) {
       return HasCaption(element) == withCaptions && IsLeft(element);
     };
+    // The view that reverses a range is none that Clang 14 compiles.
+    // NOLINTNEXTLINE(modernize-loop-convert)
     for (auto element = formerElements.rbegin(); element != formerElements.rend(); ++element) {
       // From the end, so that the first of a key is taken first.
       if (takesPart(**element)) groups[formerKey(**element)].push_back(*element);

@@ -409,10 +409,11 @@ void Merging::SetLinks() {
     if (present.variable != link.variable) {
       std::int32_t id = -1;
       ElementKind kind = ElementKind::None;
-      if (isNumber(link.variable))
+      if (isNumber(link.variable)) {
         id = KvfInteger(link.variable);
-      else
+      } else {
         ours.FindElementBySymbol(link.variable, id, kind);
+      }
       search.variableId.SetInt(id);
     }
     if (present.specie == link.specie) continue;

@@ -16,9 +16,9 @@ auto PartnerIn(const Map& partners, const CEL_Element* element) {
   return hit == partners.end() ? nullptr : hit->second;
 }
 
-/// The element of ours that the matching found in it.
+/// The element of ours that the matching, which only reads, found in it.
 CEL_Element* Ours(const CEL_Element* found) {
-  return const_cast<CEL_Element*>(found);
+  return const_cast<CEL_Element*>(found);  // NOLINT(cppcoreguidelines-pro-type-const-cast)
 }
 
 std::string SymbolOf(const CEL_Element* element) {

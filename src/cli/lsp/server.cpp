@@ -282,6 +282,7 @@ const LoadedDocument* LanguageServer::LoadedFor(const OpenDocument& document, Ne
   const std::vector<LeftOut> tries =
       need == Need::AtTypedPlace ? LeftOutAt(asItIs, PositionIn(asItIs, params)) : LeftOutAtFault(asItIs);
   std::vector<std::string> texts;
+  texts.reserve(tries.size());
   for (const LeftOut& leftOut : tries) texts.push_back(WithLeftOut(asItIs, leftOut));
   for (std::string& text : texts) {
     loaded.reset();
