@@ -17,6 +17,25 @@ inline namespace v1 {
 
 namespace {
 
+/// Whether a kind of the surface has the number that the library's inside gives it.
+constexpr bool IsSame(Kind shown, ElementKind inside) {
+  return static_cast<std::int32_t>(shown) == NumberOf(inside);
+}
+
+static_assert(IsSame(Kind::StateVariable, ElementKind::StateVariable) &&
+              IsSame(Kind::Constant, ElementKind::Constant) && IsSame(Kind::Forcing, ElementKind::Forcing) &&
+              IsSame(Kind::Auxiliary, ElementKind::Auxiliary) &&
+              IsSame(Kind::Process, ElementKind::Process) &&
+              IsSame(Kind::DerivedOutput, ElementKind::DerivedOutput) &&
+              IsSame(Kind::ParticleClass, ElementKind::Specie) &&
+              IsSame(Kind::ParticleStateVariable, ElementKind::SpecieStateVariable) &&
+              IsSame(Kind::ParticleConstant, ElementKind::SpecieConstant) &&
+              IsSame(Kind::ParticleForcing, ElementKind::SpecieForcing) &&
+              IsSame(Kind::AreaSearch, ElementKind::SpatialFunction) &&
+              IsSame(Kind::ArithmeticExpression, ElementKind::ArithmeticExpression) &&
+              IsSame(Kind::HorizontalMovement, ElementKind::HorizontalVector) &&
+              IsSame(Kind::VerticalMovement, ElementKind::VerticalEquation));
+
 /// The value that a choice gives a property of that type, as text.
 std::string ValueOf(const CEL_Choice& choice, ValueType type) {
   switch (type) {
